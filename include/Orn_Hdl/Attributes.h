@@ -1,0 +1,269 @@
+/// \file
+/// Attributes: named, typed values attached to the objects of a design.
+#pragma once
+
+#include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Containers/StringPtrMap.h"
+#include "Orn_Hdl/Model/Object.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+class AttributeVisitor;
+
+/// A bit-vector literal: its digits, and, when they were given, its base and its length in bits.
+class ORN_HDL_API BitVectorValue {
+public:
+    BitVectorValue() = default;
+    explicit BitVectorValue(const char* text) { SetValue(text); }
+
+    /// Reads "LENGTH:BASE:DIGITS" with base B, O or H, such as "8:H:A5"; a text with fewer than
+    /// three parts is taken as the digits alone. Null is read as "".
+    void SetValue(const char* text);
+
+    const Port::StringBase<char>& GetValue() const noexcept { return digits_; }
+    /// 2, 8 or 16; 2 when none was given.
+    int GetBase() const noexcept { return base_; }
+    /// In bits; 1 when none was given.
+    int GetLength() const noexcept { return length_; }
+    bool HasBaseAndLength() const noexcept { return hasBaseAndLength_; }
+
+private:
+    static int ConvertToBase(std::string_view text) noexcept;
+
+    Port::StringBase<char> digits_;
+    int base_ = 2;
+    int length_ = 1;
+    bool hasBaseAndLength_ = false;
+};
+
+/// An attribute: a name, a value of one of seven types, and two options that say how the writers
+/// treat it.
+class ORN_HDL_API Attribute : public Object {
+public:
+    enum ValueType { String, Integer, Float, Boolean, Bit, BitVector, User };
+    /// Values of the generic option.
+    enum GenericOption { GenericNone = 0, GenericNoSyn = 1, GenericSyn = 2 };
+    /// Values of the synthesis-attribute option.
+    enum SynAttrOption { SynAttrNone = 0, SynAttrAssign = 1, SynAttrAssignNoDec = 2 };
+
+    static constexpr const char* DEFAULT_ATTRTYPE = "String";
+    static constexpr int DEFAULT_GENERIC = GenericNone;
+    static constexpr int DEFAULT_SYNATTR = SynAttrNone;
+
+    void AcceptObject(ObjectVisitor& visitor) override;
+    virtual void AcceptAttribute(AttributeVisitor& visitor);
+    /// A new attribute of the same class with the same name, comment, options and value; the caller
+    /// owns it.
+    virtual Attribute* CloneAttribute() const = 0;
+    /// Parses and stores a value text. No text is refused; null is read as "".
+    virtual void SetValue(const char* text) = 0;
+    virtual Port::StringBase<char> GetValueString() const = 0;
+    virtual ValueType GetValueType() const = 0;
+
+    Port::StringBase<char> GetValueTypeName() const;
+
+    /// Sets the generic option from "NONE", "SYN" or "NOSYN", letter case ignored.
+    /// \return false, the option unchanged, for any other text.
+    bool SetGeneric(const char* text) noexcept;
+    Port::StringBase<char> GetGeneric() const;
+    GenericOption GetGenericOption() const noexcept {
+        return static_cast<GenericOption>(generic_);
+    }
+    /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", likewise.
+    bool SetSynAttr(const char* text) noexcept;
+    Port::StringBase<char> GetSynAttr() const;
+    SynAttrOption GetSynAttrOption() const noexcept {
+        return static_cast<SynAttrOption>(synAttr_);
+    }
+
+    /// Whether name, comment, type and both options are equal, and the value texts ignoring case.
+    bool operator==(const Attribute& other) const;
+    bool operator!=(const Attribute& other) const { return !(*this == other); }
+
+protected:
+    explicit Attribute(const char* name);
+    Attribute(const Attribute&) = default;
+    Attribute& operator=(const Attribute&) = default;
+
+private:
+    unsigned generic_ : 2;
+    unsigned synAttr_ : 2;
+};
+
+/// A text.
+class ORN_HDL_API AttributeString : public Attribute {
+public:
+    AttributeString(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return String; }
+    Port::StringBase<char> GetValue() const { return value_; }
+
+private:
+    Port::StringBase<char> value_;
+};
+
+/// A signed 32-bit integer, parsed by the rules of `atoi`, saturating.
+class ORN_HDL_API AttributeInteger : public Attribute {
+public:
+    AttributeInteger(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return Integer; }
+    int GetValue() const noexcept { return value_; }
+
+private:
+    int value_ = 0;
+};
+
+/// A floating-point number that is written with as many decimals as its text had.
+class ORN_HDL_API AttributeFloat : public Attribute {
+public:
+    AttributeFloat(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return Float; }
+    double GetValue() const noexcept { return value_; }
+
+private:
+    double value_ = 0.0;
+    int width_ = 3;
+    int precision_ = 1;
+};
+
+/// True exactly for the text "true" in any letter case.
+class ORN_HDL_API AttributeBoolean : public Attribute {
+public:
+    AttributeBoolean(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return Boolean; }
+    bool GetValue() const noexcept { return value_; }
+
+private:
+    bool value_ = false;
+};
+
+/// "1" for the text "1", else "0".
+class ORN_HDL_API AttributeBit : public Attribute {
+public:
+    AttributeBit(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return Bit; }
+    Port::StringBase<char> GetValue() const { return GetValueString(); }
+
+private:
+    bool value_ = false;
+};
+
+/// A bit-vector literal.
+class ORN_HDL_API AttributeBitVector : public Attribute {
+public:
+    AttributeBitVector(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    /// The digits alone.
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return BitVector; }
+    Port::StringBase<char> GetValue() const { return value_.GetValue(); }
+    BitVectorValue GetBitVectorValue() const { return value_; }
+
+private:
+    BitVectorValue value_;
+};
+
+/// A text of a type that the user names.
+class ORN_HDL_API AttributeUser : public Attribute {
+public:
+    AttributeUser(const char* name, const char* value);
+    static Attribute* CreateAttribute(const char* name, const char* value);
+    void AcceptAttribute(AttributeVisitor& visitor) override;
+    Attribute* CloneAttribute() const override;
+    void SetValue(const char* text) override;
+    Port::StringBase<char> GetValueString() const override;
+    ValueType GetValueType() const override { return User; }
+    Port::StringBase<char> GetValue() const { return value_; }
+    void SetUserType(const char* type) { userType_ = type; }
+    Port::StringBase<char> GetUserType() const { return userType_; }
+
+private:
+    Port::StringBase<char> value_;
+    Port::StringBase<char> userType_;
+};
+
+/// Visits attributes by value type; every operation of the base does nothing.
+class ORN_HDL_API AttributeVisitor {
+public:
+    AttributeVisitor() = default;
+    AttributeVisitor(const AttributeVisitor&) = default;
+    AttributeVisitor& operator=(const AttributeVisitor&) = default;
+    virtual ~AttributeVisitor();
+    virtual void VisitAttribute(Attribute* attribute);
+    virtual void VisitAttributeString(AttributeString* attribute);
+    virtual void VisitAttributeInteger(AttributeInteger* attribute);
+    virtual void VisitAttributeFloat(AttributeFloat* attribute);
+    virtual void VisitAttributeBit(AttributeBit* attribute);
+    virtual void VisitAttributeBitVector(AttributeBitVector* attribute);
+    virtual void VisitAttributeBoolean(AttributeBoolean* attribute);
+    virtual void VisitAttributeUser(AttributeUser* attribute);
+};
+
+/// Owns attributes, in the order in which they were added. A holder without attributes owns no
+/// table.
+class ORN_HDL_API AttributeHolder {
+public:
+    AttributeHolder() noexcept;
+    /// Clones every attribute.
+    AttributeHolder(const AttributeHolder& other);
+    AttributeHolder& operator=(const AttributeHolder& other);
+    virtual ~AttributeHolder();
+
+    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is an attribute
+    /// that has an owner. A second
+    /// attribute of one name is held and iterated too, and `GetAttr` then finds the later one.
+    virtual void AddAttr(Attribute* attribute);
+    /// The attribute of that name, normalised and letter case ignored; null when there is none.
+    virtual Attribute* GetAttr(const char* name) const;
+
+    Iterator<Attribute*> GetAttrIterator() const noexcept;
+    bool HasAttrs() const noexcept { return table_ != nullptr; }
+
+private:
+    struct Table;
+    std::unique_ptr<Table> table_;
+};
+
+/// Makes attributes by the name of their type.
+class ORN_HDL_API AttributeFactory {
+public:
+    using Creator = Attribute* (*)(const char* name, const char* value);
+
+    /// The table of the seven types, shared by the whole process and never changed once made.
+    static const IStringPtrMap<Creator>& GetCreators();
+};
+
+} // namespace Orn_Hdl

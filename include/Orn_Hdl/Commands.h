@@ -1,0 +1,113 @@
+/// \file
+/// The command language: commands, the factory that finds them by phrase, and the manager that runs
+/// and keeps them.
+#pragma once
+
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Containers/StringPtrMap.h"
+#include "Port/Export.h"
+
+#include <cstddef>
+#include <memory>
+#include <vector>
+
+namespace Orn_Hdl {
+
+class Model;
+
+/// One command on one model: parsed from the words of a line, then executed.
+class ORN_HDL_API Command {
+public:
+    /// \param model the model to act on; not owned, may be null.
+    explicit Command(Model* model) noexcept : model_(model) {}
+    Command(const Command&) = delete;
+    Command& operator=(const Command&) = delete;
+    virtual ~Command();
+    /// Reads the arguments from the words of the whole line, phrase included, by position.
+    /// \return false when they are missing or invalid.
+    virtual bool Parse(const StringArray& tokens) = 0;
+    /// Applies the command to its model; throws `Exception` "Missing Model.\n" without one.
+    virtual void Execute() = 0;
+    /// The phrase that selects the command, in its registered spelling.
+    virtual const char* GetName() const = 0;
+
+    Model* GetModel() const noexcept { return model_; }
+    void SetModel(Model* model) noexcept { model_ = model; }
+
+    /// Millions of done commands are kept: they come from pages of their own.
+    static void* operator new(std::size_t size);
+    static void operator delete(void* memory) noexcept;
+
+private:
+    Model* model_;
+};
+
+/// Makes an unparsed command bound to a model; the caller owns it.
+using CommandCreator = Command* (*)(Model* model, const StringArray& tokens);
+
+/// What a user needs to know of one phrase of the command language.
+struct CommandInfo {
+    const char* phrase;
+    /// The arguments after the phrase: <required>, [optional], "..." for several words.
+    const char* arguments;
+    /// What the command does, in one line.
+    const char* help;
+};
+
+/// Finds commands by their phrase. An engine has one factory; a program can register phrases of its
+/// own in it. Copies share one table.
+class ORN_HDL_API CommandFactory {
+public:
+    /// Registers every phrase of the command language.
+    CommandFactory();
+    CommandFactory(const CommandFactory& other);
+    CommandFactory& operator=(const CommandFactory& other);
+    ~CommandFactory();
+
+    /// Registers a phrase; its words are separated by blanks. A phrase that is present gets the new
+    /// creator.
+    void AddCommandCreator(const char* phrase, CommandCreator creator);
+    void AddCommandCreator(const StringArray& words, CommandCreator creator);
+    /// The creator of the longest registered phrase that the line begins with, letter case ignored;
+    /// null when there is none.
+    CommandCreator GetCommandCreator(const StringArray& tokens) const;
+    CommandCreator GetCommandCreator(const char* text) const;
+    /// A new command of that phrase, not parsed yet; the caller owns it. Null when there is none.
+    Command* CreateCommand(Model* model, const StringArray& tokens) const;
+    Command* CreateCommand(Model* model, const char* text) const;
+    /// A new model bound to this factory, which must outlive it; the caller owns it.
+    Model* CreateModel();
+
+    /// The command language, in the order of registration.
+    static const std::vector<CommandInfo>& GetCatalogue();
+
+private:
+    std::shared_ptr<IStringPtrMap<CommandCreator>> creators_;
+};
+
+/// Runs commands and keeps the done ones, which it owns.
+class ORN_HDL_API CommandManager {
+public:
+    CommandManager();
+    CommandManager(const CommandManager&) = delete;
+    CommandManager& operator=(const CommandManager&) = delete;
+    ~CommandManager();
+
+    /// Creates, parses, executes and keeps the command of a line.
+    /// \return true.
+    /// \throws Exception "Command not find.\n" when no phrase matches or `factory` is null,
+    ///         "PHRASE: Invalid Arguments.\n" when the arguments do not parse, or whatever the
+    ///         command throws; the command is then deleted.
+    bool CreateAndExecute(const StringArray& tokens, Model* model, CommandFactory* factory);
+    /// Takes ownership. Null is ignored.
+    void AddDoneCommand(Command* command);
+    int GetDoneCommandCount() const noexcept;
+    /// Deletes every done command, the first one first.
+    void Clear();
+
+private:
+    struct Implementation;
+    std::unique_ptr<Implementation> implementation_;
+};
+
+} // namespace Orn_Hdl

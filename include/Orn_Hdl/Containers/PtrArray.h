@@ -1,0 +1,188 @@
+/// \file
+/// Ordered arrays of pointers, and the iterator over them.
+#pragma once
+
+#include "Port/Export.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <type_traits>
+
+namespace Orn_Hdl {
+
+/// An ordered sequence of untyped pointers. It never deletes what they point at; nulls may be
+/// stored. Made small, since every signal and every instance holds one: an empty array owns no
+/// memory, and growth from empty begins with three places, what most nets need.
+class ORN_HDL_API PtrArrayBase {
+public:
+    using Less = bool (*)(void* a, void* b, void* context);
+
+    PtrArrayBase() noexcept = default;
+    PtrArrayBase(const PtrArrayBase& other);
+    PtrArrayBase& operator=(const PtrArrayBase& other);
+    virtual ~PtrArrayBase();
+
+    int GetSize() const noexcept { return static_cast<int>(size_); }
+    bool IsEmpty() const noexcept { return size_ == 0; }
+    /// Makes room for `capacity` elements in all.
+    void Reserve(int capacity);
+    /// Drops all elements without deleting them.
+    void Empty() noexcept;
+    /// Drops the last element without deleting it; an empty array stays as it is.
+    void RemoveTail() noexcept {
+        if (size_ > 0) {
+            --size_;
+        }
+    }
+    /// Exchanges two elements; an index out of range changes nothing.
+    void Swap(int i, int j) noexcept;
+
+protected:
+    void* GetAt(int i) const noexcept {
+        return i < 0 || static_cast<std::uint32_t>(i) >= size_ ? nullptr : items_[i];
+    }
+    void* GetTail() const noexcept { return size_ == 0 ? nullptr : items_[size_ - 1]; }
+    int GetIndex(const void* p) const noexcept;
+    int Add(void* p) {
+        if (size_ == capacity_) {
+            Grow();
+        }
+        items_[size_] = p;
+        return static_cast<int>(size_++);
+    }
+    void SetAt(int i, void* p);
+    bool Remove(const void* p) noexcept;
+    void RemoveAt(int i) noexcept;
+    void Sort(Less less, void* context);
+    void** GetItems() noexcept { return items_; }
+
+private:
+    void Grow();
+    void Reallocate(std::size_t capacity);
+
+    void** items_ = nullptr;
+    std::uint32_t size_ = 0;
+    std::uint32_t capacity_ = 0;
+};
+
+/// The typed front: `T` is a pointer to an object.
+template <class T> class PtrArray : public PtrArrayBase {
+public:
+    static_assert(std::is_pointer<T>::value, "the array holds pointers");
+
+    /// The element at `i`; null for an index out of range.
+    T GetAt(int i) const noexcept { return static_cast<T>(PtrArrayBase::GetAt(i)); }
+    /// The last element; null when there is none.
+    T GetTail() const noexcept { return static_cast<T>(PtrArrayBase::GetTail()); }
+    /// The index of the first element equal to `p`, or -1.
+    int GetIndex(T p) const noexcept { return PtrArrayBase::GetIndex(p); }
+    bool Contains(T p) const noexcept { return GetIndex(p) >= 0; }
+    /// Appends. \return the index of the new element.
+    int Add(T p) { return PtrArrayBase::Add(p); }
+    /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
+    void SetAt(int i, T p) { PtrArrayBase::SetAt(i, p); }
+    /// Removes the first element equal to `p`, keeping the others' order.
+    /// \return false when there is none.
+    bool Remove(T p) noexcept { return PtrArrayBase::Remove(p); }
+    /// Removes the element at `i`, keeping the others' order; an index out of range is ignored.
+    void RemoveAt(int i) noexcept { PtrArrayBase::RemoveAt(i); }
+
+    /// Sorts stably with the caller's less-than predicate, which receives `context`.
+    void Sort(bool (*less)(T a, T b, void* context), void* context) {
+        struct Caller {
+            bool (*less)(T, T, void*);
+            void* context;
+        } caller{less, context};
+        PtrArrayBase::Sort(
+            [](void* a, void* b, void* c) {
+                const Caller* typed = static_cast<const Caller*>(c);
+                return typed->less(static_cast<T>(a), static_cast<T>(b), typed->context);
+            },
+            &caller);
+    }
+};
+
+/// A `PtrArray` that owns its elements: its destructor deletes them, the last one first. Only the
+/// destructor deletes; `Empty`, `Remove`, `RemoveTail` and `SetAt` let go of what they drop.
+template <class T> class OwnPtrArray : public PtrArray<T> {
+public:
+    OwnPtrArray() noexcept = default;
+    OwnPtrArray(const OwnPtrArray&) = delete;
+    OwnPtrArray& operator=(const OwnPtrArray&) = delete;
+    ~OwnPtrArray() override { DeleteAll(); }
+
+    /// Appends; a pointer that the array holds already is ignored.
+    /// \return the index of the element. Looks at every element: a caller who knows that the
+    ///         object is new uses `AddNew`.
+    int Add(T p) {
+        const int present = p == nullptr ? -1 : this->GetIndex(p);
+        return present >= 0 ? present : AddNew(p);
+    }
+    /// Appends an object that the array does not hold.
+    int AddNew(T p) { return PtrArray<T>::Add(p); }
+    /// As `PtrArray::SetAt`; a pointer that the array holds at another place is ignored.
+    void SetAt(int i, T p) {
+        if (p == nullptr || this->GetIndex(p) < 0) {
+            PtrArray<T>::SetAt(i, p);
+        }
+    }
+    /// Deletes every element, the last one first.
+    void DeleteAll() {
+        while (!this->IsEmpty()) {
+            T last = this->GetTail();
+            this->RemoveTail();
+            delete last;
+        }
+    }
+};
+
+/// Walks a `PtrArray<T>` by index, stored nulls included. It reads the array's present size at each
+/// step, so elements appended on the way are met too. The array must outlive it.
+///
+/// \code
+/// for (Signal* signal : netlist.GetSignalIterator()) { ... }
+/// \endcode
+template <class T> class Iterator {
+public:
+    /// Over no array: yields nothing.
+    Iterator() noexcept = default;
+    explicit Iterator(const PtrArray<T>* array) noexcept : array_(array) {}
+    Iterator(const Iterator&) noexcept = default;
+    Iterator& operator=(const Iterator&) noexcept = default;
+    virtual ~Iterator() = default;
+
+    bool IsAtEnd() const noexcept { return array_ == nullptr || index_ >= array_->GetSize(); }
+    /// The present element; null at the end.
+    T GetCurrent() const noexcept { return array_ == nullptr ? nullptr : array_->GetAt(index_); }
+    void Next() noexcept {
+        if (!IsAtEnd()) {
+            ++index_;
+        }
+    }
+
+    /// For range-based for loops, from the present element on.
+    class Cursor {
+    public:
+        explicit Cursor(const Iterator& from) noexcept : array_(from.array_), index_(from.index_) {}
+        T operator*() const noexcept { return array_->GetAt(index_); }
+        Cursor& operator++() noexcept {
+            ++index_;
+            return *this;
+        }
+        friend bool operator!=(const Cursor& a, std::nullptr_t) noexcept {
+            return a.array_ != nullptr && a.index_ < a.array_->GetSize();
+        }
+
+    private:
+        const PtrArray<T>* array_;
+        int index_;
+    };
+    Cursor begin() const noexcept { return Cursor(*this); }
+    std::nullptr_t end() const noexcept { return nullptr; }
+
+private:
+    const PtrArray<T>* array_ = nullptr;
+    int index_ = 0;
+};
+
+} // namespace Orn_Hdl

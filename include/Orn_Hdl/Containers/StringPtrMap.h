@@ -1,0 +1,86 @@
+/// \file
+/// `IStringPtrMap<T>`, a map from a name, letter case ignored, to a pointer that it does not own.
+#pragma once
+
+#include "Port/Export.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <memory>
+#include <string_view>
+#include <type_traits>
+
+namespace Orn_Hdl {
+
+/// The untyped map behind every `IStringPtrMap<T>`. It copies the names and never deletes what the
+/// pointers point at. An empty map owns no memory.
+class ORN_HDL_API IStringPtrMapBase {
+public:
+    IStringPtrMapBase() noexcept;
+    /// Copies the names and the pointers, not what they point at.
+    IStringPtrMapBase(const IStringPtrMapBase& other);
+    IStringPtrMapBase& operator=(const IStringPtrMapBase& other);
+    virtual ~IStringPtrMapBase();
+
+    /// Enters a name, or gives a name that is present another pointer: it keeps its first spelling.
+    void Add(std::string_view name, void* pointer);
+    /// The pointer of a name, null when the name is absent.
+    void* Get(std::string_view name) const noexcept;
+    bool Contains(std::string_view name) const noexcept;
+    void Remove(std::string_view name) noexcept;
+    bool IsEmpty() const noexcept;
+    void Empty() noexcept;
+    /// The length of the longest name that was ever entered.
+    std::size_t GetLongestName() const noexcept;
+
+protected:
+    /// As `Get`, for a caller who has hashed the name (ignoring case) already.
+    void* GetHashed(std::uint32_t hash, std::string_view name) const noexcept;
+
+private:
+    struct Table;
+    std::unique_ptr<Table> table_;
+};
+
+/// The typed front: `T` is a pointer to an object or to a function.
+template <class T> class IStringPtrMap : public IStringPtrMapBase {
+public:
+    static_assert(std::is_pointer<T>::value, "the map holds pointers");
+
+    void Add(const char* name, T pointer) { Add(View(name), pointer); }
+    void Add(std::string_view name, T pointer) {
+        IStringPtrMapBase::Add(name, ToUntyped(pointer));
+    }
+    T Get(const char* name) const noexcept { return Get(View(name)); }
+    T Get(std::string_view name) const noexcept {
+        return FromUntyped(IStringPtrMapBase::Get(name));
+    }
+    T GetHashed(std::uint32_t hash, std::string_view name) const noexcept {
+        return FromUntyped(IStringPtrMapBase::GetHashed(hash, name));
+    }
+    bool Contains(const char* name) const noexcept {
+        return IStringPtrMapBase::Contains(View(name));
+    }
+    void Remove(const char* name) noexcept { IStringPtrMapBase::Remove(View(name)); }
+
+private:
+    static std::string_view View(const char* name) noexcept {
+        return name == nullptr ? std::string_view() : std::string_view(name);
+    }
+    static void* ToUntyped(T pointer) noexcept {
+        if constexpr (std::is_function<std::remove_pointer_t<T>>::value) {
+            return reinterpret_cast<void*>(pointer);
+        } else {
+            return const_cast<void*>(static_cast<const void*>(pointer));
+        }
+    }
+    static T FromUntyped(void* pointer) noexcept {
+        if constexpr (std::is_function<std::remove_pointer_t<T>>::value) {
+            return reinterpret_cast<T>(pointer);
+        } else {
+            return static_cast<T>(pointer);
+        }
+    }
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,111 @@
+/// \file
+/// Components (cell types) and instances (their placements).
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Model/Object.h"
+#include "Orn_Hdl/Model/Pins.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+#include <memory>
+
+namespace Orn_Hdl {
+
+struct ComponentAnchor;
+class PinIndex;
+
+/// The pins of a component or an instance, in order. Long lists are searched through an index.
+class ORN_HDL_API PinList : public PtrArray<Pin*> {
+public:
+    PinList() noexcept;
+    PinList(const PinList&) = delete;
+    PinList& operator=(const PinList&) = delete;
+    ~PinList() override;
+
+    /// The first pin of that name, normalised and letter case ignored; null when there is none.
+    Pin* GetPin(const char* name) const;
+    Pin* GetPin(std::string_view name) const;
+    /// Sorts by polarity value, then by name in natural order, stably.
+    void SortByPolarityAndName();
+
+private:
+    static constexpr int LongestUnindexed = 16;
+
+    mutable std::unique_ptr<PinIndex> index_;
+};
+
+/// A cell type: a name and an ordered list of pins, which it owns.
+class ORN_HDL_API Component : public Object, public AttributeHolder {
+public:
+    explicit Component(const char* name);
+    Component(const Component&) = delete;
+    Component& operator=(const Component&) = delete;
+    /// Instances of this component keep their pins and then have no component.
+    ~Component() override;
+
+    void AcceptObject(ObjectVisitor& visitor) override;
+
+    /// Appends a pin of the class that the name's form asks for. A name that is taken is not
+    /// refused here. Instances made before do not get the pin.
+    /// \param name null is read as "".
+    /// \param defaultValue taken when its text is not empty.
+    void AddPin(const char* name, const Polarity& polarity, const BitVectorValue& defaultValue);
+    void AddPin(const char* name, const Polarity& polarity, const char* defaultValue);
+    /// Appends a clone of a pin.
+    void AddPin(const Pin& pin);
+    Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
+    Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
+    Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
+
+private:
+    friend class Instance;
+
+    void AddNewPin(std::unique_ptr<Pin> pin);
+
+    PinList pins_;
+    ComponentAnchor* anchor_;
+};
+
+/// A placement of a component, with its own copies of the component's pins.
+class ORN_HDL_API Instance : public Object, public AttributeHolder {
+public:
+    /// \param component not owned; null gives an instance without pins.
+    Instance(const char* name, const Component* component);
+    Instance(const Instance&) = delete;
+    Instance& operator=(const Instance&) = delete;
+    ~Instance() override;
+
+    void AcceptObject(ObjectVisitor& visitor) override;
+
+    /// The component; null when there is none, or none any more.
+    Component* GetComponent() const noexcept;
+    /// The component's name; empty when there is no component.
+    Port::StringBase<char> GetComponentName() const;
+    /// The component's attribute of that name; null when there is none.
+    Attribute* GetComponentAttr(const char* name) const;
+
+    Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
+    Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
+    Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
+    /// Sorts the pins by polarity value, then by name in natural order.
+    void SortPinName() { pins_.SortByPolarityAndName(); }
+
+    /// Appends the pins that are wired to no signal.
+    /// \param inputsOnly whether to take input pins only.
+    /// \return whether the list has elements then.
+    bool GetOpenPin(PtrArray<Pin*>& pins, bool inputsOnly) const;
+    /// Appends the input and bidirectional pins whose signal, or a member of it, is an output port.
+    void GetOutPortConnectedToInPin(PtrArray<Pin*>& pins) const;
+    /// Appends the output and bidirectional pins whose signal, or a member of it, is an input port.
+    void GetInPortConnectedToOutPin(PtrArray<Pin*>& pins) const;
+
+private:
+    void GetPinsOnPort(int pinPolarity, int portPolarity, PtrArray<Pin*>& pins) const;
+
+    ComponentAnchor* anchor_;
+    PinList pins_;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,191 @@
+/// \file
+/// `Model`, one design and every operation on it by name.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Model/Netlist.h"
+#include "Orn_Hdl/Options.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+#include <memory>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+class CommandFactory;
+class CommandManager;
+
+/// One design: its netlist, its output options and its done commands.
+///
+/// Every operation takes plain texts, looks the named objects up, checks them, and throws
+/// `Orn_Hdl::Exception` with a fixed message when a check fails; nothing that was done before is
+/// undone. A null name reads as "" in every look-up. Operations that change the design set the
+/// modified flag.
+///
+/// Signals need not be declared: the first use of a name in a connection or constant declares it,
+/// and its form tells what it is: N a scalar signal, D(7:0) a bus or a slice of the bus D, D(2) a bit
+/// of the bus D, A,D(3:0) a compound. Brackets "[]", "{}", "<>" and "()" are one and the same.
+class ORN_HDL_API Model {
+public:
+    /// \param factory makes the commands; not owned, must outlive the model. Null: no command is
+    ///        ever found.
+    explicit Model(CommandFactory* factory);
+    Model(const Model&) = delete;
+    Model& operator=(const Model&) = delete;
+    ~Model();
+
+    bool IsModified() const noexcept;
+    void SetModifiedFlag(bool modified) noexcept;
+
+    Netlist* GetNetlist() noexcept;
+    const Netlist* GetNetlist() const noexcept;
+    HdlOptions* GetOptions() noexcept;
+    CommandFactory* GetCommandFactory() const noexcept;
+    CommandManager* GetCommandManager() noexcept;
+
+    Port::StringBase<char> GetName() const;
+    /// Null gives "HDL_NETLIST".
+    void SetName(const char* name);
+    Port::StringBase<char> GetSourceFileName() const;
+    void SetSourceFileName(const char* name);
+
+    /// Splits a command line and runs it. An empty line does nothing.
+    /// \return true whenever no exception is thrown.
+    bool Execute(const char* text);
+    /// As above, for a text of known length that ends at its first NUL.
+    bool ExecuteLine(std::string_view line);
+    bool Execute(const StringArray& tokens);
+    /// Replays a command file and clears the modified flag. An exception of a line ends the replay.
+    /// \return false when the file cannot be opened or read.
+    bool Read(const char* fileName);
+    /// Clears the modified flag and returns true; done commands are kept in memory only.
+    bool Write(const char* fileName);
+
+    /// What became of the last netlist that a write command wrote: the file's name and the system's
+    /// error number, 0 when every byte was written.
+    void RecordWrite(const char* fileName, int error);
+    int GetWriteError() const noexcept;
+    Port::StringBase<char> GetWrittenFileName() const;
+
+    Component* GetComponent(const char* name) const;
+    Instance* GetInstance(const char* name) const;
+    Signal* GetSignal(const char* name) const;
+    Pin* GetPin(const char* name, const Component* component) const;
+    Pin* GetPin(const char* name, const Instance* instance) const;
+    Attribute* GetAttr(const char* name, const AttributeHolder* holder) const;
+
+    /// Components, instances and signals share one name space.
+    bool AddComponent(const char* name);
+    bool AddPin(const char* name, const Polarity& polarity, const char* component,
+                const char* defaultValue);
+    bool AddInstance(const char* name, const char* component);
+    bool AddSignal(const char* name);
+    bool ConnectSignalToPin(const char* signal, const char* instance, const char* pin);
+    /// Makes the second signal an alias of the first.
+    bool ConnectSignals(const char* first, const char* second);
+    bool AssignConstantToSignal(const char* signal, const char* value);
+    /// Wires a pin to a signal of its own that carries the constant.
+    bool AssignConstantToPin(const char* instance, const char* pin, const char* value);
+
+    /// Adds an attribute, or gives one that is present another value, its type kept.
+    /// \param type one of the seven type names; null means "String".
+    bool AddAttr(AttributeHolder* holder, const char* name, const char* value, const char* type);
+    bool AddModuleAttr(const char* name, const char* value, const char* type);
+    bool AddComponentAttr(const char* component, const char* name, const char* value,
+                          const char* type);
+    bool AddInstanceAttr(const char* instance, const char* name, const char* value,
+                         const char* type);
+    bool AddSignalAttr(const char* signal, const char* name, const char* value, const char* type);
+    bool AddComponentPinAttr(const char* component, const char* pin, const char* name,
+                             const char* value, const char* type);
+    bool AddInstancePinAttr(const char* instance, const char* pin, const char* name,
+                            const char* value, const char* type);
+
+    /// Operations on one attribute of a holder; a null holder does nothing.
+    bool SetAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    bool SetGenericAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    bool SetSynAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    bool SetUserType(AttributeHolder* holder, const char* attribute, const char* value);
+
+    /// The same by object; an instance's attribute is looked for on its component too.
+    bool SetModuleAttrValue(const char* attribute, const char* value);
+    bool SetComponentAttrValue(const char* component, const char* attribute, const char* value);
+    bool SetInstanceAttrValue(const char* instance, const char* attribute, const char* value);
+    bool SetSignalAttrValue(const char* signal, const char* attribute, const char* value);
+    bool SetComponentPinAttrValue(const char* component, const char* pin, const char* attribute,
+                                  const char* value);
+    bool SetInstancePinAttrValue(const char* instance, const char* pin, const char* attribute,
+                                 const char* value);
+
+    bool SetModuleGenericAttrValue(const char* attribute, const char* value);
+    bool SetComponentGenericAttrValue(const char* component, const char* attribute,
+                                      const char* value);
+    bool SetInstanceGenericAttrValue(const char* instance, const char* attribute,
+                                     const char* value);
+    bool SetSignalGenericAttrValue(const char* signal, const char* attribute, const char* value);
+    bool SetComponentPinGenericAttrValue(const char* component, const char* pin,
+                                         const char* attribute, const char* value);
+    bool SetInstancePinGenericAttrValue(const char* instance, const char* pin,
+                                        const char* attribute, const char* value);
+
+    bool SetModuleSynAttrValue(const char* attribute, const char* value);
+    bool SetComponentSynAttrValue(const char* component, const char* attribute, const char* value);
+    bool SetInstanceSynAttrValue(const char* instance, const char* attribute, const char* value);
+    bool SetSignalSynAttrValue(const char* signal, const char* attribute, const char* value);
+    bool SetComponentPinSynAttrValue(const char* component, const char* pin, const char* attribute,
+                                     const char* value);
+    bool SetInstancePinSynAttrValue(const char* instance, const char* pin, const char* attribute,
+                                    const char* value);
+
+    bool SetModuleUserType(const char* attribute, const char* type);
+    bool SetComponentUserType(const char* component, const char* attribute, const char* type);
+    bool SetInstanceUserType(const char* instance, const char* attribute, const char* type);
+    bool SetSignalUserType(const char* signal, const char* attribute, const char* type);
+    bool SetComponentPinUserType(const char* component, const char* pin, const char* attribute,
+                                 const char* type);
+    bool SetInstancePinUserType(const char* instance, const char* pin, const char* attribute,
+                                const char* type);
+
+    /// Adds a line to the module's comment; null adds nothing.
+    bool AddNotes(const char* text);
+    bool AddComponentComment(const char* component, const char* text);
+    bool AddInstanceComment(const char* instance, const char* text);
+    bool AddSignalComment(const char* signal, const char* text);
+    bool AddComponentPinComment(const char* component, const char* pin, const char* text);
+    bool AddInstancePinComment(const char* instance, const char* pin, const char* text);
+
+private:
+    struct Implementation;
+
+    bool IsNamedUsed(const char* name) const;
+    Component* FindComponent(const char* name) const;
+    Instance* FindInstance(const char* name) const;
+    Signal* FindSignal(const char* name) const;
+    Pin* FindComponentPin(const char* component, const char* pin) const;
+    Pin* FindInstancePin(const char* instance, const char* pin) const;
+    Attribute* FindAttr(const char* name, const AttributeHolder* holder) const;
+    Attribute* FindInstanceAttr(const char* instance, const char* attribute) const;
+    Attribute* GetInstanceOrComponentAttr(const char* name, const Instance* instance) const;
+
+    bool SetAttrValue(Attribute* attribute, const char* value);
+    bool SetGenericAttrValue(Attribute* attribute, const char* value);
+    bool SetSynAttrValue(Attribute* attribute, const char* value);
+    bool SetUserType(Attribute* attribute, const char* type);
+    bool AddComment(Object& object, const char* text);
+
+    Signal* GetOrCreateSignal(const char* name);
+    Signal* CreateAndAddBusIndexSignal(std::string_view name);
+    Signal* CreateAndAddBusSliceSignal(std::string_view name);
+    Signal* CreateAndAddCompundSignal(std::string_view name);
+    Signal* GetOrCreateMember(std::string_view name);
+    bool Connect(Signal* signal, Pin* pin);
+    bool Connect(Signal* first, Signal* second);
+    bool AssignConstant(Signal* signal, const char* value);
+    bool AssignConstant(Pin* pin, const char* value, const char* instance);
+
+    std::unique_ptr<Implementation> implementation_;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,130 @@
+/// \file
+/// `Object`, the base of every named thing of a design, and `ObjectVisitor`.
+#pragma once
+
+#include "Orn_Hdl/Model/ObjectName.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+#include <cstddef>
+#include <memory>
+#include <string>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+class Attribute;
+class BitVectorValue;
+class Component;
+class Instance;
+class Netlist;
+class ObjectVisitor;
+class Pin;
+class Signal;
+struct ObjectDetails;
+
+/// Which kind of thing an `Object` is.
+enum ObjectType {
+    ObjectTypeAttribute = 100,
+    ObjectTypeSignal = 101,
+    ObjectTypePin = 102,
+    ObjectTypeComponent = 103,
+    ObjectTypeInstance = 104,
+    ObjectTypeNetlist = 105
+};
+
+/// A named thing: the netlist, a component, instance, pin, signal or attribute. It has a name,
+/// stored normalised, and a comment of any number of lines.
+///
+/// Whatever owns an object deletes it: the netlist its components, instances and signals, these
+/// their pins, an attribute holder its attributes. An object that is destroyed first takes itself
+/// out of every other object's lists, so no list ever names a dead object.
+class ORN_HDL_API Object {
+public:
+    virtual ~Object();
+    virtual int GetObjectType() const;
+    /// Calls the visit operation of this object's kind with this object.
+    virtual void AcceptObject(ObjectVisitor& visitor) = 0;
+    /// Stores a name, normalised; null is read as "".
+    virtual void SetName(const char* name);
+
+    Port::StringBase<char> GetName() const { return GetNameView(); }
+    /// The name without a copy, valid until the object is renamed or ends.
+    std::string_view GetNameView() const noexcept { return name_.GetView(); }
+    /// Whether the text, as it stands, equals the name ignoring case.
+    bool IsNamed(const char* name) const noexcept;
+
+    /// Appends the text, null read as "", and a line feed to the comment.
+    void AddComment(const char* text);
+    Port::StringBase<char> GetComment() const;
+    /// The comment without a copy, valid until it changes.
+    std::string_view GetCommentView() const noexcept;
+
+    /// Whether comment, name and type are equal.
+    bool operator==(const Object& other) const noexcept;
+    bool operator!=(const Object& other) const noexcept { return !(*this == other); }
+
+    /// Turns every "[", "{" and "<" into "(", every "]", "}" and ">" into ")", and every "-" into ":".
+    static void NormalizeName(Port::StringBase<char>& name);
+    /// The normalised text before its first "(" when it holds "(" and ")" and no ","; otherwise the
+    /// whole normalised text. Null gives "".
+    static Port::StringBase<char> GetBaseName(const char* name);
+    /// Whether the whole text is a letter, "'" or "_" followed by letters, digits and "_".
+    static bool IsValidBaseName(const char* name) noexcept;
+    /// Whether the whole text is digits with an optional sign.
+    static bool IsValidIntegerString(const Port::StringBase<char>& text) noexcept;
+
+    /// Objects come from pages of their own: no bookkeeping for each of millions of objects.
+    static void* operator new(std::size_t size);
+    static void operator delete(void* memory) noexcept;
+    static void* operator new(std::size_t, void* place) noexcept { return place; }
+    static void operator delete(void*, void*) noexcept {}
+
+protected:
+    explicit Object(ObjectType type) noexcept;
+    /// Copies name, comment and type.
+    Object(const Object& other);
+    Object& operator=(const Object& other);
+
+    void SetNameVerbatim(std::string_view name);
+    void CopyNameFrom(const Object& other);
+
+    /// The parts that few objects have, made when first asked for.
+    ObjectDetails& MakeDetails();
+    /// The same, null when the object has none.
+    ObjectDetails* GetDetails() const noexcept { return details_.get(); }
+
+    /// Flags for the derived classes, kept in a spare byte.
+    bool HasFlag(unsigned flag) const noexcept { return (name_.GetOwnerByte() & flag) != 0; }
+    void SetFlag(unsigned flag, bool on) noexcept;
+
+private:
+    friend class OwnedFlag;
+    friend struct ObjectKey;
+
+    static constexpr unsigned TypeMask = 0x07;
+    static constexpr unsigned OwnedFlagBit = 0x08;
+
+    std::string_view GetKeyName() const noexcept;
+    void KeepKeyName(std::string_view newName);
+
+    ObjectName name_;
+    std::unique_ptr<ObjectDetails> details_;
+};
+
+/// Visits objects by kind; every operation of the base does nothing.
+class ORN_HDL_API ObjectVisitor {
+public:
+    ObjectVisitor() = default;
+    ObjectVisitor(const ObjectVisitor&) = default;
+    ObjectVisitor& operator=(const ObjectVisitor&) = default;
+    virtual ~ObjectVisitor();
+    virtual void VisitAttribute(Attribute* attribute);
+    virtual void VisitSignal(Signal* signal);
+    virtual void VisitComponent(Component* component);
+    virtual void VisitPin(Pin* pin);
+    virtual void VisitInstance(Instance* instance);
+    virtual void VisitNetlist(Netlist* netlist);
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,199 @@
+/// \file
+/// Pins, their direction, and `PinVisitor`.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Model/Object.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+namespace Orn_Hdl {
+
+class BusIndexPin;
+class BusPin;
+class PinVisitor;
+class ScalarPin;
+
+/// The direction of a port or pin: input, output, bidirectional, or invalid.
+class ORN_HDL_API Polarity {
+public:
+    enum Value { Invalid = -1, Input = 0, Output = 1, BiDirectional = 2 };
+
+    /// Invalid.
+    Polarity() noexcept = default;
+    explicit Polarity(int value) noexcept : value_(value) {}
+    explicit Polarity(const char* text) noexcept : value_(GetValue(text)) {}
+
+    /// The direction whose name begins with the text, letter case ignored, tried in the order
+    /// Input, Output, BiDirectional: "in", "O" and "bidir" are directions; "" and "inputs" are not.
+    static int GetValue(const char* text) noexcept;
+    static bool IsValidValue(int value) noexcept { return value >= Input && value <= BiDirectional; }
+
+    int GetValue() const noexcept { return value_; }
+    void SetValue(int value) noexcept { value_ = value; }
+    void SetValue(const char* text) noexcept { value_ = GetValue(text); }
+    bool IsValid() const noexcept { return IsValidValue(value_); }
+    /// "Input", "Output" or "BiDirectional"; "Output" for a value that is no direction.
+    const char* GetValueName() const noexcept;
+
+    friend bool operator==(const Polarity& a, const Polarity& b) noexcept {
+        return a.value_ == b.value_;
+    }
+    friend bool operator!=(const Polarity& a, const Polarity& b) noexcept { return !(a == b); }
+    friend bool operator<(const Polarity& a, const Polarity& b) noexcept {
+        return a.value_ < b.value_;
+    }
+
+private:
+    int value_ = Invalid;
+};
+
+/// Codes of the pin classes.
+enum PinType { PinTypeScalar = 1, PinTypeBus = 2, PinTypeBusIndex = 3 };
+
+/// A terminal of a component, or an instance's own copy of one. It points at the signal that it is
+/// wired to, if any.
+class ORN_HDL_API Pin : public Object, public AttributeHolder {
+public:
+    ~Pin() override;
+    /// `ObjectTypePin`, whatever was copied into the pin.
+    int GetObjectType() const override;
+    void AcceptObject(ObjectVisitor& visitor) override;
+    void SetName(const char* name) override;
+    virtual int GetPinType() const = 0;
+    /// A new pin of the same class with the same name, polarity and default value; the caller owns it.
+    virtual Pin* ClonePin() const = 0;
+    /// Calls the visit operation of this pin's class, and only that.
+    virtual void AcceptPin(PinVisitor& visitor) = 0;
+    /// The name, of a bus pin or bus bit pin without its range or index.
+    virtual Port::StringBase<char> GetBaseName() const = 0;
+
+    /// Points the pin at a signal, null for none. The signal's list of pins stays as it is:
+    /// `Signal::Connect` links both ways.
+    void Connect(Signal* signal);
+    void Disconnect() { Connect(nullptr); }
+    Signal* GetSignal() const noexcept { return signal_; }
+
+    void SetPolarity(const Polarity& polarity) noexcept { polarity_ = polarity; }
+    Polarity GetPolarity() const noexcept { return polarity_; }
+    const char* GetPolarityName() const noexcept { return polarity_.GetValueName(); }
+
+    void SetDefaultValue(const BitVectorValue& value);
+    /// Parses a bit-vector literal; null is read as "".
+    void SetDefaultValue(const char* value);
+    const BitVectorValue& GetDefaultValue() const noexcept;
+
+    /// Makes a pin of the class that the name's form asks for; the caller owns it.
+    static Pin* Create(const char* name, const Polarity& polarity);
+
+protected:
+    Pin(const char* name, const Polarity& polarity);
+    /// Copies name, polarity and default value; not the signal, the attributes or the comment.
+    Pin(const Pin& other);
+    Pin& operator=(const Pin& other);
+
+private:
+    friend class PinBlock;
+    friend class Signal;
+    friend class PinList;
+
+    /// Makes a copy of this pin at `place`, which has room for any pin.
+    virtual Pin* CloneInto(void* place) const = 0;
+
+    bool IsListedBy(const Signal* signal) const noexcept;
+    void NoteListed(Signal* signal);
+    void NoteUnlisted(Signal* signal) noexcept;
+
+    static constexpr unsigned ListedFlag = 0x10;
+
+    Signal* signal_ = nullptr;
+    Polarity polarity_;
+};
+
+/// A pin of one bit.
+class ORN_HDL_API ScalarPin final : public Pin {
+public:
+    ScalarPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
+    ScalarPin(const ScalarPin&) = default;
+    ScalarPin& operator=(const ScalarPin&) = default;
+    int GetPinType() const override { return PinTypeScalar; }
+    Pin* ClonePin() const override;
+    void AcceptPin(PinVisitor& visitor) override;
+    Port::StringBase<char> GetBaseName() const override { return GetNameView(); }
+
+private:
+    Pin* CloneInto(void* place) const override;
+};
+
+/// A pin with a range, such as D(7:0).
+class ORN_HDL_API BusPin final : public Pin {
+public:
+    BusPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
+    BusPin(const BusPin&) = default;
+    BusPin& operator=(const BusPin&) = default;
+    int GetPinType() const override { return PinTypeBus; }
+    Pin* ClonePin() const override;
+    void AcceptPin(PinVisitor& visitor) override;
+    Port::StringBase<char> GetBaseName() const override;
+    /// The texts of both indices; untouched and false when the name is no bus name.
+    bool GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const;
+    /// Whether the left index is greater than the right one.
+    bool IsDownTo() const noexcept;
+    /// The number of bits, at most INT_MAX; 0 when the name is no bus name.
+    int GetWidth() const noexcept;
+
+private:
+    Pin* CloneInto(void* place) const override;
+};
+
+/// A pin for one bit of a bus, such as D(3).
+class ORN_HDL_API BusIndexPin final : public Pin {
+public:
+    BusIndexPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
+    BusIndexPin(const BusIndexPin&) = default;
+    BusIndexPin& operator=(const BusIndexPin&) = default;
+    int GetPinType() const override { return PinTypeBusIndex; }
+    Pin* ClonePin() const override;
+    void AcceptPin(PinVisitor& visitor) override;
+    Port::StringBase<char> GetBaseName() const override;
+    /// The text of the index; empty when the name is no bit name.
+    Port::StringBase<char> GetIndex() const;
+
+private:
+    Pin* CloneInto(void* place) const override;
+};
+
+/// Visits pins by class; every operation of the base does nothing. `VisitPin` is there for callers:
+/// `AcceptPin` never calls it.
+class ORN_HDL_API PinVisitor {
+public:
+    PinVisitor() = default;
+    PinVisitor(const PinVisitor&) = default;
+    PinVisitor& operator=(const PinVisitor&) = default;
+    virtual ~PinVisitor();
+    virtual void VisitPin(Pin* pin);
+    virtual void VisitScalarPin(ScalarPin* pin);
+    virtual void VisitBusPin(BusPin* pin);
+    virtual void VisitBusIndexPin(BusIndexPin* pin);
+};
+
+/// Forms the name of the signal that carries a pin's constant: the instance's name, the pin's base
+/// name and "CONST_SIGNAL", joined by "_", then the pin's range or index.
+class ORN_HDL_API PinConstantSignalVisitor : public PinVisitor {
+public:
+    explicit PinConstantSignalVisitor(const char* instanceName) : instanceName_(instanceName) {}
+    void VisitScalarPin(ScalarPin* pin) override;
+    void VisitBusPin(BusPin* pin) override;
+    void VisitBusIndexPin(BusIndexPin* pin) override;
+    /// The name that the last visit formed.
+    const Port::StringBase<char>& GetName() const noexcept { return name_; }
+
+private:
+    void SetResult(std::string_view baseName, std::string_view index);
+
+    Port::StringBase<char> instanceName_;
+    Port::StringBase<char> name_;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,91 @@
+/// \file
+/// `HdlOptions`, what a model's option commands set and the writers read, and `HdlUtilities`, the
+/// helpers that both writers share.
+#pragma once
+
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+namespace Orn_Hdl {
+
+class Instance;
+class OutStream;
+
+/// The output options of one model.
+struct ORN_HDL_API HdlOptions {
+    struct ORN_HDL_API VhdlOption {
+        bool suppressConfiguration = false;
+        bool flattenBus = false;
+        bool useDefaultLibrary = true;
+        StringArray libraries;
+        StringArray useClauses;
+        bool useAttrType = false;
+        bool openPin = true;
+        bool suppressComponent = false;
+    };
+
+    struct ORN_HDL_API VerilogOption {
+        enum SynthesisType {
+            QSN = 0,
+            EXEMPLAR = 1,
+            SYNPLICITY = 2,
+            SYNOPSYS = 3,
+            VERILOG2001 = 4,
+            PRECISION = 5
+        };
+        /// How names are written. `DEFSULT` keeps them as they are; the spelling is the option's.
+        enum CaseType { DEFSULT = 10, UPPERCASE = 11, LOWERCASE = 12 };
+
+        int synthesisType = QSN;
+        CaseType signalCase = DEFSULT;
+        CaseType instanceCase = DEFSULT;
+        CaseType componentCase = DEFSULT;
+        StringArray includePaths;
+
+        /// Selects the synthesis tool by name, letter case ignored; an unknown name selects QSN.
+        void SetSynthesisType(const char* text);
+        /// Whether a statement's semicolon stands before its synthesis attributes.
+        bool IsSemiColonWrittenBeforeAttr() const noexcept { return synthesisType != SYNPLICITY; }
+        /// The case of a name, letter case ignored; an unknown name gives `DEFSULT`.
+        static CaseType GetCaseType(const char* text);
+    };
+
+    VhdlOption vhdl;
+    VerilogOption verilog;
+    bool writeHeader = true;
+    Port::StringBase<char> application;
+    Port::StringBase<char> command;
+    Port::StringBase<char> device;
+    Port::StringBase<char> purpose;
+    Port::StringBase<char> reference;
+    bool onePortPerLine = true;
+    /// Whether instances pass the module's own INIT parameter down. Each Verilog write sets it.
+    mutable bool hierarchicalInit = false;
+};
+
+/// Helpers that both writers share.
+class ORN_HDL_API HdlUtilities {
+public:
+    /// The present time as MM/DD/YYYY HH:MM:SS, or the instant of SOURCE_DATE_EPOCH in UTC.
+    static const Port::StringBase<char> CurrentTimeString();
+    /// The library's version.
+    static const Port::StringBase<char> GetVersion();
+    /// The base specifier of a VHDL bit string literal (IEEE 1076-1993, 13.7): "b", "o" or "x".
+    static const Port::StringBase<char> ConvertVhdlBase(int base);
+    /// The base letter of a Verilog sized constant (IEEE 1364, 2.5.1): "b", "o" or "h".
+    static const Port::StringBase<char> ConvertVerilogBase(int base);
+    /// Puts "_DUMMY" behind a name, or before its range: D(7:0) gives D_DUMMY(7:0).
+    static const Port::StringBase<char> AddDummySuffix(const char* name);
+    /// Takes the quotes off a text that is wholly enclosed in double or in single quotes.
+    static const Port::StringBase<char> RemoveQuotes(const char* text);
+    /// The names of an instance's attributes, then those of its component's that it does not have.
+    /// A null instance gives an empty list.
+    static const StringArray GetAttrNames(const Instance* instance);
+    /// Writes the header banner.
+    /// \param commentStyle true for VHDL comments, false for Verilog's.
+    static void WriteHeader(const Port::StringBase<char>& designName, bool commentStyle,
+                            const HdlOptions& options, OutStream& out);
+};
+
+} // namespace Orn_Hdl

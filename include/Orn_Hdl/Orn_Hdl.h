@@ -1,0 +1,13 @@
+/// \file
+/// The whole library.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Commands.h"
+#include "Orn_Hdl/Containers.h"
+#include "Orn_Hdl/Engine.h"
+#include "Orn_Hdl/Exception.h"
+#include "Orn_Hdl/Model.h"
+#include "Orn_Hdl/Options.h"
+#include "Orn_Hdl/Streams.h"
+#include "Orn_Hdl/Writers.h"

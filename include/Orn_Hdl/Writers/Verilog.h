@@ -1,0 +1,119 @@
+/// \file
+/// The Verilog writer: `VerilogStatements` writes single constructs, `VerilogNetlister` a whole
+/// design.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Model/Netlist.h"
+#include "Orn_Hdl/Options.h"
+#include "Orn_Hdl/Streams.h"
+#include "Port/Export.h"
+#include "Port/String.h"
+
+#include <memory>
+#include <string_view>
+#include <vector>
+
+namespace Orn_Hdl {
+
+/// Writes single Verilog constructs (IEEE 1364-1995), literally as it is given them. Unless told
+/// otherwise a statement is left open: the caller writes ";" or goes on.
+class ORN_HDL_API VerilogStatements {
+public:
+    /// \param out not owned; it must outlive the statements.
+    explicit VerilogStatements(OutStream& out) noexcept : out_(out) {}
+
+    /// Turns every "(" into "[" and every ")" into "]".
+    void NormalizeBusName(Port::StringBase<char>& name) const;
+    /// `timescale UNIT / PRECISION, and the line end.
+    void WriteTimeScale(const char* unit, const char* precision);
+    void WriteTimeStamp(const char* sourceFileName);
+    /// The declaration of a port; an empty name writes nothing.
+    void WritePortDeclaration(const char* name, const Polarity& polarity);
+    void WriteSignalDeclaration(const char* name);
+    /// A reference: of a bus name with its range in brackets, of any other name as it is.
+    void WriteSignalName(const char* name);
+    /// assign LEFT = RIGHT
+    void WriteSignalAssignment(const char* left, const char* right);
+    /// assign NAME = CONSTANT, the name without its range or index.
+    /// \param singleBit writes a bare 0 or 1 whatever the value's base.
+    void WriteConstantSignalAssignment(const char* name, bool singleBit,
+                                       const BitVectorValue& value);
+    /// parameter NAME = VALUE
+    void WriteParameterStatement(Attribute* attribute);
+    /// defparam INSTANCE.NAME = VALUE
+    void WriteDefParamStatement(Attribute* attribute, const char* instanceName);
+    /// defparam INSTANCE.NAME = NAME: passes the module's parameter of that name down.
+    void WriteDefParamInitStatement(Attribute* attribute, const char* instanceName);
+    /// The object's comment, every line behind "// ".
+    void WriteComment(const Object* object);
+    void WriteIncludePath(const StringArray& fileNames);
+
+    /// The attributes whose synthesis option is not "NONE", in the syntax of one synthesis tool.
+    void WriteSynplicityAttr(const Iterator<Attribute*>& attributes);
+    void WriteSynopsysAttr(const Iterator<Attribute*>& attributes);
+    void WriteQSNAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
+    void WriteExemplarAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
+    void WritePrecisionAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
+
+private:
+    friend class VerilogNetlister;
+
+    /// As above, for names as the objects hold them.
+    void WritePortDeclaration(std::string_view name, const Polarity& polarity);
+    void WriteSignalDeclaration(std::string_view name);
+    void WriteSignalName(std::string_view name);
+    void WriteConstantSignalAssignment(std::string_view name, bool singleBit,
+                                       const BitVectorValue& value);
+    /// The right side of a constant assignment.
+    void WriteConstant(bool singleBit, const BitVectorValue& value);
+    void WriteRange(int msb, int lsb);
+    void WriteWire(std::string_view name);
+    void WriteWireBus(std::string_view base, int msb, int lsb);
+    void WriteQSNAttrStatement(std::string_view name, const char* instanceName,
+                               std::string_view value);
+    void WriteExemplarAttrStatement(std::string_view name, const char* instanceName,
+                                    std::string_view value);
+    void WritePrecisionAttrStatement(std::string_view name, const char* instanceName,
+                                     std::string_view value);
+
+    OutStream& out_;
+};
+
+/// Writes an attribute's value as a Verilog constant.
+class ORN_HDL_API WriteVerilogAttrValueVisitor : public AttributeVisitor {
+public:
+    explicit WriteVerilogAttrValueVisitor(OutStream& out) noexcept : out_(out) {}
+    void VisitAttributeString(AttributeString* attribute) override;
+    void VisitAttributeInteger(AttributeInteger* attribute) override;
+    void VisitAttributeFloat(AttributeFloat* attribute) override;
+    void VisitAttributeBit(AttributeBit* attribute) override;
+    void VisitAttributeBitVector(AttributeBitVector* attribute) override;
+    void VisitAttributeBoolean(AttributeBoolean* attribute) override;
+    void VisitAttributeUser(AttributeUser* attribute) override;
+
+private:
+    OutStream& out_;
+};
+
+/// Writes a netlist as one structural Verilog module. It can be used for any number of netlists.
+class ORN_HDL_API VerilogNetlister {
+public:
+    /// \param out not owned; it must outlive the netlister.
+    explicit VerilogNetlister(OutStream& out);
+    ~VerilogNetlister();
+
+    /// Sorts the netlist, makes the stand-in signals that it needs, renames its objects when the
+    /// options ask for upper or lower case, and writes it. A null netlist writes nothing.
+    void WriteNetlist(Netlist* netlist, const HdlOptions& options);
+
+private:
+    class Writer;
+
+    OutStream& out_;
+    std::unique_ptr<VerilogStatements> statements_;
+};
+
+} // namespace Orn_Hdl

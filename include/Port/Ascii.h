@@ -1,0 +1,45 @@
+/// \file
+/// Letter case and digits of ASCII text. Only the letters A to Z have case, and no locale is ever
+/// consulted, so the same input gives the same output on every machine.
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+
+namespace Port {
+
+constexpr bool IsDigit(char c) noexcept {
+    return c >= '0' && c <= '9';
+}
+
+constexpr bool IsLetter(char c) noexcept {
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
+}
+
+constexpr char ToUpper(char c) noexcept {
+    return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c;
+}
+
+constexpr char ToLower(char c) noexcept {
+    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+}
+
+/// True when both texts are equal but for the case of ASCII letters.
+constexpr bool EqualIgnoringCase(std::string_view a, std::string_view b) noexcept {
+    if (a.size() != b.size()) {
+        return false;
+    }
+    for (std::size_t i = 0; i < a.size(); ++i) {
+        if (ToUpper(a[i]) != ToUpper(b[i])) {
+            return false;
+        }
+    }
+    return true;
+}
+
+/// The text of a possibly null pointer: null reads as the empty text.
+constexpr std::string_view ViewOf(const char* text) noexcept {
+    return text == nullptr ? std::string_view() : std::string_view(text);
+}
+
+} // namespace Port

@@ -1,0 +1,30 @@
+/// \file
+/// `UT_TIMESTAMP`, an instant split into the texts of its fields.
+#pragma once
+
+#include "Port/Export.h"
+#include "Port/String.h"
+
+#include <ctime>
+
+/// An instant: year in four digits, every other field in two.
+class ORN_HDL_API UT_TIMESTAMP {
+public:
+    /// The present instant in local time. When the environment variable SOURCE_DATE_EPOCH holds a
+    /// number of seconds since 1970, that instant in UTC, so that builds can be repeated.
+    UT_TIMESTAMP();
+    /// An instant in UTC.
+    static UT_TIMESTAMP FromUtc(std::time_t instant);
+
+    Port::String getTimeStampYear() const;
+    Port::String getTimeStampMonthNumber() const;
+    Port::String getTimeStampMonthDay() const;
+    Port::String getTimeStampHour() const;
+    Port::String getTimeStampMinute() const;
+    Port::String getTimeStampSecond() const;
+
+private:
+    explicit UT_TIMESTAMP(const std::tm& fields) : fields_(fields) {}
+
+    std::tm fields_;
+};

@@ -1,0 +1,107 @@
+#include "Orn_Hdl/Containers/PtrArray.h"
+
+#include <algorithm>
+#include <cstdlib>
+#include <cstring>
+#include <new>
+#include <vector>
+
+namespace Orn_Hdl {
+
+PtrArrayBase::PtrArrayBase(const PtrArrayBase& other) {
+    *this = other;
+}
+
+PtrArrayBase& PtrArrayBase::operator=(const PtrArrayBase& other) {
+    if (this != &other) {
+        Reserve(other.GetSize());
+        if (other.size_ > 0) {
+            std::memcpy(items_, other.items_, other.size_ * sizeof(void*));
+        }
+        size_ = other.size_;
+    }
+    return *this;
+}
+
+PtrArrayBase::~PtrArrayBase() {
+    std::free(items_);
+}
+
+void PtrArrayBase::Reallocate(std::size_t capacity) {
+    // Indices are signed ints, and so is the largest size.
+    void* const items = capacity > static_cast<std::size_t>(INT32_MAX)
+                            ? nullptr
+                            : std::realloc(items_, capacity * sizeof(void*));
+    if (items == nullptr) {
+        throw std::bad_alloc();
+    }
+    items_ = static_cast<void**>(items);
+    capacity_ = static_cast<std::uint32_t>(capacity);
+}
+
+void PtrArrayBase::Grow() {
+    // 3, 5, 9, 17, ...: with the allocator's own word these sizes leave nothing unused.
+    Reallocate(capacity_ < 3 ? 3 : std::size_t(capacity_) * 2 - 1);
+}
+
+void PtrArrayBase::Reserve(int capacity) {
+    if (capacity > 0 && static_cast<std::uint32_t>(capacity) > capacity_) {
+        Reallocate(static_cast<std::size_t>(capacity));
+    }
+}
+
+void PtrArrayBase::Empty() noexcept {
+    std::free(items_);
+    items_ = nullptr;
+    size_ = 0;
+    capacity_ = 0;
+}
+
+void PtrArrayBase::Swap(int i, int j) noexcept {
+    if (i >= 0 && j >= 0 && i < GetSize() && j < GetSize()) {
+        std::swap(items_[i], items_[j]);
+    }
+}
+
+int PtrArrayBase::GetIndex(const void* p) const noexcept {
+    for (std::uint32_t i = 0; i < size_; ++i) {
+        if (items_[i] == p) {
+            return static_cast<int>(i);
+        }
+    }
+    return -1;
+}
+
+void PtrArrayBase::SetAt(int i, void* p) {
+    if (i < 0) {
+        return;
+    }
+    const auto index = static_cast<std::uint32_t>(i);
+    if (index >= size_) {
+        Reserve(i == INT32_MAX ? i : i + 1);
+        std::fill(items_ + size_, items_ + index, nullptr);
+        size_ = index + 1;
+    }
+    items_[index] = p;
+}
+
+bool PtrArrayBase::Remove(const void* p) noexcept {
+    const int index = GetIndex(p);
+    RemoveAt(index);
+    return index >= 0;
+}
+
+void PtrArrayBase::RemoveAt(int i) noexcept {
+    if (i >= 0 && i < GetSize()) {
+        const auto index = static_cast<std::uint32_t>(i);
+        std::memmove(items_ + index, items_ + index + 1, (size_ - index - 1) * sizeof(void*));
+        --size_;
+    }
+}
+
+void PtrArrayBase::Sort(Less less, void* context) {
+    std::stable_sort(items_, items_ + size_,
+                     [less, context](void* a, void* b) { return less(a, b, context); });
+}
+
+} // namespace Orn_Hdl

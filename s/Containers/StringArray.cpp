@@ -1,0 +1,235 @@
+#include "Orn_Hdl/Containers/StringArray.h"
+
+#include "Port/Ascii.h"
+#include "Port/Text.h"
+
+#include <algorithm>
+#include <climits>
+#include <utility>
+
+namespace Orn_Hdl {
+
+using std::string_view;
+
+StringArray::StringArray(const char* text, const char* separators, bool skipEmpty,
+                         const char* quotes) {
+    Parse(text, separators, skipEmpty, quotes);
+}
+
+bool StringArray::GetIntAt(int i, int& value, int /*unused*/) const {
+    const Port::StringBase<char> text = GetAt(i);
+    long number = 0;
+    if (!Port::strtol(text.CStr(), number) || number < INT_MIN || number > INT_MAX) {
+        return false;
+    }
+    value = static_cast<int>(number);
+    return true;
+}
+
+bool StringArray::Contains(const Port::StringBase<char>& text) const noexcept {
+    for (int i = 0; i < GetSize(); ++i) {
+        if (GetView(i) == text.GetView()) {
+            return true;
+        }
+    }
+    return false;
+}
+
+bool StringArray::IContains(const Port::StringBase<char>& text) const noexcept {
+    for (int i = 0; i < GetSize(); ++i) {
+        if (Port::EqualIgnoringCase(GetView(i), text.GetView())) {
+            return true;
+        }
+    }
+    return false;
+}
+
+bool StringArray::Contains(const StringArray& other) const noexcept {
+    if (other.GetSize() > GetSize()) {
+        return false;
+    }
+    for (int i = 0; i < other.GetSize(); ++i) {
+        if (!Contains(other.GetAt(i))) {
+            return false;
+        }
+    }
+    return true;
+}
+
+bool StringArray::IContains(const StringArray& other) const noexcept {
+    if (other.GetSize() > GetSize()) {
+        return false;
+    }
+    for (int i = 0; i < other.GetSize(); ++i) {
+        if (!IContains(other.GetAt(i))) {
+            return false;
+        }
+    }
+    return true;
+}
+
+Port::StringBase<char> StringArray::Concatenate(const Port::StringBase<char>& separator) const {
+    Port::StringBase<char> text;
+    for (int i = 0; i < GetSize(); ++i) {
+        if (i > 0) {
+            text += separator;
+        }
+        text += GetView(i);
+    }
+    return text;
+}
+
+std::string StringArray::JoinFrom(int first) const {
+    std::string text;
+    for (int i = first; i < GetSize(); ++i) {
+        if (i > first) {
+            text += ' ';
+        }
+        text += GetView(i);
+    }
+    return text;
+}
+
+void StringArray::ClosePiece(std::size_t start) {
+    slots_.push_back({start, text_.size() - start});
+}
+
+int StringArray::AddView(string_view text) {
+    const std::size_t start = text_.size();
+    text_.append(text);
+    ClosePiece(start);
+    return GetSize() - 1;
+}
+
+void StringArray::Add(const StringArray& other) {
+    // By index and with the size read once: the list may be added to itself.
+    const int count = other.GetSize();
+    for (int i = 0; i < count; ++i) {
+        Add(other.GetAt(i));
+    }
+}
+
+void StringArray::SetAt(int i, const Port::StringBase<char>& text) {
+    if (i < 0) {
+        return;
+    }
+    const auto index = static_cast<std::size_t>(i);
+    if (index >= slots_.size()) {
+        slots_.resize(index + 1, Slot{0, 0});
+    }
+    Slot& slot = slots_[index];
+    if (text.GetLength() > slot.length) {
+        slot.start = text_.size();
+        text_.append(text.GetView());
+    } else {
+        text_.replace(slot.start, text.GetLength(), text.GetView());
+    }
+    slot.length = text.GetLength();
+}
+
+void StringArray::Empty() noexcept {
+    text_.clear();
+    slots_.clear();
+}
+
+void StringArray::Sort() {
+    std::stable_sort(slots_.begin(), slots_.end(), [this](const Slot& a, const Slot& b) {
+        const string_view text = text_;
+        return text.substr(a.start, a.length) < text.substr(b.start, b.length);
+    });
+}
+
+void StringArray::Sort(bool (*less)(const Port::StringBase<char>&, const Port::StringBase<char>&,
+                                    void*),
+                       void* context) {
+    std::vector<Port::StringBase<char>> texts;
+    texts.reserve(slots_.size());
+    for (int i = 0; i < GetSize(); ++i) {
+        texts.push_back(GetAt(i));
+    }
+    std::stable_sort(texts.begin(), texts.end(),
+                     [less, context](const auto& a, const auto& b) { return less(a, b, context); });
+    Empty();
+    for (const auto& text : texts) {
+        AddView(text);
+    }
+}
+
+int StringArray::Parse(const char* text, const char* separators, bool skipEmpty,
+                       const char* quotes) {
+    return Parse(Port::ViewOf(text), Port::ViewOf(separators), skipEmpty, Port::ViewOf(quotes));
+}
+
+int StringArray::ParseCommandLine(string_view line) {
+    return Parse(line, " ", true, "\"\"''");
+}
+
+namespace {
+
+/// The closing character of the pair that `c` opens, or NUL when it opens none.
+char ClosingOf(char c, string_view quotes) noexcept {
+    for (std::size_t i = 0; i + 1 < quotes.size(); i += 2) {
+        if (quotes[i] == c) {
+            return quotes[i + 1];
+        }
+    }
+    return '\0';
+}
+
+} // namespace
+
+int StringArray::Parse(string_view text, string_view separators, bool skipEmpty,
+                       string_view quotes) {
+    const int before = GetSize();
+    const auto isSeparator = [separators](char c) { return separators.find(c) != string_view::npos; };
+    // Pieces are shorter than the text and as many as its separators at most; the buffer grows once.
+    text_.reserve(text_.size() + text.size());
+    std::size_t start = text_.size();
+    char closing = '\0';
+    bool wasQuoted = false;
+    std::size_t i = 0;
+    const auto openQuote = [&] {
+        closing = i < text.size() ? ClosingOf(text[i], quotes) : '\0';
+        if (closing != '\0') {
+            ++i;
+        }
+    };
+    openQuote();
+    while (i < text.size()) {
+        const char c = text[i];
+        const char next = i + 1 < text.size() ? text[i + 1] : '\0';
+        const bool isLast = i + 1 == text.size();
+        if (closing == '\0' && !isSeparator(c)) {
+            // A run of plain characters is copied as a whole.
+            const std::size_t end = std::min(text.find_first_of(separators, i), text.size());
+            text_.append(text, i, end - i);
+            i = end;
+        } else if (closing == '\0') {
+            if (text_.size() > start || !skipEmpty || wasQuoted) {
+                ClosePiece(start);
+                start = text_.size();
+            }
+            wasQuoted = false;
+            ++i;
+            openQuote();
+        } else if (c == closing) {
+            if (isLast || isSeparator(next)) {
+                closing = '\0';
+                wasQuoted = true;
+            }
+            ++i;
+        } else if (c == '\\' && next == closing && !isLast) {
+            text_ += closing;
+            i += 2;
+        } else {
+            text_ += c;
+            ++i;
+        }
+    }
+    if (text_.size() > start) {
+        ClosePiece(start);
+    }
+    return GetSize() - before;
+}
+
+} // namespace Orn_Hdl

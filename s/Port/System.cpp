@@ -1,0 +1,41 @@
+#include "Port/System.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+namespace Port {
+
+namespace {
+
+System systemCalls;
+System* inUse = &systemCalls;
+
+} // namespace
+
+System::~System() = default;
+
+int System::Open(const char* name, int flags, unsigned mode) {
+    return ::open(name, flags, mode);
+}
+
+ssize_t System::Read(int descriptor, void* buffer, std::size_t size) {
+    return ::read(descriptor, buffer, size);
+}
+
+ssize_t System::Write(int descriptor, const void* data, std::size_t size) {
+    return ::write(descriptor, data, size);
+}
+
+int System::Close(int descriptor) {
+    return ::close(descriptor);
+}
+
+System& System::Get() noexcept {
+    return *inUse;
+}
+
+void System::Replace(System* system) noexcept {
+    inUse = system == nullptr ? &systemCalls : system;
+}
+
+} // namespace Port

@@ -1,0 +1,28 @@
+// The one seam around the operating system's file calls. Everything that opens, reads, writes, closes
+// or renames a file goes through it, so that a test can make the N-th call fail.
+#pragma once
+
+#include "Port/Export.h"
+
+#include <cstddef>
+#include <sys/types.h>
+
+namespace Port {
+
+/// The file calls of the system, with their POSIX meaning: -1 and errno on a failure.
+class ORN_HDL_API System {
+public:
+    virtual ~System();
+    virtual int Open(const char* name, int flags, unsigned mode);
+    virtual ssize_t Read(int descriptor, void* buffer, std::size_t size);
+    virtual ssize_t Write(int descriptor, const void* data, std::size_t size);
+    virtual int Close(int descriptor);
+
+    /// The calls in use.
+    static System& Get() noexcept;
+    /// Puts other calls in use, null for the system's own; not owned. For tests, before any file is
+    /// open.
+    static void Replace(System* system) noexcept;
+};
+
+} // namespace Port

@@ -1,0 +1,118 @@
+#include "Orn_Hdl/Streams.h"
+
+#include "Port/Ascii.h"
+#include "Streams/TextFileDst.h"
+#include "Streams/TextMemDst.h"
+
+namespace Orn_Hdl {
+
+StreamDst::~StreamDst() = default;
+
+void StreamDst::Flush() {}
+
+void StreamDst::WriteNewLine() {
+    WriteView("\n");
+}
+
+void StreamDst::WriteView(std::string_view text) {
+    Write(std::string(text).c_str());
+}
+
+OutStream::OutStream(StreamDst* destination) : destination_(destination) {}
+
+OutStream::~OutStream() = default;
+
+OutStream& OutStream::operator<<(const char* text) {
+    return *this << Port::ViewOf(text);
+}
+
+OutStream& OutStream::operator<<(std::string_view text) {
+    if (destination_ != nullptr) {
+        destination_->WriteView(text);
+    }
+    return *this;
+}
+
+OutStream& OutStream::operator<<(int number) {
+    if (destination_ != nullptr) {
+        destination_->Write(number);
+    }
+    return *this;
+}
+
+OutStream& OutStream::operator<<(Operand operand) {
+    if (destination_ != nullptr && operand == NewLine) {
+        destination_->WriteNewLine();
+    } else if (destination_ != nullptr && operand == Flush) {
+        destination_->Flush();
+    }
+    return *this;
+}
+
+void OutStream::Indent() noexcept {
+    if (destination_ != nullptr) {
+        destination_->Indent();
+    }
+}
+
+void OutStream::Unindent() noexcept {
+    if (destination_ != nullptr) {
+        destination_->Unindent();
+    }
+}
+
+void OutStream::WriteEmptyLine() {
+    int levels = 0;
+    while (destination_ != nullptr && destination_->GetIndentLevel() > 0) {
+        Unindent();
+        ++levels;
+    }
+    *this << NewLine;
+    for (; levels > 0; --levels) {
+        Indent();
+    }
+}
+
+TextFileOutStream::TextFileOutStream()
+    : OutStream(new TextFileDst()), file_(static_cast<TextFileDst&>(*GetDestination())) {}
+
+TextFileOutStream::TextFileOutStream(const char* fileName, bool append)
+    : OutStream(new TextFileDst(fileName, append)),
+      file_(static_cast<TextFileDst&>(*GetDestination())) {}
+
+TextFileOutStream::~TextFileOutStream() = default;
+
+bool TextFileOutStream::Open(const char* fileName, bool append) {
+    return file_.Open(fileName, append);
+}
+
+bool TextFileOutStream::IsOpen() const noexcept {
+    return file_.IsOpen();
+}
+
+void TextFileOutStream::Close() {
+    file_.Close();
+}
+
+Port::StringBase<char> TextFileOutStream::GetFileName() const {
+    return file_.GetFileName();
+}
+
+int TextFileOutStream::GetError() const noexcept {
+    return file_.GetError();
+}
+
+TextMemOutStream::TextMemOutStream(const char* initial)
+    : OutStream(new TextMemDst(initial)), memory_(static_cast<TextMemDst&>(*GetDestination())) {}
+
+TextMemOutStream::~TextMemOutStream() = default;
+
+Port::StringBase<char> TextMemOutStream::GetValue() const {
+    return memory_.GetText();
+}
+
+void TextMemOutStream::SetValue(const char* text) {
+    memory_.SetText(text);
+}
+
+} // namespace Orn_Hdl

@@ -1,0 +1,27 @@
+// The memory destination: everything as it comes, no indentation, no breaks.
+#pragma once
+
+#include "Orn_Hdl/Streams.h"
+#include "Port/Ascii.h"
+
+#include <string>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+class TextMemDst final : public StreamDst {
+public:
+    explicit TextMemDst(const char* initial) : text_(Port::ViewOf(initial)) {}
+
+    const std::string& GetText() const noexcept { return text_; }
+    void SetText(const char* text) { text_ = Port::ViewOf(text); }
+
+    void Write(const char* text) override { text_ += Port::ViewOf(text); }
+    void Write(int number) override { text_ += std::to_string(number); }
+    void WriteView(std::string_view text) override { text_ += text; }
+
+private:
+    std::string text_;
+};
+
+} // namespace Orn_Hdl
