@@ -1,0 +1,49 @@
+// The stand-ins that a netlist makes for ports which are used against their direction: an output port
+// that is read inside, or has several drivers, and an input port that is driven inside.
+#pragma once
+
+#include "Orn_Hdl/Model/Netlist.h"
+
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace Orn_Hdl {
+
+/// Remembers which dummy stands in for which signal, so that a netlist can be written any number of
+/// times. It owns nothing: the netlist owns both.
+class DummySignals {
+public:
+    /// Lets each dummy take over what its signal has gained since it was made.
+    void Refresh(Netlist& netlist);
+    /// Makes dummies for the named signals.
+    /// \param forOutputs whether the signals are output ports, which their dummies drive, or input
+    ///        ports, which drive their dummies.
+    void Make(Netlist& netlist, const StringSet& names, bool forOutputs);
+    /// Drops a signal that is about to end, be it a dummy or not.
+    void Forget(const Signal* signal);
+
+private:
+    struct Entry {
+        Signal* original;
+        Signal* dummy;
+        bool forOutputs;
+    };
+
+    Signal* Find(const Signal* original) const noexcept;
+    void MakeForScalar(Netlist& netlist, ScalarSignal& signal, bool forOutputs);
+    void MakeForBus(Netlist& netlist, Bus& bus, bool forOutputs);
+    void MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool forOutputs);
+    void MakeForCompound(Netlist& netlist, CompoundBus& compound, bool forOutputs);
+    /// Adds a dummy to the netlist and to the memory, and lets it take over for the first time.
+    void Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs);
+    static void TakeOver(const Entry& entry);
+    static void Link(const Entry& entry);
+    static void ReplaceInCompounds(const Entry& entry);
+
+    /// In the order in which the dummies were made.
+    std::vector<Entry> entries_;
+    std::unordered_map<const Signal*, Signal*> dummyOf_;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,235 @@
+#include "HdlModel/Names.h"
+
+#include "Port/Text.h"
+
+#include <algorithm>
+#include <climits>
+
+namespace Orn_Hdl::Names {
+
+using std::string_view;
+
+bool IsNormalized(string_view name) noexcept {
+    return std::all_of(name.begin(), name.end(), [](char c) { return Normalized(c) == c; });
+}
+
+void Normalize(std::string& name) noexcept {
+    for (char& c : name) {
+        c = Normalized(c);
+    }
+}
+
+NormalizedText::NormalizedText(string_view text) : view_(text) {
+    if (!IsNormalized(text)) {
+        copy_ = text;
+        Normalize(copy_);
+        view_ = copy_;
+    }
+}
+
+bool IsBase(string_view text) noexcept {
+    if (text.empty() || !(Port::IsLetter(text[0]) || text[0] == '_' || text[0] == '\'')) {
+        return false;
+    }
+    return std::all_of(text.begin() + 1, text.end(), [](char c) {
+        return Port::IsLetter(c) || Port::IsDigit(c) || c == '_';
+    });
+}
+
+bool IsInteger(string_view text) noexcept {
+    if (!text.empty() && (text[0] == '+' || text[0] == '-')) {
+        text.remove_prefix(1);
+    }
+    return !text.empty() && std::all_of(text.begin(), text.end(), Port::IsDigit);
+}
+
+std::int64_t BusName::GetBits() const noexcept {
+    const std::int64_t distance = std::int64_t(leftIndex) - rightIndex;
+    return (distance < 0 ? -distance : distance) + 1;
+}
+
+int BusName::GetWidth() const noexcept {
+    return static_cast<int>(std::min<std::int64_t>(GetBits(), INT_MAX));
+}
+
+int BusName::IndexAt(std::int64_t position) const noexcept {
+    return static_cast<int>(leftIndex >= rightIndex ? leftIndex - position : leftIndex + position);
+}
+
+bool ParseBus(string_view name, BusName& parsed) noexcept {
+    if (name.empty() || name.back() != ')') {
+        return false;
+    }
+    const std::size_t open = name.find('(');
+    const std::size_t colon = name.find(':');
+    if (open >= colon || colon == string_view::npos || name.find(')') != name.size() - 1) {
+        return false;
+    }
+    const string_view base = name.substr(0, open);
+    const string_view left = name.substr(open + 1, colon - open - 1);
+    const string_view right = name.substr(colon + 1, name.size() - colon - 2);
+    if (!IsBase(base) || !IsInteger(left) || !IsInteger(right)) {
+        return false;
+    }
+    parsed = {base, left, right, Port::ToIntSaturated(left), Port::ToIntSaturated(right)};
+    return true;
+}
+
+bool ParseBit(string_view name, BitName& parsed) noexcept {
+    if (name.empty() || name.back() != ')') {
+        return false;
+    }
+    const std::size_t open = name.find('(');
+    if (open == string_view::npos || name.find(')') != name.size() - 1) {
+        return false;
+    }
+    const string_view base = name.substr(0, open);
+    const string_view index = name.substr(open + 1, name.size() - open - 2);
+    if (!IsBase(base) || !IsInteger(index)) {
+        return false;
+    }
+    parsed = {base, index, Port::ToIntSaturated(index)};
+    return true;
+}
+
+bool CompoundPieces::Next(string_view& piece) noexcept {
+    while (!rest_.empty()) {
+        const std::size_t end = std::min(rest_.find_first_of(",\\"), rest_.size());
+        piece = rest_.substr(0, end);
+        rest_.remove_prefix(std::min(end + 1, rest_.size()));
+        if (!piece.empty()) {
+            return true;
+        }
+    }
+    return false;
+}
+
+bool IsCompound(string_view name) noexcept {
+    CompoundPieces pieces(name);
+    string_view piece;
+    BusName bus;
+    BitName bit;
+    int count = 0;
+    while (pieces.Next(piece)) {
+        if (!IsBase(piece) && !ParseBus(piece, bus) && !ParseBit(piece, bit)) {
+            return false;
+        }
+        count = std::min(count + 1, 2);
+    }
+    return count > 1;
+}
+
+string_view BaseName(string_view name) noexcept {
+    const std::size_t open = name.find('(');
+    if (open == string_view::npos || name.find(')') == string_view::npos ||
+        name.find(',') != string_view::npos) {
+        return name;
+    }
+    return name.substr(0, open);
+}
+
+string_view BeforeParenthesis(string_view name) noexcept {
+    return name.substr(0, name.find('('));
+}
+
+std::string WithIndex(string_view base, string_view index) {
+    std::string name;
+    name.reserve(base.size() + index.size() + 2);
+    name.append(base).append("(").append(index).append(")");
+    return name;
+}
+
+std::string WithIndex(string_view base, int index) {
+    return WithIndex(base, std::to_string(index));
+}
+
+std::string WithRange(string_view base, string_view left, string_view right) {
+    std::string name;
+    name.reserve(base.size() + left.size() + right.size() + 3);
+    name.append(base).append("(").append(left).append(":").append(right).append(")");
+    return name;
+}
+
+std::string WithRange(string_view base, int left, int right) {
+    return WithRange(base, std::to_string(left), std::to_string(right));
+}
+
+namespace {
+
+std::size_t DigitRun(string_view text, std::size_t start) noexcept {
+    std::size_t end = start;
+    while (end < text.size() && Port::IsDigit(text[end])) {
+        ++end;
+    }
+    return end - start;
+}
+
+unsigned char Rank(char c) noexcept {
+    return static_cast<unsigned char>(Port::ToUpper(c));
+}
+
+} // namespace
+
+int CompareNatural(string_view a, string_view b) noexcept {
+    const std::size_t common = std::min(a.size(), b.size());
+    std::size_t i = 0;
+    while (i < common && Rank(a[i]) == Rank(b[i])) {
+        ++i;
+    }
+    if (i == a.size() || i == b.size()) {
+        return a.size() == b.size() ? 0 : (a.size() < b.size() ? -1 : 1);
+    }
+    const bool digitA = Port::IsDigit(a[i]);
+    const bool digitB = Port::IsDigit(b[i]);
+    if (digitA != digitB) {
+        return digitA ? 1 : -1;
+    }
+    if (digitA) {
+        const std::size_t runA = DigitRun(a, i);
+        const std::size_t runB = DigitRun(b, i);
+        if (runA != runB) {
+            return runA < runB ? -1 : 1;
+        }
+    }
+    return Rank(a[i]) < Rank(b[i]) ? -1 : 1;
+}
+
+std::uint64_t NaturalKey(string_view name) noexcept {
+    // Each step must keep the order: a run of digits is coded as 255, its length and its digits, so
+    // that it sorts after every other character and longer runs after shorter ones. What cannot be
+    // coded so in one byte ends the key.
+    constexpr unsigned DigitMark = 255;
+    constexpr int KeyBytes = 8;
+    std::uint64_t key = 0;
+    int used = 0;
+    const auto append = [&key, &used](unsigned byte) {
+        if (used < KeyBytes) {
+            key |= std::uint64_t(byte) << (8 * (KeyBytes - 1 - used));
+            ++used;
+        }
+    };
+    for (std::size_t i = 0; i < name.size() && used < KeyBytes;) {
+        if (!Port::IsDigit(name[i])) {
+            const unsigned rank = Rank(name[i]);
+            if (rank >= DigitMark - 1) {
+                append(DigitMark - 1);
+                break;
+            }
+            append(rank);
+            ++i;
+            continue;
+        }
+        const std::size_t run = DigitRun(name, i);
+        append(DigitMark);
+        append(static_cast<unsigned>(std::min<std::size_t>(run, 255)));
+        if (run > 255) {
+            break;
+        }
+        for (std::size_t end = i + run; i < end; ++i) {
+            append(Rank(name[i]));
+        }
+    }
+    return key;
+}
+
+} // namespace Orn_Hdl::Names

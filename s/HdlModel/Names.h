@@ -1,0 +1,118 @@
+// What names mean: the scanners behind every rule that reads a name. All of them take views, keep no
+// copies, run in one pass without recursion, and so hold up at names of any length.
+#pragma once
+
+#include "Port/Ascii.h"
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+
+namespace Orn_Hdl::Names {
+
+/// The most bits that one name is ever expanded into.
+constexpr std::int64_t MostExpandedBits = 1048576;
+
+/// One character of a name in its normalised form.
+constexpr char Normalized(char c) noexcept {
+    switch (c) {
+    case '[':
+    case '{':
+    case '<':
+        return '(';
+    case ']':
+    case '}':
+    case '>':
+        return ')';
+    case '-':
+        return ':';
+    default:
+        return c;
+    }
+}
+
+bool IsNormalized(std::string_view name) noexcept;
+void Normalize(std::string& name) noexcept;
+
+/// A normalised view of a text, copied only when the text is not normalised already.
+class NormalizedText {
+public:
+    explicit NormalizedText(std::string_view text);
+    std::string_view GetView() const noexcept { return view_; }
+
+private:
+    std::string copy_;
+    std::string_view view_;
+};
+
+bool IsBase(std::string_view text) noexcept;
+bool IsInteger(std::string_view text) noexcept;
+
+/// The pieces of a bus name such as D(7:0); the views point into the name.
+struct BusName {
+    std::string_view base;
+    std::string_view left;
+    std::string_view right;
+    /// The indices, saturated to 32 bits.
+    int leftIndex = 0;
+    int rightIndex = 0;
+
+    bool IsDownTo() const noexcept { return leftIndex > rightIndex; }
+    bool IsOneBit() const noexcept { return leftIndex == rightIndex; }
+    /// The number of bits, exact.
+    std::int64_t GetBits() const noexcept;
+    /// The number of bits, at most INT_MAX.
+    int GetWidth() const noexcept;
+    /// The index of the bit at `position`, counted from the left.
+    int IndexAt(std::int64_t position) const noexcept;
+};
+
+/// The pieces of a bit name such as D(3); the views point into the name.
+struct BitName {
+    std::string_view base;
+    std::string_view index;
+    int value = 0;
+};
+
+/// Both take a normalised name; false, `parsed` untouched, for a name of another form.
+bool ParseBus(std::string_view name, BusName& parsed) noexcept;
+bool ParseBit(std::string_view name, BitName& parsed) noexcept;
+
+/// Whether a normalised name is two or more base, bus or bit names separated by "," or "\".
+bool IsCompound(std::string_view name) noexcept;
+
+/// Steps through the pieces of a compound name; empty pieces are skipped.
+class CompoundPieces {
+public:
+    explicit CompoundPieces(std::string_view name) noexcept : rest_(name) {}
+    /// \return false when there is no further piece.
+    bool Next(std::string_view& piece) noexcept;
+
+private:
+    std::string_view rest_;
+};
+
+/// The part of a normalised name before its first "(" when it holds "(" and ")" and no ",",
+/// otherwise the whole name.
+std::string_view BaseName(std::string_view name) noexcept;
+/// What stands before the first "(", or the whole name.
+std::string_view BeforeParenthesis(std::string_view name) noexcept;
+
+/// Text of a name with an index or a range in parentheses.
+std::string WithIndex(std::string_view base, std::string_view index);
+std::string WithIndex(std::string_view base, int index);
+std::string WithRange(std::string_view base, std::string_view left, std::string_view right);
+std::string WithRange(std::string_view base, int left, int right);
+
+inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
+    return Port::EqualIgnoringCase(name, other);
+}
+
+/// Below, at or above zero in natural order: letter case ignored, runs of digits by their value, a
+/// digit after every other character, the end of a name before any character.
+int CompareNatural(std::string_view a, std::string_view b) noexcept;
+/// The first eight characters' worth of natural order: a smaller key sorts first, equal keys say
+/// nothing.
+std::uint64_t NaturalKey(std::string_view name) noexcept;
+
+} // namespace Orn_Hdl::Names

@@ -1,0 +1,372 @@
+#include "Orn_Hdl/Model/Netlist.h"
+
+#include "HdlModel/DummySignals.h"
+#include "HdlModel/NameIndex.h"
+#include "HdlModel/Names.h"
+#include "HdlModel/NaturalSort.h"
+#include "HdlModel/ObjectKey.h"
+#include "Port/Ascii.h"
+
+#include <algorithm>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace Orn_Hdl {
+
+namespace {
+
+/// The name under which the netlist found an object when it took it.
+struct KeyName {
+    std::string_view operator()(const Object* object) const noexcept {
+        return ObjectKey::Get(*object);
+    }
+};
+
+struct KeyBaseName {
+    std::string_view operator()(const Bus* bus) const noexcept {
+        return Names::BaseName(ObjectKey::Get(*bus));
+    }
+};
+
+/// What is removed was mostly added last.
+template <class T> int LastIndexOf(const PtrArray<T*>& objects, const T* object) noexcept {
+    int i = objects.GetSize() - 1;
+    while (i >= 0 && objects.GetAt(i) != object) {
+        --i;
+    }
+    return i;
+}
+
+int ToLength(std::size_t length) noexcept {
+    return static_cast<int>(std::min<std::size_t>(length, INT32_MAX));
+}
+
+} // namespace
+
+struct Netlist::Implementation {
+    OwnPtrArray<Component*> components;
+    OwnPtrArray<Instance*> instances;
+    OwnPtrArray<Signal*> signals;
+    NameIndex<Component, KeyName> componentsByName;
+    NameIndex<Instance, KeyName> instancesByName;
+    NameIndex<Signal, KeyName> signalsByName;
+    NameIndex<Bus, KeyBaseName> busesByBaseName;
+    DummySignals dummies;
+    std::string sourceFileName;
+
+    ~Implementation() {
+        // Signals end first: an instance then has nothing to leave. They part all at once, while all
+        // of them are alive.
+        for (Signal* signal : Iterator<Signal*>(&signals)) {
+            signal->MarkDying();
+        }
+        for (Signal* signal : Iterator<Signal*>(&signals)) {
+            signal->LeaveAll();
+        }
+        signals.DeleteAll();
+        instances.DeleteAll();
+        components.DeleteAll();
+    }
+
+    /// Takes ownership of an object that has no owner. \return false for any other.
+    template <class T, class Index>
+    static bool Take(T* object, OwnPtrArray<T*>& objects, Index& byName) {
+        if (object == nullptr || OwnedFlag::Get(*object)) {
+            return false;
+        }
+        std::unique_ptr<T> taken(object);
+        objects.AddNew(object);
+        OwnedFlag::Set(*taken.release());
+        byName.Add(object);
+        return true;
+    }
+
+    template <class T, class Index>
+    static void Destroy(T* object, OwnPtrArray<T*>& objects, Index& byName) {
+        const int place = object == nullptr ? -1 : LastIndexOf<T>(objects, object);
+        if (place >= 0) {
+            byName.Remove(object);
+            objects.RemoveAt(place);
+            delete object;
+        }
+    }
+};
+
+Netlist::Netlist(const char* name)
+    : Object(ObjectTypeNetlist), implementation_(std::make_unique<Implementation>()) {
+    SetNameVerbatim(name == nullptr ? "hdlNetlist" : name);
+}
+
+Netlist::~Netlist() = default;
+
+void Netlist::AcceptObject(ObjectVisitor& visitor) {
+    visitor.VisitNetlist(this);
+}
+
+void Netlist::SetName(const char* name) {
+    SetNameVerbatim(Port::ViewOf(name));
+}
+
+void Netlist::SetSourceFileName(const char* name) {
+    implementation_->sourceFileName = Port::ViewOf(name);
+}
+
+Port::StringBase<char> Netlist::GetSourceFileName() const {
+    return implementation_->sourceFileName;
+}
+
+void Netlist::Add(Signal* signal) {
+    Implementation& own = *implementation_;
+    if (own.Take(signal, own.signals, own.signalsByName) &&
+        signal->GetSignalType() == SignalTypeBus) {
+        own.busesByBaseName.Add(static_cast<Bus*>(signal));
+    }
+}
+
+void Netlist::Add(Instance* instance) {
+    implementation_->Take(instance, implementation_->instances, implementation_->instancesByName);
+}
+
+void Netlist::Add(Component* component) {
+    implementation_->Take(component, implementation_->components,
+                          implementation_->componentsByName);
+}
+
+void Netlist::Remove(Signal* signal) {
+    Implementation& own = *implementation_;
+    if (signal == nullptr || LastIndexOf<Signal>(own.signals, signal) < 0) {
+        return;
+    }
+    own.dummies.Forget(signal);
+    if (signal->GetSignalType() == SignalTypeBus) {
+        own.busesByBaseName.Remove(static_cast<Bus*>(signal));
+    }
+    own.Destroy(signal, own.signals, own.signalsByName);
+}
+
+void Netlist::Remove(Instance* instance) {
+    implementation_->Destroy(instance, implementation_->instances,
+                             implementation_->instancesByName);
+}
+
+void Netlist::Remove(Component* component) {
+    implementation_->Destroy(component, implementation_->components,
+                             implementation_->componentsByName);
+}
+
+Signal* Netlist::GetSignal(std::string_view name) const noexcept {
+    return implementation_->signalsByName.Find(name);
+}
+
+Instance* Netlist::GetInstance(std::string_view name) const noexcept {
+    return implementation_->instancesByName.Find(name);
+}
+
+Component* Netlist::GetComponent(std::string_view name) const noexcept {
+    return implementation_->componentsByName.Find(name);
+}
+
+Bus* Netlist::GetParentBus(const char* name) const {
+    const Names::NormalizedText normalized(Port::ViewOf(name));
+    return implementation_->busesByBaseName.Find(Names::BaseName(normalized.GetView()));
+}
+
+Iterator<Signal*> Netlist::GetSignalIterator() const noexcept {
+    return Iterator<Signal*>(&implementation_->signals);
+}
+
+Iterator<Instance*> Netlist::GetInstanceIterator() const noexcept {
+    return Iterator<Instance*>(&implementation_->instances);
+}
+
+Iterator<Component*> Netlist::GetComponentIterator() const noexcept {
+    return Iterator<Component*>(&implementation_->components);
+}
+
+void Netlist::GetInstances(const Component* component, PtrArray<Instance*>& instances) const {
+    instances.Empty();
+    for (Instance* instance : GetInstanceIterator()) {
+        if (component != nullptr && instance->GetComponent() == component) {
+            instances.Add(instance);
+        }
+    }
+}
+
+void Netlist::GetInstances(const char* componentName, PtrArray<Instance*>& instances) const {
+    GetInstances(GetComponent(componentName), instances);
+}
+
+void Netlist::SortNetlist() {
+    SortNaturally(implementation_->signals,
+                  [](const Signal* signal) { return signal->GetPortPolarity().GetValue(); });
+    SortNaturally(implementation_->components, [](const Component*) { return 0; });
+    SortNaturally(implementation_->instances, [](const Instance*) { return 0; });
+    for (Instance* instance : GetInstanceIterator()) {
+        instance->SortPinName();
+    }
+}
+
+void Netlist::ConnectOpenPinToDummy() {
+    for (Instance* instance : GetInstanceIterator()) {
+        PtrArray<Pin*> open;
+        instance->GetOpenPin(open, true);
+        for (Pin* pin : Iterator<Pin*>(&open)) {
+            if (pin->GetPinType() == PinTypeBusIndex) {
+                continue;
+            }
+            // The range is the rest of the pin's name, as it is spelled there.
+            const std::string_view pinName = pin->GetNameView();
+            const bool isBus = pin->GetPinType() == PinTypeBus;
+            const std::string_view base = isBus ? Names::BeforeParenthesis(pinName) : pinName;
+            std::string name(instance->GetNameView());
+            name.append("_").append(base).append("_openSignal").append(pinName.substr(base.size()));
+            Signal* signal = GetSignal(std::string_view(name));
+            if (signal == nullptr) {
+                signal = isBus ? static_cast<Signal*>(new Bus(name.c_str()))
+                               : new ScalarSignal(name.c_str());
+                Add(signal);
+            }
+            pin->Connect(signal);
+        }
+    }
+}
+
+void Netlist::SetBoxTypeAttribute() {
+    for (Component* component : GetComponentIterator()) {
+        const Attribute* const level = component->GetAttr("Level");
+        if (level != nullptr && Port::EqualIgnoringCase(level->GetValueString(), "HALVEX") &&
+            component->GetAttr("BOX_TYPE") == nullptr) {
+            std::unique_ptr<Attribute> boxType(
+                AttributeFactory::GetCreators().Get(Attribute::DEFAULT_ATTRTYPE)("BOX_TYPE",
+                                                                                 "BLACK_BOX"));
+            boxType->SetSynAttr("ASSIGN");
+            component->AddAttr(boxType.release());
+        }
+    }
+}
+
+void Netlist::GetFeedBackSignals(bool outputPorts, StringSet& names) const {
+    for (const Instance* instance : GetInstanceIterator()) {
+        PtrArray<Pin*> pins;
+        if (outputPorts) {
+            instance->GetOutPortConnectedToInPin(pins);
+        } else {
+            instance->GetInPortConnectedToOutPin(pins);
+        }
+        for (const Pin* pin : Iterator<Pin*>(&pins)) {
+            if (pin->GetSignal() != nullptr) {
+                pin->GetSignal()->GetBaseName(names);
+            }
+        }
+    }
+}
+
+void Netlist::GetWiredOrOutputSignals(StringSet& names) const {
+    for (const Signal* signal : GetSignalIterator()) {
+        if (signal->GetPortPolarity().GetValue() == Polarity::Output && signal->HasMultiDriver()) {
+            signal->GetBaseName(names);
+        }
+    }
+}
+
+void Netlist::CreateVerilogDummySignals() {
+    DummySignals& dummies = implementation_->dummies;
+    dummies.Refresh(*this);
+    StringSet names;
+    GetFeedBackSignals(false, names);
+    dummies.Make(*this, names, false);
+}
+
+void Netlist::CreateVhdlDummySignals() {
+    DummySignals& dummies = implementation_->dummies;
+    dummies.Refresh(*this);
+    StringSet names;
+    for (const bool outputPorts : {true, false}) {
+        GetFeedBackSignals(outputPorts, names);
+        dummies.Make(*this, names, outputPorts);
+        names.Empty();
+    }
+    GetWiredOrOutputSignals(names);
+    dummies.Make(*this, names, true);
+}
+
+void Netlist::ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider,
+                         std::unique_ptr<BusSlice> slice) {
+    wider->SetPortPolarity(narrower->GetPortPolarity());
+    static_cast<AttributeHolder&>(*wider) = *narrower;
+    wider->TakeCommentOf(*narrower);
+    slice->CloneConnection(narrower);
+    if (!narrower->GetConstantValue().GetValue().IsEmpty()) {
+        slice->AssignConstantValue(narrower->GetConstantValue());
+    }
+    narrower->ReplaceEverywhereBy(slice.get());
+    const PtrArray<Signal*> parts = narrower->slices_;
+    narrower->EmptyBusSlice();
+    for (int i = 0; i < parts.GetSize(); ++i) {
+        wider->AddBusSlice(parts.GetAt(i));
+    }
+    Remove(narrower);
+    Add(wider.release());
+    Add(slice.release());
+}
+
+int Netlist::GetLongestPinName(const Iterator<Pin*>& pins) {
+    std::size_t longest = 0;
+    for (const Pin* pin : pins) {
+        longest = std::max(longest, pin->GetNameView().size());
+    }
+    return ToLength(longest);
+}
+
+int Netlist::GetLongestPortName(const Iterator<Signal*>& signals) {
+    std::size_t longest = 0;
+    for (const Signal* signal : signals) {
+        if (signal->IsPort()) {
+            longest = std::max(longest, signal->GetNameView().size());
+        }
+    }
+    return ToLength(longest);
+}
+
+int Netlist::GetLongestSignalName(const Iterator<Signal*>& signals) {
+    std::size_t longest = 0;
+    for (const Signal* signal : signals) {
+        if (signal->IsNeededToDeclared()) {
+            longest = std::max(longest, signal->GetNameView().size());
+        }
+    }
+    return ToLength(longest);
+}
+
+int Netlist::GetLongestAttrName(const AttributeHolder* holder) {
+    std::size_t longest = 0;
+    if (holder != nullptr) {
+        for (const Attribute* attribute : holder->GetAttrIterator()) {
+            longest = std::max(longest, attribute->GetNameView().size());
+        }
+    }
+    return ToLength(longest);
+}
+
+int Netlist::GetLongestAttrName(const Netlist* netlist) {
+    if (netlist == nullptr) {
+        return 0;
+    }
+    int longest = GetLongestAttrName(static_cast<const AttributeHolder*>(netlist));
+    const auto consider = [&longest](const AttributeHolder* holder) {
+        longest = std::max(longest, GetLongestAttrName(holder));
+    };
+    for (const Signal* signal : netlist->GetSignalIterator()) {
+        consider(signal);
+    }
+    for (const Component* component : netlist->GetComponentIterator()) {
+        consider(component);
+    }
+    for (const Instance* instance : netlist->GetInstanceIterator()) {
+        consider(instance);
+    }
+    return longest;
+}
+
+} // namespace Orn_Hdl

@@ -1,0 +1,135 @@
+#include "Orn_Hdl/Model/Object.h"
+
+#include "HdlModel/Names.h"
+#include "HdlModel/ObjectDetails.h"
+#include "HdlModel/ObjectKey.h"
+#include "Port/Ascii.h"
+#include "Port/Pool.h"
+
+namespace Orn_Hdl {
+
+Object::Object(ObjectType type) noexcept {
+    SetFlag(static_cast<unsigned>(type - ObjectTypeAttribute), true);
+}
+
+Object::Object(const Object& other) : name_(other.name_) {
+    SetFlag(other.name_.GetOwnerByte() & TypeMask, true);
+    if (!other.GetCommentView().empty()) {
+        MakeDetails().comment = other.GetCommentView();
+    }
+}
+
+Object& Object::operator=(const Object& other) {
+    if (this != &other) {
+        CopyNameFrom(other);
+        SetFlag(TypeMask, false);
+        SetFlag(other.name_.GetOwnerByte() & TypeMask, true);
+        if (details_ != nullptr || !other.GetCommentView().empty()) {
+            MakeDetails().comment = other.GetCommentView();
+        }
+    }
+    return *this;
+}
+
+Object::~Object() = default;
+
+void* Object::operator new(std::size_t size) {
+    return Port::Pool::Allocate(size);
+}
+
+void Object::operator delete(void* memory) noexcept {
+    Port::Pool::Free(memory);
+}
+
+void Object::SetFlag(unsigned flag, bool on) noexcept {
+    const unsigned byte = name_.GetOwnerByte();
+    name_.SetOwnerByte(static_cast<std::uint8_t>(on ? byte | flag : byte & ~flag));
+}
+
+int Object::GetObjectType() const {
+    return ObjectTypeAttribute + static_cast<int>(name_.GetOwnerByte() & TypeMask);
+}
+
+ObjectDetails& Object::MakeDetails() {
+    if (details_ == nullptr) {
+        details_ = std::make_unique<ObjectDetails>();
+    }
+    return *details_;
+}
+
+void Object::SetName(const char* name) {
+    SetNameVerbatim(Names::NormalizedText(Port::ViewOf(name)).GetView());
+}
+
+void Object::SetNameVerbatim(std::string_view name) {
+    KeepKeyName(name);
+    name_.Assign(name);
+}
+
+void Object::CopyNameFrom(const Object& other) {
+    KeepKeyName(other.GetNameView());
+    name_ = other.name_;
+}
+
+void Object::KeepKeyName(std::string_view newName) {
+    const bool isOwned = HasFlag(OwnedFlagBit);
+    if (isOwned && (details_ == nullptr || details_->keyName == nullptr) &&
+        !Names::IsNamed(GetNameView(), newName)) {
+        MakeDetails().keyName = std::make_unique<std::string>(GetNameView());
+    }
+}
+
+std::string_view Object::GetKeyName() const noexcept {
+    return details_ != nullptr && details_->keyName != nullptr
+               ? std::string_view(*details_->keyName)
+               : GetNameView();
+}
+
+bool Object::IsNamed(const char* name) const noexcept {
+    return Names::IsNamed(GetNameView(), Port::ViewOf(name));
+}
+
+void Object::AddComment(const char* text) {
+    std::string& comment = MakeDetails().comment;
+    comment += Port::ViewOf(text);
+    comment += '\n';
+}
+
+Port::StringBase<char> Object::GetComment() const {
+    return GetCommentView();
+}
+
+std::string_view Object::GetCommentView() const noexcept {
+    return details_ == nullptr ? std::string_view() : std::string_view(details_->comment);
+}
+
+bool Object::operator==(const Object& other) const noexcept {
+    return GetCommentView() == other.GetCommentView() && GetNameView() == other.GetNameView() &&
+           ((name_.GetOwnerByte() ^ other.name_.GetOwnerByte()) & TypeMask) == 0;
+}
+
+void Object::NormalizeName(Port::StringBase<char>& name) {
+    name = Names::NormalizedText(name).GetView();
+}
+
+Port::StringBase<char> Object::GetBaseName(const char* name) {
+    return Names::BaseName(Names::NormalizedText(Port::ViewOf(name)).GetView());
+}
+
+bool Object::IsValidBaseName(const char* name) noexcept {
+    return Names::IsBase(Port::ViewOf(name));
+}
+
+bool Object::IsValidIntegerString(const Port::StringBase<char>& text) noexcept {
+    return Names::IsInteger(text);
+}
+
+ObjectVisitor::~ObjectVisitor() = default;
+void ObjectVisitor::VisitAttribute(Attribute* /*attribute*/) {}
+void ObjectVisitor::VisitSignal(Signal* /*signal*/) {}
+void ObjectVisitor::VisitComponent(Component* /*component*/) {}
+void ObjectVisitor::VisitPin(Pin* /*pin*/) {}
+void ObjectVisitor::VisitInstance(Instance* /*instance*/) {}
+void ObjectVisitor::VisitNetlist(Netlist* /*netlist*/) {}
+
+} // namespace Orn_Hdl

@@ -1,0 +1,29 @@
+// The parts of an object that few objects have. They are made when first needed, so that the
+// millions that do not need them do not pay for them.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace Orn_Hdl {
+
+struct ObjectDetails {
+    std::string comment;
+    /// The name under which a netlist finds the object, when it was renamed afterwards.
+    std::unique_ptr<std::string> keyName;
+    /// A pin's default value, or a signal's constant.
+    std::unique_ptr<BitVectorValue> value;
+    /// Of a pin: the signals that list it although it points at another, or at none.
+    std::vector<Signal*> formerSignals;
+};
+
+/// The constant or default value of an object that has none.
+inline const BitVectorValue& NoValue() {
+    static const BitVectorValue none;
+    return none;
+}
+
+} // namespace Orn_Hdl

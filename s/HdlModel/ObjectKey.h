@@ -1,0 +1,23 @@
+// What the owners of objects need to know of them: whether they have an owner, and the name under
+// which they are found.
+#pragma once
+
+#include "Orn_Hdl/Model/Object.h"
+
+#include <string_view>
+
+namespace Orn_Hdl {
+
+/// Whether an object has an owner, which deletes it. An object never gets a second one.
+class OwnedFlag {
+public:
+    static bool Get(const Object& object) noexcept { return object.HasFlag(Object::OwnedFlagBit); }
+    static void Set(Object& object) noexcept { object.SetFlag(Object::OwnedFlagBit, true); }
+};
+
+/// The name that an object had when its owner took it.
+struct ObjectKey {
+    static std::string_view Get(const Object& object) noexcept { return object.GetKeyName(); }
+};
+
+} // namespace Orn_Hdl

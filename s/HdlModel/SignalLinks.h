@@ -1,0 +1,19 @@
+// The links of a signal that most signals do not have.
+#pragma once
+
+#include "Orn_Hdl/Model/Signals.h"
+
+#include <vector>
+
+namespace Orn_Hdl {
+
+struct Signal::Links {
+    /// The aliases of this signal.
+    PtrArray<Signal*> signals;
+    /// Every signal that names this one, as an alias, a member or a slice, once each time.
+    std::vector<Signal*> referrers;
+    /// Pins that point at this signal without being listed.
+    std::vector<Pin*> unlistedPins;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,811 @@
+#include "Orn_Hdl/Model/Signals.h"
+
+#include "HdlModel/Names.h"
+#include "HdlModel/ObjectDetails.h"
+#include "HdlModel/SignalLinks.h"
+#include "Port/Ascii.h"
+
+#include <algorithm>
+#include <memory>
+
+namespace Orn_Hdl {
+
+namespace {
+
+/// The last occurrence is looked for first: what ends was mostly added last.
+template <class T> void EraseOne(std::vector<T*>& list, const T* element) noexcept {
+    const auto found = std::find(list.rbegin(), list.rend(), element);
+    if (found != list.rend()) {
+        *found = list.back();
+        list.pop_back();
+    }
+}
+
+int LastIndexOf(const PtrArray<Pin*>& pins, const Pin* pin) noexcept {
+    int i = pins.GetSize() - 1;
+    while (i >= 0 && pins.GetAt(i) != pin) {
+        --i;
+    }
+    return i;
+}
+
+} // namespace
+
+Signal::Signal(const char* name) : Object(ObjectTypeSignal) {
+    Object::SetName(name);
+}
+
+Signal::~Signal() {
+    Signal::LeaveAll();
+}
+
+void Signal::LeaveAll() noexcept {
+    OpenPins();
+    for (Pin* pin : Iterator<Pin*>(&pins_)) {
+        pin->NoteUnlisted(this);
+    }
+    pins_.Empty();
+    if (links_ == nullptr) {
+        return;
+    }
+    for (Signal* alias : Iterator<Signal*>(&links_->signals)) {
+        if (!EndTogether(*this, *alias)) {
+            alias->DropReferrer(this);
+        }
+    }
+    for (Signal* referrer : links_->referrers) {
+        if (!EndTogether(*this, *referrer)) {
+            referrer->Forget(this);
+        }
+    }
+    links_.reset();
+}
+
+void Signal::AcceptObject(ObjectVisitor& visitor) {
+    visitor.VisitSignal(this);
+}
+
+Signal::Links& Signal::MakeLinks() {
+    if (links_ == nullptr) {
+        links_ = std::make_unique<Links>();
+    }
+    return *links_;
+}
+
+void Signal::Forget(Signal* signal) noexcept {
+    if (links_ != nullptr) {
+        links_->signals.Remove(signal);
+    }
+}
+
+void Signal::NoteReferrer(Signal* by) {
+    MakeLinks().referrers.push_back(by);
+}
+
+void Signal::DropReferrer(const Signal* by) noexcept {
+    if (links_ != nullptr) {
+        EraseOne(links_->referrers, by);
+    }
+}
+
+void Signal::AddReference(PtrArray<Signal*>& list, Signal* signal) {
+    signal->NoteReferrer(this);
+    try {
+        list.Add(signal);
+    } catch (...) {
+        signal->DropReferrer(this);
+        throw;
+    }
+}
+
+void Signal::AddUnlistedPin(Pin* pin) {
+    MakeLinks().unlistedPins.push_back(pin);
+}
+
+void Signal::RemoveUnlistedPin(const Pin* pin) noexcept {
+    if (links_ != nullptr) {
+        EraseOne(links_->unlistedPins, pin);
+    }
+}
+
+void Signal::Unlist(Pin* pin) noexcept {
+    pins_.RemoveAt(LastIndexOf(pins_, pin));
+}
+
+void Signal::Connect(Pin* pin) {
+    if (pin == nullptr) {
+        return;
+    }
+    if (!pin->IsListedBy(this)) {
+        pins_.Add(pin);
+        try {
+            pin->NoteListed(this);
+        } catch (...) {
+            pins_.RemoveTail();
+            throw;
+        }
+    }
+    pin->Connect(this);
+}
+
+void Signal::Connect(Signal* other) {
+    if (other == nullptr || other == this) {
+        return;
+    }
+    Links& links = MakeLinks();
+    // Whichever side has fewer links tells whether the two are linked already.
+    const std::vector<Signal*>& referrers = other->MakeLinks().referrers;
+    const bool lookHere = static_cast<std::size_t>(links.signals.GetSize()) <= referrers.size();
+    const bool isListed =
+        lookHere ? links.signals.Contains(other)
+                 : std::find(referrers.begin(), referrers.end(), this) != referrers.end() &&
+                       links.signals.Contains(other);
+    if (!isListed) {
+        AddReference(links.signals, other);
+    }
+}
+
+void Signal::Disconnect(Pin* pin) {
+    if (pin == nullptr) {
+        return;
+    }
+    if (pin->IsListedBy(this)) {
+        Unlist(pin);
+        if (pin->signal_ == this) {
+            pin->SetFlag(Pin::ListedFlag, false);
+            pin->signal_ = nullptr;
+        } else {
+            pin->NoteUnlisted(this);
+        }
+    } else if (pin->signal_ == this) {
+        pin->Disconnect();
+    }
+}
+
+void Signal::Disconnect(Signal* other) {
+    if (other != nullptr && links_ != nullptr && links_->signals.Remove(other)) {
+        other->DropReferrer(this);
+    }
+}
+
+void Signal::OpenPins() noexcept {
+    for (Pin* pin : Iterator<Pin*>(&pins_)) {
+        if (pin->signal_ == this) {
+            pin->SetFlag(Pin::ListedFlag, false);
+            pin->signal_ = nullptr;
+        }
+    }
+    if (links_ != nullptr) {
+        for (Pin* pin : links_->unlistedPins) {
+            pin->signal_ = nullptr;
+        }
+        links_->unlistedPins.clear();
+    }
+}
+
+void Signal::DisconnectAll() {
+    OpenPins();
+    for (Pin* pin : Iterator<Pin*>(&pins_)) {
+        pin->NoteUnlisted(this);
+    }
+    pins_.Empty();
+    if (links_ != nullptr) {
+        for (Signal* alias : Iterator<Signal*>(&links_->signals)) {
+            alias->DropReferrer(this);
+        }
+        links_->signals.Empty();
+    }
+}
+
+void Signal::CloneConnection(Signal* other) {
+    if (other == nullptr || other == this) {
+        return;
+    }
+    for (Pin* pin : other->GetPinIterator()) {
+        if (pin->GetSignal() == other) {
+            Connect(pin);
+        }
+    }
+    for (Signal* alias : other->GetSignalIterator()) {
+        Connect(alias);
+    }
+}
+
+Iterator<Signal*> Signal::GetSignalIterator() const noexcept {
+    return Iterator<Signal*>(links_ == nullptr ? nullptr : &links_->signals);
+}
+
+void Signal::AssignConstantValue(const BitVectorValue& value) {
+    MakeDetails().value = std::make_unique<BitVectorValue>(value);
+}
+
+void Signal::AssignConstantValue(const char* value) {
+    AssignConstantValue(BitVectorValue(value));
+}
+
+const BitVectorValue& Signal::GetConstantValue() const noexcept {
+    const ObjectDetails* const details = GetDetails();
+    return details == nullptr || details->value == nullptr ? NoValue() : *details->value;
+}
+
+void Signal::TakeCommentOf(const Signal& other) {
+    if (!other.GetCommentView().empty()) {
+        MakeDetails().comment = other.GetCommentView();
+    }
+}
+
+bool Signal::HasMultiDriver() const noexcept {
+    int drivers = 0;
+    for (const Pin* pin : GetPinIterator()) {
+        if (pin->GetSignal() == this && pin->GetPolarity().GetValue() == Polarity::Output &&
+            ++drivers > 1) {
+            return true;
+        }
+    }
+    return false;
+}
+
+void Signal::ReplaceReference(Signal* from, Signal* to) {
+    const int index = links_ == nullptr ? -1 : links_->signals.GetIndex(from);
+    if (index < 0) {
+        return;
+    }
+    Links& links = *links_;
+    if (to == this || links.signals.Contains(to)) {
+        links.signals.RemoveAt(index);
+    } else {
+        to->NoteReferrer(this);
+        links.signals.SetAt(index, to);
+    }
+    from->DropReferrer(this);
+}
+
+void Signal::ReplaceEverywhereBy(Signal* other) {
+    if (links_ == nullptr) {
+        return;
+    }
+    const std::vector<Pin*> pins = links_->unlistedPins;
+    for (Pin* pin : pins) {
+        pin->Connect(other);
+    }
+    const std::vector<Signal*> referrers = links_->referrers;
+    for (Signal* referrer : referrers) {
+        referrer->ReplaceReference(this, other);
+    }
+}
+
+void ScalarSignal::AcceptSignal(SignalVisitor& visitor) {
+    visitor.VisitScalarSignal(this);
+    visitor.VisitSignal(this);
+}
+
+namespace {
+
+constexpr std::string_view DummySuffix = "_DUMMY";
+
+bool EndsInDummySuffix(std::string_view name) noexcept {
+    return name.size() >= DummySuffix.size() &&
+           Port::EqualIgnoringCase(name.substr(name.size() - DummySuffix.size()), DummySuffix);
+}
+
+/// A base name with the suffix behind it.
+std::string DummyBase(std::string_view base) {
+    return std::string(base).append(DummySuffix);
+}
+
+/// The dummy name of a name with a range or index: the suffix goes before it.
+std::string DummyOfPart(std::string_view name) {
+    const std::string_view base = Names::BeforeParenthesis(name);
+    return DummyBase(base).append(name.substr(base.size()));
+}
+
+} // namespace
+
+Port::StringBase<char> ScalarSignal::GetDummySignalName() const {
+    return EndsInDummySuffix(GetNameView()) ? std::string(GetNameView())
+                                            : DummyBase(GetNameView());
+}
+
+void ScalarSignal::GetBaseName(StringSet& names) const {
+    names.Add(GetNameView());
+}
+
+ScalarSignal* ScalarSignal::CreateDummySignal() const {
+    return new ScalarSignal(GetDummySignalName().CStr());
+}
+
+Bus** Bus::ParentLink(Signal* signal) noexcept {
+    switch (signal->GetSignalType()) {
+    case SignalTypeBusSlice:
+        return &static_cast<BusSlice*>(signal)->parent_;
+    case SignalTypeBusIndex:
+        return &static_cast<BusIndex*>(signal)->parent_;
+    default:
+        return nullptr;
+    }
+}
+
+Bus::~Bus() {
+    Bus::LeaveAll();
+}
+
+void Bus::LeaveAll() noexcept {
+    for (int i = slices_.GetSize(); i > 0; --i) {
+        Signal* const slice = slices_.GetAt(i - 1);
+        if (Bus** parent = ParentLink(slice)) {
+            *parent = nullptr;
+        } else if (!EndTogether(*this, *slice)) {
+            slice->DropReferrer(this);
+        }
+    }
+    slices_.Empty();
+    Signal::LeaveAll();
+}
+
+void Bus::AcceptSignal(SignalVisitor& visitor) {
+    visitor.VisitBus(this);
+    visitor.VisitSignal(this);
+}
+
+int Bus::GetWidth() const {
+    Names::BusName parsed;
+    return Names::ParseBus(GetNameView(), parsed) ? parsed.GetWidth() : 0;
+}
+
+Port::StringBase<char> Bus::GetDummySignalName() const {
+    return EndsInDummySuffix(Names::BeforeParenthesis(GetNameView())) ? std::string(GetNameView())
+                                                                     : DummyOfPart(GetNameView());
+}
+
+void Bus::GetBaseName(StringSet& names) const {
+    names.Add(Names::BeforeParenthesis(GetNameView()));
+}
+
+Bus* Bus::CreateDummySignal() const {
+    return new Bus(GetDummySignalName().CStr());
+}
+
+Port::StringBase<char> Bus::GetBaseName() const {
+    return Names::BeforeParenthesis(GetNameView());
+}
+
+namespace {
+
+bool GetIndexTexts(std::string_view name, Port::StringBase<char>& left,
+                   Port::StringBase<char>& right) {
+    Names::BusName parsed;
+    if (!Names::ParseBus(name, parsed)) {
+        return false;
+    }
+    left = parsed.left;
+    right = parsed.right;
+    return true;
+}
+
+} // namespace
+
+bool Bus::GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const {
+    return GetIndexTexts(GetNameView(), left, right);
+}
+
+bool Bus::GetIndex(int& left, int& right) const noexcept {
+    Names::BusName parsed;
+    if (!Names::ParseBus(GetNameView(), parsed)) {
+        return false;
+    }
+    left = parsed.leftIndex;
+    right = parsed.rightIndex;
+    return true;
+}
+
+bool Bus::IsDownTo() const noexcept {
+    Names::BusName parsed;
+    return Names::ParseBus(GetNameView(), parsed) && parsed.IsDownTo();
+}
+
+void Bus::AddBusSlice(Signal* slice) {
+    if (slice == nullptr) {
+        return;
+    }
+    Bus** const parent = ParentLink(slice);
+    // A slice or bit knows its parent, so the list need not be searched; anything else that is put
+    // here may be listed already.
+    if (parent != nullptr ? *parent == this : slices_.Contains(slice)) {
+        return;
+    }
+    if (parent == nullptr) {
+        AddReference(slices_, slice);
+        return;
+    }
+    slices_.Add(slice);
+    if (*parent != nullptr) {
+        (*parent)->RemoveBusSlice(slice);
+    }
+    *parent = this;
+}
+
+void Bus::RemoveBusSlice(Signal* slice) {
+    int i = slices_.GetSize() - 1;
+    while (i >= 0 && slices_.GetAt(i) != slice) {
+        --i;
+    }
+    if (i < 0) {
+        return;
+    }
+    slices_.RemoveAt(i);
+    if (Bus** parent = ParentLink(slice)) {
+        *parent = nullptr;
+    } else {
+        slice->DropReferrer(this);
+    }
+}
+
+void Bus::EmptyBusSlice() {
+    while (!slices_.IsEmpty()) {
+        RemoveBusSlice(slices_.GetTail());
+    }
+}
+
+void Bus::Forget(Signal* signal) noexcept {
+    Signal::Forget(signal);
+    slices_.Remove(signal);
+}
+
+void Bus::ReplaceReference(Signal* from, Signal* to) {
+    Signal::ReplaceReference(from, to);
+    if (slices_.Contains(from)) {
+        RemoveBusSlice(from);
+        AddBusSlice(to);
+    }
+}
+
+bool Bus::IsBusName(const char* name) noexcept {
+    Names::BusName parsed;
+    return Names::ParseBus(Port::ViewOf(name), parsed);
+}
+
+bool Bus::ParseBusName(const char* name, Port::StringBase<char>& base,
+                       Port::StringBase<char>& left, Port::StringBase<char>& right) {
+    // Copies first: the results may be put where the name stands.
+    const Port::StringBase<char> text = name;
+    Names::BusName parsed;
+    if (!Names::ParseBus(text, parsed)) {
+        return false;
+    }
+    base = parsed.base;
+    left = parsed.left;
+    right = parsed.right;
+    return true;
+}
+
+bool Bus::ParseBusName(const char* name, Port::StringBase<char>& base, int& left, int& right) {
+    const Port::StringBase<char> text = name;
+    Names::BusName parsed;
+    if (!Names::ParseBus(text, parsed)) {
+        return false;
+    }
+    base = parsed.base;
+    left = parsed.leftIndex;
+    right = parsed.rightIndex;
+    return true;
+}
+
+bool Bus::ParseBusName(const char* name, StringArray& bits) {
+    Names::BusName parsed;
+    if (!Names::ParseBus(Port::ViewOf(name), parsed) ||
+        parsed.GetBits() > Names::MostExpandedBits) {
+        return false;
+    }
+    for (std::int64_t i = 0; i < parsed.GetBits(); ++i) {
+        bits.Add(Names::WithIndex(parsed.base, parsed.IndexAt(i)));
+    }
+    return true;
+}
+
+Port::StringBase<char> Bus::GetBusSliceName(const char* name, int start, int count) {
+    Names::BusName parsed;
+    if (!Names::ParseBus(Port::ViewOf(name), parsed)) {
+        return Names::WithRange(Port::ViewOf(name), start, count);
+    }
+    const std::int64_t last = std::int64_t(start) + count - 1;
+    return Names::WithRange(parsed.base, parsed.IndexAt(start), parsed.IndexAt(last));
+}
+
+BusSlice::BusSlice(const char* name, Bus* parent) : Signal(name) {
+    if (parent != nullptr) {
+        parent->AddBusSlice(this);
+    }
+}
+
+BusSlice::~BusSlice() {
+    BusSlice::LeaveAll();
+}
+
+void BusSlice::LeaveAll() noexcept {
+    if (parent_ != nullptr && !EndTogether(*this, *parent_)) {
+        parent_->RemoveBusSlice(this);
+    }
+    parent_ = nullptr;
+    Signal::LeaveAll();
+}
+
+void BusSlice::SetPortPolarity(const Polarity& /*polarity*/) {}
+
+void BusSlice::AcceptSignal(SignalVisitor& visitor) {
+    visitor.VisitBusSlice(this);
+    visitor.VisitSignal(this);
+}
+
+Polarity BusSlice::GetPortPolarity() const {
+    return parent_ == nullptr ? Polarity() : parent_->GetPortPolarity();
+}
+
+int BusSlice::GetWidth() const {
+    Names::BusName parsed;
+    return Names::ParseBus(GetNameView(), parsed) ? parsed.GetWidth() : 0;
+}
+
+Port::StringBase<char> BusSlice::GetDummySignalName() const {
+    return DummyOfPart(GetNameView());
+}
+
+void BusSlice::GetBaseName(StringSet& names) const {
+    names.Add(Names::BeforeParenthesis(GetNameView()));
+}
+
+BusSlice* BusSlice::CreateDummySignal(Bus* parent) const {
+    return new BusSlice(GetDummySignalName().CStr(), parent);
+}
+
+Port::StringBase<char> BusSlice::GetBaseName() const {
+    return Names::BeforeParenthesis(GetNameView());
+}
+
+bool BusSlice::GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const {
+    return GetIndexTexts(GetNameView(), left, right);
+}
+
+bool BusSlice::IsDownTo() const noexcept {
+    Names::BusName parsed;
+    return Names::ParseBus(GetNameView(), parsed) && parsed.IsDownTo();
+}
+
+bool BusSlice::IsSameDirectionAsParent() const noexcept {
+    if (parent_ == nullptr) {
+        return true;
+    }
+    Names::BusName parsed;
+    const bool isOneBit = Names::ParseBus(GetNameView(), parsed) && parsed.IsOneBit();
+    return !isOneBit && IsDownTo() == parent_->IsDownTo();
+}
+
+BusIndex::BusIndex(const char* name, Bus* parent) : Signal(name) {
+    if (parent != nullptr) {
+        parent->AddBusSlice(this);
+    }
+}
+
+BusIndex::~BusIndex() {
+    BusIndex::LeaveAll();
+}
+
+void BusIndex::LeaveAll() noexcept {
+    if (parent_ != nullptr && !EndTogether(*this, *parent_)) {
+        parent_->RemoveBusSlice(this);
+    }
+    parent_ = nullptr;
+    Signal::LeaveAll();
+}
+
+void BusIndex::AcceptSignal(SignalVisitor& visitor) {
+    visitor.VisitBusIndex(this);
+    visitor.VisitSignal(this);
+}
+
+Polarity BusIndex::GetPortPolarity() const {
+    return parent_ == nullptr ? polarity_ : parent_->GetPortPolarity();
+}
+
+Port::StringBase<char> BusIndex::GetDummySignalName() const {
+    return DummyOfPart(GetNameView());
+}
+
+void BusIndex::GetBaseName(StringSet& names) const {
+    names.Add(Names::BeforeParenthesis(GetNameView()));
+}
+
+BusIndex* BusIndex::CreateDummySignal(Bus* parent) const {
+    return new BusIndex(GetDummySignalName().CStr(), parent);
+}
+
+Port::StringBase<char> BusIndex::GetBaseName() const {
+    return Names::BeforeParenthesis(GetNameView());
+}
+
+Port::StringBase<char> BusIndex::GetIndex() const {
+    Names::BitName parsed;
+    return Names::ParseBit(GetNameView(), parsed) ? parsed.index : std::string_view();
+}
+
+bool BusIndex::IsBusIndexName(const char* name) noexcept {
+    Names::BitName parsed;
+    return Names::ParseBit(Port::ViewOf(name), parsed);
+}
+
+bool BusIndex::ParseBusIndexName(const char* name, Port::StringBase<char>& base,
+                                 Port::StringBase<char>& index) {
+    const Port::StringBase<char> text = name;
+    Names::BitName parsed;
+    if (!Names::ParseBit(text, parsed)) {
+        return false;
+    }
+    base = parsed.base;
+    index = parsed.index;
+    return true;
+}
+
+bool BusIndex::ParseBusIndexName(const char* name, Port::StringBase<char>& base, int& index) {
+    const Port::StringBase<char> text = name;
+    Names::BitName parsed;
+    if (!Names::ParseBit(text, parsed)) {
+        return false;
+    }
+    base = parsed.base;
+    index = parsed.value;
+    return true;
+}
+
+CompoundBus::CompoundBus(const char* name, const PtrArray<Signal*>& members) : Signal(name) {
+    for (int i = 0; i < members.GetSize(); ++i) {
+        AddBusMember(members.GetAt(i));
+    }
+}
+
+CompoundBus::~CompoundBus() {
+    CompoundBus::LeaveAll();
+}
+
+void CompoundBus::LeaveAll() noexcept {
+    for (Signal* member : GetBusMemberIterator()) {
+        if (!EndTogether(*this, *member)) {
+            member->DropReferrer(this);
+        }
+    }
+    members_.Empty();
+    Signal::LeaveAll();
+}
+
+void CompoundBus::SetPortPolarity(const Polarity& polarity) {
+    for (Signal* member : GetBusMemberIterator()) {
+        member->SetPortPolarity(polarity);
+    }
+}
+
+void CompoundBus::AcceptSignal(SignalVisitor& visitor) {
+    visitor.VisitCompoundBus(this);
+    visitor.VisitSignal(this);
+}
+
+Polarity CompoundBus::GetPortPolarity() const {
+    if (members_.IsEmpty()) {
+        return Polarity();
+    }
+    const Polarity first = members_.GetAt(0)->GetPortPolarity();
+    for (const Signal* member : GetBusMemberIterator()) {
+        if (member->GetPortPolarity() != first) {
+            return Polarity();
+        }
+    }
+    return first;
+}
+
+int CompoundBus::GetWidth() const {
+    std::int64_t width = 0;
+    for (const Signal* member : GetBusMemberIterator()) {
+        width += member->GetWidth();
+    }
+    return static_cast<int>(std::min<std::int64_t>(width, INT32_MAX));
+}
+
+Port::StringBase<char> CompoundBus::GetDummySignalName() const {
+    Port::StringBase<char> name;
+    for (const Signal* member : GetBusMemberIterator()) {
+        if (!name.IsEmpty()) {
+            name += ',';
+        }
+        name += member->GetDummySignalName();
+    }
+    return name;
+}
+
+void CompoundBus::GetBaseName(StringSet& names) const {
+    for (const Signal* member : GetBusMemberIterator()) {
+        member->GetBaseName(names);
+    }
+    names.Add(GetNameView());
+}
+
+CompoundBus* CompoundBus::CreateDummySignal() const {
+    return new CompoundBus(GetDummySignalName().CStr());
+}
+
+/// Whether this compound is `from` or is reached through the members of `from`. Without recursion:
+/// compounds can be nested to any depth.
+bool CompoundBus::Reaches(const Signal* from) const {
+    if (from->GetSignalType() != SignalTypeCompoundBus) {
+        return false;
+    }
+    std::vector<const CompoundBus*> rest{static_cast<const CompoundBus*>(from)};
+    for (std::size_t i = 0; i < rest.size(); ++i) {
+        if (rest[i] == this) {
+            return true;
+        }
+        for (const Signal* member : rest[i]->GetBusMemberIterator()) {
+            if (member->GetSignalType() == SignalTypeCompoundBus &&
+                std::find(rest.begin(), rest.end(), member) == rest.end()) {
+                rest.push_back(static_cast<const CompoundBus*>(member));
+            }
+        }
+    }
+    return false;
+}
+
+void CompoundBus::AddBusMember(Signal* member) {
+    if (member == nullptr || Reaches(member)) {
+        return;
+    }
+    AddReference(members_, member);
+}
+
+void CompoundBus::SetAt(int index, Signal* member) {
+    if (member == nullptr || index < 0 || index >= members_.GetSize() || Reaches(member)) {
+        return;
+    }
+    member->NoteReferrer(this);
+    members_.GetAt(index)->DropReferrer(this);
+    members_.SetAt(index, member);
+}
+
+void CompoundBus::Forget(Signal* signal) noexcept {
+    Signal::Forget(signal);
+    members_.Remove(signal);
+}
+
+void CompoundBus::ReplaceReference(Signal* from, Signal* to) {
+    Signal::ReplaceReference(from, to);
+    const int index = members_.GetIndex(from);
+    if (index >= 0) {
+        SetAt(index, to);
+    }
+}
+
+bool CompoundBus::IsCompoundBusName(const char* name) noexcept {
+    return Names::IsCompound(Port::ViewOf(name));
+}
+
+bool CompoundBus::ParseCompoundBusName(const char* name, StringArray& names, bool expand) {
+    const std::string_view text = Port::ViewOf(name);
+    std::string_view piece;
+    Names::BusName bus;
+    for (Names::CompoundPieces pieces(text); expand && pieces.Next(piece);) {
+        if (Names::ParseBus(piece, bus) && bus.GetBits() > Names::MostExpandedBits) {
+            return false;
+        }
+    }
+    for (Names::CompoundPieces pieces(text); pieces.Next(piece);) {
+        if (!expand || !Bus::ParseBusName(std::string(piece).c_str(), names)) {
+            names.Add(std::string(piece));
+        }
+    }
+    return true;
+}
+
+SignalVisitor::~SignalVisitor() = default;
+void SignalVisitor::VisitSignal(Signal* /*signal*/) {}
+void SignalVisitor::VisitScalarSignal(ScalarSignal* /*signal*/) {}
+void SignalVisitor::VisitBus(Bus* /*bus*/) {}
+void SignalVisitor::VisitBusSlice(BusSlice* /*slice*/) {}
+void SignalVisitor::VisitBusIndex(BusIndex* /*bit*/) {}
+void SignalVisitor::VisitCompoundBus(CompoundBus* /*compound*/) {}
+
+} // namespace Orn_Hdl

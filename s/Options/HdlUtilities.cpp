@@ -1,0 +1,87 @@
+#include "Orn_Hdl/Model/Component.h"
+#include "Orn_Hdl/Options.h"
+#include "Orn_Hdl/Streams.h"
+#include "Orn_Hdl/Writers/NetlistHeader.h"
+#include "Port/Ascii.h"
+#include "Port/Timestamp.h"
+#include "Port/Version.h"
+
+#include <string>
+
+namespace Orn_Hdl {
+
+using Text = Port::StringBase<char>;
+
+const Text HdlUtilities::CurrentTimeString() {
+    const UT_TIMESTAMP now;
+    return now.getTimeStampMonthNumber() + "/" + now.getTimeStampMonthDay() + "/" +
+           now.getTimeStampYear() + " " + now.getTimeStampHour() + ":" + now.getTimeStampMinute() +
+           ":" + now.getTimeStampSecond();
+}
+
+const Text HdlUtilities::GetVersion() {
+    return Port::Version::getValue("version");
+}
+
+const Text HdlUtilities::ConvertVhdlBase(int base) {
+    return base == 2 ? "b" : base == 8 ? "o" : "x";
+}
+
+const Text HdlUtilities::ConvertVerilogBase(int base) {
+    return base == 2 ? "b" : base == 8 ? "o" : "h";
+}
+
+const Text HdlUtilities::AddDummySuffix(const char* name) {
+    const std::string_view text = Port::ViewOf(name);
+    const std::size_t open = text.find('(');
+    const std::size_t close = text.find(')');
+    if (open == std::string_view::npos || close == std::string_view::npos) {
+        return std::string(text).append("_DUMMY");
+    }
+    std::string result(text.substr(0, open));
+    result.append("_DUMMY");
+    if (close > open) {
+        result.append(text.substr(open, close - open + 1));
+    }
+    return result;
+}
+
+const Text HdlUtilities::RemoveQuotes(const char* text) {
+    const std::string_view whole = Port::ViewOf(text);
+    Text result = text;
+    for (const char quote : {'"', '\''}) {
+        if (!whole.empty() && whole.front() == quote && whole.back() == quote) {
+            result.Trim(quote);
+        }
+    }
+    return result;
+}
+
+const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
+    StringArray names;
+    if (instance == nullptr) {
+        return names;
+    }
+    for (const Attribute* attribute : instance->GetAttrIterator()) {
+        names.Add(attribute->GetName());
+    }
+    if (const Component* component = instance->GetComponent()) {
+        for (const Attribute* attribute : component->GetAttrIterator()) {
+            if (!names.IContains(attribute->GetName())) {
+                names.Add(attribute->GetName());
+            }
+        }
+    }
+    return names;
+}
+
+void HdlUtilities::WriteHeader(const Text& designName, bool commentStyle, const HdlOptions& options,
+                               OutStream& out) {
+    const auto* const file = dynamic_cast<const TextFileOutStream*>(&out);
+    NetlistHeader(options.application, file == nullptr ? Text() : file->GetFileName(),
+                  options.command, designName, options.device, options.purpose, options.reference,
+                  commentStyle, out)
+        .Write();
+}
+
+} // namespace Orn_Hdl
