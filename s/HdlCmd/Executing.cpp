@@ -1,0 +1,66 @@
+#include "HdlCmd/Executing.h"
+
+#include "Orn_Hdl/Streams.h"
+#include "Orn_Hdl/Writers.h"
+
+namespace Orn_Hdl {
+
+void ExecuteAddPin(Model& model, const Arguments& arguments) {
+    model.AddPin(arguments.Get(0), Polarity(arguments.Get(1)), arguments.Get(2), arguments.Get(3));
+}
+
+void ExecuteAddPort(Model& model, const Arguments& arguments) {
+    if (model.AddSignal(arguments.Get(0))) {
+        if (Signal* signal = model.GetSignal(arguments.Get(0))) {
+            signal->SetPortPolarity(Polarity(arguments.Get(1)));
+        }
+    }
+}
+
+void ExecuteConnection(Model& model, const Arguments& arguments) {
+    if (arguments.HasFlag(OnAPin)) {
+        model.ConnectSignalToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
+    } else {
+        model.ConnectSignals(arguments.Get(0), arguments.Get(1));
+    }
+}
+
+void ExecuteConstant(Model& model, const Arguments& arguments) {
+    if (arguments.HasFlag(OnAPin)) {
+        model.AssignConstantToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
+    } else {
+        model.AssignConstantToSignal(arguments.Get(0), arguments.Get(1));
+    }
+}
+
+void ExecuteSetSynthesis(Model& model, const Arguments& arguments) {
+    model.GetOptions()->verilog.SetSynthesisType(arguments.Get(0));
+}
+
+namespace {
+
+/// Opens the file, lets `write` write into it, closes it, and tells the model how that went.
+template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
+    const char* const fileName = arguments.Get(0);
+    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile));
+    model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);
+    write(out, *model.GetNetlist(), *model.GetOptions());
+    out.Close();
+    model.RecordWrite(fileName, out.GetError());
+}
+
+} // namespace
+
+void ExecuteWriteVerilog(Model& model, const Arguments& arguments) {
+    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, const HdlOptions& options) {
+        VerilogNetlister(out).WriteNetlist(&netlist, options);
+    });
+}
+
+void ExecuteWriteVhdl(Model& model, const Arguments& arguments) {
+    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, const HdlOptions& options) {
+        VhdlNetlister(out).WriteNetlist(&netlist, &options);
+    });
+}
+
+} // namespace Orn_Hdl
