@@ -1,0 +1,370 @@
+#include "Orn_Hdl/Writers/Verilog.h"
+
+#include "HdlModel/Names.h"
+#include "Verilog/WriteSignalVisitor.h"
+#include "Writers/Generics.h"
+#include "Writers/SignalLists.h"
+#include "Writers/Text.h"
+
+#include <string>
+
+namespace Orn_Hdl {
+
+using std::string_view;
+using Writers::Put;
+using Writers::PutLine;
+
+namespace {
+
+/// What stands before the first port's name, "module" and "(" with their blanks.
+constexpr std::size_t ModuleHeadLength = 8;
+/// What stands before an instance's first pin besides both names.
+constexpr std::size_t InstanceHeadLength = 3;
+
+bool IsWritable(string_view name) {
+    return !name.empty();
+}
+
+/// Scalar signals and buses are named by the statements themselves.
+bool IsNamedPlainly(const Signal& signal) {
+    return signal.GetSignalType() == SignalTypeScalar || signal.GetSignalType() == SignalTypeBus;
+}
+
+} // namespace
+
+/// Writes one netlist: first the netlist is prepared, then it is only read.
+class VerilogNetlister::Writer {
+public:
+    Writer(OutStream& out, VerilogStatements& statements, Netlist& netlist,
+           const HdlOptions& options)
+        : out_(out), statements_(statements), netlist_(netlist), options_(options),
+          connection_(out, WriteSignalVisitor::Connection),
+          reference_(out, WriteSignalVisitor::Assignment) {}
+
+    void Write();
+
+private:
+    void Prepare();
+    void SetNameCase();
+    static void SetNameCase(Object& object, HdlOptions::VerilogOption::CaseType nameCase);
+
+    void WriteHead();
+    void WriteModulelAndPorts(const std::vector<Signal*>& ports);
+    void WriteParameters();
+    void WritePortDeclarations(const std::vector<Signal*>& ports);
+    void WriteSignalDeclarations(const std::vector<Signal*>& signals);
+    void WriteSignalAssignments(const Writers::SignalLists& signals);
+    void WriteConstantAssignment(Signal& signal);
+    void WriteAlias(Signal& signal, Signal& alias);
+    void WriteReference(Signal& signal);
+    void WriteInstances();
+    void WriteInstance(const Instance& instance);
+    void WriteConnections(const Instance& instance, std::size_t column);
+    void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
+
+    void WriteNextItem(std::size_t column);
+    void WriteSemicolon() { PutLine(out_, ";"); }
+    void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
+    void WriteSynthesisAttr(const Iterator<Attribute*>& attributes, const char* objectName);
+    template <class WriteStatement>
+    void WriteGenericAttrs(const Writers::GenericAttrs& attributes, const Attribute* leftOut,
+                           const WriteStatement& writeStatement);
+
+    OutStream& out_;
+    VerilogStatements& statements_;
+    Netlist& netlist_;
+    const HdlOptions& options_;
+    WriteSignalVisitor connection_;
+    WriteSignalVisitor reference_;
+    PtrArray<Attribute*> effectiveAttrs_;
+    Writers::GenericAttrs genericAttrs_;
+};
+
+VerilogNetlister::VerilogNetlister(OutStream& out)
+    : out_(out), statements_(std::make_unique<VerilogStatements>(out)) {}
+
+VerilogNetlister::~VerilogNetlister() = default;
+
+void VerilogNetlister::WriteNetlist(Netlist* netlist, const HdlOptions& options) {
+    if (netlist != nullptr) {
+        Writer(out_, *statements_, *netlist, options).Write();
+    }
+}
+
+void VerilogNetlister::Writer::Write() {
+    Prepare();
+    const Writers::SignalLists signals(netlist_, IsWritable);
+    WriteHead();
+    WriteModulelAndPorts(signals.ports);
+    out_.Indent();
+    WriteParameters();
+    WritePortDeclarations(signals.ports);
+    WriteSignalDeclarations(signals.internals);
+    WriteSignalAssignments(signals);
+    WriteInstances();
+    out_.Unindent();
+    PutLine(out_, "endmodule");
+}
+
+void VerilogNetlister::Writer::Prepare() {
+    netlist_.SortNetlist();
+    netlist_.CreateVhdlDummySignals();
+    SetNameCase();
+    const string_view name = netlist_.GetNameView();
+    options_.hierarchicalInit =
+        (name.find("MHALVEX") != string_view::npos || name.find("HHALVEX") != string_view::npos) &&
+        Writers::InitDefined(netlist_);
+}
+
+void VerilogNetlister::Writer::SetNameCase() {
+    for (Signal* signal : netlist_.GetSignalIterator()) {
+        SetNameCase(*signal, options_.verilog.signalCase);
+    }
+    for (Component* component : netlist_.GetComponentIterator()) {
+        SetNameCase(*component, options_.verilog.componentCase);
+    }
+    for (Instance* instance : netlist_.GetInstanceIterator()) {
+        SetNameCase(*instance, options_.verilog.instanceCase);
+    }
+}
+
+void VerilogNetlister::Writer::SetNameCase(Object& object,
+                                           HdlOptions::VerilogOption::CaseType nameCase) {
+    if (nameCase == HdlOptions::VerilogOption::DEFSULT) {
+        return;
+    }
+    Port::String name = object.GetName();
+    if (nameCase == HdlOptions::VerilogOption::UPPERCASE) {
+        name.MakeUpper();
+    } else {
+        name.MakeLower();
+    }
+    object.SetName(name.CStr());
+}
+
+void VerilogNetlister::Writer::WriteHead() {
+    if (options_.writeHeader) {
+        HdlUtilities::WriteHeader(netlist_.GetName(), false, options_, out_);
+    }
+    statements_.WriteComment(&netlist_);
+    statements_.WriteIncludePath(options_.verilog.includePaths);
+    statements_.WriteTimeScale("1ns", "1ps");
+    out_.WriteEmptyLine();
+}
+
+void VerilogNetlister::Writer::WriteModulelAndPorts(const std::vector<Signal*>& ports) {
+    const string_view name = netlist_.GetNameView();
+    Put(out_, "module", " ", name, "(");
+    bool isFirst = true;
+    for (const Signal* port : ports) {
+        if (!isFirst) {
+            WriteNextItem(name.size() + ModuleHeadLength);
+        }
+        isFirst = false;
+        const string_view portName = port->GetNameView();
+        Put(out_, (port->GetSignalType() == SignalTypeBus ? Names::BaseName(portName) : portName));
+    }
+    PutLine(out_, ");");
+    out_.WriteEmptyLine();
+}
+
+void VerilogNetlister::Writer::WriteParameters() {
+    const Writers::GenericAttrs attributes(netlist_.GetAttrIterator());
+    if (!attributes.IsEmpty()) {
+        WriteGenericAttrs(attributes, nullptr, [this](Attribute* attribute) {
+            statements_.WriteParameterStatement(attribute);
+        });
+        out_.WriteEmptyLine();
+    }
+}
+
+void VerilogNetlister::Writer::WritePortDeclarations(const std::vector<Signal*>& ports) {
+    for (const Signal* port : ports) {
+        statements_.WriteComment(port);
+        statements_.WritePortDeclaration(port->GetNameView(), port->GetPortPolarity());
+        EndStatement(port->GetAttrIterator(), Names::BaseName(port->GetNameView()));
+    }
+    out_.WriteEmptyLine();
+}
+
+void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*>& signals) {
+    for (const Signal* signal : signals) {
+        statements_.WriteComment(signal);
+        statements_.WriteSignalDeclaration(signal->GetNameView());
+        EndStatement(signal->GetAttrIterator(), Names::BaseName(signal->GetNameView()));
+    }
+    out_.WriteEmptyLine();
+}
+
+void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists& signals) {
+    for (Signal* signal : signals.constants) {
+        WriteConstantAssignment(*signal);
+    }
+    for (Signal* signal : signals.aliased) {
+        for (Signal* alias : signal->GetSignalIterator()) {
+            if (IsWritable(alias->GetNameView())) {
+                WriteAlias(*signal, *alias);
+            }
+        }
+    }
+}
+
+void VerilogNetlister::Writer::WriteConstantAssignment(Signal& signal) {
+    const BitVectorValue& value = signal.GetConstantValue();
+    if (IsNamedPlainly(signal)) {
+        statements_.WriteConstantSignalAssignment(signal.GetNameView(),
+                                                  Writers::IsSingleBit(signal), value);
+    } else {
+        Put(out_, "assign", " ");
+        WriteReference(signal);
+        Put(out_, " = ");
+        statements_.WriteConstant(Writers::IsSingleBit(signal), value);
+    }
+    WriteSemicolon();
+}
+
+void VerilogNetlister::Writer::WriteAlias(Signal& signal, Signal& alias) {
+    Put(out_, "assign", " ");
+    WriteReference(signal);
+    Put(out_, " = ");
+    WriteReference(alias);
+    WriteSemicolon();
+}
+
+void VerilogNetlister::Writer::WriteReference(Signal& signal) {
+    if (IsNamedPlainly(signal)) {
+        statements_.WriteSignalName(signal.GetNameView());
+    } else {
+        signal.AcceptSignal(reference_);
+    }
+}
+
+void VerilogNetlister::Writer::WriteInstances() {
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        WriteInstance(*instance);
+        Writers::GetEffectiveAttrs(*instance, effectiveAttrs_);
+        EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance->GetNameView());
+        WriteDefParam(*instance, effectiveAttrs_);
+    }
+}
+
+void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {
+    const Component* const component = instance.GetComponent();
+    string_view componentName;
+    if (component != nullptr) {
+        statements_.WriteComment(component);
+        componentName = component->GetNameView();
+    }
+    statements_.WriteComment(&instance);
+    const string_view name = instance.GetNameView();
+    Put(out_, componentName, " ", name, " ", "(");
+    WriteConnections(instance, componentName.size() + name.size() + InstanceHeadLength);
+    Put(out_, ")");
+}
+
+void VerilogNetlister::Writer::WriteConnections(const Instance& instance, std::size_t column) {
+    bool isFirst = true;
+    for (const Pin* pin : instance.GetPinIterator()) {
+        if (!isFirst) {
+            WriteNextItem(column);
+        }
+        isFirst = false;
+        Put(out_, ".", Writers::GetBaseName(*pin), "(");
+        if (Signal* const signal = pin->GetSignal()) {
+            signal->AcceptSignal(connection_);
+        }
+        Put(out_, ")");
+    }
+}
+
+void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
+                                             const PtrArray<Attribute*>& attributes) {
+    genericAttrs_.Split(Iterator<Attribute*>(&attributes));
+    if (genericAttrs_.IsEmpty()) {
+        return;
+    }
+    const Port::String name = instance.GetName();
+    Attribute* const init = options_.hierarchicalInit ? genericAttrs_.FindInit() : nullptr;
+    if (init != nullptr) {
+        statements_.WriteDefParamInitStatement(init, name.CStr());
+        WriteSemicolon();
+    }
+    WriteGenericAttrs(genericAttrs_, init, [this, &name](Attribute* attribute) {
+        statements_.WriteDefParamStatement(attribute, name.CStr());
+    });
+}
+
+/// Separates an item of a list from the one before it.
+void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
+    Put(out_, ", ");
+    if (options_.onePortPerLine) {
+        PutLine(out_);
+        Writers::WriteBlanks(out_, column);
+    }
+}
+
+/// Ends a statement whose object has synthesis attributes: one tool wants them before the
+/// semicolon.
+void VerilogNetlister::Writer::EndStatement(const Iterator<Attribute*>& attributes,
+                                            string_view objectName) {
+    if (attributes.IsAtEnd()) {
+        WriteSemicolon();
+        return;
+    }
+    const bool semicolonFirst = options_.verilog.IsSemiColonWrittenBeforeAttr();
+    if (semicolonFirst) {
+        WriteSemicolon();
+    }
+    WriteSynthesisAttr(attributes, Port::String(objectName).CStr());
+    if (!semicolonFirst) {
+        WriteSemicolon();
+    }
+}
+
+void VerilogNetlister::Writer::WriteSynthesisAttr(const Iterator<Attribute*>& attributes,
+                                                  const char* objectName) {
+    switch (options_.verilog.synthesisType) {
+    case HdlOptions::VerilogOption::EXEMPLAR:
+        statements_.WriteExemplarAttr(attributes, objectName);
+        break;
+    case HdlOptions::VerilogOption::SYNPLICITY:
+        statements_.WriteSynplicityAttr(attributes);
+        break;
+    case HdlOptions::VerilogOption::SYNOPSYS:
+        statements_.WriteSynopsysAttr(attributes);
+        break;
+    case HdlOptions::VerilogOption::VERILOG2001:
+        break;
+    case HdlOptions::VerilogOption::PRECISION:
+        statements_.WritePrecisionAttr(attributes, objectName);
+        break;
+    default:
+        statements_.WriteQSNAttr(attributes, objectName);
+        break;
+    }
+}
+
+/// Writes a statement for each "SYN" attribute but one, then for each "NOSYN" attribute, hidden
+/// from synthesis.
+template <class WriteStatement>
+void VerilogNetlister::Writer::WriteGenericAttrs(const Writers::GenericAttrs& attributes,
+                                                 const Attribute* leftOut,
+                                                 const WriteStatement& writeStatement) {
+    for (Attribute* attribute : Iterator<Attribute*>(&attributes.syn)) {
+        if (attribute != leftOut) {
+            writeStatement(attribute);
+            WriteSemicolon();
+        }
+    }
+    if (attributes.nosyn.IsEmpty()) {
+        return;
+    }
+    PutLine(out_, "// synopsys translate_off");
+    for (Attribute* attribute : Iterator<Attribute*>(&attributes.nosyn)) {
+        writeStatement(attribute);
+        WriteSemicolon();
+    }
+    PutLine(out_, "// synopsys translate_on");
+}
+
+} // namespace Orn_Hdl

@@ -1,0 +1,91 @@
+#include "Verilog/WriteSignalVisitor.h"
+
+#include "Writers/SignalLists.h"
+#include "Writers/Text.h"
+
+#include <algorithm>
+#include <cstdint>
+
+namespace Orn_Hdl {
+
+using std::string_view;
+using Writers::Put;
+
+bool WriteSignalVisitor::IsWritten(const Signal& signal) const noexcept {
+    return place_ == Assignment || !Writers::IsOpen(signal.GetNameView());
+}
+
+void WriteSignalVisitor::WriteInBrackets(string_view name) {
+    text_ = name;
+    std::replace(text_.begin(), text_.end(), '(', '[');
+    std::replace(text_.begin(), text_.end(), ')', ']');
+    Put(out_, string_view(text_));
+}
+
+void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
+    Put(out_, "{");
+    for (std::int64_t i = 0; i < slice.GetBits(); ++i) {
+        if (i > 0) {
+            Put(out_, ", ");
+        }
+        WriteInBrackets(Names::WithIndex(slice.base, slice.IndexAt(i)));
+    }
+    Put(out_, "}");
+}
+
+void WriteSignalVisitor::VisitScalarSignal(ScalarSignal* signal) {
+    if (IsWritten(*signal)) {
+        Put(out_, signal->GetNameView());
+    }
+}
+
+void WriteSignalVisitor::VisitBus(Bus* bus) {
+    if (!IsWritten(*bus)) {
+        return;
+    }
+    const string_view name = bus->GetNameView();
+    Names::BusName parsed;
+    if (Names::ParseBus(name, parsed) && parsed.IsOneBit()) {
+        WriteInBrackets(Names::WithIndex(parsed.base, parsed.leftIndex));
+    } else {
+        WriteInBrackets(name);
+    }
+}
+
+void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
+    if (!IsWritten(*slice)) {
+        return;
+    }
+    const string_view name = slice->GetNameView();
+    Names::BusName parsed;
+    if (Writers::RunsAgainstParent(*slice) && Names::ParseBus(name, parsed) &&
+        parsed.GetBits() <= Names::MostExpandedBits) {
+        WriteBits(parsed);
+    } else {
+        WriteInBrackets(name);
+    }
+}
+
+void WriteSignalVisitor::VisitBusIndex(BusIndex* bit) {
+    if (IsWritten(*bit)) {
+        WriteInBrackets(bit->GetNameView());
+    }
+}
+
+void WriteSignalVisitor::VisitCompoundBus(CompoundBus* compound) {
+    if (!IsWritten(*compound)) {
+        return;
+    }
+    Put(out_, "{");
+    bool isFirst = true;
+    for (Signal* member : compound->GetBusMemberIterator()) {
+        if (!isFirst) {
+            Put(out_, ", ");
+        }
+        isFirst = false;
+        member->AcceptSignal(*this);
+    }
+    Put(out_, "}");
+}
+
+} // namespace Orn_Hdl

@@ -1,0 +1,42 @@
+// Writes a signal as a Verilog expression.
+#pragma once
+
+#include "HdlModel/Names.h"
+#include "Orn_Hdl/Model/Signals.h"
+#include "Orn_Hdl/Streams.h"
+
+#include <string>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+/// Writes what connects a pin: a name, with its range or index in brackets, or a list in braces. A
+/// slice that runs against its bus is no expression of Verilog, so it becomes a list of its bits.
+class WriteSignalVisitor : public SignalVisitor {
+public:
+    enum Place {
+        /// In a pin connection, where an empty name or "open" stands for nothing.
+        Connection,
+        /// In an assignment, where every name stands for itself.
+        Assignment
+    };
+
+    WriteSignalVisitor(OutStream& out, Place place) noexcept : out_(out), place_(place) {}
+
+    void VisitScalarSignal(ScalarSignal* signal) override;
+    void VisitBus(Bus* bus) override;
+    void VisitBusSlice(BusSlice* slice) override;
+    void VisitBusIndex(BusIndex* bit) override;
+    void VisitCompoundBus(CompoundBus* compound) override;
+
+private:
+    bool IsWritten(const Signal& signal) const noexcept;
+    void WriteInBrackets(std::string_view name);
+    void WriteBits(const Names::BusName& slice);
+
+    OutStream& out_;
+    Place place_;
+    std::string text_;
+};
+
+} // namespace Orn_Hdl

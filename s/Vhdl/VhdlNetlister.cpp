@@ -1,0 +1,528 @@
+#include "Orn_Hdl/Writers/Vhdl.h"
+
+#include "HdlModel/Names.h"
+#include "Vhdl/WritePortAssignmentVisitor.h"
+#include "Writers/Generics.h"
+#include "Writers/SignalLists.h"
+#include "Writers/Text.h"
+
+#include <algorithm>
+#include <unordered_map>
+#include <vector>
+
+namespace Orn_Hdl {
+
+using std::string_view;
+using Writers::Put;
+using Writers::PutLine;
+using namespace std::literals::string_view_literals;
+
+namespace {
+
+constexpr const char* TranslateOff = "-- synopsys translate_off";
+constexpr const char* TranslateOn = "-- synopsys translate_on";
+constexpr string_view PortIndentation = "       ";      // 7 blanks
+constexpr string_view GenericIndentation = "         "; // 9 blanks
+constexpr string_view AssociationPerLine = ",\n          ";
+
+/// The fixed words of a generic clause or a generic map.
+struct GenericForm {
+    string_view keyword;
+    string_view separator;
+    string_view closing;
+};
+constexpr GenericForm GenericClause = {"generic", ";", ";"};
+constexpr GenericForm GenericMap = {"generic map", ",", ""};
+
+bool IsWritable(string_view name) {
+    return !Writers::IsOpen(name);
+}
+
+/// Whether only the signal's bits, not the signal, can stand in an assignment.
+bool IsCompoundOrAgainst(const Signal& signal) {
+    return signal.GetSignalType() == SignalTypeCompoundBus || Writers::RunsAgainstParent(signal);
+}
+
+/// Whether an alias of the signal must be written bit by bit: a bus of one bit, a vector, may be
+/// aliased with a bit.
+bool IsAliasedByBits(const Signal& signal) {
+    return (!Writers::IsSingleBit(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
+}
+
+/// Appends the names of the signal's bits, leftmost first.
+/// \return false when they cannot be listed.
+bool AddBitNames(const Signal& signal, StringArray& bits) {
+    if (Writers::IsSingleBit(signal)) {
+        bits.Add(signal.GetName());
+        return true;
+    }
+    if (signal.GetSignalType() != SignalTypeCompoundBus) {
+        return Bus::ParseBusName(signal.GetName().CStr(), bits);
+    }
+    for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
+        if (!AddBitNames(*member, bits)) {
+            return false;
+        }
+    }
+    return true;
+}
+
+bool IsBinary(string_view digits) {
+    return digits.find_first_not_of("01") == string_view::npos;
+}
+
+/// Cells of the primitive library need no configuration.
+bool NeedsConfiguration(const Component& component) {
+    const Attribute* const level = component.GetAttr("Level");
+    return level == nullptr || !Names::IsNamed(level->GetValueString().GetView(), "HALVEX");
+}
+
+} // namespace
+
+/// Writes one netlist: first the netlist is prepared, then it is only read.
+class VhdlNetlister::Writer {
+public:
+    Writer(OutStream& out, VhdlStatements& statements, StringSet& declared, Netlist& netlist,
+           const HdlOptions& options)
+        : out_(out), statements_(statements), declared_(declared), netlist_(netlist),
+          options_(options) {}
+
+    void Write();
+
+private:
+    void Prepare();
+    void WriteHead();
+    void WriteEntity(const std::vector<Signal*>& ports);
+    void WriteArchitecture(const Writers::SignalLists& signals);
+    void WriteAttrDeclarations(const std::vector<Signal*>& signals);
+    void WriteSignalDeclaration(const Signal& signal, int width);
+    void WriteComponents();
+    void WriteComponent(const Component& component);
+    void WriteGenericMap(const AttributeHolder& holder);
+    void WriteSynthesisAttrAssignment(const std::vector<Signal*>& signals);
+    void WriteInstanceAttrAssignment(const Instance& instance);
+    void WriteConstant(const Signal& signal);
+    void WriteConstantBits(const Signal& signal);
+    void WriteAlias(const Signal& signal, const Signal& alias);
+    void WriteAliasBits(const StringArray& bits, const StringArray& aliasBits);
+    void WriteInstances();
+    void WriteInstance(const Instance& instance, WritePortAssignmentVisitor& portMap);
+    void WriteInstanceGenericMap(const Instance& instance);
+    void WriteConfiguration();
+    void WriteConfigurationItem(const Component& component,
+                                const std::vector<const Instance*>& instances);
+
+    template <class List, class WritePort>
+    void WritePortClause(const List& ports, const WritePort& writePort);
+    template <class WriteItem>
+    void WriteGenerics(const Writers::GenericAttrs& attributes, Attribute* init,
+                       const GenericForm& form, const WriteItem& writeItem);
+    void WriteAttrDeclaration(const AttributeHolder* holder);
+    void WriteAttrAssignment(const Signal& signal);
+
+    OutStream& out_;
+    VhdlStatements& statements_;
+    /// The names of the attributes that this file has declared.
+    StringSet& declared_;
+    Netlist& netlist_;
+    const HdlOptions& options_;
+    /// Whether instances are given the entity's own generic INIT.
+    bool passesInit_ = false;
+    /// The width of the column of names in the declarations of attributes.
+    int attrWidth_ = 0;
+    PtrArray<Attribute*> effectiveAttrs_;
+    Writers::GenericAttrs genericAttrs_;
+};
+
+VhdlNetlister::VhdlNetlister(OutStream& out)
+    : out_(out), statements_(std::make_unique<VhdlStatements>(out)) {}
+
+VhdlNetlister::VhdlNetlister(const VhdlNetlister& other)
+    : out_(other.out_), statements_(std::make_unique<VhdlStatements>(other.out_)),
+      declared_(other.declared_) {}
+
+VhdlNetlister::~VhdlNetlister() = default;
+
+void VhdlNetlister::WriteNetlist(Netlist* netlist, const HdlOptions* options) {
+    if (netlist != nullptr && options != nullptr) {
+        declared_ = StringSet();
+        Writer(out_, *statements_, declared_, *netlist, *options).Write();
+    }
+}
+
+void VhdlNetlister::Writer::Write() {
+    Prepare();
+    const Writers::SignalLists signals(netlist_, IsWritable);
+    WriteHead();
+    WriteEntity(signals.ports);
+    WriteArchitecture(signals);
+    out_.WriteEmptyLine();
+    if (!options_.vhdl.suppressConfiguration) {
+        WriteConfiguration();
+        out_.WriteEmptyLine();
+    }
+}
+
+void VhdlNetlister::Writer::Prepare() {
+    netlist_.SortNetlist();
+    netlist_.CreateVhdlDummySignals();
+    netlist_.SetBoxTypeAttribute();
+    if (!options_.vhdl.openPin) {
+        netlist_.ConnectOpenPinToDummy();
+    }
+    passesInit_ = netlist_.GetNameView().find("MHALVEX") != string_view::npos &&
+                  Writers::InitDefined(netlist_);
+    attrWidth_ = Netlist::GetLongestAttrName(&netlist_);
+}
+
+void VhdlNetlister::Writer::WriteHead() {
+    if (options_.writeHeader) {
+        HdlUtilities::WriteHeader(netlist_.GetName(), true, options_, out_);
+    }
+    statements_.WriteComment(&netlist_);
+    out_.WriteEmptyLine();
+    statements_.WriteUserLibrary(options_.vhdl.libraries);
+    statements_.WriteUseUserLibrary(options_.vhdl.useClauses);
+    if (options_.vhdl.useDefaultLibrary) {
+        statements_.WriteIEEELibrary();
+        statements_.WriteKestraLibrary(false);
+        out_.WriteEmptyLine();
+    }
+}
+
+void VhdlNetlister::Writer::WriteEntity(const std::vector<Signal*>& ports) {
+    const string_view name = netlist_.GetNameView();
+    PutLine(out_, "entity", " ", name, " ", "is");
+    out_.Indent();
+    WriteGenericMap(netlist_);
+    const int width = Netlist::GetLongestPortName(netlist_.GetSignalIterator());
+    WritePortClause(ports, [this, width](const Signal& port) {
+        statements_.WritePortStatement(port.GetNameView(), port.GetPortPolarity(), width);
+    });
+    for (const Signal* port : ports) {
+        WriteAttrDeclaration(port);
+        WriteAttrAssignment(*port);
+    }
+    out_.Unindent();
+    PutLine(out_, "end", " ", name, ";");
+}
+
+template <class List, class WritePort>
+void VhdlNetlister::Writer::WritePortClause(const List& ports, const WritePort& writePort) {
+    Put(out_, "port", " ( ");
+    bool isFirst = true;
+    for (const auto* port : ports) {
+        if (!isFirst) {
+            PutLine(out_, "; ");
+            Put(out_, PortIndentation);
+        }
+        isFirst = false;
+        writePort(*port);
+    }
+    PutLine(out_, ");");
+}
+
+void VhdlNetlister::Writer::WriteAttrDeclaration(const AttributeHolder* holder) {
+    statements_.WriteAttrDeclaration(holder, declared_, options_.vhdl.useAttrType, attrWidth_);
+}
+
+void VhdlNetlister::Writer::WriteAttrAssignment(const Signal& signal) {
+    if (signal.HasAttrs()) {
+        const Port::String baseName(Names::BaseName(signal.GetNameView()));
+        statements_.WriteAttrAssignment(&signal, baseName.CStr(), "signal",
+                                        options_.vhdl.useAttrType);
+    }
+}
+
+void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signals) {
+    PutLine(out_, "architecture", " BEHAVIORAL ", "of", " ", netlist_.GetNameView(), " ", "is");
+    out_.Indent();
+    WriteAttrDeclarations(signals.internals);
+    const int width = Netlist::GetLongestSignalName(netlist_.GetSignalIterator());
+    for (const Signal* signal : signals.internals) {
+        WriteSignalDeclaration(*signal, width);
+    }
+    if (!options_.vhdl.suppressComponent) {
+        WriteComponents();
+    }
+    WriteSynthesisAttrAssignment(signals.internals);
+    out_.Unindent();
+    PutLine(out_, "begin");
+    out_.Indent();
+    for (const Signal* signal : signals.constants) {
+        WriteConstant(*signal);
+    }
+    for (const Signal* signal : signals.aliased) {
+        for (const Signal* alias : signal->GetSignalIterator()) {
+            if (IsWritable(alias->GetNameView())) {
+                WriteAlias(*signal, *alias);
+            }
+        }
+    }
+    WriteInstances();
+    out_.Unindent();
+    PutLine(out_, "end", " BEHAVIORAL;");
+}
+
+void VhdlNetlister::Writer::WriteAttrDeclarations(const std::vector<Signal*>& signals) {
+    for (const Signal* signal : signals) {
+        WriteAttrDeclaration(signal);
+    }
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        WriteAttrDeclaration(instance->GetComponent());
+        WriteAttrDeclaration(instance);
+    }
+}
+
+void VhdlNetlister::Writer::WriteSignalDeclaration(const Signal& signal, int width) {
+    statements_.WriteComment(&signal);
+    if (signal.GetSignalType() == SignalTypeBus) {
+        statements_.WriteSignalVectorStatement(signal.GetNameView(), width);
+    } else {
+        statements_.WriteSignalStatement(signal.GetNameView(), width);
+    }
+}
+
+void VhdlNetlister::Writer::WriteComponents() {
+    StringSet written;
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        const Component* const component = instance->GetComponent();
+        if (component != nullptr && !written.IContains(component->GetNameView())) {
+            written.Add(component->GetNameView());
+            WriteComponent(*component);
+        }
+    }
+}
+
+void VhdlNetlister::Writer::WriteComponent(const Component& component) {
+    statements_.WriteComment(&component);
+    PutLine(out_, "component", " ", component.GetNameView());
+    out_.Indent();
+    WriteGenericMap(component);
+    const Iterator<Pin*> pins = component.GetPinIterator();
+    if (!pins.IsAtEnd()) {
+        const int width = Netlist::GetLongestPinName(pins);
+        WritePortClause(pins, [this, width](const Pin& pin) {
+            statements_.WritePortStatement(pin.GetNameView(), pin.GetPolarity(), width);
+        });
+    }
+    out_.Unindent();
+    PutLine(out_, "end", " ", "component", ";");
+    statements_.WriteAttrAssignment(&component, component.GetName().CStr(), "component",
+                                    options_.vhdl.useAttrType);
+    out_.WriteEmptyLine();
+}
+
+void VhdlNetlister::Writer::WriteGenericMap(const AttributeHolder& holder) {
+    genericAttrs_.Split(holder.GetAttrIterator());
+    WriteGenerics(genericAttrs_, nullptr, GenericClause,
+                  [this](Attribute* attribute) { statements_.WriteGenericMapAttrType(attribute); });
+}
+
+/// Writes a generic clause or map. The items that are kept from synthesis come last; a clause of
+/// such items alone is kept from it as a whole. The attribute `init`, which may be null, gets its
+/// value from the entity's generic of its name.
+template <class WriteItem>
+void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attributes, Attribute* init,
+                                          const GenericForm& form, const WriteItem& writeItem) {
+    if (attributes.IsEmpty() && init == nullptr) {
+        return;
+    }
+    const bool hasHidden = !attributes.nosyn.IsEmpty();
+    const bool isHidden = attributes.syn.IsEmpty() && init == nullptr;
+    bool isFirst = true;
+    const auto beginItem = [this, &form, &isFirst] {
+        if (!isFirst) {
+            PutLine(out_, form.separator);
+            Put(out_, GenericIndentation);
+        }
+        isFirst = false;
+    };
+    if (isHidden) {
+        PutLine(out_, TranslateOff);
+    }
+    Put(out_, form.keyword, "( ");
+    if (init != nullptr) {
+        beginItem();
+        statements_.WriteGenericMapInitAttr(init);
+    }
+    for (Attribute* attribute : Iterator<Attribute*>(&attributes.syn)) {
+        beginItem();
+        writeItem(attribute);
+    }
+    if (hasHidden && !isHidden) {
+        PutLine(out_);
+        PutLine(out_, TranslateOff);
+    }
+    for (Attribute* attribute : Iterator<Attribute*>(&attributes.nosyn)) {
+        beginItem();
+        writeItem(attribute);
+    }
+    if (hasHidden && !isHidden) {
+        PutLine(out_);
+        PutLine(out_, TranslateOn);
+    }
+    PutLine(out_, ")", form.closing);
+    if (isHidden) {
+        PutLine(out_, TranslateOn);
+    }
+}
+
+void VhdlNetlister::Writer::WriteSynthesisAttrAssignment(const std::vector<Signal*>& signals) {
+    for (const Signal* signal : signals) {
+        WriteAttrAssignment(*signal);
+    }
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        WriteInstanceAttrAssignment(*instance);
+    }
+}
+
+/// What the component's declaration says already is not repeated.
+void VhdlNetlister::Writer::WriteInstanceAttrAssignment(const Instance& instance) {
+    for (Attribute* attribute : instance.GetAttrIterator()) {
+        if (attribute->GetSynAttrOption() == Attribute::SynAttrNone) {
+            continue;
+        }
+        const Attribute* const inherited = instance.GetComponentAttr(attribute->GetName().CStr());
+        if (inherited == nullptr || *inherited != *attribute) {
+            statements_.WriteAttrAssignment(attribute, instance.GetName().CStr(), "label",
+                                            options_.vhdl.useAttrType);
+        }
+    }
+}
+
+void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
+    if (IsCompoundOrAgainst(signal)) {
+        WriteConstantBits(signal);
+    } else {
+        statements_.WriteConstantSignalAssignment(
+            signal.GetNameView(), Writers::IsSingleBit(signal), signal.GetConstantValue());
+    }
+}
+
+/// Writes nothing when the digits of the constant are not the bits of the signal.
+void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
+    const BitVectorValue& value = signal.GetConstantValue();
+    const string_view digits = value.GetValue();
+    StringArray bits;
+    if (value.GetBase() != 2 || !IsBinary(digits) || !AddBitNames(signal, bits) ||
+        digits.size() != static_cast<std::size_t>(bits.GetSize())) {
+        return;
+    }
+    for (int i = 0; i < bits.GetSize(); ++i) {
+        if (IsWritable(bits.GetView(i))) {
+            const Port::String digit(digits.substr(static_cast<std::size_t>(i), 1));
+            statements_.WriteConstantSignalAssignment(bits.GetView(i), true,
+                                                      BitVectorValue(digit.CStr()));
+        }
+    }
+}
+
+void VhdlNetlister::Writer::WriteAlias(const Signal& signal, const Signal& alias) {
+    StringArray bits;
+    StringArray aliasBits;
+    if ((IsAliasedByBits(signal) || IsAliasedByBits(alias)) && AddBitNames(signal, bits) &&
+        AddBitNames(alias, aliasBits)) {
+        WriteAliasBits(bits, aliasBits);
+    } else {
+        statements_.WriteSignalAssignment(signal.GetNameView(), alias.GetNameView());
+    }
+}
+
+void VhdlNetlister::Writer::WriteAliasBits(const StringArray& bits, const StringArray& aliasBits) {
+    for (int i = 0; i < std::min(bits.GetSize(), aliasBits.GetSize()); ++i) {
+        if (IsWritable(bits.GetView(i)) && IsWritable(aliasBits.GetView(i))) {
+            statements_.WriteSignalAssignment(bits.GetView(i), aliasBits.GetView(i));
+        }
+    }
+}
+
+void VhdlNetlister::Writer::WriteInstances() {
+    const string_view separator = options_.onePortPerLine ? AssociationPerLine : ", "sv;
+    WritePortAssignmentVisitor portMap(separator, statements_, out_);
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        WriteInstance(*instance, portMap);
+    }
+}
+
+void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
+                                          WritePortAssignmentVisitor& portMap) {
+    const Component* const component = instance.GetComponent();
+    statements_.WriteComment(&instance);
+    PutLine(out_, instance.GetNameView(), " : ",
+            component == nullptr ? string_view() : component->GetNameView());
+    WriteInstanceGenericMap(instance);
+    out_.Indent();
+    const Iterator<Pin*> pins = instance.GetPinIterator();
+    if (!pins.IsAtEnd()) {
+        Put(out_, "port", " ", "map", " (");
+        portMap.BeginPortMap();
+        for (const Pin* pin : pins) {
+            portMap.WritePin(*pin);
+        }
+        Put(out_, ")");
+    }
+    PutLine(out_, ";");
+    out_.Unindent();
+}
+
+void VhdlNetlister::Writer::WriteInstanceGenericMap(const Instance& instance) {
+    Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+    genericAttrs_.Split(Iterator<Attribute*>(&effectiveAttrs_));
+    Attribute* const init = passesInit_ ? genericAttrs_.FindInit() : nullptr;
+    genericAttrs_.syn.Remove(init);
+    genericAttrs_.nosyn.Remove(init);
+    out_.Indent();
+    WriteGenerics(genericAttrs_, init, GenericMap,
+                  [this](Attribute* attribute) { statements_.WriteGenericMapAttr(attribute); });
+    out_.Unindent();
+}
+
+void VhdlNetlister::Writer::WriteConfiguration() {
+    std::unordered_map<const Component*, std::vector<const Instance*>> placements;
+    for (const Component* component : netlist_.GetComponentIterator()) {
+        if (NeedsConfiguration(*component)) {
+            placements[component];
+        }
+    }
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        const auto placement = placements.find(instance->GetComponent());
+        if (placement != placements.end()) {
+            placement->second.push_back(instance);
+        }
+    }
+    const string_view name = netlist_.GetNameView();
+    PutLine(out_, TranslateOff);
+    PutLine(out_, "configuration", " ", "CFG_", name, " ", "of", "  ", name, " ", "is");
+    out_.Indent();
+    PutLine(out_, "for", " ", "BEHAVIORAL");
+    out_.Indent();
+    for (const Component* component : netlist_.GetComponentIterator()) {
+        const auto placement = placements.find(component);
+        if (placement != placements.end() && !placement->second.empty()) {
+            WriteConfigurationItem(*component, placement->second);
+        }
+    }
+    out_.Unindent();
+    PutLine(out_, "end", " ", "for", ";");
+    out_.Unindent();
+    PutLine(out_, "end", " ", "CFG_", name, ";");
+    PutLine(out_, TranslateOn);
+}
+
+void VhdlNetlister::Writer::WriteConfigurationItem(const Component& component,
+                                                   const std::vector<const Instance*>& instances) {
+    Put(out_, "for", " ");
+    bool isFirst = true;
+    for (const Instance* instance : instances) {
+        Put(out_, (isFirst ? "" : ", "), instance->GetNameView());
+        isFirst = false;
+    }
+    PutLine(out_, " : ", component.GetNameView());
+    out_.Indent();
+    PutLine(out_, "use", " ", "configuration", " ", "WORK.CFG_", component.GetNameView(), ";");
+    out_.Unindent();
+    PutLine(out_, "end", " ", "for", ";");
+}
+
+} // namespace Orn_Hdl

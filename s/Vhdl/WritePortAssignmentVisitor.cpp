@@ -1,0 +1,130 @@
+#include "Vhdl/WritePortAssignmentVisitor.h"
+
+#include "HdlModel/Names.h"
+#include "Writers/Text.h"
+
+#include <algorithm>
+#include <climits>
+
+namespace Orn_Hdl {
+
+using std::string_view;
+using Writers::Put;
+using namespace std::literals::string_view_literals;
+
+void WritePortAssignmentVisitor::WritePin(const Pin& pin) {
+    SetFormal(pin.GetNameView());
+    if (Signal* const signal = pin.GetSignal()) {
+        signal->AcceptSignal(*this);
+    } else if (pin.GetPinType() == PinTypeBus) {
+        WriteBus(string_view());
+    } else {
+        WriteScalar(string_view());
+    }
+}
+
+/// A formal of one bit is that bit, not a range of one.
+void WritePortAssignmentVisitor::SetFormal(string_view name) {
+    Names::BusName bus;
+    const bool isBus = Names::ParseBus(name, bus);
+    isScalarFormal_ = !isBus || bus.IsOneBit();
+    if (isBus && bus.IsOneBit()) {
+        formal_ = Names::WithIndex(bus.base, bus.leftIndex);
+    } else {
+        formal_ = name;
+    }
+}
+
+/// Makes a piece of a formal the formal; only a range can be cut.
+void WritePortAssignmentVisitor::SetFormalPiece(const std::string& formal, int start, int count) {
+    if (Bus::IsBusName(formal.c_str())) {
+        SetFormal(Bus::GetBusSliceName(formal.c_str(), start, count));
+    } else {
+        SetFormal(formal);
+    }
+}
+
+void WritePortAssignmentVisitor::WriteSeparator() {
+    Put(out_, pending_);
+    pending_ = separator_;
+}
+
+void WritePortAssignmentVisitor::WriteFormal() {
+    WriteSeparator();
+    if (isScalarFormal_) {
+        Put(out_, string_view(formal_));
+    } else {
+        statements_.WriteBus(string_view(formal_));
+    }
+    Put(out_, "=>");
+}
+
+void WritePortAssignmentVisitor::WriteScalar(string_view actual) {
+    WriteSeparator();
+    Put(out_, string_view(formal_), "=>", (actual.empty() ? "open" : actual));
+}
+
+void WritePortAssignmentVisitor::WriteBus(string_view actual) {
+    if (actual.empty()) {
+        WriteSeparator();
+        Put(out_, Names::BaseName(formal_), "=>", "open");
+        return;
+    }
+    WriteFormal();
+    Names::BusName bus;
+    if (Names::ParseBus(actual, bus) && bus.IsOneBit()) {
+        Put(out_, string_view(Names::WithIndex(bus.base, bus.leftIndex)));
+    } else {
+        statements_.WriteBus(actual);
+    }
+}
+
+void WritePortAssignmentVisitor::VisitScalarSignal(ScalarSignal* signal) {
+    WriteScalar(signal->GetNameView());
+}
+
+void WritePortAssignmentVisitor::VisitBus(Bus* bus) {
+    WriteBus(bus->GetNameView());
+}
+
+void WritePortAssignmentVisitor::VisitBusSlice(BusSlice* slice) {
+    const string_view name = slice->GetNameView();
+    if (!slice->IsSameDirectionAsParent() && WriteBitByBit(name)) {
+        return;
+    }
+    WriteFormal();
+    statements_.WriteBus(Writers::IsOpen(name) ? "open"sv : name);
+}
+
+void WritePortAssignmentVisitor::VisitBusIndex(BusIndex* bit) {
+    WriteScalar(bit->GetNameView());
+}
+
+void WritePortAssignmentVisitor::VisitCompoundBus(CompoundBus* compound) {
+    const std::string formal = formal_;
+    int offset = 0;
+    for (Signal* member : compound->GetBusMemberIterator()) {
+        const int width = member->GetWidth();
+        if (width > 0) {
+            SetFormalPiece(formal, offset, width);
+            member->AcceptSignal(*this);
+            offset = width > INT_MAX - offset ? INT_MAX : offset + width;
+        }
+    }
+}
+
+/// \return false, nothing written, when the slice cannot be expanded.
+bool WritePortAssignmentVisitor::WriteBitByBit(string_view slice) {
+    Names::BusName range;
+    if (!Names::ParseBus(slice, range) || range.GetBits() > Names::MostExpandedBits) {
+        return false;
+    }
+    const std::string formal = formal_;
+    for (int i = 0; i < range.GetWidth(); ++i) {
+        SetFormalPiece(formal, i, 1);
+        WriteScalar(Names::WithIndex(range.base, range.IndexAt(i)));
+    }
+    return true;
+}
+
+} // namespace Orn_Hdl

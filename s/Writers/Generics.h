@@ -1,0 +1,33 @@
+// The attributes that take effect on an instance, and those that become parameters or generics.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Model/Netlist.h"
+
+namespace Orn_Hdl::Writers {
+
+/// The attributes whose generic option is "SYN" and those for which it is "NOSYN".
+struct GenericAttrs {
+    PtrArray<Attribute*> syn;
+    PtrArray<Attribute*> nosyn;
+
+    GenericAttrs() = default;
+    explicit GenericAttrs(const Iterator<Attribute*>& attributes) { Split(attributes); }
+
+    bool IsEmpty() const noexcept { return syn.IsEmpty() && nosyn.IsEmpty(); }
+    /// Replaces both lists by those of `attributes`.
+    void Split(const Iterator<Attribute*>& attributes);
+    /// The first attribute named exactly "INIT", a "SYN" one before a "NOSYN" one; null without
+    /// one.
+    Attribute* FindInit() const;
+};
+
+/// Replaces the list by the instance's attributes and those of its component that it does not hide
+/// by one of the same name.
+void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes);
+
+/// Whether the module itself has a parameter INIT that its instances can be given.
+bool InitDefined(const Netlist& netlist);
+
+} // namespace Orn_Hdl::Writers

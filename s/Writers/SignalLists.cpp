@@ -1,0 +1,32 @@
+#include "Writers/SignalLists.h"
+
+namespace Orn_Hdl::Writers {
+
+SignalLists::SignalLists(const Netlist& netlist, NameTest isWritable) {
+    for (Signal* signal : netlist.GetSignalIterator()) {
+        if (!isWritable(signal->GetNameView())) {
+            continue;
+        }
+        if (signal->IsNeededToDeclared()) {
+            (signal->IsPort() ? ports : internals).push_back(signal);
+        }
+        if (!signal->GetConstantValue().GetValue().IsEmpty()) {
+            constants.push_back(signal);
+        }
+        if (!signal->GetSignalIterator().IsAtEnd()) {
+            aliased.push_back(signal);
+        }
+    }
+}
+
+bool IsSingleBit(const Signal& signal) {
+    const int type = signal.GetSignalType();
+    return type == SignalTypeScalar || type == SignalTypeBusIndex;
+}
+
+bool RunsAgainstParent(const Signal& signal) {
+    return signal.GetSignalType() == SignalTypeBusSlice && signal.GetWidth() != 1 &&
+           !static_cast<const BusSlice&>(signal).IsSameDirectionAsParent();
+}
+
+} // namespace Orn_Hdl::Writers

@@ -1,0 +1,33 @@
+// Which signals a writer has something to write for.
+#pragma once
+
+#include "Orn_Hdl/Model/Netlist.h"
+
+#include <string_view>
+#include <vector>
+
+namespace Orn_Hdl::Writers {
+
+/// The signals that are declared or assigned, gathered in one walk, each list in the netlist's
+/// order.
+struct SignalLists {
+    /// Tells whether a signal of that name can be written.
+    using NameTest = bool (*)(std::string_view name);
+
+    SignalLists(const Netlist& netlist, NameTest isWritable);
+
+    std::vector<Signal*> ports;
+    /// Declared, but no ports.
+    std::vector<Signal*> internals;
+    std::vector<Signal*> constants;
+    /// Each is assigned each signal of its own list.
+    std::vector<Signal*> aliased;
+};
+
+/// Whether the signal is a scalar signal or a bit of a bus; a bus of one bit is neither.
+bool IsSingleBit(const Signal& signal);
+
+/// Whether a slice of more than one bit counts the other way than the bus that it is a part of.
+bool RunsAgainstParent(const Signal& signal);
+
+} // namespace Orn_Hdl::Writers

@@ -1,0 +1,43 @@
+#include "Writers/Text.h"
+
+#include "Orn_Hdl/Options.h"
+
+#include <algorithm>
+#include <string>
+
+namespace Orn_Hdl::Writers {
+
+std::string_view GetBaseName(const Pin& pin) {
+    const std::string_view name = pin.GetNameView();
+    return pin.GetPinType() == PinTypeScalar ? name : Names::BeforeParenthesis(name);
+}
+
+Port::String GetUnquotedValue(const Attribute& attribute) {
+    return HdlUtilities::RemoveQuotes(attribute.GetValueString().CStr());
+}
+
+std::string_view GetSingleBit(const BitVectorValue& value) {
+    const std::string_view digits = value.GetValue();
+    return !digits.empty() && digits.back() == '0' ? "0" : "1";
+}
+
+void WriteBlanks(OutStream& out, std::size_t count) {
+    static const std::string some(256, ' ');
+    if (count <= some.size()) {
+        out << std::string_view(some).substr(0, count);
+    } else {
+        out << std::string_view(std::string(count, ' '));
+    }
+}
+
+void WriteCommentLines(OutStream& out, std::string_view prefix, std::string_view comment) {
+    while (!comment.empty()) {
+        const std::size_t end = std::min(comment.find('\n'), comment.size());
+        if (end > 0) {
+            out << prefix << comment.substr(0, end) << "\n";
+        }
+        comment.remove_prefix(std::min(end + 1, comment.size()));
+    }
+}
+
+} // namespace Orn_Hdl::Writers

@@ -1,0 +1,53 @@
+// What both writers do with names and plain text.
+#pragma once
+
+#include "HdlModel/Names.h"
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Model/Pins.h"
+#include "Orn_Hdl/Streams.h"
+
+#include <cstddef>
+#include <string_view>
+
+namespace Orn_Hdl::Writers {
+
+/// Whether a signal of that name stands for no signal at all: the empty name and "open".
+inline bool IsOpen(std::string_view name) noexcept {
+    return name.empty() || Names::IsNamed(name, "open");
+}
+
+/// As `Pin::GetBaseName`, without a copy.
+std::string_view GetBaseName(const Pin& pin);
+
+/// The text of an attribute's value without the quotes around it.
+Port::String GetUnquotedValue(const Attribute& attribute);
+
+/// The bit that a constant gives to a signal of one bit: only a last digit 0 gives "0".
+std::string_view GetSingleBit(const BitVectorValue& value);
+
+inline void PutPiece(OutStream& out, std::string_view text) {
+    out << text;
+}
+inline void PutPiece(OutStream& out, const char* text) {
+    out << Port::ViewOf(text);
+}
+inline void PutPiece(OutStream& out, int number) {
+    out << number;
+}
+/// Writes texts and numbers, each as a piece of its own: lines are broken between pieces only.
+template <class... Pieces> void Put(OutStream& out, const Pieces&... pieces) {
+    (PutPiece(out, pieces), ...);
+}
+/// The same, and the end of the line.
+template <class... Pieces> void PutLine(OutStream& out, const Pieces&... pieces) {
+    (PutPiece(out, pieces), ...);
+    out << OutStream::NewLine;
+}
+
+/// Writes blanks as one piece of text, which no line break divides.
+void WriteBlanks(OutStream& out, std::size_t count);
+
+/// Writes each line of a comment behind a prefix; lines without any text are left out.
+void WriteCommentLines(OutStream& out, std::string_view prefix, std::string_view comment);
+
+} // namespace Orn_Hdl::Writers
