@@ -1,0 +1,54 @@
+"""The orn-hdl under test."""
+
+from __future__ import annotations
+
+import os
+from pathlib import Path
+
+from judging import Forms
+from judges import run_tool
+from vectors import ports_of
+
+
+class Tool:
+    """Runs orn-hdl in a folder; what it writes holds no time of day."""
+
+    def __init__(self, program: Path) -> None:
+        self.program = program.resolve()
+        os.environ["SOURCE_DATE_EPOCH"] = "0"
+
+    def import_netlist(self, source: Path, top: str, work: Path) -> Forms:
+        """Imports JSON as a command file, X.cmd, and straight to both languages.
+
+        In the table of names the last two fields of a line, which a tab separates, are the old
+        name and the new one. A net or a cell may have the old name of a port, but not the new one.
+        """
+        self.run(work, "import", source, "-o", "X.cmd", "--name-map", "X.map")
+        self.run(work, "import", source, "--verilog", "X.v")
+        self.run(work, "import", source, "--vhdl", "X.vhd")
+        forms = Forms(work / "X.v", work / "X.vhd")
+        ports = {port.name for port in ports_of(forms.verilog, top, work)}
+        for line in (work / "X.map").read_text().splitlines():
+            old, new = line.split("\t")[-2:]
+            if new in ports:
+                forms.port_names[old] = new
+        return forms
+
+    def replay(self, commands: Path, work: Path) -> Forms:
+        """Replays a command file once for each language."""
+        self.run(work, "run", "--quiet", "--verilog", "X.v", commands)
+        self.run(work, "run", "--quiet", "--vhdl", "X.vhd", commands)
+        return Forms(work / "X.v", work / "X.vhd")
+
+    def replay_repeatedly(self, commands: Path, work: Path) -> Forms:
+        """Has one replay write VHDL, Verilog, VHDL, Verilog; returns the last of each."""
+        script = work / "repeated.cmd"
+        script.write_text(commands.read_text() +
+                          "WRITE VHDL first.vhd\nWRITE VERILOG first.v\n"
+                          "WRITE VHDL second.vhd\nWRITE VERILOG second.v\n")
+        self.run(work, "run", "--quiet", script)
+        return Forms(work / "second.v", work / "second.vhd")
+
+    def run(self, work: Path, *arguments: str | Path) -> None:
+        work.mkdir(parents=True, exist_ok=True)
+        run_tool([self.program, *arguments], work)

@@ -1,0 +1,14 @@
+SET NETLIST NAME bare_bus_constant
+ADD NOTES "A constant on a bus without length and base."
+
+ADD COMPONENT INV
+ADD PIN INV I Input
+ADD PIN INV O Output
+
+ADD PORT A Input
+ADD PORT Y Output
+ADD PORT K(3:0) Output
+ASSIGN CONSTANT K(3:0) 1010
+ADD INSTANCE INV U1
+CONNECT SIGNAL A U1.I
+CONNECT SIGNAL Y U1.O

@@ -1,0 +1,16 @@
+SET NETLIST NAME constant_width
+ADD NOTES "Octal and hexadecimal constants whose digits hold more bits than the bus."
+
+ADD COMPONENT INV
+ADD PIN INV I Input
+ADD PIN INV O Output
+
+ADD PORT A Input
+ADD PORT Y Output
+ADD PORT K(7:0) Output
+ADD PORT L(5:0) Output
+ASSIGN CONSTANT K(7:0) 8:O:377
+ASSIGN CONSTANT L(5:0) 6:H:2A
+ADD INSTANCE INV U1
+CONNECT SIGNAL A U1.I
+CONNECT SIGNAL Y U1.O

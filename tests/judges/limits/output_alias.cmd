@@ -1,0 +1,14 @@
+SET NETLIST NAME output_alias
+ADD NOTES "A net that is an alias of an output port reads the port."
+
+ADD COMPONENT INV
+ADD PIN INV I Input
+ADD PIN INV O Output
+
+ADD PORT A Input
+ADD PORT Y Output
+ADD PORT Z Output
+ADD INSTANCE INV U1
+CONNECT SIGNAL A U1.I
+CONNECT SIGNAL Y U1.O
+CONNECT SIGNAL Z Y

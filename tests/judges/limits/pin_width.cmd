@@ -1,0 +1,12 @@
+SET NETLIST NAME pin_width
+ADD NOTES "A slice on a pin of another width."
+
+ADD COMPONENT REV4
+ADD PIN REV4 I(0:3) Input
+ADD PIN REV4 O(0:3) Output
+
+ADD PORT A(7:0) Input
+ADD PORT Y(3:0) Output
+ADD INSTANCE REV4 U1
+CONNECT SIGNAL A(7:0) U1.I(0:3)
+CONNECT SIGNAL Y(3:0) U1.O(0:3)
