@@ -181,7 +181,12 @@ char ClosingOf(char c, string_view quotes) noexcept {
 int StringArray::Parse(string_view text, string_view separators, bool skipEmpty,
                        string_view quotes) {
     const int before = GetSize();
-    const auto isSeparator = [separators](char c) { return separators.find(c) != string_view::npos; };
+    const char separator = separators.empty() ? '\0' : separators.front();
+    const string_view others = separators.substr(std::min<std::size_t>(1, separators.size()));
+    const auto isSeparator = [separator, others](char c) {
+        return (c == separator && separator != '\0') ||
+               (!others.empty() && others.find(c) != string_view::npos);
+    };
     // Pieces are shorter than the text and as many as its separators at most; the buffer grows once.
     text_.reserve(text_.size() + text.size());
     std::size_t start = text_.size();
@@ -201,7 +206,10 @@ int StringArray::Parse(string_view text, string_view separators, bool skipEmpty,
         const bool isLast = i + 1 == text.size();
         if (closing == '\0' && !isSeparator(c)) {
             // A run of plain characters is copied as a whole.
-            const std::size_t end = std::min(text.find_first_of(separators, i), text.size());
+            std::size_t end = i + 1;
+            while (end < text.size() && !isSeparator(text[end])) {
+                ++end;
+            }
             text_.append(text, i, end - i);
             i = end;
         } else if (closing == '\0') {

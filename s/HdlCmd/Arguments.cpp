@@ -18,7 +18,7 @@ Arguments::Arguments(std::initializer_list<std::string_view> texts, unsigned fla
     for (const std::string_view text : texts) {
         size += text.size() + 1;
     }
-    block_ = static_cast<char*>(Port::Pool::Allocate(size));
+    block_ = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::Commands));
     block_[0] = static_cast<char>(texts.size());
     block_[1] = static_cast<char>(flags);
     char* place = block_ + HeaderSize;

@@ -14,10 +14,42 @@
 
 namespace Orn_Hdl {
 
+namespace {
+
+/// The leading words of a line, with their hash. The phrases of the language fit into the object.
+class PhraseKey {
+public:
+    void Append(std::string_view text) {
+        for (const char c : text) {
+            hash_.AddUpper(c);
+        }
+        if (long_.empty() && size_ + text.size() <= sizeof short_) {
+            size_ += text.copy(short_ + size_, text.size());
+            return;
+        }
+        if (long_.empty()) {
+            long_.assign(short_, size_);
+        }
+        long_.append(text);
+    }
+    std::string_view GetView() const noexcept {
+        return long_.empty() ? std::string_view(short_, size_) : std::string_view(long_);
+    }
+    std::uint32_t GetHash() const noexcept { return hash_.GetValue(); }
+
+private:
+    char short_[64];
+    std::size_t size_ = 0;
+    std::string long_;
+    NameHash hash_;
+};
+
+} // namespace
+
 Command::~Command() = default;
 
 void* Command::operator new(std::size_t size) {
-    return Port::Pool::Allocate(size);
+    return Port::Pool::Allocate(size, Port::Pool::Commands);
 }
 
 void Command::operator delete(void* memory) noexcept {
@@ -46,22 +78,17 @@ CommandCreator CommandFactory::GetCommandCreator(const StringArray& tokens) cons
     // The key grows word by word and its hash with it; beyond the longest phrase nothing can match.
     const std::size_t longest = creators_->GetLongestName();
     CommandCreator found = nullptr;
-    std::string key;
-    NameHash hash;
+    PhraseKey key;
     for (int i = 0; i < tokens.GetSize(); ++i) {
         const std::string_view token = tokens.GetView(i);
-        const std::size_t start = key.size();
-        if (start + (i > 0 ? 1 : 0) + token.size() > longest) {
+        if (key.GetView().size() + token.size() + (i > 0 ? 1 : 0) > longest) {
             break;
         }
         if (i > 0) {
-            key += ' ';
+            key.Append(" ");
         }
-        key += token;
-        for (std::size_t c = start; c < key.size(); ++c) {
-            hash.AddUpper(key[c]);
-        }
-        if (const CommandCreator creator = creators_->GetHashed(hash.GetValue(), key)) {
+        key.Append(token);
+        if (const CommandCreator creator = creators_->GetHashed(key.GetHash(), key.GetView())) {
             found = creator;
         }
     }

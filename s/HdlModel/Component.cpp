@@ -104,7 +104,7 @@ public:
         }
         to.Reserve(count);
         const auto size = static_cast<std::size_t>(count) * PlaceSize;
-        auto* const block = static_cast<char*>(Port::Pool::Allocate(size));
+        auto* const block = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::DesignObjects));
         try {
             for (int i = 0; i < count; ++i) {
                 to.Add(from.GetAt(i)->CloneInto(block + static_cast<std::size_t>(i) * PlaceSize));

@@ -6,6 +6,7 @@
 #include "Port/Ascii.h"
 
 #include <cstdint>
+#include <cstring>
 #include <string_view>
 #include <vector>
 
@@ -43,16 +44,7 @@ template <class T, class KeyOf> class NameIndex {
 public:
     /// The object of that name; null when there is none.
     T* Find(std::string_view name) const noexcept {
-        if (hashes_.empty()) {
-            return nullptr;
-        }
-        const std::uint32_t hash = HashFolded(name);
-        for (std::size_t i = Home(hash); objects_[i] != nullptr; i = Next(i)) {
-            if (hashes_[i] == hash && EqualFolded(KeyOf()(objects_[i]), name)) {
-                return objects_[i];
-            }
-        }
-        return nullptr;
+        return slots_.empty() ? nullptr : slots_[Probe(HashFolded(name), name)].GetObject();
     }
 
     /// Enters an object, in the place of another of its name.
@@ -60,79 +52,89 @@ public:
         Reserve(count_ + 1);
         const std::string_view name = KeyOf()(object);
         const std::uint32_t hash = HashFolded(name);
-        std::size_t i = Home(hash);
-        while (objects_[i] != nullptr &&
-               !(hashes_[i] == hash && EqualFolded(KeyOf()(objects_[i]), name))) {
-            i = Next(i);
-        }
-        count_ += objects_[i] == nullptr ? 1 : 0;
-        hashes_[i] = hash;
-        objects_[i] = object;
+        Slot& slot = slots_[Probe(hash, name)];
+        count_ += slot.IsFree() ? 1 : 0;
+        slot.Set(hash, object);
     }
 
     /// Takes an object out, unless another has taken its place.
     void Remove(const T* object) noexcept {
-        if (hashes_.empty()) {
+        const std::string_view name = KeyOf()(object);
+        std::size_t hole = slots_.empty() ? 0 : Probe(HashFolded(name), name);
+        if (slots_.empty() || slots_[hole].GetObject() != object) {
             return;
         }
-        const std::uint32_t hash = HashFolded(KeyOf()(object));
-        std::size_t hole = Home(hash);
-        while (objects_[hole] != object) {
-            if (objects_[hole] == nullptr) {
-                return;
-            }
-            hole = Next(hole);
-        }
         // What the freed place lets nearer to its home moves up.
-        for (std::size_t i = Next(hole); objects_[i] != nullptr; i = Next(i)) {
-            if (Distance(Home(hashes_[i]), i) >= Distance(hole, i)) {
-                hashes_[hole] = hashes_[i];
-                objects_[hole] = objects_[i];
+        for (std::size_t i = Next(hole); !slots_[i].IsFree(); i = Next(i)) {
+            if (Distance(Home(slots_[i].hash), i) >= Distance(hole, i)) {
+                slots_[hole] = slots_[i];
                 hole = i;
             }
         }
-        objects_[hole] = nullptr;
+        slots_[hole] = Slot();
         --count_;
     }
 
     void Clear() noexcept {
-        hashes_.clear();
-        objects_.clear();
+        slots_.clear();
         count_ = 0;
     }
 
+private:
+    /// Twelve bytes, so that a look-up mostly touches one cache line and a million names cost little.
+    struct Slot {
+        std::uint32_t hash = 0;
+        unsigned char object[sizeof(T*)] = {};
+
+        T* GetObject() const noexcept {
+            T* pointer = nullptr;
+            std::memcpy(&pointer, object, sizeof pointer);
+            return pointer;
+        }
+        bool IsFree() const noexcept { return GetObject() == nullptr; }
+        void Set(std::uint32_t newHash, T* newObject) noexcept {
+            hash = newHash;
+            std::memcpy(object, &newObject, sizeof newObject);
+        }
+    };
+
+    /// The place of a name, or the free place where it would go.
+    std::size_t Probe(std::uint32_t hash, std::string_view name) const noexcept {
+        std::size_t i = Home(hash);
+        while (!slots_[i].IsFree() && !(slots_[i].hash == hash &&
+                                        EqualFolded(KeyOf()(slots_[i].GetObject()), name))) {
+            i = Next(i);
+        }
+        return i;
+    }
+
+    /// At most three quarters of the places are taken.
     void Reserve(std::size_t count) {
-        if (count * 4 <= objects_.size() * 3) {
+        if (count * 4 <= slots_.size() * 3) {
             return;
         }
-        const std::size_t size = objects_.size() < 16 ? 16 : objects_.size() + objects_.size() / 2;
-        std::vector<std::uint32_t> hashes(size);
-        std::vector<T*> objects(size);
-        hashes.swap(hashes_);
-        objects.swap(objects_);
-        for (std::size_t from = 0; from < objects.size(); ++from) {
-            if (objects[from] != nullptr) {
-                std::size_t i = Home(hashes[from]);
-                while (objects_[i] != nullptr) {
+        std::vector<Slot> former(slots_.size() < 16 ? 16 : slots_.size() + slots_.size() / 2);
+        former.swap(slots_);
+        for (const Slot& slot : former) {
+            if (!slot.IsFree()) {
+                std::size_t i = Home(slot.hash);
+                while (!slots_[i].IsFree()) {
                     i = Next(i);
                 }
-                hashes_[i] = hashes[from];
-                objects_[i] = objects[from];
+                slots_[i] = slot;
             }
         }
     }
 
-private:
     std::size_t Home(std::uint32_t hash) const noexcept {
-        return static_cast<std::size_t>((std::uint64_t(hash) * objects_.size()) >> 32);
+        return static_cast<std::size_t>((std::uint64_t(hash) * slots_.size()) >> 32);
     }
-    std::size_t Next(std::size_t i) const noexcept { return i + 1 == objects_.size() ? 0 : i + 1; }
+    std::size_t Next(std::size_t i) const noexcept { return i + 1 == slots_.size() ? 0 : i + 1; }
     std::size_t Distance(std::size_t from, std::size_t to) const noexcept {
-        return to >= from ? to - from : to + objects_.size() - from;
+        return to >= from ? to - from : to + slots_.size() - from;
     }
 
-    std::vector<std::uint32_t> hashes_;
-    std::vector<T*> objects_;
+    std::vector<Slot> slots_;
     std::size_t count_ = 0;
 };
 

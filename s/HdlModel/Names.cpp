@@ -194,42 +194,46 @@ int CompareNatural(string_view a, string_view b) noexcept {
     return Rank(a[i]) < Rank(b[i]) ? -1 : 1;
 }
 
-std::uint64_t NaturalKey(string_view name) noexcept {
-    // Each step must keep the order: a run of digits is coded as 255, its length and its digits, so
-    // that it sorts after every other character and longer runs after shorter ones. What cannot be
-    // coded so in one byte ends the key.
-    constexpr unsigned DigitMark = 255;
-    constexpr int KeyBytes = 8;
-    std::uint64_t key = 0;
-    int used = 0;
-    const auto append = [&key, &used](unsigned byte) {
-        if (used < KeyBytes) {
-            key |= std::uint64_t(byte) << (8 * (KeyBytes - 1 - used));
-            ++used;
-        }
-    };
-    for (std::size_t i = 0; i < name.size() && used < KeyBytes;) {
-        if (!Port::IsDigit(name[i])) {
-            const unsigned rank = Rank(name[i]);
-            if (rank >= DigitMark - 1) {
-                append(DigitMark - 1);
-                break;
-            }
-            append(rank);
-            ++i;
+void NaturalKey::Append(unsigned byte) noexcept {
+    if (!IsFull()) {
+        std::uint64_t& half = used_ < sizeof first_ ? first_ : second_;
+        half |= std::uint64_t(byte) << (8 * (7 - used_ % 8));
+        ++used_;
+    }
+}
+
+// Each step must keep the order. A run of digits is coded as 255, its length, and two digits a byte, so
+// that it sorts after every other character, and a longer run after a shorter one.
+NaturalKey::NaturalKey(string_view name) noexcept {
+    constexpr unsigned LastPlainRank = 253;
+    for (std::size_t i = 0; i < name.size() && !IsFull();) {
+        if (Port::IsDigit(name[i])) {
+            i = AppendDigits(name, i);
             continue;
         }
-        const std::size_t run = DigitRun(name, i);
-        append(DigitMark);
-        append(static_cast<unsigned>(std::min<std::size_t>(run, 255)));
-        if (run > 255) {
-            break;
-        }
-        for (std::size_t end = i + run; i < end; ++i) {
-            append(Rank(name[i]));
-        }
+        const unsigned rank = Rank(name[i]);
+        Append(std::min(rank, LastPlainRank + 1));
+        // What has no rank of its own here ends the key.
+        i = rank > LastPlainRank ? name.size() : i + 1;
     }
-    return key;
+}
+
+std::size_t NaturalKey::AppendDigits(string_view name, std::size_t start) noexcept {
+    constexpr unsigned DigitMark = 255;
+    constexpr std::size_t LongestRun = 255;
+    const std::size_t run = DigitRun(name, start);
+    Append(DigitMark);
+    Append(static_cast<unsigned>(std::min(run, LongestRun)));
+    if (run >= LongestRun) {
+        return name.size();
+    }
+    const std::size_t end = start + run;
+    for (std::size_t i = start; i < end; i += 2) {
+        const unsigned high = Rank(name[i]) & 15U;
+        const unsigned low = i + 1 < end ? Rank(name[i + 1]) & 15U : 0;
+        Append(high << 4 | low);
+    }
+    return end;
 }
 
 } // namespace Orn_Hdl::Names

@@ -111,8 +111,28 @@ inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
 /// Below, at or above zero in natural order: letter case ignored, runs of digits by their value, a
 /// digit after every other character, the end of a name before any character.
 int CompareNatural(std::string_view a, std::string_view b) noexcept;
-/// The first eight characters' worth of natural order: a smaller key sorts first, equal keys say
+/// The start of a name in sixteen bytes: a smaller key sorts first in natural order, equal keys say
 /// nothing.
-std::uint64_t NaturalKey(std::string_view name) noexcept;
+class NaturalKey {
+public:
+    explicit NaturalKey(std::string_view name) noexcept;
+
+    friend bool operator!=(const NaturalKey& a, const NaturalKey& b) noexcept {
+        return a.first_ != b.first_ || a.second_ != b.second_;
+    }
+    friend bool operator<(const NaturalKey& a, const NaturalKey& b) noexcept {
+        return a.first_ != b.first_ ? a.first_ < b.first_ : a.second_ < b.second_;
+    }
+
+private:
+    bool IsFull() const noexcept { return used_ == 2 * sizeof(std::uint64_t); }
+    void Append(unsigned byte) noexcept;
+    /// \return the index behind the digits.
+    std::size_t AppendDigits(std::string_view name, std::size_t start) noexcept;
+
+    std::uint64_t first_ = 0;
+    std::uint64_t second_ = 0;
+    unsigned used_ = 0;
+};
 
 } // namespace Orn_Hdl::Names

@@ -246,7 +246,25 @@ void Netlist::SetBoxTypeAttribute() {
     }
 }
 
+bool Netlist::MayHaveFeedBack(bool outputPorts) const {
+    const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
+    const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;
+    for (const Signal* signal : GetSignalIterator()) {
+        // A compound has a polarity of its own only when its members agree; any member counts here.
+        const bool isCandidate = signal->GetSignalType() == SignalTypeCompoundBus ||
+                                 signal->GetPortPolarity().GetValue() == portPolarity;
+        if (isCandidate && signal->HasPinOf(pinPolarity)) {
+            return true;
+        }
+    }
+    return false;
+}
+
 void Netlist::GetFeedBackSignals(bool outputPorts, StringSet& names) const {
+    // Most designs use no port against its direction; the ports tell that faster than all pins do.
+    if (!MayHaveFeedBack(outputPorts)) {
+        return;
+    }
     for (const Instance* instance : GetInstanceIterator()) {
         PtrArray<Pin*> pins;
         if (outputPorts) {

@@ -34,7 +34,7 @@ Object& Object::operator=(const Object& other) {
 Object::~Object() = default;
 
 void* Object::operator new(std::size_t size) {
-    return Port::Pool::Allocate(size);
+    return Port::Pool::Allocate(size, Port::Pool::DesignObjects);
 }
 
 void Object::operator delete(void* memory) noexcept {

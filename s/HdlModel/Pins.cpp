@@ -95,15 +95,6 @@ bool Pin::IsListedBy(const Signal* signal) const noexcept {
                details->formerSignals.end();
 }
 
-void Pin::NoteListed(Signal* signal) {
-    if (signal == signal_) {
-        signal->RemoveUnlistedPin(this);
-        SetFlag(ListedFlag, true);
-    } else {
-        MakeDetails().formerSignals.push_back(signal);
-    }
-}
-
 void Pin::NoteUnlisted(Signal* signal) noexcept {
     if (signal == signal_) {
         SetFlag(ListedFlag, false);
@@ -117,27 +108,34 @@ void Pin::Connect(Signal* signal) {
     if (signal == signal_) {
         return;
     }
-    const bool willBeListed = signal != nullptr && IsListedBy(signal);
-    const bool isListed = signal_ != nullptr && HasFlag(ListedFlag);
+    const bool isListed = signal != nullptr && IsListedBy(signal);
     // What can fail for want of memory comes first.
-    if (isListed) {
+    PrepareToLeave();
+    if (signal != nullptr && !isListed) {
+        signal->AddUnlistedPin(this);
+    }
+    PointAt(signal, isListed);
+}
+
+/// Makes room for remembering the present signal, if that goes on listing the pin.
+void Pin::PrepareToLeave() {
+    if (signal_ != nullptr && HasFlag(ListedFlag)) {
         auto& former = MakeDetails().formerSignals;
         former.reserve(former.size() + 1);
     }
-    if (signal != nullptr && !willBeListed) {
-        signal->AddUnlistedPin(this);
-    }
-    if (isListed) {
+}
+
+void Pin::PointAt(Signal* signal, bool isListed) noexcept {
+    if (signal_ != nullptr && HasFlag(ListedFlag)) {
         GetDetails()->formerSignals.push_back(signal_);
     } else if (signal_ != nullptr) {
         signal_->RemoveUnlistedPin(this);
     }
-    if (willBeListed) {
-        auto& former = GetDetails()->formerSignals;
-        former.erase(std::find(former.begin(), former.end(), signal));
+    if (isListed && GetDetails() != nullptr) {
+        NoteUnlisted(signal);
     }
     signal_ = signal;
-    SetFlag(ListedFlag, willBeListed);
+    SetFlag(ListedFlag, isListed);
 }
 
 void Pin::SetDefaultValue(const BitVectorValue& value) {

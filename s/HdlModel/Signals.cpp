@@ -116,16 +116,17 @@ void Signal::Connect(Pin* pin) {
     if (pin == nullptr) {
         return;
     }
-    if (!pin->IsListedBy(this)) {
+    if (pin->IsListedBy(this)) {
+        pin->Connect(this);
+    } else if (pin->signal_ == this) {
         pins_.Add(pin);
-        try {
-            pin->NoteListed(this);
-        } catch (...) {
-            pins_.RemoveTail();
-            throw;
-        }
+        RemoveUnlistedPin(pin);
+        pin->SetFlag(Pin::ListedFlag, true);
+    } else {
+        pin->PrepareToLeave();
+        pins_.Add(pin);
+        pin->PointAt(this, true);
     }
-    pin->Connect(this);
 }
 
 void Signal::Connect(Signal* other) {
@@ -243,6 +244,21 @@ bool Signal::HasMultiDriver() const noexcept {
         }
     }
     return false;
+}
+
+bool Signal::HasPinOf(int polarity) const noexcept {
+    const auto matches = [this, polarity](const Pin* pin) {
+        const int value = pin->GetPolarity().GetValue();
+        return pin->GetSignal() == this &&
+               (value == polarity || value == Polarity::BiDirectional);
+    };
+    for (const Pin* pin : GetPinIterator()) {
+        if (matches(pin)) {
+            return true;
+        }
+    }
+    return links_ != nullptr &&
+           std::any_of(links_->unlistedPins.begin(), links_->unlistedPins.end(), matches);
 }
 
 void Signal::ReplaceReference(Signal* from, Signal* to) {

@@ -89,6 +89,7 @@ private:
     friend class Model;
     struct Implementation;
 
+    bool MayHaveFeedBack(bool outputPorts) const;
     void GetFeedBackSignals(bool outputPorts, StringSet& names) const;
     void GetWiredOrOutputSignals(StringSet& names) const;
     /// Puts `wider` in the place of a narrower bus of the same base name, which is destroyed;

@@ -102,8 +102,9 @@ private:
     virtual Pin* CloneInto(void* place) const = 0;
 
     bool IsListedBy(const Signal* signal) const noexcept;
-    void NoteListed(Signal* signal);
     void NoteUnlisted(Signal* signal) noexcept;
+    void PrepareToLeave();
+    void PointAt(Signal* signal, bool isListed) noexcept;
 
     static constexpr unsigned ListedFlag = 0x10;
 

@@ -114,6 +114,8 @@ private:
     void RemoveUnlistedPin(const Pin* pin) noexcept;
     void ReplaceEverywhereBy(Signal* other);
     void TakeCommentOf(const Signal& other);
+    /// Whether a pin of that polarity, or a bidirectional one, points at this signal.
+    bool HasPinOf(int polarity) const noexcept;
     virtual void ReplaceReference(Signal* from, Signal* to);
     void MarkDying() noexcept { SetFlag(DyingFlag, true); }
 
