@@ -7,7 +7,6 @@ from pathlib import Path
 
 from judging import Forms
 from judges import run_tool
-from vectors import ports_of
 
 
 class Tool:
@@ -20,17 +19,15 @@ class Tool:
     def import_netlist(self, source: Path, top: str, work: Path) -> Forms:
         """Imports JSON as a command file, X.cmd, and straight to both languages.
 
-        In the table of names the last two fields of a line, which a tab separates, are the old
-        name and the new one. A net or a cell may have the old name of a port, but not the new one.
+        A line of the table of names holds a kind, the old name and the new one, separated by tabs.
         """
         self.run(work, "import", source, "-o", "X.cmd", "--name-map", "X.map")
         self.run(work, "import", source, "--verilog", "X.v")
         self.run(work, "import", source, "--vhdl", "X.vhd")
         forms = Forms(work / "X.v", work / "X.vhd")
-        ports = {port.name for port in ports_of(forms.verilog, top, work)}
         for line in (work / "X.map").read_text().splitlines():
-            old, new = line.split("\t")[-2:]
-            if new in ports:
+            kind, old, new = line.split("\t")
+            if kind == "port":
                 forms.port_names[old] = new
         return forms
 

@@ -1,0 +1,27 @@
+#!/usr/bin/env bash
+# Sets everything up and passes the tests: the optimised build with every test, the real tools
+# included, then the unit tests and the random scripts again under the sanitizers.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+
+scripts/setup.sh test
+jobs=$(nproc)
+export CMAKE_CXX_COMPILER_LAUNCHER=ccache
+
+step() {
+    echo "== $* ($(date +%T))"
+}
+
+step "optimised build"
+cmake --preset release
+cmake --build --preset release -j "$jobs"
+
+step "sanitizer build"
+cmake --preset asan
+cmake --build --preset asan -j "$jobs"
+
+step "tests under AddressSanitizer and UndefinedBehaviorSanitizer"
+ctest --preset asan -j "$jobs" --exclude-regex '^(flow|install|docs|judges|packaging|bench)\.'
+
+step "tests"
+ctest --preset release -j "$jobs"
