@@ -24,16 +24,20 @@ PtrArrayBase& PtrArrayBase::operator=(const PtrArrayBase& other) {
 }
 
 PtrArrayBase::~PtrArrayBase() {
-    std::free(items_);
+    PtrArrayBase::Empty();
 }
 
 void PtrArrayBase::Reallocate(std::size_t capacity) {
     // Indices are signed ints, and so is the largest size.
+    void** const own = IsBorrowed() ? nullptr : items_;
     void* const items = capacity > static_cast<std::size_t>(INT32_MAX)
                             ? nullptr
-                            : std::realloc(items_, capacity * sizeof(void*));
+                            : std::realloc(own, capacity * sizeof(void*));
     if (items == nullptr) {
         throw std::bad_alloc();
+    }
+    if (IsBorrowed() && size_ > 0) {
+        std::memcpy(items, items_, size_ * sizeof(void*));
     }
     items_ = static_cast<void**>(items);
     capacity_ = static_cast<std::uint32_t>(capacity);
@@ -41,17 +45,20 @@ void PtrArrayBase::Reallocate(std::size_t capacity) {
 
 void PtrArrayBase::Grow() {
     // 3, 5, 9, 17, ...: with the allocator's own word these sizes leave nothing unused.
-    Reallocate(capacity_ < 3 ? 3 : std::size_t(capacity_) * 2 - 1);
+    Reallocate(size_ < 3 ? 3 : std::size_t(size_) * 2 - 1);
 }
 
 void PtrArrayBase::Reserve(int capacity) {
-    if (capacity > 0 && static_cast<std::uint32_t>(capacity) > capacity_) {
-        Reallocate(static_cast<std::size_t>(capacity));
+    const auto wanted = static_cast<std::uint32_t>(capacity < 0 ? 0 : capacity);
+    if (wanted > capacity_ && wanted > size_) {
+        Reallocate(wanted);
     }
 }
 
 void PtrArrayBase::Empty() noexcept {
-    std::free(items_);
+    if (!IsBorrowed()) {
+        std::free(items_);
+    }
     items_ = nullptr;
     size_ = 0;
     capacity_ = 0;

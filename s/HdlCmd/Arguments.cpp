@@ -2,46 +2,76 @@
 
 #include "Port/Pool.h"
 
+#include <algorithm>
 #include <cstring>
-#include <utility>
 
 namespace Orn_Hdl {
 
 namespace {
 
-constexpr std::size_t HeaderSize = 2;
+/// Enough for the pointer to a block.
+constexpr std::size_t LeastRoom = 12;
+constexpr std::size_t MostRoom = 4096;
 
 } // namespace
 
-Arguments::Arguments(std::initializer_list<std::string_view> texts, unsigned flags) {
-    std::size_t size = HeaderSize;
+std::size_t Arguments::RoomFor(const StringArray& tokens, std::size_t phraseLength) noexcept {
+    std::size_t length = 0;
+    for (int i = 0; i < tokens.GetSize(); ++i) {
+        length += tokens.GetView(i).size() + 1;
+    }
+    const std::size_t behindPhrase = length - std::min(length, phraseLength + 1);
+    return std::clamp(behindPhrase, LeastRoom, MostRoom);
+}
+
+Arguments::Arguments(std::size_t room) noexcept : room_(static_cast<std::uint16_t>(room)) {}
+
+void Arguments::Release() noexcept {
+    if ((count_ & OwnBlock) != 0) {
+        Port::Pool::Free(const_cast<char*>(GetTexts()));
+    }
+    count_ = 0;
+}
+
+const char* Arguments::GetTexts() const noexcept {
+    if ((count_ & OwnBlock) == 0) {
+        return GetRoom();
+    }
+    const char* block = nullptr;
+    std::memcpy(&block, GetRoom(), sizeof block);
+    return block;
+}
+
+char* Arguments::MakePlace(std::size_t size) {
+    Release();
+    if (size <= room_) {
+        return GetRoom();
+    }
+    char* const block = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::Commands));
+    std::memcpy(GetRoom(), &block, sizeof block);
+    count_ = OwnBlock;
+    return block;
+}
+
+void Arguments::Set(std::initializer_list<std::string_view> texts, unsigned flags) {
+    std::size_t size = 0;
     for (const std::string_view text : texts) {
         size += text.size() + 1;
     }
-    block_ = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::Commands));
-    block_[0] = static_cast<char>(texts.size());
-    block_[1] = static_cast<char>(flags);
-    char* place = block_ + HeaderSize;
+    char* place = MakePlace(size);
     for (const std::string_view text : texts) {
         place += text.copy(place, text.size());
         *place++ = '\0';
     }
-}
-
-Arguments& Arguments::operator=(Arguments&& other) noexcept {
-    std::swap(block_, other.block_);
-    return *this;
-}
-
-Arguments::~Arguments() {
-    Port::Pool::Free(block_);
+    count_ = static_cast<std::uint8_t>(count_ | texts.size());
+    flags_ = static_cast<std::uint8_t>(flags);
 }
 
 const char* Arguments::Get(int index) const noexcept {
-    if (block_ == nullptr || index < 0 || index >= block_[0]) {
+    if (index < 0 || index >= (count_ & ~OwnBlock)) {
         return "";
     }
-    const char* text = block_ + HeaderSize;
+    const char* text = GetTexts();
     for (; index > 0; --index) {
         text += std::strlen(text) + 1;
     }

@@ -1,35 +1,49 @@
-// What a command keeps of its line: its argument texts, packed into one block of memory.
+// What a command keeps of its line: its argument texts.
 #pragma once
 
+#include "Orn_Hdl/Containers/StringArray.h"
+
+#include <cstddef>
 #include <cstdint>
 #include <initializer_list>
 #include <string_view>
 
 namespace Orn_Hdl {
 
-/// Up to fifteen texts and eight flags. Millions of done commands each hold one, so it is a single
-/// pointer to one block.
+/// Some texts and eight flags. Millions of done commands are kept, so the texts stand in the command's
+/// own memory, behind the command; only texts that find no room there get a block of their own.
+///
+/// It must be the last member of an object that was made with `RoomFor` more bytes than it needs
+/// without arguments.
 class Arguments {
 public:
-    Arguments() noexcept = default;
-    explicit Arguments(std::initializer_list<std::string_view> texts, unsigned flags = 0);
-    Arguments(Arguments&& other) noexcept : block_(other.block_) { other.block_ = nullptr; }
-    Arguments& operator=(Arguments&& other) noexcept;
+    /// The bytes that the words of a line behind its phrase take as arguments, and a few more.
+    static std::size_t RoomFor(const StringArray& tokens, std::size_t phraseLength) noexcept;
+
+    explicit Arguments(std::size_t room) noexcept;
     Arguments(const Arguments&) = delete;
     Arguments& operator=(const Arguments&) = delete;
-    ~Arguments();
+    ~Arguments() { Release(); }
 
+    void Set(std::initializer_list<std::string_view> texts, unsigned flags = 0);
     /// The text at `index`, closed by a NUL; empty when there is none.
     const char* Get(int index) const noexcept;
-    bool HasFlag(unsigned flag) const noexcept { return (GetFlags() & flag) != 0; }
+    bool HasFlag(unsigned flag) const noexcept { return (flags_ & flag) != 0; }
 
 private:
-    unsigned GetFlags() const noexcept {
-        return block_ == nullptr ? 0U : static_cast<unsigned char>(block_[1]);
-    }
+    static constexpr std::uint8_t OwnBlock = 0x80;
 
-    /// The number of texts, the flags, then the texts, each closed by a NUL.
-    char* block_ = nullptr;
+    char* GetRoom() noexcept { return reinterpret_cast<char*>(this) + sizeof(Arguments); }
+    const char* GetRoom() const noexcept {
+        return reinterpret_cast<const char*>(this) + sizeof(Arguments);
+    }
+    const char* GetTexts() const noexcept;
+    char* MakePlace(std::size_t size);
+    void Release() noexcept;
+
+    std::uint16_t room_;
+    std::uint8_t count_ = 0;
+    std::uint8_t flags_ = 0;
 };
 
 } // namespace Orn_Hdl

@@ -5,6 +5,8 @@
 #include "HdlCmd/Arguments.h"
 #include "Orn_Hdl/Commands.h"
 
+#include <new>
+#include <string>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -32,10 +34,12 @@ Model& RequireModel(Model* model);
 /// A command of the language: all that makes it special stands in its entry.
 template <const CommandEntry& Entry> class CatalogueCommand final : public Command {
 public:
-    using Command::Command;
-
-    static Command* Create(Model* model, const StringArray& /*tokens*/) {
-        return new CatalogueCommand(model);
+    static Command* Create(Model* model, const StringArray& tokens) {
+        const std::size_t room =
+            Arguments::RoomFor(tokens, std::char_traits<char>::length(Entry.info.phrase));
+        // The arguments are the last member, with nothing between them and the base.
+        void* const memory = Command::operator new(sizeof(Command) + sizeof(Arguments) + room);
+        return ::new (memory) CatalogueCommand(model, room);
     }
 
     bool Parse(const StringArray& tokens) override { return Entry.parse(tokens, arguments_); }
@@ -43,6 +47,8 @@ public:
     const char* GetName() const override { return Entry.info.phrase; }
 
 private:
+    CatalogueCommand(Model* model, std::size_t room) noexcept : Command(model), arguments_(room) {}
+
     Arguments arguments_;
 };
 

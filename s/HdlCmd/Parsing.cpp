@@ -47,7 +47,7 @@ bool ParseNameKind(string_view text, string_view signalWord, Arguments& argument
     } else if (Port::EqualIgnoringCase(text, "component")) {
         kind = ComponentNames;
     }
-    arguments = Arguments({}, kind);
+    arguments.Set({}, kind);
     return kind != 0;
 }
 
@@ -69,18 +69,21 @@ struct OwnerNames {
         }
     }
 
-    /// The arguments of a command: the names that there are, then the other texts.
+    /// Sets the arguments of a command: the names that there are, then the other texts.
     template <class... Texts>
-    Arguments With(AttributeOwner owner, unsigned flags, Texts... texts) const {
+    void SetBefore(Arguments& arguments, AttributeOwner owner, unsigned flags,
+                   Texts... texts) const {
         switch (owner) {
         case OnModule:
-            return Arguments({texts...}, flags);
+            arguments.Set({texts...}, flags);
+            break;
         case OnObject:
-            return Arguments({first, texts...}, flags);
+            arguments.Set({first, texts...}, flags);
+            break;
         case OnPin:
+            arguments.Set({first, second, texts...}, flags);
             break;
         }
-        return Arguments({first, second, texts...}, flags);
     }
 };
 
@@ -102,33 +105,32 @@ bool ParseNothing(const StringArray& /*tokens*/, Arguments& /*arguments*/) {
 }
 
 bool ParsePin(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments(
-        {tokens.GetView(3), tokens.GetView(4), tokens.GetView(2), tokens.GetView(5)});
+    arguments.Set({tokens.GetView(3), tokens.GetView(4), tokens.GetView(2), tokens.GetView(5)});
     return tokens.GetSize() >= 5 && IsDirection(tokens.GetView(4));
 }
 
 bool ParsePort(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments({tokens.GetView(2), tokens.GetView(3)});
+    arguments.Set({tokens.GetView(2), tokens.GetView(3)});
     return tokens.GetSize() >= 4 && IsDirection(tokens.GetView(3));
 }
 
 bool ParseSignal(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments({tokens.GetView(2)});
+    arguments.Set({tokens.GetView(2)});
     return tokens.GetSize() >= 3 && (tokens.GetSize() == 3 || IsDirection(tokens.GetView(3)));
 }
 
 bool ParseConnection(const StringArray& tokens, Arguments& arguments) {
     const PinPath target(tokens.GetView(3));
-    arguments = Arguments({tokens.GetView(2), target.owner, target.pin}, target.isPin ? unsigned(OnAPin) : 0U);
+    arguments.Set({tokens.GetView(2), target.owner, target.pin}, target.isPin ? unsigned(OnAPin) : 0U);
     return tokens.GetSize() >= 4;
 }
 
 bool ParseConstant(const StringArray& tokens, Arguments& arguments) {
     const PinPath target(tokens.GetView(2));
     if (target.isPin) {
-        arguments = Arguments({target.owner, target.pin, tokens.GetView(3)}, OnAPin);
+        arguments.Set({target.owner, target.pin, tokens.GetView(3)}, OnAPin);
     } else {
-        arguments = Arguments({target.owner, tokens.GetView(3)});
+        arguments.Set({target.owner, tokens.GetView(3)});
     }
     return tokens.GetSize() >= 4;
 }
@@ -144,7 +146,7 @@ bool ParseWrite(const StringArray& tokens, Arguments& arguments) {
             flags |= WithoutHeader;
         }
     }
-    arguments = Arguments({tokens.GetView(filePosition)}, flags);
+    arguments.Set({tokens.GetView(filePosition)}, flags);
     return !tokens.GetView(filePosition).empty();
 }
 
@@ -158,19 +160,19 @@ bool ParseLowercase(const StringArray& tokens, Arguments& arguments) {
 }
 
 bool ParseOwnerComment(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments({tokens.GetView(3), tokens.JoinFrom(4)});
+    arguments.Set({tokens.GetView(3), tokens.JoinFrom(4)});
     return tokens.GetSize() >= 5;
 }
 
 bool ParsePinComment(const StringArray& tokens, Arguments& arguments) {
     const PinPath path(tokens.GetView(4));
-    arguments = Arguments({path.owner, path.pin, tokens.JoinFrom(5)});
+    arguments.Set({path.owner, path.pin, tokens.JoinFrom(5)});
     return tokens.GetSize() >= 6 && path.isPin;
 }
 
 bool ParseFlagAt(const StringArray& tokens, int position, Arguments& arguments) {
     const bool isOff = Port::EqualIgnoringCase(tokens.GetView(position), "false");
-    arguments = Arguments({}, isOff ? 0U : unsigned(FlagOn));
+    arguments.Set({}, isOff ? 0U : unsigned(FlagOn));
     return true;
 }
 
@@ -181,15 +183,15 @@ bool ParseAddAttributeOf(const StringArray& tokens, AttributeOwner owner, Argume
     if (IsOption(tokens.GetView(position), "-TYPE=", type)) {
         ++position;
     }
-    arguments =
-        names.With(owner, 0, tokens.GetView(position), tokens.GetView(position + 1), type);
+    names.SetBefore(arguments, owner, 0, tokens.GetView(position), tokens.GetView(position + 1),
+                    type);
     return tokens.GetSize() > position && names.isValid;
 }
 
 bool ParseAttributeTextOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments) {
     const OwnerNames names(tokens, owner, OwnerPosition(owner, 2));
     const int position = AttributePosition(owner, 2);
-    arguments = names.With(owner, 0, tokens.GetView(position), tokens.GetView(position + 1));
+    names.SetBefore(arguments, owner, 0, tokens.GetView(position), tokens.GetView(position + 1));
     return tokens.GetSize() > position + 1 && names.isValid;
 }
 
@@ -213,7 +215,7 @@ bool ParseAttributeOptionsOf(const StringArray& tokens, AttributeOwner owner,
             return false;
         }
     }
-    arguments = names.With(owner, flags, tokens.GetView(position), generic, synAttr);
+    names.SetBefore(arguments, owner, flags, tokens.GetView(position), generic, synAttr);
     return true;
 }
 

@@ -49,20 +49,20 @@ bool ParseAttributeOptionsOf(const StringArray& tokens, AttributeOwner owner, Ar
 
 /// One text, which must not be empty.
 template <int Position> bool ParseText(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments({tokens.GetView(Position)});
+    arguments.Set({tokens.GetView(Position)});
     return !tokens.GetView(Position).empty();
 }
 
 /// The texts at some positions of a line that has at least `Least` words.
 template <int Least, int... Positions>
 bool ParseTexts(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments({tokens.GetView(Positions)...});
+    arguments.Set({tokens.GetView(Positions)...});
     return tokens.GetSize() >= Least;
 }
 
 /// The words from a position on, joined by one blank.
 template <int Least, int First> bool ParseJoined(const StringArray& tokens, Arguments& arguments) {
-    arguments = Arguments({tokens.JoinFrom(First)});
+    arguments.Set({tokens.JoinFrom(First)});
     return tokens.GetSize() >= Least;
 }
 

@@ -94,28 +94,33 @@ void Component::AddPin(const Pin& pin) {
     AddNewPin(std::unique_ptr<Pin>(pin.ClonePin()));
 }
 
-/// The pins of an instance stand in one block of memory, in the order of the component's pins.
+/// The pins of an instance stand in one block of memory, in the order of the component's pins, and
+/// behind them the array of pointers to them.
 class PinBlock {
 public:
-    static void CloneAll(const PtrArray<Pin*>& from, PtrArray<Pin*>& to) {
-        const int count = from.GetSize();
+    static void CloneAll(const PinList& from, PinList& to) {
+        const auto count = static_cast<std::size_t>(from.GetSize());
         if (count == 0) {
             return;
         }
-        to.Reserve(count);
-        const auto size = static_cast<std::size_t>(count) * PlaceSize;
-        auto* const block = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::DesignObjects));
+        auto* const block = static_cast<char*>(
+            Port::Pool::Allocate(count * (PlaceSize + sizeof(void*)), Port::Pool::DesignObjects));
+        void** const pointers = reinterpret_cast<void**>(block + count * PlaceSize);
+        std::size_t made = 0;
         try {
-            for (int i = 0; i < count; ++i) {
-                to.Add(from.GetAt(i)->CloneInto(block + static_cast<std::size_t>(i) * PlaceSize));
+            for (; made < count; ++made) {
+                const Pin* const pin = from.GetAt(static_cast<int>(made));
+                pointers[made] = pin->CloneInto(block + made * PlaceSize);
             }
         } catch (...) {
+            to.Borrow(pointers, static_cast<int>(made));
             Destroy(to, block);
             throw;
         }
+        to.Borrow(pointers, from.GetSize());
     }
 
-    static void DestroyAll(PtrArray<Pin*>& pins) noexcept {
+    static void DestroyAll(PinList& pins) noexcept {
         if (!pins.IsEmpty()) {
             // The pins may have been sorted since: the block begins at the lowest of them.
             Pin* first = pins.GetAt(0);
@@ -131,7 +136,7 @@ private:
     static_assert(sizeof(BusPin) == PlaceSize && sizeof(BusIndexPin) == PlaceSize);
     static_assert(alignof(ScalarPin) <= 8);
 
-    static void Destroy(PtrArray<Pin*>& pins, void* block) noexcept {
+    static void Destroy(PinList& pins, void* block) noexcept {
         for (int i = pins.GetSize(); i > 0; --i) {
             pins.GetAt(i - 1)->~Pin();
         }

@@ -46,6 +46,20 @@ void Object::SetFlag(unsigned flag, bool on) noexcept {
     name_.SetOwnerByte(static_cast<std::uint8_t>(on ? byte | flag : byte & ~flag));
 }
 
+void Object::SetDirection(int direction) {
+    const bool isOdd = direction < -1 || direction > 2;
+    if (isOdd) {
+        MakeDetails().oddDirection = direction;
+    }
+    SetFlag(DirectionMask, false);
+    SetFlag(isOdd ? 0 : static_cast<unsigned>(direction + 1) << 5U, true);
+    SetFlag(OddDirectionBit, isOdd);
+}
+
+int Object::GetOddDirection() const noexcept {
+    return details_->oddDirection;
+}
+
 int Object::GetObjectType() const {
     return ObjectTypeAttribute + static_cast<int>(name_.GetOwnerByte() & TypeMask);
 }

@@ -16,6 +16,8 @@ struct ObjectDetails {
     std::unique_ptr<std::string> keyName;
     /// A pin's default value, or a signal's constant.
     std::unique_ptr<BitVectorValue> value;
+    /// A direction that is none of input, output, bidirectional and invalid.
+    int oddDirection = 0;
     /// Of a pin: the signals that list it although it points at another, or at none.
     std::vector<Signal*> formerSignals;
 };

@@ -31,13 +31,14 @@ const char* Polarity::GetValueName() const noexcept {
     return PolarityNames[IsValid() ? value_ : Output];
 }
 
-Pin::Pin(const char* name, const Polarity& polarity)
-    : Object(ObjectTypePin), polarity_(polarity) {
+Pin::Pin(const char* name, const Polarity& polarity) : Object(ObjectTypePin) {
     Object::SetName(name);
+    SetPolarity(polarity);
 }
 
-Pin::Pin(const Pin& other) : Object(ObjectTypePin), AttributeHolder(), polarity_(other.polarity_) {
+Pin::Pin(const Pin& other) : Object(ObjectTypePin), AttributeHolder() {
     CopyNameFrom(other);
+    SetPolarity(other.GetPolarity());
     if (!other.GetDefaultValue().GetValue().IsEmpty()) {
         SetDefaultValue(other.GetDefaultValue());
     }
@@ -47,7 +48,7 @@ Pin& Pin::operator=(const Pin& other) {
     if (this != &other) {
         CopyNameFrom(other);
         PinIndex::NoteRenaming();
-        polarity_ = other.polarity_;
+        SetPolarity(other.GetPolarity());
         const bool hasValue = !GetDefaultValue().GetValue().IsEmpty();
         if (hasValue || !other.GetDefaultValue().GetValue().IsEmpty()) {
             SetDefaultValue(other.GetDefaultValue());

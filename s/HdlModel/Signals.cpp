@@ -619,7 +619,7 @@ void BusIndex::AcceptSignal(SignalVisitor& visitor) {
 }
 
 Polarity BusIndex::GetPortPolarity() const {
-    return parent_ == nullptr ? polarity_ : parent_->GetPortPolarity();
+    return parent_ == nullptr ? Polarity(GetDirection()) : parent_->GetPortPolarity();
 }
 
 Port::StringBase<char> BusIndex::GetDummySignalName() const {

@@ -44,7 +44,7 @@ protected:
     void* GetTail() const noexcept { return size_ == 0 ? nullptr : items_[size_ - 1]; }
     int GetIndex(const void* p) const noexcept;
     int Add(void* p) {
-        if (size_ == capacity_) {
+        if (size_ >= capacity_) {
             Grow();
         }
         items_[size_] = p;
@@ -54,14 +54,22 @@ protected:
     bool Remove(const void* p) noexcept;
     void RemoveAt(int i) noexcept;
     void Sort(Less less, void* context);
-    void** GetItems() noexcept { return items_; }
+    /// Fills an empty array from memory that somebody else owns and that outlives the array.
+    void Borrow(void** items, int size) noexcept {
+        items_ = items;
+        size_ = static_cast<std::uint32_t>(size);
+        capacity_ = 0;
+    }
 
 private:
     void Grow();
     void Reallocate(std::size_t capacity);
 
+    bool IsBorrowed() const noexcept { return capacity_ == 0; }
+
     void** items_ = nullptr;
     std::uint32_t size_ = 0;
+    /// 0 when the array owns no memory.
     std::uint32_t capacity_ = 0;
 };
 

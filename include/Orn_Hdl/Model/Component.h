@@ -31,6 +31,8 @@ public:
     void SortByPolarityAndName();
 
 private:
+    friend class PinBlock;
+
     static constexpr int LongestUnindexed = 16;
 
     mutable std::unique_ptr<PinIndex> index_;

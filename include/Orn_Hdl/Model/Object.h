@@ -94,6 +94,15 @@ protected:
     /// The same, null when the object has none.
     ObjectDetails* GetDetails() const noexcept { return details_.get(); }
 
+    /// A direction, as pins and signals have one: -1 to 2 stand in spare bits, where they cost nothing,
+    /// any other number in the details.
+    int GetDirection() const noexcept {
+        const unsigned byte = name_.GetOwnerByte();
+        return (byte & OddDirectionBit) != 0 ? GetOddDirection()
+                                             : static_cast<int>((byte & DirectionMask) >> 5U) - 1;
+    }
+    void SetDirection(int direction);
+
     /// Flags for the derived classes, kept in a spare byte.
     bool HasFlag(unsigned flag) const noexcept { return (name_.GetOwnerByte() & flag) != 0; }
     void SetFlag(unsigned flag, bool on) noexcept;
@@ -104,7 +113,11 @@ private:
 
     static constexpr unsigned TypeMask = 0x07;
     static constexpr unsigned OwnedFlagBit = 0x08;
+    // 0x10 is the derived classes'.
+    static constexpr unsigned DirectionMask = 0x60;
+    static constexpr unsigned OddDirectionBit = 0x80;
 
+    int GetOddDirection() const noexcept;
     std::string_view GetKeyName() const noexcept;
     void KeepKeyName(std::string_view newName);
 

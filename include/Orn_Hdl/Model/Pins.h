@@ -75,9 +75,9 @@ public:
     void Disconnect() { Connect(nullptr); }
     Signal* GetSignal() const noexcept { return signal_; }
 
-    void SetPolarity(const Polarity& polarity) noexcept { polarity_ = polarity; }
-    Polarity GetPolarity() const noexcept { return polarity_; }
-    const char* GetPolarityName() const noexcept { return polarity_.GetValueName(); }
+    void SetPolarity(const Polarity& polarity) { SetDirection(polarity.GetValue()); }
+    Polarity GetPolarity() const noexcept { return Polarity(GetDirection()); }
+    const char* GetPolarityName() const noexcept { return GetPolarity().GetValueName(); }
 
     void SetDefaultValue(const BitVectorValue& value);
     /// Parses a bit-vector literal; null is read as "".
@@ -109,7 +109,6 @@ private:
     static constexpr unsigned ListedFlag = 0x10;
 
     Signal* signal_ = nullptr;
-    Polarity polarity_;
 };
 
 /// A pin of one bit.

@@ -131,20 +131,19 @@ public:
     explicit ScalarSignal(const char* name) : Signal(name) {}
 
     int GetSignalType() const override { return SignalTypeScalar; }
-    void SetPortPolarity(const Polarity& polarity) override { polarity_ = polarity; }
+    void SetPortPolarity(const Polarity& polarity) override {
+        SetDirection(polarity.GetValue());
+    }
     void AcceptSignal(SignalVisitor& visitor) override;
-    Polarity GetPortPolarity() const override { return polarity_; }
+    Polarity GetPortPolarity() const override { return Polarity(GetDirection()); }
     int GetWidth() const override { return 1; }
-    bool IsPort() const override { return polarity_.IsValid(); }
+    bool IsPort() const override { return Polarity::IsValidValue(GetDirection()); }
     bool IsNeededToDeclared() const override { return true; }
     /// The name with "_DUMMY" behind it, unless it ends so.
     Port::StringBase<char> GetDummySignalName() const override;
     void GetBaseName(StringSet& names) const override;
     /// A new scalar signal with the dummy name; the caller owns it.
     ScalarSignal* CreateDummySignal() const;
-
-private:
-    Polarity polarity_;
 };
 
 /// A declared bus, such as D(7:0). It knows its slices and bits, which it does not own.
@@ -154,11 +153,13 @@ public:
     ~Bus() override;
 
     int GetSignalType() const override { return SignalTypeBus; }
-    void SetPortPolarity(const Polarity& polarity) override { polarity_ = polarity; }
+    void SetPortPolarity(const Polarity& polarity) override {
+        SetDirection(polarity.GetValue());
+    }
     void AcceptSignal(SignalVisitor& visitor) override;
-    Polarity GetPortPolarity() const override { return polarity_; }
+    Polarity GetPortPolarity() const override { return Polarity(GetDirection()); }
     int GetWidth() const override;
-    bool IsPort() const override { return polarity_.IsValid(); }
+    bool IsPort() const override { return Polarity::IsValidValue(GetDirection()); }
     bool IsNeededToDeclared() const override { return true; }
     Port::StringBase<char> GetDummySignalName() const override;
     void GetBaseName(StringSet& names) const override;
@@ -204,7 +205,6 @@ private:
 
     friend class Netlist;
 
-    Polarity polarity_;
     PtrArray<Signal*> slices_;
 };
 
@@ -252,7 +252,9 @@ public:
 
     int GetSignalType() const override { return SignalTypeBusIndex; }
     /// Sets the bit's own polarity, which shows only without a parent.
-    void SetPortPolarity(const Polarity& polarity) override { polarity_ = polarity; }
+    void SetPortPolarity(const Polarity& polarity) override {
+        SetDirection(polarity.GetValue());
+    }
     void AcceptSignal(SignalVisitor& visitor) override;
     Polarity GetPortPolarity() const override;
     int GetWidth() const override { return 1; }
@@ -280,7 +282,6 @@ private:
     void LeaveAll() noexcept override;
 
     Bus* parent_ = nullptr;
-    Polarity polarity_;
 };
 
 /// A concatenation of signals, leftmost first. It does not own its members.
