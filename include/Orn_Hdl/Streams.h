@@ -27,6 +27,7 @@ public:
     /// Writes a text of known length; in the base through `Write(const char*)`.
     virtual void WriteView(std::string_view text);
 
+    /// Goes one level deeper.
     void Indent() noexcept { ++indentLevel_; }
     /// Never goes below level 0.
     void Unindent() noexcept {
@@ -34,6 +35,7 @@ public:
             --indentLevel_;
         }
     }
+    /// The present level, from 0.
     int GetIndentLevel() const noexcept { return indentLevel_; }
 
 protected:
@@ -48,6 +50,7 @@ private:
 /// A front over a destination: forwards texts, numbers, line ends and indentation.
 class ORN_HDL_API OutStream {
 public:
+    /// What is written besides texts and numbers: a line end, or all that is held back.
     enum Operand { NewLine = 0, Flush = 1 };
 
     /// Takes ownership of the destination; null makes a stream that drops everything.
@@ -57,18 +60,25 @@ public:
     /// Deletes the destination, which flushes and closes a file.
     virtual ~OutStream();
 
+    /// \{
+    /// Writes a text, a number or an operand; a null text writes nothing.
     OutStream& operator<<(const char* text);
     OutStream& operator<<(const Port::StringBase<char>& text) { return *this << text.GetView(); }
     OutStream& operator<<(std::string_view text);
     OutStream& operator<<(int number);
     OutStream& operator<<(Operand operand);
+    /// \}
 
+    /// \{
+    /// As those of the destination.
     void Indent() noexcept;
     void Unindent() noexcept;
+    /// \}
     /// Writes a line end with the indent level at 0, so that the empty line holds no blanks.
     void WriteEmptyLine();
 
 protected:
+    /// The destination; null when everything is dropped.
     StreamDst* GetDestination() const noexcept { return destination_.get(); }
 
 private:
@@ -86,16 +96,25 @@ class TextMemDst;
 /// `GetError` tells the system's reason.
 class ORN_HDL_API TextFileOutStream : public OutStream {
 public:
+    /// What becomes of the file that is there already. `Replace` is `Overwrite` that happens as a
+    /// whole: the former file stands as it was until `Close` puts the new one in its place, which it
+    /// does only when everything was written. A stream that ends without `Close` drops its text.
+    enum Mode { Overwrite, Append, Replace };
+
     /// A stream without a file.
     TextFileOutStream();
     /// \param fileName the file to open; null opens none.
     /// \param append whether the text goes behind what the file holds or replaces it.
     TextFileOutStream(const char* fileName, bool append);
+    /// \param mode what becomes of a file that is there.
+    TextFileOutStream(const char* fileName, Mode mode);
     ~TextFileOutStream() override;
 
     /// Closes the file that is open and opens another. The remembered name does not change.
     bool Open(const char* fileName, bool append);
+    /// Whether a file is open.
     bool IsOpen() const noexcept;
+    /// Writes what is held back and closes the file; `GetError` then tells whether all is written.
     void Close();
     /// The name that the constructor was given.
     Port::StringBase<char> GetFileName() const;
@@ -114,7 +133,9 @@ public:
     explicit TextMemOutStream(const char* initial = nullptr);
     ~TextMemOutStream() override;
 
+    /// The text so far.
     Port::StringBase<char> GetValue() const;
+    /// Replaces the text; null is read as "".
     void SetValue(const char* text);
 
 private:

@@ -8,18 +8,22 @@
 
 namespace Port {
 
+/// Whether a character is 0 to 9.
 constexpr bool IsDigit(char c) noexcept {
     return c >= '0' && c <= '9';
 }
 
+/// Whether a character is a letter of ASCII.
 constexpr bool IsLetter(char c) noexcept {
     return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
 }
 
+/// The letter in upper case, any other character as it is.
 constexpr char ToUpper(char c) noexcept {
     return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c;
 }
 
+/// The letter in lower case, any other character as it is.
 constexpr char ToLower(char c) noexcept {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
 }

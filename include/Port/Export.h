@@ -3,6 +3,8 @@
 /// defines ORN_HDL_STATIC for itself and, through its CMake target, for its users.
 #pragma once
 
+/// \def ORN_HDL_API
+/// Stands in the declaration of everything that is exported.
 #if defined(ORN_HDL_STATIC)
 #define ORN_HDL_API
 #elif defined(_WIN32)

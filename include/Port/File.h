@@ -17,7 +17,12 @@ namespace Port {
 /// One open file, or none. Closed by its destructor.
 class ORN_HDL_API File {
 public:
-    enum Mode { Read = 1, Overwrite = 2, Append = 6 };
+    /// `Replace` is `Overwrite` that takes effect as a whole: what is written goes into a temporary
+    /// file in the same folder, which `close` puts in the place of the named one when nothing has
+    /// failed. Until then, and after any failure, the former file stands as it was; its permission
+    /// bits are kept, and a symbolic link stays one. Devices, pipes and other files that are not
+    /// regular are written directly.
+    enum Mode { Read = 1, Overwrite = 2, Append = 6, Replace = 10 };
 
     File() noexcept = default;
     ~File();
@@ -26,10 +31,14 @@ public:
 
     /// Opens a file, closing the one that was open.
     /// \param fromStart reading and overwriting begin at the first byte, appending (false) at the end.
+    ///        Of no meaning for `Replace`.
     /// \return false when the file cannot be opened; a directory never can.
     bool open(const char* name, Mode mode, bool fromStart);
-    /// \return false when the system reports that what was written is lost.
+    /// \return false when anything has failed since `open`: what was written may be lost.
     bool close();
+    /// Closes the file. What was written to replace a file is dropped; anything else stays.
+    void Discard() noexcept;
+    /// Whether a file is open.
     bool IsOpen() const noexcept { return descriptor_ >= 0; }
 
     /// Reads up to `size` bytes. \return their number, 0 at the end of the file or on a failure.
@@ -46,10 +55,18 @@ public:
 
 private:
     bool Fail(int error) noexcept;
+    bool OpenDescriptor(const char* name, int flags, unsigned mode);
+    void CloseDescriptor() noexcept;
+    bool OpenToReplace(const char* name);
+    bool OpenTemporary(unsigned mode);
     bool FillLineBuffer();
 
     int descriptor_ = -1;
     int error_ = 0;
+    /// The file that is being written to replace another; empty when there is none.
+    std::string temporary_;
+    /// What it is to replace.
+    std::string target_;
     std::string lineBuffer_;
     std::size_t lineStart_ = 0;
     bool atEnd_ = false;
@@ -65,6 +82,7 @@ public:
     Stream(const Stream&) = delete;
     Stream& operator=(const Stream&) = delete;
 
+    /// Adds a text.
     Stream& operator<<(std::string_view text);
     /// \return false when something could not be written.
     bool flush();
@@ -81,6 +99,7 @@ private:
 /// The parts of a file name.
 class ORN_HDL_API FileName {
 public:
+    /// Null is read as "".
     explicit FileName(const char* name) : name_(name) {}
     /// What follows the last "/".
     String GetTail() const;

@@ -9,15 +9,20 @@
 #include <string_view>
 #include <vector>
 
-/// A piece of a text: its first character's index (from 0) and its length.
+/// A piece of a text: its first character's index (from 0) and its length. A range that was given
+/// neither stands before the text.
 class Port_Range {
 public:
     constexpr Port_Range() noexcept = default;
+    /// A piece of that place and length.
     constexpr Port_Range(std::size_t start, std::size_t length) noexcept
         : start_(start), length_(length) {}
 
+    /// The index of the first character.
     constexpr std::size_t GetStart() const noexcept { return start_; }
+    /// The number of characters.
     constexpr std::size_t GetLength() const noexcept { return length_; }
+    /// The index behind the last character.
     constexpr std::size_t GetEnd() const noexcept { return start_ + length_; }
 
     friend constexpr bool operator==(const Port_Range& a, const Port_Range& b) noexcept {
@@ -28,7 +33,7 @@ public:
     }
 
 private:
-    std::size_t start_ = 0;
+    std::size_t start_ = static_cast<std::size_t>(-1);
     std::size_t length_ = 0;
 };
 

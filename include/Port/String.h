@@ -18,18 +18,26 @@ class File;
 /// An owned text of bytes. Indices count from 0; a search that finds nothing gives -1.
 template <class Char> class ORN_HDL_API StringBase {
 public:
+    /// A piece of such a text that someone else owns.
     using View = std::basic_string_view<Char>;
 
+    /// How letters compare.
     enum CompareType { CompareExact, CompareIgnoringCase };
+    /// Which ends are trimmed.
     enum TrimType { TrimLeft, TrimRight, TrimBoth };
+    /// What becomes of empty tokens.
     enum ParseType { KeepEmptyTokens = 0, SkipEmptyTokens = 1 };
 
     StringBase() = default;
     /// A null pointer gives the empty text.
     StringBase(const Char* text) : text_(text == nullptr ? View() : View(text)) {}
+    /// A copy of a text.
     StringBase(View text) : text_(text) {}
+    /// Takes over a text.
     StringBase(std::basic_string<Char> text) : text_(std::move(text)) {}
 
+    /// \{
+    /// Appends a text or a character; a null text appends nothing.
     StringBase& operator+=(View text) {
         text_ += text;
         return *this;
@@ -38,25 +46,35 @@ public:
     StringBase& operator+=(const StringBase& text) { return *this += text.GetView(); }
     StringBase& operator+=(Char c) {
         text_ += c;
+    /// \}
         return *this;
     }
 
+    /// \{
+    /// The text without a copy, valid until the string changes or ends.
     View GetView() const noexcept { return text_; }
     operator View() const noexcept { return text_; }
+    /// \}
     /// The text with a closing NUL, valid until the string changes or ends.
     const Char* CStr() const noexcept { return text_.c_str(); }
+    /// The number of characters.
     std::size_t GetLength() const noexcept { return text_.size(); }
+    /// Whether there are none.
     bool IsEmpty() const noexcept { return text_.empty(); }
     /// The character at `index`; NUL when there is none.
     Char operator[](std::size_t index) const noexcept {
         return index < text_.size() ? text_[index] : Char();
     }
+    /// Makes the text empty.
     void Empty() noexcept { text_.clear(); }
 
     /// Below, at or above zero as this text sorts before, with or after `other` (bytes unsigned).
     int Compare(View other, CompareType type = CompareExact) const noexcept;
+    /// The index of the first `c`.
     int GetIndexOfFirstChar(Char c) const noexcept;
+    /// The index of the last `c`.
     int GetIndexOfLastChar(Char c) const noexcept;
+    /// The index of the first occurrence of a text.
     int GetIndexOfString(View text) const noexcept;
 
     /// The piece that `range` names, cut to what the text has.
@@ -64,8 +82,11 @@ public:
     /// Takes the piece that `range` names out of the text.
     void Remove(const Port_Range& range);
 
+    /// \{
+    /// Turns the letters of ASCII into upper or lower case.
     void MakeUpper() noexcept;
     void MakeLower() noexcept;
+    /// \}
     /// Takes every `c` off the chosen ends.
     void Trim(Char c, TrimType type = TrimBoth);
     /// Replaces each character that occurs in `from` by `to`.

@@ -16,12 +16,15 @@ public:
     /// An instant in UTC.
     static UT_TIMESTAMP FromUtc(std::time_t instant);
 
+    /// \{
+    /// The fields as texts, padded with zeros.
     Port::String getTimeStampYear() const;
     Port::String getTimeStampMonthNumber() const;
     Port::String getTimeStampMonthDay() const;
     Port::String getTimeStampHour() const;
     Port::String getTimeStampMinute() const;
     Port::String getTimeStampSecond() const;
+    /// \}
 
 private:
     explicit UT_TIMESTAMP(const std::tm& fields) : fields_(fields) {}

@@ -39,10 +39,12 @@ void ExecuteSetSynthesis(Model& model, const Arguments& arguments) {
 
 namespace {
 
-/// Opens the file, lets `write` write into it, closes it, and tells the model how that went.
+/// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
+/// that is there already is replaced when everything was written, and untouched otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
-    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile));
+    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
+                                                                    : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();

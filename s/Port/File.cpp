@@ -3,39 +3,83 @@
 #include "Port/System.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cerrno>
+#include <climits>
 #include <cstring>
 #include <fcntl.h>
-#include <sys/stat.h>
 #include <system_error>
+#include <unistd.h>
+#include <utility>
 
 namespace Port {
 
 namespace {
 
 constexpr std::size_t ReadSize = std::size_t(1) << 18;
+constexpr unsigned DefaultPermissions = 0666;
+constexpr unsigned PermissionBits = 07777;
+constexpr int MostLinks = 40;
 
 int OpenFlags(File::Mode mode, bool fromStart) noexcept {
     switch (mode) {
     case File::Read:
-        return O_RDONLY | O_CLOEXEC;
+        return O_RDONLY;
     case File::Overwrite:
-        return O_WRONLY | O_CREAT | O_CLOEXEC | (fromStart ? O_TRUNC : 0);
+    case File::Replace:
+        return O_WRONLY | O_CREAT | (fromStart ? O_TRUNC : 0);
     case File::Append:
         break;
     }
-    return O_WRONLY | O_CREAT | O_CLOEXEC | O_APPEND;
+    return O_WRONLY | O_CREAT | O_APPEND;
 }
 
-bool IsDirectory(int descriptor) noexcept {
+bool IsDirectory(int descriptor) {
     struct stat status {};
-    return fstat(descriptor, &status) == 0 && S_ISDIR(status.st_mode);
+    return System::Get().GetStatus(descriptor, &status) == 0 && S_ISDIR(status.st_mode);
+}
+
+/// The folder of a file, with its closing "/"; empty for the current folder.
+std::string FolderOf(const std::string& name) {
+    return name.substr(0, name.rfind('/') + 1);
+}
+
+/// Whether the system serves the name itself. Such names lead to open files and devices by ways that
+/// are no folders, so nothing can be put in their place.
+bool IsServedBySystem(std::string_view name) noexcept {
+    constexpr std::string_view devices = "/dev/";
+    constexpr std::string_view processes = "/proc/";
+    return name.substr(0, devices.size()) == devices ||
+           name.substr(0, processes.size()) == processes;
+}
+
+/// Replaces a name by the file that its chain of symbolic links leads to, whether it exists or not.
+/// \return false, errno set, when a link cannot be read.
+bool FollowLinks(std::string& name) {
+    char link[PATH_MAX];
+    for (int i = 0; i < MostLinks && !IsServedBySystem(name); ++i) {
+        const ssize_t length = System::Get().ReadLink(name.c_str(), link, sizeof link);
+        if (length < 0) {
+            // No link, or nothing at all.
+            return errno == EINVAL || errno == ENOENT;
+        }
+        const std::string_view next(link, static_cast<std::size_t>(length));
+        name = next.substr(0, 1) == "/" ? std::string(next) : FolderOf(name).append(next);
+    }
+    return true;
+}
+
+/// A name that no other file of this process has; short, since the target's may be as long as a name
+/// can be.
+std::string TemporaryName(const std::string& folder) {
+    static std::atomic<unsigned> count{0};
+    return folder + ".orn_hdl_" + std::to_string(getpid()) + "_" + std::to_string(++count);
 }
 
 } // namespace
 
 File::~File() {
-    close();
+    Discard();
 }
 
 bool File::Fail(int error) noexcept {
@@ -45,34 +89,119 @@ bool File::Fail(int error) noexcept {
     return false;
 }
 
+bool File::OpenDescriptor(const char* name, int flags, unsigned mode) {
+    do {
+        descriptor_ = System::Get().Open(name, flags | O_CLOEXEC, mode);
+    } while (descriptor_ < 0 && errno == EINTR);
+    return descriptor_ >= 0;
+}
+
+void File::CloseDescriptor() noexcept {
+    const int result = System::Get().Close(descriptor_);
+    descriptor_ = -1;
+    // An interrupted close has closed the file all the same.
+    if (result != 0 && errno != EINTR) {
+        Fail(errno);
+    }
+}
+
 bool File::open(const char* name, Mode mode, bool fromStart) {
     close();
     error_ = 0;
     lineBuffer_.clear();
     lineStart_ = 0;
     atEnd_ = false;
-    do {
-        descriptor_ = System::Get().Open(name == nullptr ? "" : name, OpenFlags(mode, fromStart),
-                                         0666);
-    } while (descriptor_ < 0 && errno == EINTR);
-    if (descriptor_ < 0) {
+    name = name == nullptr ? "" : name;
+    if (mode == Replace) {
+        return OpenToReplace(name);
+    }
+    if (!OpenDescriptor(name, OpenFlags(mode, fromStart), DefaultPermissions)) {
         return Fail(errno);
     }
     if (IsDirectory(descriptor_)) {
-        close();
-        return Fail(EISDIR);
+        Fail(EISDIR);
+        Discard();
+        return false;
     }
     return true;
 }
 
-bool File::close() {
-    if (descriptor_ < 0) {
+bool File::OpenToReplace(const char* name) {
+    std::string target(name);
+    if (!FollowLinks(target)) {
+        return Fail(errno);
+    }
+    if (IsServedBySystem(target)) {
+        return open(name, Overwrite, true);
+    }
+    // Opened, but not touched: it tells whether the file may be written at all, and what it is.
+    if (!OpenDescriptor(target.c_str(), O_WRONLY, 0)) {
+        if (errno != ENOENT || target.empty()) {
+            return Fail(errno);
+        }
+        target_ = std::move(target);
+        return OpenTemporary(DefaultPermissions);
+    }
+    struct stat status {};
+    if (System::Get().GetStatus(descriptor_, &status) != 0) {
+        Fail(errno);
+        Discard();
+        return false;
+    }
+    if (!S_ISREG(status.st_mode)) {
         return true;
     }
-    const int result = System::Get().Close(descriptor_);
-    descriptor_ = -1;
-    // An interrupted close has closed the file all the same.
-    return result == 0 || errno == EINTR || Fail(errno);
+    CloseDescriptor();
+    target_ = std::move(target);
+    const unsigned permissions = status.st_mode & PermissionBits;
+    if (!OpenTemporary(permissions)) {
+        return false;
+    }
+    if (System::Get().ChangeMode(descriptor_, permissions) != 0) {
+        Fail(errno);
+        Discard();
+        return false;
+    }
+    return true;
+}
+
+bool File::OpenTemporary(unsigned mode) {
+    const std::string folder = FolderOf(target_);
+    std::string name;
+    do {
+        name = TemporaryName(folder);
+    } while (!OpenDescriptor(name.c_str(), O_WRONLY | O_CREAT | O_EXCL, mode) && errno == EEXIST);
+    if (!IsOpen()) {
+        return Fail(errno);
+    }
+    temporary_ = std::move(name);
+    return true;
+}
+
+bool File::close() {
+    if (!IsOpen()) {
+        return true;
+    }
+    CloseDescriptor();
+    if (!temporary_.empty() && error_ == 0) {
+        if (System::Get().Rename(temporary_.c_str(), target_.c_str()) == 0) {
+            temporary_.clear();
+        } else {
+            Fail(errno);
+        }
+    }
+    Discard();
+    return error_ == 0;
+}
+
+void File::Discard() noexcept {
+    if (IsOpen()) {
+        CloseDescriptor();
+    }
+    if (!temporary_.empty()) {
+        System::Get().Unlink(temporary_.c_str());
+        temporary_.clear();
+    }
 }
 
 std::size_t File::read(char* buffer, std::size_t size) {

@@ -86,8 +86,7 @@ template <class Char>
 bool StringBase<Char>::NextTokenRange(Port_Range& range, const Char* separators,
                                       ParseType type) const {
     const View set = ViewOf(separators);
-    const bool isFirst = range == Port_Range();
-    std::size_t start = isFirst ? 0 : range.GetEnd() + 1;
+    std::size_t start = range.GetEnd() + 1;
     if (type == SkipEmptyTokens) {
         start = std::min(text_.find_first_not_of(set, start), text_.size());
     }

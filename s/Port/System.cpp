@@ -1,5 +1,6 @@
 #include "Port/System.h"
 
+#include <cstdio>
 #include <fcntl.h>
 #include <unistd.h>
 
@@ -28,6 +29,26 @@ ssize_t System::Write(int descriptor, const void* data, std::size_t size) {
 
 int System::Close(int descriptor) {
     return ::close(descriptor);
+}
+
+int System::GetStatus(int descriptor, struct stat* status) {
+    return ::fstat(descriptor, status);
+}
+
+int System::ChangeMode(int descriptor, unsigned mode) {
+    return ::fchmod(descriptor, mode);
+}
+
+ssize_t System::ReadLink(const char* name, char* target, std::size_t size) {
+    return ::readlink(name, target, size);
+}
+
+int System::Rename(const char* from, const char* to) {
+    return std::rename(from, to);
+}
+
+int System::Unlink(const char* name) {
+    return ::unlink(name);
 }
 
 System& System::Get() noexcept {

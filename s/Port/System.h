@@ -1,10 +1,11 @@
-// The one seam around the operating system's file calls. Everything that opens, reads, writes, closes
-// or renames a file goes through it, so that a test can make the N-th call fail.
+// The one seam around the operating system's file calls. Everything that opens, reads, writes, closes,
+// renames or removes a file goes through it, so that a test can make the N-th call fail.
 #pragma once
 
 #include "Port/Export.h"
 
 #include <cstddef>
+#include <sys/stat.h>
 #include <sys/types.h>
 
 namespace Port {
@@ -17,6 +18,11 @@ public:
     virtual ssize_t Read(int descriptor, void* buffer, std::size_t size);
     virtual ssize_t Write(int descriptor, const void* data, std::size_t size);
     virtual int Close(int descriptor);
+    virtual int GetStatus(int descriptor, struct stat* status);
+    virtual int ChangeMode(int descriptor, unsigned mode);
+    virtual ssize_t ReadLink(const char* name, char* target, std::size_t size);
+    virtual int Rename(const char* from, const char* to);
+    virtual int Unlink(const char* name);
 
     /// The calls in use.
     static System& Get() noexcept;

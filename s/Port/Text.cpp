@@ -95,13 +95,14 @@ double ToDouble(const char* text) {
     if (!number.empty() && (number.front() == '-' || number.front() == '+')) {
         number.remove_prefix(1);
     }
-    if (!number.empty() && (number.front() == '-' || number.front() == '+')) {
-        return 0.0;
-    }
     std::chars_format format = std::chars_format::general;
     if (number.size() > 2 && number[0] == '0' && ToLower(number[1]) == 'x') {
         number.remove_prefix(2);
         format = std::chars_format::hex;
+    }
+    // A second sign ends the number before it began; the conversion below would take a "-".
+    if (!number.empty() && (number.front() == '-' || number.front() == '+')) {
+        return 0.0;
     }
     double value = 0.0;
     const auto result =

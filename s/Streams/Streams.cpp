@@ -77,13 +77,16 @@ TextFileOutStream::TextFileOutStream()
     : OutStream(new TextFileDst()), file_(static_cast<TextFileDst&>(*GetDestination())) {}
 
 TextFileOutStream::TextFileOutStream(const char* fileName, bool append)
-    : OutStream(new TextFileDst(fileName, append)),
+    : TextFileOutStream(fileName, append ? Append : Overwrite) {}
+
+TextFileOutStream::TextFileOutStream(const char* fileName, Mode mode)
+    : OutStream(new TextFileDst(fileName, mode)),
       file_(static_cast<TextFileDst&>(*GetDestination())) {}
 
 TextFileOutStream::~TextFileOutStream() = default;
 
 bool TextFileOutStream::Open(const char* fileName, bool append) {
-    return file_.Open(fileName, append);
+    return file_.Open(fileName, append ? Append : Overwrite);
 }
 
 bool TextFileOutStream::IsOpen() const noexcept {

@@ -11,21 +11,50 @@ namespace {
 constexpr std::string_view IndentStep = "   ";
 constexpr int ContinuationLevels = 2;
 
+Port::File::Mode FileMode(TextFileOutStream::Mode mode) noexcept {
+    switch (mode) {
+    case TextFileOutStream::Append:
+        return Port::File::Append;
+    case TextFileOutStream::Replace:
+        return Port::File::Replace;
+    case TextFileOutStream::Overwrite:
+        break;
+    }
+    return Port::File::Overwrite;
+}
+
+/// Most pieces of a netlist are a few characters long: looking at these one by one beats a call.
+std::size_t FindLineFeed(std::string_view text) noexcept {
+    constexpr std::size_t Short = 16;
+    if (text.size() > Short) {
+        return text.find('\n');
+    }
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        if (text[i] == '\n') {
+            return i;
+        }
+    }
+    return std::string_view::npos;
+}
+
 } // namespace
 
-TextFileDst::TextFileDst(const char* fileName, bool append) : fileName_(fileName) {
+TextFileDst::TextFileDst(const char* fileName, TextFileOutStream::Mode mode) : fileName_(fileName) {
     if (fileName != nullptr) {
-        Open(fileName, append);
+        Open(fileName, mode);
     }
 }
 
 TextFileDst::~TextFileDst() {
-    Close();
+    if (!replaces_) {
+        Close();
+    }
 }
 
-bool TextFileDst::Open(const char* fileName, bool append) {
+bool TextFileDst::Open(const char* fileName, TextFileOutStream::Mode mode) {
     Close();
-    if (file_.open(fileName, append ? Port::File::Append : Port::File::Overwrite, !append)) {
+    replaces_ = mode == TextFileOutStream::Replace;
+    if (file_.open(fileName, FileMode(mode), mode != TextFileOutStream::Append)) {
         stream_.emplace(file_);
     }
     return IsOpen();
@@ -73,7 +102,8 @@ void TextFileDst::WriteView(std::string_view text) {
     if (!IsOpen()) {
         return;
     }
-    for (std::size_t end = text.find('\n'); end != std::string_view::npos; end = text.find('\n')) {
+    for (std::size_t end = FindLineFeed(text); end != std::string_view::npos;
+         end = FindLineFeed(text)) {
         BeginLine();
         *stream_ << line_ << text.substr(0, end + 1);
         EndBuffer();

@@ -15,12 +15,12 @@ public:
     static constexpr std::size_t Width = 80;
 
     TextFileDst() = default;
-    TextFileDst(const char* fileName, bool append);
+    TextFileDst(const char* fileName, TextFileOutStream::Mode mode);
     TextFileDst(const TextFileDst&) = delete;
     TextFileDst& operator=(const TextFileDst&) = delete;
     ~TextFileDst() override;
 
-    bool Open(const char* fileName, bool append);
+    bool Open(const char* fileName, TextFileOutStream::Mode mode);
     bool IsOpen() const noexcept { return file_.IsOpen(); }
     void Close();
     const Port::StringBase<char>& GetFileName() const noexcept { return fileName_; }
@@ -50,6 +50,7 @@ private:
     void EndBuffer();
 
     Port::File file_;
+    bool replaces_ = false;
     std::optional<Port::Stream> stream_;
     Port::StringBase<char> fileName_;
     std::string line_;
