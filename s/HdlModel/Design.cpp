@@ -254,6 +254,12 @@ bool Model::AddInstance(const char* name, const char* componentName) {
 }
 
 bool Model::AddSignal(const char* name) {
+    DeclareSignal(name);
+    SetModifiedFlag(true);
+    return true;
+}
+
+void Model::DeclareSignal(const char* name) {
     RequireName(__LINE__, name);
     if (IsNamedUsed(name)) {
         FailInModel(__LINE__, "Identifier \"%s\" already defined.\n", {name});
@@ -270,8 +276,6 @@ bool Model::AddSignal(const char* name) {
     } else {
         netlist.Add(new ScalarSignal(name));
     }
-    SetModifiedFlag(true);
-    return true;
 }
 
 Signal* Model::GetOrCreateSignal(const char* text) {
@@ -288,7 +292,7 @@ Signal* Model::GetOrCreateSignal(const char* text) {
     if (IsCompoundName(name)) {
         return CreateAndAddCompundSignal(name);
     }
-    AddSignal(text == nullptr ? "" : text);
+    DeclareSignal(text == nullptr ? "" : text);
     return implementation_->netlist.GetSignal(name);
 }
 
@@ -299,7 +303,6 @@ Signal* Model::CreateAndAddBusIndexSignal(std::string_view name) {
     }
     Signal* const bit = new BusIndex(SpelledAs(*parent, name).c_str(), parent);
     implementation_->netlist.Add(bit);
-    SetModifiedFlag(true);
     return bit;
 }
 
@@ -307,13 +310,12 @@ Signal* Model::CreateAndAddBusSliceSignal(std::string_view name) {
     Netlist& netlist = implementation_->netlist;
     Bus* const present = netlist.GetParentBus(std::string(name).c_str());
     if (present == nullptr) {
-        AddSignal(std::string(name).c_str());
+        DeclareSignal(std::string(name).c_str());
         return netlist.GetSignal(name);
     }
     const std::string spelled = SpelledAs(*present, name);
     Names::BusName parsed;
     Names::ParseBus(spelled, parsed);
-    SetModifiedFlag(true);
     if (present->GetWidth() > parsed.GetWidth()) {
         Signal* const slice = new BusSlice(spelled.c_str(), present);
         netlist.Add(slice);
@@ -335,7 +337,7 @@ Signal* Model::GetOrCreateMember(std::string_view name) {
         member = CreateAndAddBusSliceSignal(name);
     }
     if (member == nullptr) {
-        AddSignal(std::string(name).c_str());
+        DeclareSignal(std::string(name).c_str());
         member = netlist.GetSignal(name);
     }
     return member;
@@ -355,7 +357,6 @@ Signal* Model::CreateAndAddCompundSignal(std::string_view name) {
     }
     Signal* const result = compound.get();
     implementation_->netlist.Add(compound.release());
-    SetModifiedFlag(true);
     return result;
 }
 
@@ -423,7 +424,7 @@ bool Model::AssignConstant(Pin* pin, const char* value, const char* instanceName
     pin->AcceptPin(visitor);
     const char* const name = visitor.GetName().CStr();
     if (GetSignal(name) == nullptr) {
-        AddSignal(name);
+        DeclareSignal(name);
     }
     Signal* const signal = GetSignal(name);
     AssignConstant(signal, value);

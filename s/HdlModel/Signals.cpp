@@ -707,8 +707,8 @@ Polarity CompoundBus::GetPortPolarity() const {
         return Polarity();
     }
     const Polarity first = members_.GetAt(0)->GetPortPolarity();
-    for (const Signal* member : GetBusMemberIterator()) {
-        if (member->GetPortPolarity() != first) {
+    for (int i = 1; i < members_.GetSize(); ++i) {
+        if (members_.GetAt(i)->GetPortPolarity() != first) {
             return Polarity();
         }
     }

@@ -41,6 +41,7 @@ private:
 /// A cell type: a name and an ordered list of pins, which it owns.
 class ORN_HDL_API Component : public Object, public AttributeHolder {
 public:
+    /// A component without pins; a null name is read as "".
     explicit Component(const char* name);
     Component(const Component&) = delete;
     Component& operator=(const Component&) = delete;
@@ -57,8 +58,10 @@ public:
     void AddPin(const char* name, const Polarity& polarity, const char* defaultValue);
     /// Appends a clone of a pin.
     void AddPin(const Pin& pin);
+    /// The pin of that name; null when there is none.
     Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
     Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
+    /// The pins, in order.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
 
 private:
@@ -88,8 +91,10 @@ public:
     /// The component's attribute of that name; null when there is none.
     Attribute* GetComponentAttr(const char* name) const;
 
+    /// The pin of that name; null when there is none.
     Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
     Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
+    /// The pins, in order.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
     /// Sorts the pins by polarity value, then by name in natural order.
     void SortPinName() { pins_.SortByPolarityAndName(); }

@@ -36,26 +36,38 @@ public:
     Model& operator=(const Model&) = delete;
     ~Model();
 
+    /// Whether the design has changed since the flag was cleared.
     bool IsModified() const noexcept;
+    /// Sets or clears the flag.
     void SetModifiedFlag(bool modified) noexcept;
 
+    /// \{
+    /// What the model owns; never null.
     Netlist* GetNetlist() noexcept;
     const Netlist* GetNetlist() const noexcept;
     HdlOptions* GetOptions() noexcept;
+    /// \}
+    /// The factory that was given, which the model does not own.
     CommandFactory* GetCommandFactory() const noexcept;
+    /// The done commands, owned by the model.
     CommandManager* GetCommandManager() noexcept;
 
+    /// The netlist's name.
     Port::StringBase<char> GetName() const;
     /// Null gives "HDL_NETLIST".
     void SetName(const char* name);
+    /// \{
+    /// The file from which the design comes.
     Port::StringBase<char> GetSourceFileName() const;
     void SetSourceFileName(const char* name);
+    /// \}
 
     /// Splits a command line and runs it. An empty line does nothing.
     /// \return true whenever no exception is thrown.
     bool Execute(const char* text);
     /// As above, for a text of known length that ends at its first NUL.
     bool ExecuteLine(std::string_view line);
+    /// As above, for a line that has been split.
     bool Execute(const StringArray& tokens);
     /// Replays a command file and clears the modified flag. An exception of a line ends the replay.
     /// \return false when the file cannot be opened or read.
@@ -66,25 +78,35 @@ public:
     /// What became of the last netlist that a write command wrote: the file's name and the system's
     /// error number, 0 when every byte was written.
     void RecordWrite(const char* fileName, int error);
+    /// The error number of the last write.
     int GetWriteError() const noexcept;
+    /// The file name of the last write.
     Port::StringBase<char> GetWrittenFileName() const;
 
+    /// \{
+    /// The object of that name, which the design owns; null when there is none, or no owner.
     Component* GetComponent(const char* name) const;
     Instance* GetInstance(const char* name) const;
     Signal* GetSignal(const char* name) const;
     Pin* GetPin(const char* name, const Component* component) const;
     Pin* GetPin(const char* name, const Instance* instance) const;
     Attribute* GetAttr(const char* name, const AttributeHolder* holder) const;
+    /// \}
 
     /// Components, instances and signals share one name space.
     bool AddComponent(const char* name);
+    /// Appends a pin to a component; a default value that is not empty is taken.
     bool AddPin(const char* name, const Polarity& polarity, const char* component,
                 const char* defaultValue);
+    /// Places a component.
     bool AddInstance(const char* name, const char* component);
+    /// Declares a signal, which is no port.
     bool AddSignal(const char* name);
+    /// Wires a pin to a signal.
     bool ConnectSignalToPin(const char* signal, const char* instance, const char* pin);
     /// Makes the second signal an alias of the first.
     bool ConnectSignals(const char* first, const char* second);
+    /// Ties a signal to a constant.
     bool AssignConstantToSignal(const char* signal, const char* value);
     /// Wires a pin to a signal of its own that carries the constant.
     bool AssignConstantToPin(const char* instance, const char* pin, const char* value);
@@ -92,6 +114,8 @@ public:
     /// Adds an attribute, or gives one that is present another value, its type kept.
     /// \param type one of the seven type names; null means "String".
     bool AddAttr(AttributeHolder* holder, const char* name, const char* value, const char* type);
+    /// \{
+    /// The same on an object by its name.
     bool AddModuleAttr(const char* name, const char* value, const char* type);
     bool AddComponentAttr(const char* component, const char* name, const char* value,
                           const char* type);
@@ -102,13 +126,17 @@ public:
                              const char* value, const char* type);
     bool AddInstancePinAttr(const char* instance, const char* pin, const char* name,
                             const char* value, const char* type);
+    /// \}
 
+    /// \{
     /// Operations on one attribute of a holder; a null holder does nothing.
     bool SetAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
     bool SetGenericAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
     bool SetSynAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
     bool SetUserType(AttributeHolder* holder, const char* attribute, const char* value);
+    /// \}
 
+    /// \{
     /// The same by object; an instance's attribute is looked for on its component too.
     bool SetModuleAttrValue(const char* attribute, const char* value);
     bool SetComponentAttrValue(const char* component, const char* attribute, const char* value);
@@ -147,14 +175,18 @@ public:
                                  const char* type);
     bool SetInstancePinUserType(const char* instance, const char* pin, const char* attribute,
                                 const char* type);
+    /// \}
 
     /// Adds a line to the module's comment; null adds nothing.
     bool AddNotes(const char* text);
+    /// \{
+    /// The same to the comment of an object by its name.
     bool AddComponentComment(const char* component, const char* text);
     bool AddInstanceComment(const char* instance, const char* text);
     bool AddSignalComment(const char* signal, const char* text);
     bool AddComponentPinComment(const char* component, const char* pin, const char* text);
     bool AddInstancePinComment(const char* instance, const char* pin, const char* text);
+    /// \}
 
 private:
     struct Implementation;
@@ -175,6 +207,9 @@ private:
     bool SetUserType(Attribute* attribute, const char* type);
     bool AddComment(Object& object, const char* text);
 
+    /// These change the netlist without setting the modified flag: the operation that calls them may
+    /// fail yet.
+    void DeclareSignal(const char* name);
     Signal* GetOrCreateSignal(const char* name);
     Signal* CreateAndAddBusIndexSignal(std::string_view name);
     Signal* CreateAndAddBusSliceSignal(std::string_view name);

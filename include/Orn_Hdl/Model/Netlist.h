@@ -30,7 +30,9 @@ public:
     void AcceptObject(ObjectVisitor& visitor) override;
     /// Stores the name as it stands; null is read as "".
     void SetName(const char* name) override;
+    /// Remembers from which file the design comes.
     void SetSourceFileName(const char* name);
+    /// The file from which the design comes; empty when it is not known.
     Port::StringBase<char> GetSourceFileName() const;
 
     /// Takes ownership and appends. Null is ignored, and so is an object that has an owner. An
@@ -44,6 +46,7 @@ public:
     void Remove(Instance* instance);
     void Remove(Component* component);
 
+    /// \{
     /// Look-ups by name, normalised; null when there is none.
     Signal* GetSignal(const char* name) const noexcept { return GetSignal(Port::ViewOf(name)); }
     Instance* GetInstance(const char* name) const noexcept { return GetInstance(Port::ViewOf(name)); }
@@ -51,12 +54,16 @@ public:
     Signal* GetSignal(std::string_view name) const noexcept;
     Instance* GetInstance(std::string_view name) const noexcept;
     Component* GetComponent(std::string_view name) const noexcept;
+    /// \}
     /// The bus with the base name of a text: D, D(3) and D(7:0) all give the bus D.
     Bus* GetParentBus(const char* name) const;
 
+    /// \{
+    /// What the netlist owns, in order of addition until `SortNetlist`.
     Iterator<Signal*> GetSignalIterator() const noexcept;
     Iterator<Instance*> GetInstanceIterator() const noexcept;
     Iterator<Component*> GetComponentIterator() const noexcept;
+    /// \}
     /// Replaces the list by the instances of a component, in order.
     void GetInstances(const Component* component, PtrArray<Instance*>& instances) const;
     void GetInstances(const char* componentName, PtrArray<Instance*>& instances) const;
@@ -81,6 +88,7 @@ public:
     static int GetLongestPortName(const Iterator<Signal*>& signals);
     /// Over the signals that need declaring.
     static int GetLongestSignalName(const Iterator<Signal*>& signals);
+    /// Over the attributes of one holder.
     static int GetLongestAttrName(const AttributeHolder* holder);
     /// Over the attributes of the netlist, its signals, components and instances.
     static int GetLongestAttrName(const Netlist* netlist);

@@ -42,12 +42,14 @@ enum ObjectType {
 class ORN_HDL_API Object {
 public:
     virtual ~Object();
+    /// The kind, an `ObjectType`.
     virtual int GetObjectType() const;
     /// Calls the visit operation of this object's kind with this object.
     virtual void AcceptObject(ObjectVisitor& visitor) = 0;
     /// Stores a name, normalised; null is read as "".
     virtual void SetName(const char* name);
 
+    /// The name, as a copy.
     Port::StringBase<char> GetName() const { return GetNameView(); }
     /// The name without a copy, valid until the object is renamed or ends.
     std::string_view GetNameView() const noexcept { return name_.GetView(); }
@@ -56,12 +58,14 @@ public:
 
     /// Appends the text, null read as "", and a line feed to the comment.
     void AddComment(const char* text);
+    /// The comment, every line of it with its line feed.
     Port::StringBase<char> GetComment() const;
     /// The comment without a copy, valid until it changes.
     std::string_view GetCommentView() const noexcept;
 
     /// Whether comment, name and type are equal.
     bool operator==(const Object& other) const noexcept;
+    /// The opposite of `==`.
     bool operator!=(const Object& other) const noexcept { return !(*this == other); }
 
     /// Turns every "[", "{" and "<" into "(", every "]", "}" and ">" into ")", and every "-" into ":".
@@ -76,17 +80,24 @@ public:
 
     /// Objects come from pages of their own: no bookkeeping for each of millions of objects.
     static void* operator new(std::size_t size);
+    /// Gives the memory back.
     static void operator delete(void* memory) noexcept;
+    /// \{
+    /// In place: takes and gives back nothing.
     static void* operator new(std::size_t, void* place) noexcept { return place; }
     static void operator delete(void*, void*) noexcept {}
+    /// \}
 
 protected:
+    /// A nameless object of a kind.
     explicit Object(ObjectType type) noexcept;
     /// Copies name, comment and type.
     Object(const Object& other);
     Object& operator=(const Object& other);
 
+    /// Stores a name as it stands.
     void SetNameVerbatim(std::string_view name);
+    /// Shares the name of another object.
     void CopyNameFrom(const Object& other);
 
     /// The parts that few objects have, made when first asked for.
@@ -101,10 +112,12 @@ protected:
         return (byte & OddDirectionBit) != 0 ? GetOddDirection()
                                              : static_cast<int>((byte & DirectionMask) >> 5U) - 1;
     }
+    /// Sets the direction.
     void SetDirection(int direction);
 
     /// Flags for the derived classes, kept in a spare byte.
     bool HasFlag(unsigned flag) const noexcept { return (name_.GetOwnerByte() & flag) != 0; }
+    /// Sets or clears a flag.
     void SetFlag(unsigned flag, bool on) noexcept;
 
 private:
@@ -132,12 +145,15 @@ public:
     ObjectVisitor(const ObjectVisitor&) = default;
     ObjectVisitor& operator=(const ObjectVisitor&) = default;
     virtual ~ObjectVisitor();
+    /// \{
+    /// Called by an object's `AcceptObject`, by its kind.
     virtual void VisitAttribute(Attribute* attribute);
     virtual void VisitSignal(Signal* signal);
     virtual void VisitComponent(Component* component);
     virtual void VisitPin(Pin* pin);
     virtual void VisitInstance(Instance* instance);
     virtual void VisitNetlist(Netlist* netlist);
+    /// \}
 };
 
 } // namespace Orn_Hdl

@@ -16,19 +16,23 @@ namespace Orn_Hdl {
 class ORN_HDL_API ObjectName {
 public:
     ObjectName() noexcept : bytes_(), length_(0) {}
+    /// As `Assign`.
     explicit ObjectName(std::string_view text) : ObjectName() { Assign(text); }
     ObjectName(const ObjectName& other) noexcept;
     ObjectName& operator=(const ObjectName& other) noexcept;
     ~ObjectName() { Release(); }
 
+    /// Stores a text.
     void Assign(std::string_view text);
 
+    /// The name, valid until it changes.
     std::string_view GetView() const noexcept {
         return length_ <= InlineCapacity ? std::string_view(bytes_, length_) : SharedView();
     }
 
     /// The owner's byte; copying a name does not copy it.
     std::uint8_t GetOwnerByte() const noexcept { return ownerByte_; }
+    /// Sets the owner's byte.
     void SetOwnerByte(std::uint8_t value) noexcept { ownerByte_ = value; }
 
 private:

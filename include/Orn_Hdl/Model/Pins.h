@@ -18,21 +18,29 @@ class ScalarPin;
 /// The direction of a port or pin: input, output, bidirectional, or invalid.
 class ORN_HDL_API Polarity {
 public:
+    /// The directions; ports sort in this order.
     enum Value { Invalid = -1, Input = 0, Output = 1, BiDirectional = 2 };
 
     /// Invalid.
     Polarity() noexcept = default;
+    /// The direction of that value, which is not checked.
     explicit Polarity(int value) noexcept : value_(value) {}
+    /// As `GetValue`.
     explicit Polarity(const char* text) noexcept : value_(GetValue(text)) {}
 
     /// The direction whose name begins with the text, letter case ignored, tried in the order
     /// Input, Output, BiDirectional: "in", "O" and "bidir" are directions; "" and "inputs" are not.
     static int GetValue(const char* text) noexcept;
+    /// Whether a value is a direction.
     static bool IsValidValue(int value) noexcept { return value >= Input && value <= BiDirectional; }
 
+    /// The value, a `Value` unless another one was set.
     int GetValue() const noexcept { return value_; }
+    /// Sets the value, which is not checked.
     void SetValue(int value) noexcept { value_ = value; }
+    /// Sets the value from a text, as `GetValue` reads it.
     void SetValue(const char* text) noexcept { value_ = GetValue(text); }
+    /// Whether this is a direction.
     bool IsValid() const noexcept { return IsValidValue(value_); }
     /// "Input", "Output" or "BiDirectional"; "Output" for a value that is no direction.
     const char* GetValueName() const noexcept;
@@ -61,6 +69,7 @@ public:
     int GetObjectType() const override;
     void AcceptObject(ObjectVisitor& visitor) override;
     void SetName(const char* name) override;
+    /// The class, a `PinType`.
     virtual int GetPinType() const = 0;
     /// A new pin of the same class with the same name, polarity and default value; the caller owns it.
     virtual Pin* ClonePin() const = 0;
@@ -72,22 +81,30 @@ public:
     /// Points the pin at a signal, null for none. The signal's list of pins stays as it is:
     /// `Signal::Connect` links both ways.
     void Connect(Signal* signal);
+    /// Opens the pin.
     void Disconnect() { Connect(nullptr); }
+    /// The signal that the pin points at; null when it is open.
     Signal* GetSignal() const noexcept { return signal_; }
 
+    /// Sets the direction.
     void SetPolarity(const Polarity& polarity) { SetDirection(polarity.GetValue()); }
+    /// The direction.
     Polarity GetPolarity() const noexcept { return Polarity(GetDirection()); }
+    /// As `Polarity::GetValueName`.
     const char* GetPolarityName() const noexcept { return GetPolarity().GetValueName(); }
 
+    /// Stores a default value, which copies of the pin get too; the writers write none.
     void SetDefaultValue(const BitVectorValue& value);
     /// Parses a bit-vector literal; null is read as "".
     void SetDefaultValue(const char* value);
+    /// The default value, with an empty text when there is none.
     const BitVectorValue& GetDefaultValue() const noexcept;
 
     /// Makes a pin of the class that the name's form asks for; the caller owns it.
     static Pin* Create(const char* name, const Polarity& polarity);
 
 protected:
+    /// An open pin; a null name is read as "".
     Pin(const char* name, const Polarity& polarity);
     /// Copies name, polarity and default value; not the signal, the attributes or the comment.
     Pin(const Pin& other);
@@ -114,6 +131,7 @@ private:
 /// A pin of one bit.
 class ORN_HDL_API ScalarPin final : public Pin {
 public:
+    /// An open pin; a null name is read as "".
     ScalarPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
     ScalarPin(const ScalarPin&) = default;
     ScalarPin& operator=(const ScalarPin&) = default;
@@ -129,6 +147,7 @@ private:
 /// A pin with a range, such as D(7:0).
 class ORN_HDL_API BusPin final : public Pin {
 public:
+    /// An open pin; a null name is read as "".
     BusPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
     BusPin(const BusPin&) = default;
     BusPin& operator=(const BusPin&) = default;
@@ -150,6 +169,7 @@ private:
 /// A pin for one bit of a bus, such as D(3).
 class ORN_HDL_API BusIndexPin final : public Pin {
 public:
+    /// An open pin; a null name is read as "".
     BusIndexPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
     BusIndexPin(const BusIndexPin&) = default;
     BusIndexPin& operator=(const BusIndexPin&) = default;
@@ -172,16 +192,20 @@ public:
     PinVisitor(const PinVisitor&) = default;
     PinVisitor& operator=(const PinVisitor&) = default;
     virtual ~PinVisitor();
+    /// \{
+    /// Called by a pin's `AcceptPin`, by its class.
     virtual void VisitPin(Pin* pin);
     virtual void VisitScalarPin(ScalarPin* pin);
     virtual void VisitBusPin(BusPin* pin);
     virtual void VisitBusIndexPin(BusIndexPin* pin);
+    /// \}
 };
 
 /// Forms the name of the signal that carries a pin's constant: the instance's name, the pin's base
 /// name and "CONST_SIGNAL", joined by "_", then the pin's range or index.
 class ORN_HDL_API PinConstantSignalVisitor : public PinVisitor {
 public:
+    /// For pins of an instance of that name.
     explicit PinConstantSignalVisitor(const char* instanceName) : instanceName_(instanceName) {}
     void VisitScalarPin(ScalarPin* pin) override;
     void VisitBusPin(BusPin* pin) override;

@@ -41,13 +41,17 @@ public:
     ~Signal() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
+    /// The class, a `SignalType`.
     virtual int GetSignalType() const = 0;
+    /// Makes the signal a port of that direction, or no port when it is invalid.
     virtual void SetPortPolarity(const Polarity& polarity) = 0;
     /// Calls the visit operation of this signal's class, then `VisitSignal`.
     virtual void AcceptSignal(SignalVisitor& visitor) = 0;
+    /// The direction; invalid when the signal is no port.
     virtual Polarity GetPortPolarity() const = 0;
     /// The number of bits, at most INT_MAX; 0 for a range that does not parse.
     virtual int GetWidth() const = 0;
+    /// Whether the signal is a port.
     virtual bool IsPort() const = 0;
     /// Whether the writers declare the signal: only scalar signals and buses.
     virtual bool IsNeededToDeclared() const = 0;
@@ -67,12 +71,17 @@ public:
     /// Takes over, from another signal, the pins that still point at it, and its aliases.
     void CloneConnection(Signal* other);
 
+    /// \{
+    /// Ties the signal to a constant.
     void AssignConstantValue(const BitVectorValue& value);
     void AssignConstantValue(const char* value);
+    /// \}
     /// The constant, with an empty text when there is none.
     const BitVectorValue& GetConstantValue() const noexcept;
 
+    /// The listed pins, in the order in which they were connected.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
+    /// The listed aliases, in order.
     Iterator<Signal*> GetSignalIterator() const noexcept;
 
     /// Whether more than one listed output pin points at this signal.
@@ -82,6 +91,7 @@ public:
     virtual void GetBaseName(StringSet& names) const = 0;
 
 protected:
+    /// A signal without pins; a null name is read as "".
     explicit Signal(const char* name);
 
     /// Leaves everything that names this signal and opens its pins, before it ends.
@@ -94,6 +104,7 @@ protected:
     }
     /// Remembers that `by` names this signal, so that it can be told when this signal ends.
     void NoteReferrer(Signal* by);
+    /// Forgets that `by` names this signal.
     void DropReferrer(const Signal* by) noexcept;
     /// Appends a signal to a list of this one, and remembers in it that this one names it.
     void AddReference(PtrArray<Signal*>& list, Signal* signal);
@@ -128,6 +139,7 @@ private:
 /// A net of one bit.
 class ORN_HDL_API ScalarSignal final : public Signal {
 public:
+    /// A null name is read as "".
     explicit ScalarSignal(const char* name) : Signal(name) {}
 
     int GetSignalType() const override { return SignalTypeScalar; }
@@ -149,6 +161,7 @@ public:
 /// A declared bus, such as D(7:0). It knows its slices and bits, which it does not own.
 class ORN_HDL_API Bus final : public Signal {
 public:
+    /// A null name is read as "".
     explicit Bus(const char* name) : Signal(name) {}
     ~Bus() override;
 
@@ -163,6 +176,7 @@ public:
     bool IsNeededToDeclared() const override { return true; }
     Port::StringBase<char> GetDummySignalName() const override;
     void GetBaseName(StringSet& names) const override;
+    /// A new bus with the dummy name; the caller owns it.
     Bus* CreateDummySignal() const;
 
     /// The name before "(".
@@ -177,7 +191,9 @@ public:
     void AddBusSlice(Signal* slice);
     /// Drops a slice or bit, which then has no parent.
     void RemoveBusSlice(Signal* slice);
+    /// Drops all slices and bits, which then have no parent.
     void EmptyBusSlice();
+    /// The slices and bits, in order.
     Iterator<Signal*> GetBusSliceIterator() const noexcept { return Iterator<Signal*>(&slices_); }
 
     /// Whether a normalised text is a base name followed by "(", an integer, ":", an integer and ")".
@@ -225,14 +241,19 @@ public:
     bool IsNeededToDeclared() const override { return false; }
     Port::StringBase<char> GetDummySignalName() const override;
     void GetBaseName(StringSet& names) const override;
+    /// A new slice with the dummy name and that parent; the caller owns it.
     BusSlice* CreateDummySignal(Bus* parent) const;
 
+    /// The name before "(".
     Port::StringBase<char> GetBaseName() const;
+    /// The texts of both indices; untouched and false when the name is no bus name.
     bool GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const;
+    /// Whether the left index is greater than the right one.
     bool IsDownTo() const noexcept;
     /// True without a parent; false for a one-bit slice; otherwise whether both count down or
     /// neither does.
     bool IsSameDirectionAsParent() const noexcept;
+    /// The bus that lists this; null when there is none.
     Bus* GetParentBus() const noexcept { return parent_; }
 
 private:
@@ -262,11 +283,14 @@ public:
     bool IsNeededToDeclared() const override { return false; }
     Port::StringBase<char> GetDummySignalName() const override;
     void GetBaseName(StringSet& names) const override;
+    /// A new bit with the dummy name and that parent; the caller owns it.
     BusIndex* CreateDummySignal(Bus* parent) const;
 
+    /// The name before "(".
     Port::StringBase<char> GetBaseName() const;
     /// The text of the index; empty when the name is no bit name.
     Port::StringBase<char> GetIndex() const;
+    /// The bus that lists this; null when there is none.
     Bus* GetParentBus() const noexcept { return parent_; }
 
     /// Whether a normalised text is a base name followed by "(", an integer and ")".
@@ -287,7 +311,9 @@ private:
 /// A concatenation of signals, leftmost first. It does not own its members.
 class ORN_HDL_API CompoundBus final : public Signal {
 public:
+    /// A compound without members; a null name is read as "".
     explicit CompoundBus(const char* name) : Signal(name) {}
+    /// As above, with members, which are added as `AddBusMember` does.
     CompoundBus(const char* name, const PtrArray<Signal*>& members);
     ~CompoundBus() override;
 
@@ -313,7 +339,9 @@ public:
     void SetAt(int index, Signal* member);
     /// The member at an index; null when there is none.
     Signal* GetAt(int index) const noexcept { return members_.GetAt(index); }
+    /// The number of members.
     int GetSize() const noexcept { return members_.GetSize(); }
+    /// The members, leftmost first.
     Iterator<Signal*> GetBusMemberIterator() const noexcept {
         return Iterator<Signal*>(&members_);
     }
@@ -340,12 +368,15 @@ public:
     SignalVisitor(const SignalVisitor&) = default;
     SignalVisitor& operator=(const SignalVisitor&) = default;
     virtual ~SignalVisitor();
+    /// \{
+    /// Called by a signal's `AcceptSignal`: first by its class, then `VisitSignal`.
     virtual void VisitSignal(Signal* signal);
     virtual void VisitScalarSignal(ScalarSignal* signal);
     virtual void VisitBus(Bus* bus);
     virtual void VisitBusSlice(BusSlice* slice);
     virtual void VisitBusIndex(BusIndex* bit);
     virtual void VisitCompoundBus(CompoundBus* compound);
+    /// \}
 };
 
 } // namespace Orn_Hdl
