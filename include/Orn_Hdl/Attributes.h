@@ -20,17 +20,20 @@ class AttributeVisitor;
 class ORN_HDL_API BitVectorValue {
 public:
     BitVectorValue() = default;
+    /// As `SetValue`.
     explicit BitVectorValue(const char* text) { SetValue(text); }
 
     /// Reads "LENGTH:BASE:DIGITS" with base B, O or H, such as "8:H:A5"; a text with fewer than
     /// three parts is taken as the digits alone. Null is read as "".
     void SetValue(const char* text);
 
+    /// The digits.
     const Port::StringBase<char>& GetValue() const noexcept { return digits_; }
     /// 2, 8 or 16; 2 when none was given.
     int GetBase() const noexcept { return base_; }
     /// In bits; 1 when none was given.
     int GetLength() const noexcept { return length_; }
+    /// Whether the text gave base and length.
     bool HasBaseAndLength() const noexcept { return hasBaseAndLength_; }
 
 private:
@@ -46,47 +49,61 @@ private:
 /// treat it.
 class ORN_HDL_API Attribute : public Object {
 public:
+    /// The types of a value.
     enum ValueType { String, Integer, Float, Boolean, Bit, BitVector, User };
     /// Values of the generic option.
     enum GenericOption { GenericNone = 0, GenericNoSyn = 1, GenericSyn = 2 };
     /// Values of the synthesis-attribute option.
     enum SynAttrOption { SynAttrNone = 0, SynAttrAssign = 1, SynAttrAssignNoDec = 2 };
 
+    /// \{
+    /// What an attribute has when nothing else is said.
     static constexpr const char* DEFAULT_ATTRTYPE = "String";
     static constexpr int DEFAULT_GENERIC = GenericNone;
     static constexpr int DEFAULT_SYNATTR = SynAttrNone;
+    /// \}
 
     void AcceptObject(ObjectVisitor& visitor) override;
+    /// Calls the visit operation of this attribute's type.
     virtual void AcceptAttribute(AttributeVisitor& visitor);
     /// A new attribute of the same class with the same name, comment, options and value; the caller
     /// owns it.
     virtual Attribute* CloneAttribute() const = 0;
     /// Parses and stores a value text. No text is refused; null is read as "".
     virtual void SetValue(const char* text) = 0;
+    /// The value as a text, spelt as the type spells it.
     virtual Port::StringBase<char> GetValueString() const = 0;
+    /// The type of the value.
     virtual ValueType GetValueType() const = 0;
 
+    /// The name of the type, such as "BitVector".
     Port::StringBase<char> GetValueTypeName() const;
 
     /// Sets the generic option from "NONE", "SYN" or "NOSYN", letter case ignored.
     /// \return false, the option unchanged, for any other text.
     bool SetGeneric(const char* text) noexcept;
+    /// The generic option as a text.
     Port::StringBase<char> GetGeneric() const;
+    /// The generic option.
     GenericOption GetGenericOption() const noexcept {
         return static_cast<GenericOption>(generic_);
     }
     /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", likewise.
     bool SetSynAttr(const char* text) noexcept;
+    /// The synthesis-attribute option as a text.
     Port::StringBase<char> GetSynAttr() const;
+    /// The synthesis-attribute option.
     SynAttrOption GetSynAttrOption() const noexcept {
         return static_cast<SynAttrOption>(synAttr_);
     }
 
     /// Whether name, comment, type and both options are equal, and the value texts ignoring case.
     bool operator==(const Attribute& other) const;
+    /// The opposite of `==`.
     bool operator!=(const Attribute& other) const { return !(*this == other); }
 
 protected:
+    /// An attribute with the default options.
     explicit Attribute(const char* name);
     Attribute(const Attribute&) = default;
     Attribute& operator=(const Attribute&) = default;
@@ -99,13 +116,16 @@ private:
 /// A text.
 class ORN_HDL_API AttributeString : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeString(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
     void SetValue(const char* text) override;
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return String; }
+    /// The text.
     Port::StringBase<char> GetValue() const { return value_; }
 
 private:
@@ -115,13 +135,16 @@ private:
 /// A signed 32-bit integer, parsed by the rules of `atoi`, saturating.
 class ORN_HDL_API AttributeInteger : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeInteger(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
     void SetValue(const char* text) override;
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return Integer; }
+    /// The number.
     int GetValue() const noexcept { return value_; }
 
 private:
@@ -131,13 +154,16 @@ private:
 /// A floating-point number that is written with as many decimals as its text had.
 class ORN_HDL_API AttributeFloat : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeFloat(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
     void SetValue(const char* text) override;
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return Float; }
+    /// The number.
     double GetValue() const noexcept { return value_; }
 
 private:
@@ -149,13 +175,16 @@ private:
 /// True exactly for the text "true" in any letter case.
 class ORN_HDL_API AttributeBoolean : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeBoolean(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
     void SetValue(const char* text) override;
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return Boolean; }
+    /// The value.
     bool GetValue() const noexcept { return value_; }
 
 private:
@@ -165,13 +194,16 @@ private:
 /// "1" for the text "1", else "0".
 class ORN_HDL_API AttributeBit : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeBit(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
     void SetValue(const char* text) override;
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return Bit; }
+    /// "1" or "0".
     Port::StringBase<char> GetValue() const { return GetValueString(); }
 
 private:
@@ -181,7 +213,9 @@ private:
 /// A bit-vector literal.
 class ORN_HDL_API AttributeBitVector : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeBitVector(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -189,7 +223,9 @@ public:
     /// The digits alone.
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return BitVector; }
+    /// The digits.
     Port::StringBase<char> GetValue() const { return value_.GetValue(); }
+    /// The whole literal.
     BitVectorValue GetBitVectorValue() const { return value_; }
 
 private:
@@ -199,15 +235,20 @@ private:
 /// A text of a type that the user names.
 class ORN_HDL_API AttributeUser : public Attribute {
 public:
+    /// Null texts are read as "".
     AttributeUser(const char* name, const char* value);
+    /// The same on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
     void SetValue(const char* text) override;
     Port::StringBase<char> GetValueString() const override;
     ValueType GetValueType() const override { return User; }
+    /// The text.
     Port::StringBase<char> GetValue() const { return value_; }
+    /// Names the type; null is read as "".
     void SetUserType(const char* type) { userType_ = type; }
+    /// The name of the type; empty until it is set.
     Port::StringBase<char> GetUserType() const { return userType_; }
 
 private:
@@ -222,6 +263,8 @@ public:
     AttributeVisitor(const AttributeVisitor&) = default;
     AttributeVisitor& operator=(const AttributeVisitor&) = default;
     virtual ~AttributeVisitor();
+    /// \{
+    /// Called by an attribute's `AcceptAttribute`, by the type of its value.
     virtual void VisitAttribute(Attribute* attribute);
     virtual void VisitAttributeString(AttributeString* attribute);
     virtual void VisitAttributeInteger(AttributeInteger* attribute);
@@ -230,6 +273,7 @@ public:
     virtual void VisitAttributeBitVector(AttributeBitVector* attribute);
     virtual void VisitAttributeBoolean(AttributeBoolean* attribute);
     virtual void VisitAttributeUser(AttributeUser* attribute);
+    /// \}
 };
 
 /// Owns attributes, in the order in which they were added. A holder without attributes owns no
@@ -249,7 +293,9 @@ public:
     /// The attribute of that name, normalised and letter case ignored; null when there is none.
     virtual Attribute* GetAttr(const char* name) const;
 
+    /// The attributes, in the order in which they were added.
     Iterator<Attribute*> GetAttrIterator() const noexcept;
+    /// Whether there are any.
     bool HasAttrs() const noexcept { return table_ != nullptr; }
 
 private:
@@ -260,6 +306,7 @@ private:
 /// Makes attributes by the name of their type.
 class ORN_HDL_API AttributeFactory {
 public:
+    /// Makes an attribute that the caller owns.
     using Creator = Attribute* (*)(const char* name, const char* value);
 
     /// The table of the seven types, shared by the whole process and never changed once made.

@@ -31,11 +31,14 @@ public:
     /// The phrase that selects the command, in its registered spelling.
     virtual const char* GetName() const = 0;
 
+    /// The model to act on.
     Model* GetModel() const noexcept { return model_; }
+    /// Sets the model to act on; not owned.
     void SetModel(Model* model) noexcept { model_ = model; }
 
     /// Millions of done commands are kept: they come from pages of their own.
     static void* operator new(std::size_t size);
+    /// Gives the memory back.
     static void operator delete(void* memory) noexcept;
 
 private:
@@ -47,8 +50,9 @@ using CommandCreator = Command* (*)(Model* model, const StringArray& tokens);
 
 /// What a user needs to know of one phrase of the command language.
 struct CommandInfo {
+    /// The words that select the command, with one blank between neighbours.
     const char* phrase;
-    /// The arguments after the phrase: <required>, [optional], "..." for several words.
+    /// The arguments after the phrase: `<required>`, `[optional]`, "..." for several words.
     const char* arguments;
     /// What the command does, in one line.
     const char* help;
@@ -101,6 +105,7 @@ public:
     bool CreateAndExecute(const StringArray& tokens, Model* model, CommandFactory* factory);
     /// Takes ownership. Null is ignored.
     void AddDoneCommand(Command* command);
+    /// How many done commands are kept.
     int GetDoneCommandCount() const noexcept;
     /// Deletes every done command, the first one first.
     void Clear();

@@ -31,7 +31,8 @@ namespace Orn_Hdl {
 class Model;
 
 /// Holds named designs (models) and runs text commands and command files on them. Names of models
-/// ignore letter case; a null text reads as "" everywhere.
+/// ignore letter case; a null text reads as "" everywhere. A model bears the name of its netlist,
+/// so SET NETLIST NAME renames it: keep the pointer, not the name, of a model whose commands do so.
 ///
 /// Engines are independent of one another; one engine and its models belong to one thread at a time.
 class ORN_HDL_API Engine {

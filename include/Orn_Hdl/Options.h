@@ -14,18 +14,29 @@ class OutStream;
 
 /// The output options of one model.
 struct ORN_HDL_API HdlOptions {
+    /// What the VHDL writer reads.
     struct ORN_HDL_API VhdlOption {
+        /// Leaves the configuration out.
         bool suppressConfiguration = false;
+        /// Has no effect on what is written.
         bool flattenBus = false;
+        /// Writes the IEEE and KESTRA clauses.
         bool useDefaultLibrary = true;
+        /// Library clauses to be added.
         StringArray libraries;
+        /// Use clauses to be added.
         StringArray useClauses;
+        /// Gives attributes their own types in place of string.
         bool useAttrType = false;
+        /// Leaves open input pins open; otherwise they are tied to signals of their own.
         bool openPin = true;
+        /// Leaves the component declarations out.
         bool suppressComponent = false;
     };
 
+    /// What the Verilog writer reads.
     struct ORN_HDL_API VerilogOption {
+        /// The tools whose syntax synthesis attributes can have.
         enum SynthesisType {
             QSN = 0,
             EXEMPLAR = 1,
@@ -37,10 +48,15 @@ struct ORN_HDL_API HdlOptions {
         /// How names are written. `DEFSULT` keeps them as they are; the spelling is the option's.
         enum CaseType { DEFSULT = 10, UPPERCASE = 11, LOWERCASE = 12 };
 
+        /// The chosen tool, a `SynthesisType`.
         int synthesisType = QSN;
+        /// \{
+        /// How names of each kind are written.
         CaseType signalCase = DEFSULT;
         CaseType instanceCase = DEFSULT;
         CaseType componentCase = DEFSULT;
+        /// \}
+        /// Files to be included.
         StringArray includePaths;
 
         /// Selects the synthesis tool by name, letter case ignored; an unknown name selects QSN.
@@ -51,14 +67,21 @@ struct ORN_HDL_API HdlOptions {
         static CaseType GetCaseType(const char* text);
     };
 
+    /// Of the VHDL writer.
     VhdlOption vhdl;
+    /// Of the Verilog writer.
     VerilogOption verilog;
+    /// Whether files begin with the header.
     bool writeHeader = true;
+    /// \{
+    /// The texts that the header shows.
     Port::StringBase<char> application;
     Port::StringBase<char> command;
     Port::StringBase<char> device;
     Port::StringBase<char> purpose;
     Port::StringBase<char> reference;
+    /// \}
+    /// Whether each port and each pin connection stands on a line of its own.
     bool onePortPerLine = true;
     /// Whether instances pass the module's own INIT parameter down. Each Verilog write sets it.
     mutable bool hierarchicalInit = false;

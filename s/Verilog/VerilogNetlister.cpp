@@ -3,10 +3,9 @@
 #include "HdlModel/Names.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/Generics.h"
+#include "Writers/InstanceWalk.h"
 #include "Writers/SignalLists.h"
 #include "Writers/Text.h"
-
-#include <string>
 
 namespace Orn_Hdl {
 
@@ -240,12 +239,12 @@ void VerilogNetlister::Writer::WriteReference(Signal& signal) {
 }
 
 void VerilogNetlister::Writer::WriteInstances() {
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
-        WriteInstance(*instance);
-        Writers::GetEffectiveAttrs(*instance, effectiveAttrs_);
-        EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance->GetNameView());
-        WriteDefParam(*instance, effectiveAttrs_);
-    }
+    Writers::ForEachInstance(netlist_, [this](const Instance& instance) {
+        WriteInstance(instance);
+        Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+        EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
+        WriteDefParam(instance, effectiveAttrs_);
+    });
 }
 
 void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {

@@ -4,8 +4,6 @@
 #include "Port/Ascii.h"
 #include "Writers/Text.h"
 
-#include <string>
-
 namespace Orn_Hdl {
 
 using Port::ViewOf;

@@ -1,13 +1,14 @@
 #include "Orn_Hdl/Writers/Vhdl.h"
 
 #include "HdlModel/Names.h"
+#include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/Generics.h"
+#include "Writers/InstanceWalk.h"
 #include "Writers/SignalLists.h"
 #include "Writers/Text.h"
 
 #include <algorithm>
-#include <unordered_map>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -93,13 +94,14 @@ private:
     void Prepare();
     void WriteHead();
     void WriteEntity(const std::vector<Signal*>& ports);
-    void WriteArchitecture(const Writers::SignalLists& signals);
-    void WriteAttrDeclarations(const std::vector<Signal*>& signals);
+    void WriteArchitecture(const Writers::SignalLists& signals, const InstanceLists& instances);
+    void WriteAttrDeclarations(const std::vector<Signal*>& signals, const InstanceLists& instances);
     void WriteSignalDeclaration(const Signal& signal, int width);
-    void WriteComponents();
+    void WriteComponents(const std::vector<const Component*>& components);
     void WriteComponent(const Component& component);
     void WriteGenericMap(const AttributeHolder& holder);
-    void WriteSynthesisAttrAssignment(const std::vector<Signal*>& signals);
+    void WriteSynthesisAttrAssignment(const std::vector<Signal*>& signals,
+                                      const std::vector<const Instance*>& instances);
     void WriteInstanceAttrAssignment(const Instance& instance);
     void WriteConstant(const Signal& signal);
     void WriteConstantBits(const Signal& signal);
@@ -108,7 +110,7 @@ private:
     void WriteInstances();
     void WriteInstance(const Instance& instance, WritePortAssignmentVisitor& portMap);
     void WriteInstanceGenericMap(const Instance& instance);
-    void WriteConfiguration();
+    void WriteConfiguration(const InstanceLists& instances);
     void WriteConfigurationItem(const Component& component,
                                 const std::vector<const Instance*>& instances);
 
@@ -153,12 +155,13 @@ void VhdlNetlister::WriteNetlist(Netlist* netlist, const HdlOptions* options) {
 void VhdlNetlister::Writer::Write() {
     Prepare();
     const Writers::SignalLists signals(netlist_, IsWritable);
+    const InstanceLists instances(netlist_);
     WriteHead();
     WriteEntity(signals.ports);
-    WriteArchitecture(signals);
+    WriteArchitecture(signals, instances);
     out_.WriteEmptyLine();
     if (!options_.vhdl.suppressConfiguration) {
-        WriteConfiguration();
+        WriteConfiguration(instances);
         out_.WriteEmptyLine();
     }
 }
@@ -234,18 +237,19 @@ void VhdlNetlister::Writer::WriteAttrAssignment(const Signal& signal) {
     }
 }
 
-void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signals) {
+void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signals,
+                                              const InstanceLists& instances) {
     PutLine(out_, "architecture", " BEHAVIORAL ", "of", " ", netlist_.GetNameView(), " ", "is");
     out_.Indent();
-    WriteAttrDeclarations(signals.internals);
+    WriteAttrDeclarations(signals.internals, instances);
     const int width = Netlist::GetLongestSignalName(netlist_.GetSignalIterator());
     for (const Signal* signal : signals.internals) {
         WriteSignalDeclaration(*signal, width);
     }
     if (!options_.vhdl.suppressComponent) {
-        WriteComponents();
+        WriteComponents(instances.GetComponents());
     }
-    WriteSynthesisAttrAssignment(signals.internals);
+    WriteSynthesisAttrAssignment(signals.internals, instances.GetAttributed());
     out_.Unindent();
     PutLine(out_, "begin");
     out_.Indent();
@@ -264,13 +268,13 @@ void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signal
     PutLine(out_, "end", " BEHAVIORAL;");
 }
 
-void VhdlNetlister::Writer::WriteAttrDeclarations(const std::vector<Signal*>& signals) {
+void VhdlNetlister::Writer::WriteAttrDeclarations(const std::vector<Signal*>& signals,
+                                                  const InstanceLists& instances) {
     for (const Signal* signal : signals) {
         WriteAttrDeclaration(signal);
     }
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
-        WriteAttrDeclaration(instance->GetComponent());
-        WriteAttrDeclaration(instance);
+    for (const AttributeHolder* holder : instances.GetHolders()) {
+        WriteAttrDeclaration(holder);
     }
 }
 
@@ -283,11 +287,11 @@ void VhdlNetlister::Writer::WriteSignalDeclaration(const Signal& signal, int wid
     }
 }
 
-void VhdlNetlister::Writer::WriteComponents() {
+/// Of components whose names differ by letter case at most, the first is written.
+void VhdlNetlister::Writer::WriteComponents(const std::vector<const Component*>& components) {
     StringSet written;
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
-        const Component* const component = instance->GetComponent();
-        if (component != nullptr && !written.IContains(component->GetNameView())) {
+    for (const Component* component : components) {
+        if (!written.IContains(component->GetNameView())) {
             written.Add(component->GetNameView());
             WriteComponent(*component);
         }
@@ -368,11 +372,12 @@ void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attribute
     }
 }
 
-void VhdlNetlister::Writer::WriteSynthesisAttrAssignment(const std::vector<Signal*>& signals) {
+void VhdlNetlister::Writer::WriteSynthesisAttrAssignment(
+    const std::vector<Signal*>& signals, const std::vector<const Instance*>& instances) {
     for (const Signal* signal : signals) {
         WriteAttrAssignment(*signal);
     }
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+    for (const Instance* instance : instances) {
         WriteInstanceAttrAssignment(*instance);
     }
 }
@@ -440,9 +445,8 @@ void VhdlNetlister::Writer::WriteAliasBits(const StringArray& bits, const String
 void VhdlNetlister::Writer::WriteInstances() {
     const string_view separator = options_.onePortPerLine ? AssociationPerLine : ", "sv;
     WritePortAssignmentVisitor portMap(separator, statements_, out_);
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
-        WriteInstance(*instance, portMap);
-    }
+    Writers::ForEachInstance(
+        netlist_, [this, &portMap](const Instance& instance) { WriteInstance(instance, portMap); });
 }
 
 void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
@@ -478,19 +482,7 @@ void VhdlNetlister::Writer::WriteInstanceGenericMap(const Instance& instance) {
     out_.Unindent();
 }
 
-void VhdlNetlister::Writer::WriteConfiguration() {
-    std::unordered_map<const Component*, std::vector<const Instance*>> placements;
-    for (const Component* component : netlist_.GetComponentIterator()) {
-        if (NeedsConfiguration(*component)) {
-            placements[component];
-        }
-    }
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
-        const auto placement = placements.find(instance->GetComponent());
-        if (placement != placements.end()) {
-            placement->second.push_back(instance);
-        }
-    }
+void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
     const string_view name = netlist_.GetNameView();
     PutLine(out_, TranslateOff);
     PutLine(out_, "configuration", " ", "CFG_", name, " ", "of", "  ", name, " ", "is");
@@ -498,9 +490,9 @@ void VhdlNetlister::Writer::WriteConfiguration() {
     PutLine(out_, "for", " ", "BEHAVIORAL");
     out_.Indent();
     for (const Component* component : netlist_.GetComponentIterator()) {
-        const auto placement = placements.find(component);
-        if (placement != placements.end() && !placement->second.empty()) {
-            WriteConfigurationItem(*component, placement->second);
+        const std::vector<const Instance*>& placed = instances.GetInstances(component);
+        if (!placed.empty() && NeedsConfiguration(*component)) {
+            WriteConfigurationItem(*component, placed);
         }
     }
     out_.Unindent();

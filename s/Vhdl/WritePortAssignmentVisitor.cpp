@@ -3,7 +3,6 @@
 #include "HdlModel/Names.h"
 #include "Writers/Text.h"
 
-#include <algorithm>
 #include <climits>
 
 namespace Orn_Hdl {

@@ -15,6 +15,7 @@ namespace Orn_Hdl {
 /// memory, and growth from empty begins with three places, what most nets need.
 class ORN_HDL_API PtrArrayBase {
 public:
+    /// Whether `a` comes before `b`; `context` is the caller's.
     using Less = bool (*)(void* a, void* b, void* context);
 
     PtrArrayBase() noexcept = default;
@@ -22,7 +23,9 @@ public:
     PtrArrayBase& operator=(const PtrArrayBase& other);
     virtual ~PtrArrayBase();
 
+    /// The number of elements, nulls included.
     int GetSize() const noexcept { return static_cast<int>(size_); }
+    /// Whether there are none.
     bool IsEmpty() const noexcept { return size_ == 0; }
     /// Makes room for `capacity` elements in all.
     void Reserve(int capacity);
@@ -38,6 +41,8 @@ public:
     void Swap(int i, int j) noexcept;
 
 protected:
+    /// \{
+    /// The untyped operations behind those of `PtrArray`.
     void* GetAt(int i) const noexcept {
         return i < 0 || static_cast<std::uint32_t>(i) >= size_ ? nullptr : items_[i];
     }
@@ -54,6 +59,7 @@ protected:
     bool Remove(const void* p) noexcept;
     void RemoveAt(int i) noexcept;
     void Sort(Less less, void* context);
+    /// \}
     /// Fills an empty array from memory that somebody else owns and that outlives the array.
     void Borrow(void** items, int size) noexcept {
         items_ = items;
@@ -84,6 +90,7 @@ public:
     T GetTail() const noexcept { return static_cast<T>(PtrArrayBase::GetTail()); }
     /// The index of the first element equal to `p`, or -1.
     int GetIndex(T p) const noexcept { return PtrArrayBase::GetIndex(p); }
+    /// Whether an element is equal to `p`.
     bool Contains(T p) const noexcept { return GetIndex(p) >= 0; }
     /// Appends. \return the index of the new element.
     int Add(T p) { return PtrArrayBase::Add(p); }
@@ -154,14 +161,17 @@ template <class T> class Iterator {
 public:
     /// Over no array: yields nothing.
     Iterator() noexcept = default;
+    /// Starts at the first element; the array is not owned.
     explicit Iterator(const PtrArray<T>* array) noexcept : array_(array) {}
     Iterator(const Iterator&) noexcept = default;
     Iterator& operator=(const Iterator&) noexcept = default;
     virtual ~Iterator() = default;
 
+    /// Whether there is no present element.
     bool IsAtEnd() const noexcept { return array_ == nullptr || index_ >= array_->GetSize(); }
     /// The present element; null at the end.
     T GetCurrent() const noexcept { return array_ == nullptr ? nullptr : array_->GetAt(index_); }
+    /// Steps to the next element; at the end nothing happens.
     void Next() noexcept {
         if (!IsAtEnd()) {
             ++index_;
@@ -171,12 +181,16 @@ public:
     /// For range-based for loops, from the present element on.
     class Cursor {
     public:
+        /// Starts at the iterator's present element.
         explicit Cursor(const Iterator& from) noexcept : array_(from.array_), index_(from.index_) {}
+        /// The present element.
         T operator*() const noexcept { return array_->GetAt(index_); }
+        /// Steps on.
         Cursor& operator++() noexcept {
             ++index_;
             return *this;
         }
+        /// Whether there is a present element.
         friend bool operator!=(const Cursor& a, std::nullptr_t) noexcept {
             return a.array_ != nullptr && a.index_ < a.array_->GetSize();
         }
@@ -185,8 +199,11 @@ public:
         const PtrArray<T>* array_;
         int index_;
     };
+    /// \{
+    /// For range-based for loops.
     Cursor begin() const noexcept { return Cursor(*this); }
     std::nullptr_t end() const noexcept { return nullptr; }
+    /// \}
 
 private:
     const PtrArray<T>* array_ = nullptr;

@@ -22,9 +22,13 @@ public:
     /// An empty list on which `Parse` is called.
     StringArray(const char* text, const char* separators, bool skipEmpty, const char* quotes);
 
+    /// The number of texts.
     int GetSize() const noexcept { return static_cast<int>(slots_.size()); }
+    /// Whether there are none.
     bool IsEmpty() const noexcept { return slots_.empty(); }
+    /// The text at `i`, as a copy.
     Port::StringBase<char> GetAt(int i) const { return GetView(i); }
+    /// As `GetAt`.
     Port::StringBase<char> operator[](int i) const { return GetView(i); }
     /// As `GetAt` without a copy; valid until the list changes.
     std::string_view GetView(int i) const noexcept {
@@ -39,10 +43,13 @@ public:
     /// \param unused has no effect.
     bool GetIntAt(int i, int& value, int unused) const;
 
+    /// Whether an element is equal to `text`.
     bool Contains(const Port::StringBase<char>& text) const noexcept;
+    /// The same, letter case ignored.
     bool IContains(const Port::StringBase<char>& text) const noexcept;
     /// Whether every element of `other` is contained; never when `other` has more elements.
     bool Contains(const StringArray& other) const noexcept;
+    /// The same, letter case ignored.
     bool IContains(const StringArray& other) const noexcept;
     /// All elements, with `separator` between neighbours.
     Port::StringBase<char> Concatenate(const Port::StringBase<char>& separator) const;
@@ -52,9 +59,11 @@ public:
     /// Appends a text. \return its index.
     int Add(const Port::StringBase<char>& text) { return AddView(text.GetView()); }
     int Add(const char* text) { return Add(Port::StringBase<char>(text)); }
+    /// Appends all texts of another list.
     void Add(const StringArray& other);
     /// Sets element `i`, growing the list with empty slots up to it; a negative index is ignored.
     void SetAt(int i, const Port::StringBase<char>& text);
+    /// Drops all texts.
     void Empty() noexcept;
     /// Sorts stably by bytes, a shorter text before a longer one that begins with it.
     void Sort();

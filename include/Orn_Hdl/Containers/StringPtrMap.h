@@ -26,9 +26,13 @@ public:
     void Add(std::string_view name, void* pointer);
     /// The pointer of a name, null when the name is absent.
     void* Get(std::string_view name) const noexcept;
+    /// Whether the name is present.
     bool Contains(std::string_view name) const noexcept;
+    /// Takes a name out; an absent one changes nothing.
     void Remove(std::string_view name) noexcept;
+    /// Whether there are no names.
     bool IsEmpty() const noexcept;
+    /// Takes all names out.
     void Empty() noexcept;
     /// The length of the longest name that was ever entered.
     std::size_t GetLongestName() const noexcept;
@@ -47,6 +51,8 @@ template <class T> class IStringPtrMap : public IStringPtrMapBase {
 public:
     static_assert(std::is_pointer<T>::value, "the map holds pointers");
 
+    /// \{
+    /// As the operations of the base; a null name is read as "".
     void Add(const char* name, T pointer) { Add(View(name), pointer); }
     void Add(std::string_view name, T pointer) {
         IStringPtrMapBase::Add(name, ToUntyped(pointer));
@@ -62,6 +68,7 @@ public:
         return IStringPtrMapBase::Contains(View(name));
     }
     void Remove(const char* name) noexcept { IStringPtrMapBase::Remove(View(name)); }
+    /// \}
 
 private:
     static std::string_view View(const char* name) noexcept {

@@ -17,6 +17,7 @@ class ORN_HDL_API StringSetIterator {
 public:
     /// The end position.
     StringSetIterator() noexcept = default;
+    /// A position that a set gives.
     explicit StringSetIterator(const void* position) noexcept : position_(position) {}
 
     /// The name at the position; the empty text at the end.
@@ -64,11 +65,14 @@ public:
     bool IContains(std::string_view name) const noexcept;
     /// Removes this spelling from the case-keeping table, any spelling from the other.
     void Remove(const char* name) noexcept;
+    /// Whether the case-keeping table is empty.
     bool IsEmpty() const noexcept;
     /// Empties the case-keeping table only: `IContains` still knows the old names.
     void Empty() noexcept;
 
+    /// The position of the first name.
     StringSetIterator GetBeginPos() const noexcept;
+    /// The position behind the last name.
     StringSetIterator GetEndPos() const noexcept { return StringSetIterator(); }
 
 private:

@@ -21,6 +21,7 @@ public:
                   const Port::StringBase<char>& reference, bool vhdlComments, OutStream& out);
     NetlistHeader(const NetlistHeader&) = default;
 
+    /// Writes the banner.
     void Write();
 
 private:

@@ -29,9 +29,11 @@ public:
     void NormalizeBusName(Port::StringBase<char>& name) const;
     /// `timescale UNIT / PRECISION, and the line end.
     void WriteTimeScale(const char* unit, const char* precision);
+    /// A comment line with the source file, if any, and the time.
     void WriteTimeStamp(const char* sourceFileName);
     /// The declaration of a port; an empty name writes nothing.
     void WritePortDeclaration(const char* name, const Polarity& polarity);
+    /// wire [RANGE] NAME
     void WriteSignalDeclaration(const char* name);
     /// A reference: of a bus name with its range in brackets, of any other name as it is.
     void WriteSignalName(const char* name);
@@ -49,14 +51,18 @@ public:
     void WriteDefParamInitStatement(Attribute* attribute, const char* instanceName);
     /// The object's comment, every line behind "// ".
     void WriteComment(const Object* object);
+    /// An `include line for each file.
     void WriteIncludePath(const StringArray& fileNames);
 
     /// The attributes whose synthesis option is not "NONE", in the syntax of one synthesis tool.
     void WriteSynplicityAttr(const Iterator<Attribute*>& attributes);
+    /// \{
+    /// As above, for other tools.
     void WriteSynopsysAttr(const Iterator<Attribute*>& attributes);
     void WriteQSNAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
     void WriteExemplarAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
     void WritePrecisionAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
+    /// \}
 
 private:
     friend class VerilogNetlister;
@@ -85,7 +91,10 @@ private:
 /// Writes an attribute's value as a Verilog constant.
 class ORN_HDL_API WriteVerilogAttrValueVisitor : public AttributeVisitor {
 public:
+    /// \param out not owned; it must outlive the visitor.
     explicit WriteVerilogAttrValueVisitor(OutStream& out) noexcept : out_(out) {}
+    /// \{
+    /// Writes it; null writes nothing.
     void VisitAttributeString(AttributeString* attribute) override;
     void VisitAttributeInteger(AttributeInteger* attribute) override;
     void VisitAttributeFloat(AttributeFloat* attribute) override;
@@ -93,6 +102,7 @@ public:
     void VisitAttributeBitVector(AttributeBitVector* attribute) override;
     void VisitAttributeBoolean(AttributeBoolean* attribute) override;
     void VisitAttributeUser(AttributeUser* attribute) override;
+    /// \}
 
 private:
     OutStream& out_;

@@ -30,19 +30,25 @@ public:
     void WriteStdLogicVector(int first, int second);
     /// A reference: of a bus name with its range, of any other name as it is; the line left open.
     void WriteBus(const char* name);
+    /// The clauses for the IEEE packages.
     void WriteIEEELibrary();
     /// \param guard whether the clauses stand between translate_off and translate_on.
     void WriteKestraLibrary(bool guard);
+    /// A library clause for each.
     void WriteUserLibrary(const StringArray& libraries);
+    /// A use clause for each.
     void WriteUseUserLibrary(const StringArray& useClauses);
+    /// A comment line with the source file, if any, and the time.
     void WriteTimeStamp(const char* sourceFileName);
     /// The object's comment, every line behind "-- ".
     void WriteComment(const Object* object);
     /// \param width the column width to which the name is padded.
     void WriteSignalStatement(const char* name, int width);
+    /// The same for a bus.
     void WriteSignalVectorStatement(const char* name, int width);
     /// The declaration of a port, the line left open.
     void WritePortStatement(const char* name, const Polarity& polarity, int width);
+    /// LEFT <= RIGHT
     void WriteSignalAssignment(const char* left, const char* right);
     /// \param singleBit writes a character literal, '0' or '1', whatever the value's base.
     void WriteConstantSignalAssignment(const char* name, bool singleBit,
@@ -59,6 +65,7 @@ public:
     /// `declared` yet, and adds these.
     void WriteAttrDeclaration(const AttributeHolder* holder, StringSet& declared, bool typed,
                               int width);
+    /// attribute NAME of OBJECT : CLASS is VALUE
     void WriteAttrAssignment(Attribute* attribute, const char* objectName, const char* objectClass,
                              bool typed);
     /// The attributes whose synthesis option is not "NONE".
@@ -86,7 +93,10 @@ private:
 /// Writes the VHDL type of an attribute.
 class ORN_HDL_API WriteVhdlAttrTypeVisitor : public AttributeVisitor {
 public:
+    /// \param out not owned; it must outlive the visitor.
     explicit WriteVhdlAttrTypeVisitor(OutStream& out) noexcept : out_(out) {}
+    /// \{
+    /// Writes it; null writes nothing.
     void VisitAttributeString(AttributeString* attribute) override;
     void VisitAttributeInteger(AttributeInteger* attribute) override;
     void VisitAttributeFloat(AttributeFloat* attribute) override;
@@ -94,6 +104,7 @@ public:
     void VisitAttributeBitVector(AttributeBitVector* attribute) override;
     void VisitAttributeBoolean(AttributeBoolean* attribute) override;
     void VisitAttributeUser(AttributeUser* attribute) override;
+    /// \}
 
 private:
     OutStream& out_;
@@ -102,7 +113,10 @@ private:
 /// Writes an attribute's value as a VHDL literal.
 class ORN_HDL_API WriteVhdlAttrValueVisitor : public AttributeVisitor {
 public:
+    /// \param out not owned; it must outlive the visitor.
     explicit WriteVhdlAttrValueVisitor(OutStream& out) noexcept : out_(out) {}
+    /// \{
+    /// Writes it; null writes nothing.
     void VisitAttributeString(AttributeString* attribute) override;
     void VisitAttributeInteger(AttributeInteger* attribute) override;
     void VisitAttributeFloat(AttributeFloat* attribute) override;
@@ -110,6 +124,7 @@ public:
     void VisitAttributeBitVector(AttributeBitVector* attribute) override;
     void VisitAttributeBoolean(AttributeBoolean* attribute) override;
     void VisitAttributeUser(AttributeUser* attribute) override;
+    /// \}
 
 private:
     OutStream& out_;
