@@ -1,0 +1,67 @@
+"""What the tests of the tool share: running it, and folders that vanish behind a test."""
+
+from __future__ import annotations
+
+import os
+import subprocess
+import tempfile
+import unittest
+from dataclasses import dataclass
+from pathlib import Path
+
+TOOL = os.environ.get("ORN_HDL_TOOL", "orn-hdl")
+EXAMPLES = Path(__file__).resolve().parents[2] / "examples"
+
+SUCCESS, FAILED, USAGE, FILE = 0, 1, 2, 3
+
+# A design of one gate, as commands.
+INVERTER = """\
+ADD COMPONENT INV
+ADD PIN INV I input
+ADD PIN INV O output
+ADD PORT A input
+ADD PORT Y output
+ADD INSTANCE INV U1
+CONNECT SIGNAL A U1.I
+CONNECT SIGNAL Y U1.O
+"""
+
+
+@dataclass
+class Outcome:
+    """What a run of the tool ended with and printed."""
+
+    status: int
+    out: str
+    err: str
+
+
+class ToolTest(unittest.TestCase):
+    """A test with a folder of its own, in which the tool runs."""
+
+    def setUp(self) -> None:
+        folder = tempfile.TemporaryDirectory()
+        self.addCleanup(folder.cleanup)
+        self.folder = Path(folder.name)
+
+    def run_tool(self, *arguments: str | Path, stdin: str = "", **environment: str) -> Outcome:
+        """Runs the tool. Texts are Latin-1, so that no byte is lost."""
+        done = subprocess.run([TOOL, *map(str, arguments)], cwd=self.folder,
+                              input=stdin.encode("latin-1"), capture_output=True, timeout=300,
+                              env={**os.environ, "SOURCE_DATE_EPOCH": "0", **environment})
+        return Outcome(done.returncode, done.stdout.decode("latin-1"),
+                       done.stderr.decode("latin-1"))
+
+    def write(self, name: str, text: str) -> Path:
+        path = self.folder / name
+        path.write_bytes(text.encode("latin-1"))
+        return path
+
+    def read(self, name: str) -> str:
+        return (self.folder / name).read_bytes().decode("latin-1")
+
+    def expect(self, outcome: Outcome, status: int, err: str = "", out: str = "") -> None:
+        """Compares all that a run gave; the messages first, they tell most."""
+        self.assertEqual(outcome.err, err)
+        self.assertEqual(outcome.status, status)
+        self.assertEqual(outcome.out, out)

@@ -1,0 +1,305 @@
+"""orn-hdl run: replay, messages, exit statuses, outputs."""
+
+from __future__ import annotations
+
+import os
+import pty
+import subprocess
+import time
+import unittest
+
+from support import EXAMPLES, FAILED, FILE, INVERTER, SUCCESS, TOOL, USAGE, ToolTest
+
+
+class Replay(ToolTest):
+    def test_nothing_is_printed_when_all_goes_well(self) -> None:
+        self.write("d.cmd", INVERTER)
+        self.expect(self.run_tool("run", "d.cmd"), SUCCESS)
+        self.assertEqual(os.listdir(self.folder), ["d.cmd"])
+
+    def test_model_is_named_after_the_file(self) -> None:
+        (self.folder / "sub").mkdir()
+        self.write("sub/my.design.cmd", INVERTER)
+        self.expect(self.run_tool("run", "sub/my.design.cmd", "--verilog", "o.v"), SUCCESS)
+        self.assertIn("module my.design(A", self.read("o.v"))
+
+    def test_file_that_begins_with_a_dot(self) -> None:
+        self.write(".hidden", INVERTER)
+        self.expect(self.run_tool("run", ".hidden", "--verilog", "o.v"), SUCCESS)
+        self.assertIn("module .hidden(A", self.read("o.v"))
+
+    def test_model_option(self) -> None:
+        self.write("d.cmd", INVERTER)
+        self.expect(self.run_tool("run", "d.cmd", "--model", "gate", "--vhdl", "o.vhd"), SUCCESS)
+        self.assertIn("entity gate is", self.read("o.vhd"))
+
+    def test_commands_name_the_netlist_last(self) -> None:
+        self.write("d.cmd", "SET NETLIST NAME final\n" + INVERTER)
+        self.expect(self.run_tool("run", "d.cmd", "--model", "gate", "--verilog", "o.v"), SUCCESS)
+        self.assertIn("module final(A", self.read("o.v"))
+
+    def test_standard_input(self) -> None:
+        self.expect(self.run_tool("run", "-", "--verilog", "o.v", stdin=INVERTER), SUCCESS)
+        self.assertIn("module HDL_NETLIST(A", self.read("o.v"))
+
+    def test_standard_input_is_called_a_dash(self) -> None:
+        self.expect(self.run_tool("run", "-", stdin="NOOP\nADD\n"), FAILED,
+                    "-:2: error: Command not find.\n")
+
+    def test_empty_file(self) -> None:
+        self.write("empty", "")
+        self.expect(self.run_tool("run", "empty", "--verilog", "o.v", "--no-header"), SUCCESS)
+        self.assertIn("module empty();", self.read("o.v"))
+
+    def test_last_line_without_line_end(self) -> None:
+        self.write("d.cmd", "NOOP\nADD")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED, "d.cmd:2: error: Command not find.\n")
+
+    def test_carriage_returns(self) -> None:
+        self.write("dos.cmd", INVERTER.replace("\n", "\r\n"))
+        self.write("unix.cmd", INVERTER)
+        for name in ("dos", "unix"):
+            self.expect(self.run_tool("run", f"{name}.cmd", "--model", "m", "--no-header",
+                                      "--verilog", f"{name}.v"), SUCCESS)
+        self.assertEqual(self.read("dos.v"), self.read("unix.v"))
+
+    def test_a_command_ends_at_its_first_nul(self) -> None:
+        self.write("d.cmd", "ADD SIGNAL a\0b c\nADD SIGNAL a\n")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED,
+                    'd.cmd:2: error: Identifier "a" already defined.\n')
+
+    def test_blank_lines_count(self) -> None:
+        self.write("d.cmd", "\n   \n\r\nADD\n")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED, "d.cmd:4: error: Command not find.\n")
+
+    def test_long_line(self) -> None:
+        name = "x" * 3_000_000
+        self.write("d.cmd", f"ADD SIGNAL {name}\nADD SIGNAL {name}\n")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED,
+                    f'd.cmd:2: error: Identifier "{name}" already defined.\n')
+
+    def test_the_file_is_called_as_given(self) -> None:
+        self.write("d.cmd", "ADD\n")
+        self.expect(self.run_tool("run", "./d.cmd"), FAILED,
+                    "./d.cmd:1: error: Command not find.\n")
+
+    def test_bytes_of_names_are_kept_in_messages(self) -> None:
+        self.write("d.cmd", "CONNECT SIGNAL \xff\x80 \xe9%s.%n\n")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED,
+                    'd.cmd:1: error: Signal "\xe9%s" not found.\n')
+
+
+class Failures(ToolTest):
+    def test_the_first_failure_ends_the_replay(self) -> None:
+        self.write("d.cmd", "NOOP\nADD\nADD\n")
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "o.v"), FAILED,
+                    "d.cmd:2: error: Command not find.\n")
+        self.assertFalse((self.folder / "o.v").exists())
+
+    def test_keep_going_reports_every_failure_and_writes(self) -> None:
+        self.write("d.cmd", "ADD\n" + INVERTER + "SET NETLIST NAME\nADD PIN INV I input\n")
+        self.expect(self.run_tool("run", "--keep-going", "d.cmd", "--verilog", "o.v"), FAILED,
+                    "d.cmd:1: error: Command not find.\n"
+                    "d.cmd:10: error: SET NETLIST NAME: Invalid Arguments.\n"
+                    'd.cmd:11: error: Component "INV" already has pin "I".\n')
+        self.assertIn("INV U1", self.read("o.v"))
+
+    def test_missing_file(self) -> None:
+        self.expect(self.run_tool("run", "none", "--keep-going", "--verilog", "o.v"), FILE,
+                    "orn-hdl: cannot read none: No such file or directory\n")
+        self.assertEqual(os.listdir(self.folder), [])
+
+    def test_folder_for_a_file(self) -> None:
+        self.expect(self.run_tool("run", "."), FILE, "orn-hdl: cannot read .: Is a directory\n")
+
+    def test_unreadable_file(self) -> None:
+        # What cannot be read although it can be opened; root may read anything else.
+        self.expect(self.run_tool("run", "/proc/self/mem"), FILE,
+                    "orn-hdl: cannot read /proc/self/mem: Input/output error\n")
+
+
+class Outputs(ToolTest):
+    def setUp(self) -> None:
+        super().setUp()
+        self.write("d.cmd", INVERTER)
+
+    def test_both_languages(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "o.v", "--vhdl", "o.vhd"), SUCCESS)
+        self.assertTrue(self.read("o.v").startswith("////"))
+        self.assertIn("Design Name: d", self.read("o.v"))
+        self.assertIn("Filename : o.v", self.read("o.v"))
+        self.assertTrue(self.read("o.vhd").startswith("----"))
+
+    def test_no_header(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "o.v", "--vhdl", "o.vhd",
+                                  "--no-header"), SUCCESS)
+        self.assertTrue(self.read("o.v").startswith("`timescale 1ns / 1ps\n"))
+        self.assertTrue(self.read("o.vhd").lstrip("\n").startswith("library ieee;"))
+
+    def test_no_header_is_no_matter_of_write_lines(self) -> None:
+        self.write("w.cmd", INVERTER + "WRITE VERILOG a.v\nWRITE VERILOG -NOHEADER b.v\n")
+        self.expect(self.run_tool("run", "w.cmd", "--no-header"), SUCCESS)
+        self.assertTrue(self.read("a.v").startswith("////"))
+        self.assertTrue(self.read("b.v").startswith("`timescale"))
+
+    def test_write_lines_go_to_the_current_folder(self) -> None:
+        (self.folder / "sub").mkdir()
+        self.write("sub/w.cmd", INVERTER + "WRITE VHDL o.vhd\n")
+        self.expect(self.run_tool("run", "sub/w.cmd"), SUCCESS)
+        self.assertTrue((self.folder / "o.vhd").exists())
+
+    def test_same_bytes_as_a_write_line(self) -> None:
+        self.write("w.cmd", INVERTER + "WRITE VERILOG -NOHEADER a.v\n")
+        self.expect(self.run_tool("run", "w.cmd", "--verilog", "b.v", "--no-header"), SUCCESS)
+        self.assertEqual(self.read("a.v"), self.read("b.v"))
+
+    def test_output_that_cannot_be_opened(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "no/o.v", "--vhdl", "o.vhd"), FILE,
+                    "orn-hdl: cannot write no/o.v: No such file or directory\n")
+        self.assertIn("entity d is", self.read("o.vhd"))
+
+    def test_folder_for_an_output(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--vhdl", "."), FILE,
+                    "orn-hdl: cannot write .: Is a directory\n")
+
+    def test_full_device(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "/dev/full"), FILE,
+                    "orn-hdl: cannot write /dev/full: No space left on device\n")
+
+    def test_write_line_that_cannot_be_opened(self) -> None:
+        self.write("w.cmd", "NOOP\nWRITE VERILOG no/o.v\nADD\n")
+        self.expect(self.run_tool("run", "w.cmd", "--vhdl", "o.vhd"), FILE,
+                    "w.cmd:2: error: cannot write no/o.v: No such file or directory\n")
+        self.assertFalse((self.folder / "o.vhd").exists())
+
+    def test_write_line_to_a_full_device(self) -> None:
+        self.write("w.cmd", INVERTER + "WRITE VHDL -APPEND /dev/full\n")
+        self.expect(self.run_tool("run", "w.cmd"), FILE,
+                    "w.cmd:9: error: cannot write /dev/full: No space left on device\n")
+
+    def test_a_write_failure_is_told_once_and_outweighs_a_failed_command(self) -> None:
+        self.write("w.cmd", "WRITE VERILOG /dev/full\nNOOP\nADD\nWRITE VERILOG fine.v\n")
+        self.expect(self.run_tool("run", "w.cmd", "--keep-going"), FILE,
+                    "w.cmd:1: error: cannot write /dev/full: No space left on device\n"
+                    "w.cmd:3: error: Command not find.\n")
+        self.assertTrue((self.folder / "fine.v").exists())
+
+    def test_standard_output_as_a_file(self) -> None:
+        outcome = self.run_tool("run", "d.cmd", "--verilog", "/dev/stdout", "--no-header")
+        self.assertEqual(outcome.status, SUCCESS)
+        self.assertIn("module d(A", outcome.out)
+
+
+class Usage(ToolTest):
+    def expect_usage(self, message: str, *arguments: str) -> None:
+        self.expect(self.run_tool(*arguments), USAGE, f"orn-hdl: {message}; --help tells more\n")
+
+    def test_usage_errors(self) -> None:
+        self.expect_usage("A subcommand is required")
+        self.expect_usage("FILE is required", "run")
+        self.expect_usage("The following argument was not expected: b", "run", "a", "b")
+        self.expect_usage("The following argument was not expected: --nothing", "run", "a",
+                          "--nothing")
+        self.expect(self.run_tool("replay", "x"), USAGE,
+                    "orn-hdl: there is no command replay; --help lists them\n")
+        self.expect_usage("--verilog: a file name is needed", "run", "a", "--verilog", "")
+        self.expect_usage("FILE: a file name is needed", "run", "")
+        self.expect_usage("--verilog: 1 required FILE missing", "run", "a", "--verilog")
+
+    def test_a_usage_error_does_nothing(self) -> None:
+        self.write("w.cmd", "WRITE VERILOG o.v\n")
+        self.assertEqual(self.run_tool("run", "w.cmd", "--nothing").status, USAGE)
+        self.assertFalse((self.folder / "o.v").exists())
+
+    def test_help(self) -> None:
+        for arguments in (["--help"], ["-h"], ["run", "--help"], ["import", "--help"],
+                          ["draw", "--help"], ["commands", "--help"]):
+            outcome = self.run_tool(*arguments)
+            self.assertEqual((outcome.status, outcome.err), (SUCCESS, ""))
+            self.assertIn("Usage: orn-hdl", outcome.out)
+
+    def test_version(self) -> None:
+        outcome = self.run_tool("--version")
+        self.assertEqual((outcome.status, outcome.err), (SUCCESS, ""))
+        self.assertRegex(outcome.out, r"^orn-hdl \d+\.\d+\.\d+\n$")
+
+    def test_standard_output_that_is_full(self) -> None:
+        for arguments in (["--version"], ["--help"], ["commands"]):
+            with open("/dev/full", "w", encoding="ascii") as full:
+                done = subprocess.run([TOOL, *arguments], stdout=full, stderr=subprocess.PIPE,
+                                      check=False)
+            self.assertEqual(done.returncode, FILE)
+            self.assertEqual(done.stderr, b"orn-hdl: cannot write standard output: "
+                                          b"No space left on device\n")
+
+
+class ProgressDisplay(ToolTest):
+    """The progress line needs a terminal and a replay of more than a second: a pipe that waits."""
+
+    def replay_slowly(self, *options: str) -> tuple[str, int]:
+        """What a slow replay shows on a terminal, and its exit status."""
+        terminal, standard_error = pty.openpty()
+        process = subprocess.Popen([TOOL, "run", "-", *options], stdin=subprocess.PIPE,
+                                   stderr=standard_error, cwd=self.folder)
+        os.close(standard_error)
+        assert process.stdin is not None
+        with process.stdin as commands:
+            commands.write(b"NOOP\n")
+            commands.flush()
+            time.sleep(1.2)
+            commands.write(b"NOOP\n" * 100_000 + b"ADD\n")
+        status = process.wait(timeout=60)
+        shown = b""
+        try:
+            while piece := os.read(terminal, 65536):
+                shown += piece
+        except OSError:  # the other side is closed
+            pass
+        os.close(terminal)
+        return shown.decode(), status
+
+    def test_shown_and_erased(self) -> None:
+        shown, status = self.replay_slowly()
+        self.assertEqual(status, FAILED)
+        self.assertRegex(shown, r"^orn-hdl: \d+ lines")
+        self.assertTrue(shown.endswith("\r\033[K-:100002: error: Command not find.\r\n"), shown)
+
+    def test_not_shown_when_quiet(self) -> None:
+        shown, status = self.replay_slowly("--quiet")
+        self.assertEqual(status, FAILED)
+        self.assertEqual(shown, "-:100002: error: Command not find.\r\n")
+
+
+class Examples(ToolTest):
+    def test_worked_example(self) -> None:
+        self.expect(self.run_tool("run", EXAMPLES / "and2" / "and2.cmd", "--no-header",
+                                  "--verilog", "o.v"), SUCCESS)
+        self.assertEqual(self.read("o.v"), """\
+`timescale 1ns / 1ps
+
+module top(A,\x20
+           Y);
+
+    input [1:0] A;
+   output Y;
+
+   wire n1;
+
+   AND2 U1 (.I0(A[0]),\x20
+            .I1(n1),\x20
+            .O(Y));
+   // synthesis attribute LOC of U1 is "P1"
+endmodule
+""")
+
+    def test_all_examples_replay(self) -> None:
+        for commands in sorted(EXAMPLES.glob("*/*.cmd")):
+            if commands.parent.name == "embed":  # uses commands of its own
+                continue
+            with self.subTest(commands.name):
+                self.expect(self.run_tool("run", commands, "--verilog", "o.v", "--vhdl", "o.vhd"),
+                            SUCCESS)
+
+
+if __name__ == "__main__":
+    unittest.main()

@@ -1,0 +1,138 @@
+#include "Draw.h"
+
+#include "DrawGraph.h"
+#include "Progress.h"
+#include "Run.h"
+
+#include "Orn_Hdl/Orn_Hdl.h"
+#include "Port/File.h"
+
+#include <array>
+#include <cerrno>
+#include <cstdio>
+#include <memory>
+#include <spawn.h>
+#include <string_view>
+#include <sys/wait.h>
+#include <unistd.h>
+
+extern char** environ;
+
+namespace Tool {
+
+namespace {
+
+/// Graphviz takes minutes for more.
+constexpr std::size_t MostBoxes = 3000;
+
+/// Stands for a write command that writes nothing: to draw a design is to read its file.
+class NoWriteCommand final : public Orn_Hdl::Command {
+public:
+    using Command::Command;
+    bool Parse(const Orn_Hdl::StringArray&) override { return true; }
+    void Execute() override {}
+    const char* GetName() const override { return "WRITE"; }
+
+    static Command* Create(Orn_Hdl::Model* model, const Orn_Hdl::StringArray&) {
+        return new NoWriteCommand(model);
+    }
+};
+
+using CFile = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
+
+/// A file of no name that holds a text, to be read from its start.
+CFile MakeTemporaryFile(std::string_view text) {
+    CFile file(std::tmpfile(), &std::fclose);
+    if (file != nullptr && (std::fwrite(text.data(), 1, text.size(), file.get()) != text.size() ||
+                            std::fflush(file.get()) != 0 ||
+                            lseek(fileno(file.get()), 0, SEEK_SET) != 0)) {
+        file.reset();
+    }
+    return file;
+}
+
+/// Starts dot. \return the system's error number.
+int StartDot(int input, int output, pid_t& process) {
+    posix_spawn_file_actions_t actions;
+    posix_spawn_file_actions_init(&actions);
+    posix_spawn_file_actions_adddup2(&actions, input, STDIN_FILENO);
+    posix_spawn_file_actions_adddup2(&actions, output, STDOUT_FILENO);
+    std::string name("dot");
+    std::string format("-Tsvg");
+    std::array<char*, 3> arguments = {name.data(), format.data(), nullptr};
+    const int error =
+        posix_spawnp(&process, name.c_str(), &actions, nullptr, arguments.data(), environ);
+    posix_spawn_file_actions_destroy(&actions);
+    return error;
+}
+
+/// Lets Graphviz turn the text of a graph into a picture.
+Status RunDot(std::string_view graph, std::string& picture) {
+    const CFile input = MakeTemporaryFile(graph);
+    const CFile output = MakeTemporaryFile("");
+    if (input == nullptr || output == nullptr) {
+        return ComplainUnwritable("a temporary file", errno);
+    }
+    pid_t process = 0;
+    const int error = StartDot(fileno(input.get()), fileno(output.get()), process);
+    if (error != 0) {
+        Complain("cannot run dot: " + std::string(Port::ErrorText(error).GetView()) +
+                 "; install Graphviz");
+        return Status::File;
+    }
+    int result = 0;
+    while (waitpid(process, &result, 0) < 0 && errno == EINTR) {
+    }
+    if (result != 0) {
+        Complain("dot could not draw the design");
+        return Status::File;
+    }
+    std::rewind(output.get());
+    std::array<char, 65536> piece;
+    for (std::size_t count = piece.size(); count == piece.size();) {
+        count = std::fread(piece.data(), 1, piece.size(), output.get());
+        picture.append(piece.data(), count);
+    }
+    return Status::Success;
+}
+
+Status WritePicture(const std::string& name, std::string_view picture) {
+    Port::File file;
+    bool written = file.open(name.c_str(), Port::File::Overwrite, true) &&
+                   file.write(picture.data(), picture.size());
+    written = file.close() && written;
+    return written ? Status::Success : ComplainUnwritable(name, file.GetError());
+}
+
+Status DrawNetlist(const Orn_Hdl::Netlist& netlist, const DrawOptions& options) {
+    Graph graph(netlist);
+    if (!options.around.empty() && !graph.KeepAround(options.around, options.depth)) {
+        Complain("there is no instance and no signal " + options.around);
+        return Status::Usage;
+    }
+    if (graph.CountBoxes() > MostBoxes) {
+        Complain(std::to_string(graph.CountBoxes()) + " instances are too many for a picture, " +
+                 std::to_string(MostBoxes) +
+                 " the most; choose a smaller part with --around and --depth");
+        return Status::Usage;
+    }
+    std::string picture;
+    const Status drawn = RunDot(graph.Write(), picture);
+    return drawn == Status::Success ? WritePicture(options.output, picture) : drawn;
+}
+
+} // namespace
+
+Status Draw(const DrawOptions& options) {
+    Orn_Hdl::Engine engine;
+    engine.CreateAndAddModel("", options.file.c_str());
+    Orn_Hdl::Model& model = *engine.GetModel("");
+    for (const char* phrase : {"WRITE VERILOG", "WRITE VHDL"}) {
+        model.GetCommandFactory()->AddCommandCreator(phrase, &NoWriteCommand::Create);
+    }
+    Progress progress(true, options.file);
+    const Replayed replayed = Replay(model, options.file, false, progress);
+    return replayed.complete ? DrawNetlist(*model.GetNetlist(), options) : replayed.status;
+}
+
+} // namespace Tool

@@ -1,0 +1,118 @@
+#include "Import.h"
+
+#include "ImportContext.h"
+#include "ImportNetlist.h"
+#include "ImportReader.h"
+#include "ImportSink.h"
+
+#include "Orn_Hdl/Engine.h"
+#include "Orn_Hdl/Model.h"
+#include "Port/File.h"
+#include "Progress.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <filesystem>
+#include <optional>
+#include <system_error>
+
+namespace Tool {
+
+namespace {
+
+using namespace Import;
+
+/// Room behind the text that the reader fills up; with it the text is never copied.
+constexpr std::size_t Margin = 4096;
+
+Status ReadFile(const std::string& name, std::string& text) {
+    Port::File file;
+    if (!file.open(SystemFileName(name.c_str()), Port::File::Read, true)) {
+        return ComplainUnreadable(name, file.GetError());
+    }
+    constexpr std::size_t piece = std::size_t(1) << 20;
+    std::error_code unknown;
+    const std::uintmax_t expected = std::filesystem::file_size(name, unknown);
+    text.reserve((unknown ? 0 : expected) + piece + Margin);
+    std::size_t size = 0;
+    std::size_t count = 0;
+    do {
+        text.resize(size + piece);
+        count = file.read(text.data() + size, piece);
+        size += count;
+    } while (count > 0);
+    text.resize(size);
+    return file.GetError() == 0 ? Status::Success : ComplainUnreadable(name, file.GetError());
+}
+
+std::optional<Bit> GetUnknownAs(const ImportOptions& options) {
+    if (options.unknownAs.empty()) {
+        return std::nullopt;
+    }
+    return options.unknownAs == "1" ? One : Zero;
+}
+
+/// Writes a text file through `write`, unless its name is empty.
+template <class Write> Status WriteFile(const std::string& name, Write write) {
+    if (name.empty()) {
+        return Status::Success;
+    }
+    Port::File file;
+    bool written = file.open(name.c_str(), Port::File::Overwrite, true);
+    if (written) {
+        Port::Stream stream(file);
+        write(stream);
+        written = stream.flush();
+        written = file.close() && written;
+    }
+    return written ? Status::Success : ComplainUnwritable(name, file.GetError());
+}
+
+Status WriteNetlists(const Netlist& netlist, const ImportOptions& options) {
+    if (options.outputs.verilog.empty() && options.outputs.vhdl.empty()) {
+        return Status::Success;
+    }
+    Orn_Hdl::Engine engine;
+    engine.CreateAndAddModel(netlist.GetName().c_str(), options.file.c_str());
+    Orn_Hdl::Model& model = *engine.GetModel(netlist.GetName().c_str());
+    ModelSink sink(model);
+    netlist.Emit(sink);
+    Progress progress(false, options.file);
+    return WriteOutputs(model, options.outputs, progress);
+}
+
+Status WriteAll(const Netlist& netlist, const ImportOptions& options) {
+    const Status commands = WriteFile(options.commandFile, [&](Port::Stream& out) {
+        CommandSink sink(out);
+        netlist.Emit(sink);
+    });
+    const Status nameMap =
+        WriteFile(options.nameMap, [&](Port::Stream& out) { netlist.WriteNameMap(out); });
+    return Worse(Worse(commands, nameMap), WriteNetlists(netlist, options));
+}
+
+} // namespace
+
+Status ImportDesign(const ImportOptions& options) {
+    std::string text;
+    const Status read = ReadFile(options.file, text);
+    if (read != Status::Success) {
+        return read;
+    }
+    try {
+        const std::unique_ptr<Design> design = ReadDesign(std::move(text), options.attributes);
+        Module& top = FindTop(*design, options.top);
+        Context context(top, GetUnknownAs(options));
+        const Netlist netlist(*design, top, context);
+        const Status written = WriteAll(netlist, options);
+        for (const std::string& warning : context.GetWarnings()) {
+            PrintError(options.file + ": warning: " + warning);
+        }
+        return written;
+    } catch (const Import::Error& error) {
+        PrintError(options.file + ": error: " + error.what());
+        return Status::Failed;
+    }
+}
+
+} // namespace Tool

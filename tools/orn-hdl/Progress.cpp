@@ -1,0 +1,72 @@
+#include "Progress.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <filesystem>
+#include <system_error>
+#include <unistd.h>
+
+namespace Tool {
+
+namespace {
+
+constexpr std::chrono::milliseconds Patience(1000);
+constexpr std::chrono::milliseconds Refresh(100);
+
+/// 0 when it is not known, as that of a pipe.
+std::uint64_t GetFileSize(const std::string& file) noexcept {
+    std::error_code error;
+    const std::uintmax_t size = std::filesystem::file_size(file, error);
+    return error ? 0 : size;
+}
+
+} // namespace
+
+Progress::Progress(bool quiet, const std::string& file)
+    : enabled_(!quiet && isatty(STDERR_FILENO) == 1),
+      totalBytes_(enabled_ ? GetFileSize(file) : 0), next_(Clock::now() + Patience) {}
+
+void Progress::Update(std::uint64_t lines, std::uint64_t bytes) {
+    if (!IsDue()) {
+        return;
+    }
+    std::string text = std::to_string(lines) + " lines";
+    if (totalBytes_ > 0) {
+        text += ", " + std::to_string(std::min<std::uint64_t>(bytes * 100 / totalBytes_, 100)) + " %";
+    }
+    Show(text);
+}
+
+void Progress::Writing(std::string_view file) {
+    if (IsDue()) {
+        Show(std::string("writing ").append(file));
+    }
+}
+
+bool Progress::IsDue() {
+    if (!enabled_) {
+        return false;
+    }
+    const Clock::time_point now = Clock::now();
+    if (now < next_) {
+        return false;
+    }
+    next_ = now + Refresh;
+    return true;
+}
+
+void Progress::Show(const std::string& text) {
+    Erase();
+    std::fprintf(stderr, "orn-hdl: %s", text.c_str());
+    std::fflush(stderr);
+    shown_ = true;
+}
+
+void Progress::Erase() {
+    if (shown_) {
+        std::fputs("\r\033[K", stderr);
+        shown_ = false;
+    }
+}
+
+} // namespace Tool

@@ -1,0 +1,124 @@
+#include "Run.h"
+
+#include "Orn_Hdl/Orn_Hdl.h"
+#include "Port/File.h"
+#include "Progress.h"
+
+#include <cstdint>
+#include <string_view>
+
+namespace Tool {
+
+namespace {
+
+/// How many lines are replayed between two looks at the clock.
+constexpr std::uint64_t LinesPerUpdate = 4096;
+
+/// What the model is called when the commands come from standard input and name nothing.
+constexpr const char* NamelessModel = "HDL_NETLIST";
+
+/// The replay of one file: what is told of its lines, and what became of them.
+class Replayer {
+public:
+    Replayer(Orn_Hdl::Model& model, const std::string& file, Progress& progress)
+        : model_(model), file_(file), progress_(progress) {}
+
+    /// Carries out one line. \return whether all went well.
+    bool ExecuteLine(std::string_view line) {
+        ++lines_;
+        bytes_ += line.size() + 1;
+        if (lines_ % LinesPerUpdate == 0) {
+            progress_.Update(lines_, bytes_);
+        }
+        try {
+            model_.ExecuteLine(line);
+        } catch (const Orn_Hdl::Exception& exception) {
+            Report(WithoutLineEnd(exception.getLocalized().GetView()));
+            status_ = Worse(status_, Status::Failed);
+            return false;
+        }
+        return model_.GetWriteError() == 0 || ReportWriteError();
+    }
+
+    Status GetStatus() const noexcept { return status_; }
+
+private:
+    static std::string_view WithoutLineEnd(std::string_view text) noexcept {
+        if (!text.empty() && text.back() == '\n') {
+            text.remove_suffix(1);
+        }
+        return text;
+    }
+
+    void Report(std::string_view text) {
+        progress_.Erase();
+        std::string message(file_);
+        message.append(":").append(std::to_string(lines_)).append(": error: ").append(text);
+        PrintError(message);
+    }
+
+    bool ReportWriteError() {
+        std::string text("cannot write ");
+        text.append(model_.GetWrittenFileName().GetView()).append(": ");
+        text.append(Port::ErrorText(model_.GetWriteError()).GetView());
+        Report(text);
+        status_ = Status::File;
+        // Told once: the model remembers its last write until the next one.
+        model_.RecordWrite("", 0);
+        return false;
+    }
+
+    Orn_Hdl::Model& model_;
+    const std::string& file_;
+    Progress& progress_;
+    std::uint64_t lines_ = 0;
+    std::uint64_t bytes_ = 0;
+    Status status_ = Status::Success;
+};
+
+std::string GetModelName(const RunOptions& options) {
+    if (options.model) {
+        return *options.model;
+    }
+    if (options.file == "-") {
+        return NamelessModel;
+    }
+    return std::string(Port::FileName(options.file.c_str()).GetStem().GetView());
+}
+
+} // namespace
+
+Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
+                Progress& progress) {
+    Port::File input;
+    if (!input.open(SystemFileName(file.c_str()), Port::File::Read, true)) {
+        return {ComplainUnreadable(file, input.GetError()), false};
+    }
+    Replayer replayer(model, file, progress);
+    std::string_view line;
+    while (input.NextLine(line)) {
+        if (!replayer.ExecuteLine(line) && !keepGoing) {
+            return {replayer.GetStatus(), false};
+        }
+    }
+    if (input.GetError() != 0) {
+        progress.Erase();
+        return {ComplainUnreadable(file, input.GetError()), false};
+    }
+    return {replayer.GetStatus(), true};
+}
+
+Status Run(const RunOptions& options) {
+    Progress progress(options.quiet, options.file);
+    Orn_Hdl::Engine engine;
+    const std::string name = GetModelName(options);
+    engine.CreateAndAddModel(name.c_str(), options.file.c_str());
+    Orn_Hdl::Model& model = *engine.GetModel(name.c_str());
+    const Replayed replayed = Replay(model, options.file, options.keepGoing, progress);
+    if (!replayed.complete) {
+        return replayed.status;
+    }
+    return Worse(replayed.status, WriteOutputs(model, options.outputs, progress));
+}
+
+} // namespace Tool

@@ -1,0 +1,43 @@
+// `orn-hdl run`: replays a command file and writes the netlists asked for.
+#pragma once
+
+#include "Output.h"
+#include "Tool.h"
+
+#include <optional>
+#include <string>
+
+namespace Orn_Hdl {
+class Model;
+}
+
+namespace Tool {
+
+class Progress;
+
+struct RunOptions {
+    /// The command file; "-" is standard input.
+    std::string file;
+    /// The name of the model; without one, the file's name without folder and extension.
+    std::optional<std::string> model;
+    Outputs outputs;
+    /// Go on behind a line that failed.
+    bool keepGoing = false;
+    bool quiet = false;
+};
+
+Status Run(const RunOptions& options);
+
+/// What became of a replay.
+struct Replayed {
+    Status status = Status::Success;
+    /// Whether the replay reached the end of the file.
+    bool complete = false;
+};
+
+/// Replays a command file into a model. Every line that fails, and every netlist that a line could
+/// not write, is reported with its place; unless told to keep going, the replay ends there.
+Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
+                Progress& progress);
+
+} // namespace Tool

@@ -1,0 +1,168 @@
+// The orn-hdl tool: reads the command line and hands over to the command that it names.
+
+#include "CommandsPage.h"
+#include "Draw.h"
+#include "Import.h"
+#include "Run.h"
+#include "Tool.h"
+
+#include "Port/Version.h"
+
+#include <CLI/CLI.hpp>
+
+#include <exception>
+#include <functional>
+#include <new>
+#include <sstream>
+#include <string>
+#include <vector>
+
+namespace {
+
+using Tool::Status;
+
+/// Refuses the empty text, which is no file's name.
+std::string CheckFileName(const std::string& name) {
+    return name.empty() ? "a file name is needed" : "";
+}
+
+std::string CheckDigit(const std::string& text) {
+    return text == "0" || text == "1" ? "" : "0 or 1 is needed";
+}
+
+CLI::Option* AddFile(CLI::App& command, const std::string& option, std::string& name,
+                     const std::string& help) {
+    return command.add_option(option, name, help)
+        ->type_name(option == "FILE" ? "" : "FILE")
+        ->check(CheckFileName);
+}
+
+void AddOutputs(CLI::App& command, Tool::Outputs& outputs) {
+    AddFile(command, "--verilog", outputs.verilog, "Write the design as Verilog");
+    AddFile(command, "--vhdl", outputs.vhdl, "Write the design as VHDL");
+    command.add_flag("--no-header", outputs.noHeader, "Write these netlists without the header");
+}
+
+/// The command line: its options, and what to do when they have been read.
+class CommandLine {
+public:
+    CommandLine() {
+        app_.require_subcommand(1);
+        app_.set_version_flag("--version",
+                              "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
+                              "Print the version and leave");
+        AddRun();
+        AddImport();
+        AddDraw();
+        AddCommands();
+    }
+
+    Status Execute(int argc, const char* const* argv) {
+        if (argc > 1 && *argv[1] != '-' && !HasCommand(argv[1])) {
+            Tool::Complain(std::string("there is no command ") + argv[1] + "; --help lists them");
+            return Status::Usage;
+        }
+        try {
+            app_.parse(argc, argv);
+        } catch (const CLI::ParseError& error) {
+            std::ostringstream help;
+            std::ostringstream complaint;
+            if (app_.exit(error, help, complaint) == 0) {
+                return Tool::Print(help.str());
+            }
+            Tool::Complain(std::string(error.what()) + "; --help tells more");
+            return Status::Usage;
+        }
+        return action_();
+    }
+
+private:
+    CLI::App& AddCommand(const std::string& name, const std::string& help,
+                         std::function<Status()> action) {
+        CLI::App& command = *app_.add_subcommand(name, help);
+        command.callback([this, action = std::move(action)] { action_ = action; });
+        return command;
+    }
+
+    bool HasCommand(const std::string& name) {
+        const auto isNamed = [&](CLI::App* command) { return command->get_name() == name; };
+        return !app_.get_subcommands(isNamed).empty();
+    }
+
+    void AddRun() {
+        CLI::App& command = AddCommand("run", "Replay a command file and write netlists",
+                                       [this] { return Tool::Run(run_); });
+        AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
+        command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
+        AddOutputs(command, run_.outputs);
+        command.add_flag("--keep-going", run_.keepGoing, "Go on behind a line that failed");
+        command.add_flag("--quiet", run_.quiet, "Show no progress");
+    }
+
+    void AddImport() {
+        CLI::App& command = AddCommand("import", "Import a JSON netlist written by Yosys",
+                                       [this] { return Tool::ImportDesign(import_); });
+        AddFile(command, "FILE", import_.file, "The JSON file; - is standard input")->required();
+        command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
+        AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
+        AddOutputs(command, import_.outputs);
+        command.add_option("--x-as", import_.unknownAs, "What the values x and z become")
+            ->type_name("0|1")
+            ->check(CheckDigit);
+        command.add_flag("--attributes", import_.attributes,
+                         "Take over the attributes of cells and nets");
+        AddFile(command, "--name-map", import_.nameMap, "Write a table of the old and new names");
+        command.footer("Without an output the file is only checked.");
+    }
+
+    void AddDraw() {
+        CLI::App& command = AddCommand("draw", "Draw the design of a command file",
+                                       [this] { return Tool::Draw(draw_); });
+        AddFile(command, "FILE", draw_.file, "The command file; - is standard input")->required();
+        AddFile(command, "-o", draw_.output, "The SVG file to write")->required();
+        CLI::Option* around =
+            command.add_option("--around", draw_.around,
+                               "Draw only what lies around an instance or signal")
+                ->type_name("NAME");
+        command.add_option("--depth", draw_.depth, "How many instances away")
+            ->type_name("N")
+            ->check(CLI::Range(0, 1000))
+            ->needs(around);
+    }
+
+    void AddCommands() {
+        CLI::App& command = AddCommand("commands", "Print the command language", [this] {
+            return markdown_ ? Tool::PrintCommandsPage() : Tool::PrintCommands(words_);
+        });
+        CLI::Option* words =
+            command.add_option("WORDS", words_, "Only commands that begin with these words");
+        command.add_flag("--markdown", markdown_, "Print the page of the documentation")
+            ->excludes(words);
+    }
+
+    CLI::App app_{"Builds designs from text commands and writes them as Verilog and VHDL netlists.",
+                  "orn-hdl"};
+    std::function<Status()> action_;
+    Tool::RunOptions run_;
+    Tool::ImportOptions import_;
+    Tool::DrawOptions draw_;
+    std::vector<std::string> words_;
+    bool markdown_ = false;
+};
+
+Status Main(int argc, const char* const* argv) {
+    try {
+        return CommandLine().Execute(argc, argv);
+    } catch (const std::bad_alloc&) {
+        Tool::Complain("out of memory");
+    } catch (const std::exception& error) {
+        Tool::Complain(error.what());
+    }
+    return Status::Failed;
+}
+
+} // namespace
+
+int main(int argc, char** argv) {
+    return static_cast<int>(Main(argc, argv));
+}
