@@ -1,0 +1,420 @@
+#include "Orn_Hdl/Containers/PtrArray.h"
+
+#include <gtest/gtest.h>
+#include <rapidcheck/gtest.h>
+
+#include <algorithm>
+#include <climits>
+#include <memory>
+#include <type_traits>
+#include <utility>
+#include <vector>
+
+namespace {
+
+using Orn_Hdl::Iterator;
+using Orn_Hdl::OwnPtrArray;
+using Orn_Hdl::PtrArray;
+
+using Array = PtrArray<int*>;
+
+template <class T> std::vector<T> ElementsOf(const PtrArray<T>& array) {
+    std::vector<T> elements;
+    for (int i = 0; i < array.GetSize(); ++i) {
+        elements.push_back(array.GetAt(i));
+    }
+    return elements;
+}
+
+TEST(PtrArray, StartsEmpty) {
+    const Array array;
+    EXPECT_EQ(array.GetSize(), 0);
+    EXPECT_TRUE(array.IsEmpty());
+    EXPECT_EQ(array.GetTail(), nullptr);
+    EXPECT_EQ(array.GetAt(0), nullptr);
+    EXPECT_EQ(array.GetAt(-1), nullptr);
+    EXPECT_EQ(array.GetIndex(nullptr), -1);
+}
+
+TEST(PtrArray, AddGivesTheIndex) {
+    int a = 0;
+    int b = 0;
+    Array array;
+    EXPECT_EQ(array.Add(&a), 0);
+    EXPECT_EQ(array.Add(&b), 1);
+    EXPECT_EQ(array.Add(&a), 2);
+    EXPECT_EQ(array.Add(nullptr), 3);
+    EXPECT_EQ(array.GetTail(), nullptr);
+    EXPECT_EQ(array.GetIndex(&a), 0);
+    EXPECT_EQ(array.GetIndex(&b), 1);
+    EXPECT_EQ(array.GetIndex(nullptr), 3);
+    EXPECT_TRUE(array.Contains(&b));
+    EXPECT_FALSE(array.IsEmpty());
+}
+
+TEST(PtrArray, ReadsOutOfRangeGiveNull) {
+    int a = 0;
+    Array array;
+    array.Add(&a);
+    for (const int i : {-1, INT_MIN, 1, 2, INT_MAX}) {
+        EXPECT_EQ(array.GetAt(i), nullptr) << i;
+    }
+}
+
+TEST(PtrArray, SetAtPastTheEndFillsWithNulls) {
+    int a = 0;
+    Array array;
+    array.SetAt(3, &a);
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{nullptr, nullptr, nullptr, &a}));
+    array.SetAt(1, &a);
+    array.SetAt(4, &a);
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{nullptr, &a, nullptr, &a, &a}));
+    array.SetAt(-1, &a);
+    array.SetAt(INT_MIN, &a);
+    EXPECT_EQ(array.GetSize(), 5);
+}
+
+TEST(PtrArray, SetAtFillsWithNullsWhatElementsHeldBefore) {
+    int a = 0;
+    Array array;
+    for (int i = 0; i < 8; ++i) {
+        array.Add(&a);
+    }
+    array.Empty();
+    array.SetAt(5, &a);
+    for (int i = 0; i < 5; ++i) {
+        EXPECT_EQ(array.GetAt(i), nullptr) << i;
+    }
+}
+
+TEST(PtrArray, RemoveTakesTheFirstOccurrenceOnly) {
+    int a = 0;
+    int b = 0;
+    int c = 0;
+    Array array;
+    for (int* p : {&b, &a, &c, &a}) {
+        array.Add(p);
+    }
+    EXPECT_TRUE(array.Remove(&a));
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&b, &c, &a}));
+    EXPECT_TRUE(array.Remove(&a));
+    EXPECT_FALSE(array.Remove(&a));
+    EXPECT_FALSE(array.Remove(nullptr));
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&b, &c}));
+}
+
+TEST(PtrArray, RemovesByIndex) {
+    int a = 0;
+    int b = 0;
+    Array array;
+    array.Add(&a);
+    array.Add(&b);
+    array.RemoveAt(-1);
+    array.RemoveAt(2);
+    EXPECT_EQ(array.GetSize(), 2);
+    array.RemoveAt(0);
+    EXPECT_EQ(ElementsOf(array), std::vector<int*>{&b});
+    array.RemoveAt(0);
+    EXPECT_TRUE(array.IsEmpty());
+}
+
+TEST(PtrArray, RemoveTailOfAnEmptyArrayIsHarmless) {
+    int a = 0;
+    Array array;
+    array.RemoveTail();
+    array.Add(&a);
+    array.RemoveTail();
+    array.RemoveTail();
+    EXPECT_EQ(array.GetSize(), 0);
+}
+
+TEST(PtrArray, SwapOutOfRangeOrWithItselfChangesNothing) {
+    int a = 0;
+    int b = 0;
+    Array array;
+    array.Add(&a);
+    array.Add(&b);
+    for (const auto& [i, j] : std::vector<std::pair<int, int>>{
+             {0, 0}, {1, 1}, {0, 2}, {2, 0}, {-1, 1}, {1, -1}, {5, 6}, {INT_MIN, INT_MAX}}) {
+        array.Swap(i, j);
+        EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&a, &b})) << i << " and " << j;
+    }
+    array.Swap(0, 1);
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&b, &a}));
+    Array empty;
+    empty.Swap(0, 0);
+    EXPECT_TRUE(empty.IsEmpty());
+}
+
+TEST(PtrArray, CopiesHoldTheSamePointers) {
+    int a = 0;
+    int b = 0;
+    Array array;
+    array.Add(&a);
+    Array copy(array);
+    copy.Add(&b);
+    EXPECT_EQ(ElementsOf(array), std::vector<int*>{&a});
+    array = copy;
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&a, &b}));
+    Array& same = array;
+    array = same;
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&a, &b}));
+    array = Array();
+    EXPECT_TRUE(array.IsEmpty());
+    EXPECT_EQ(ElementsOf(copy), (std::vector<int*>{&a, &b}));
+}
+
+bool IsLess(int* a, int* b, void* context) {
+    ++*static_cast<int*>(context);
+    return *a / 10 < *b / 10;
+}
+
+RC_GTEST_PROP(PtrArray, SortsStablyWithTheCallersOrder, ()) {
+    auto values =
+        *rc::gen::scale(5.0, rc::gen::container<std::vector<int>>(rc::gen::inRange(0, 100)));
+    Array array;
+    std::vector<int*> expected;
+    for (int& value : values) {
+        array.Add(&value);
+        expected.push_back(&value);
+    }
+    std::stable_sort(expected.begin(), expected.end(),
+                     [](int* a, int* b) { return *a / 10 < *b / 10; });
+    int calls = 0;
+    array.Sort(&IsLess, &calls);
+    RC_ASSERT(ElementsOf(array) == expected);
+    RC_ASSERT(values.size() < 2 || calls > 0);
+}
+
+RC_GTEST_PROP(PtrArray, BehavesAsAVector, (std::vector<std::pair<int, int>> calls)) {
+    std::vector<int> values(8);
+    Array array;
+    std::vector<int*> expected;
+    for (const auto& [call, raw] : calls) {
+        const int index = raw % 12;
+        int* p = &values[static_cast<unsigned>(raw) % 8];
+        switch (static_cast<unsigned>(call) % 7) {
+        case 0:
+        case 1:
+            array.Add(p);
+            expected.push_back(p);
+            break;
+        case 2:
+            array.SetAt(index, p);
+            if (index >= 0) {
+                const auto slot = static_cast<std::size_t>(index);
+                expected.resize(std::max(expected.size(), slot + 1));
+                expected[slot] = p;
+            }
+            break;
+        case 3: {
+            const auto found = std::find(expected.begin(), expected.end(), p);
+            RC_ASSERT(array.Remove(p) == (found != expected.end()));
+            if (found != expected.end()) {
+                expected.erase(found);
+            }
+            break;
+        }
+        case 4:
+            array.RemoveTail();
+            if (!expected.empty()) {
+                expected.pop_back();
+            }
+            break;
+        case 5: {
+            Array copy(array);
+            array.Empty();
+            RC_ASSERT(array.IsEmpty());
+            array = copy;
+            break;
+        }
+        default:
+            array.Reserve(index);
+            break;
+        }
+        RC_ASSERT(ElementsOf(array) == expected);
+    }
+}
+
+/// Writes its number on a list when it ends.
+class Mortal {
+public:
+    Mortal(int number, std::vector<int>& ended) : number_(number), ended_(ended) {}
+    Mortal(const Mortal&) = delete;
+    Mortal& operator=(const Mortal&) = delete;
+    virtual ~Mortal() { ended_.push_back(number_); }
+
+private:
+    int number_;
+    std::vector<int>& ended_;
+};
+
+class Heir : public Mortal {
+public:
+    using Mortal::Mortal;
+
+private:
+    std::vector<int> memory_ = std::vector<int>(100);
+};
+
+using Owner = OwnPtrArray<Mortal*>;
+
+TEST(OwnPtrArray, DeletesItsElementsLastFirst) {
+    std::vector<int> ended;
+    {
+        Owner owner;
+        for (int i = 1; i <= 4; ++i) {
+            owner.Add(new Heir(i, ended));
+        }
+    }
+    EXPECT_EQ(ended, (std::vector<int>{4, 3, 2, 1}));
+}
+
+TEST(OwnPtrArray, SkipsNullsWhenItDeletes) {
+    std::vector<int> ended;
+    {
+        Owner owner;
+        owner.SetAt(3, new Heir(1, ended));
+        EXPECT_EQ(owner.GetSize(), 4);
+        EXPECT_EQ(owner.GetAt(0), nullptr);
+        owner.Add(nullptr);
+        owner.Add(nullptr);
+    }
+    EXPECT_EQ(ended, std::vector<int>{1});
+}
+
+TEST(OwnPtrArray, OnlyItsDestructorDeletes) {
+    std::vector<int> ended;
+    const auto a = std::make_unique<Heir>(1, ended);
+    const auto b = std::make_unique<Heir>(2, ended);
+    const auto c = std::make_unique<Heir>(3, ended);
+    const auto d = std::make_unique<Heir>(4, ended);
+    {
+        Owner owner;
+        for (Mortal* mortal : {a.get(), b.get(), c.get(), d.get()}) {
+            owner.Add(mortal);
+        }
+        EXPECT_TRUE(owner.Remove(b.get()));
+        owner.RemoveTail();
+        owner.SetAt(0, nullptr);
+        owner.RemoveAt(1);
+        owner.Add(d.get());
+        owner.Empty();
+    }
+    EXPECT_TRUE(ended.empty());
+}
+
+TEST(OwnPtrArray, IgnoresAPointerThatItHolds) {
+    std::vector<int> ended;
+    {
+        Owner owner;
+        Mortal* first = new Heir(1, ended);
+        Mortal* second = new Heir(2, ended);
+        EXPECT_EQ(owner.Add(first), 0);
+        EXPECT_EQ(owner.Add(second), 1);
+        EXPECT_EQ(owner.Add(first), 0);
+        owner.SetAt(1, second);
+        owner.SetAt(1, first);
+        owner.SetAt(7, first);
+        EXPECT_EQ(owner.GetIndex(first), 0);
+        EXPECT_EQ(owner.GetAt(1), second);
+    }
+    EXPECT_EQ(ended.size(), 2u);
+}
+
+TEST(OwnPtrArray, DeletesAllOnRequest) {
+    std::vector<int> ended;
+    Owner owner;
+    owner.Add(new Heir(1, ended));
+    owner.Add(nullptr);
+    owner.Add(new Heir(2, ended));
+    owner.DeleteAll();
+    EXPECT_EQ(ended, (std::vector<int>{2, 1}));
+    EXPECT_TRUE(owner.IsEmpty());
+    owner.Add(new Heir(3, ended));
+    EXPECT_EQ(owner.GetSize(), 1);
+}
+
+TEST(OwnPtrArray, CannotBeCopied) {
+    EXPECT_FALSE(std::is_copy_constructible_v<Owner>);
+    EXPECT_FALSE(std::is_copy_assignable_v<Owner>);
+    EXPECT_TRUE(std::is_copy_constructible_v<Array>);
+}
+
+TEST(Iterator, OverNoArrayYieldsNothing) {
+    for (Iterator<int*> iterator : {Iterator<int*>(), Iterator<int*>(nullptr)}) {
+        EXPECT_TRUE(iterator.IsAtEnd());
+        EXPECT_EQ(iterator.GetCurrent(), nullptr);
+        iterator.Next();
+        EXPECT_TRUE(iterator.IsAtEnd());
+        for ([[maybe_unused]] int* element : iterator) {
+            ADD_FAILURE() << "it yields something";
+        }
+    }
+}
+
+TEST(Iterator, YieldsStoredNullsLikeAnyElement) {
+    int a = 0;
+    Array array;
+    array.SetAt(2, &a);
+    array.Add(nullptr);
+    std::vector<int*> seen;
+    for (int* element : Iterator<int*>(&array)) {
+        seen.push_back(element);
+    }
+    EXPECT_EQ(seen, (std::vector<int*>{nullptr, nullptr, &a, nullptr}));
+    seen.clear();
+    for (Iterator<int*> at(&array); !at.IsAtEnd(); at.Next()) {
+        seen.push_back(at.GetCurrent());
+    }
+    EXPECT_EQ(seen, (std::vector<int*>{nullptr, nullptr, &a, nullptr}));
+}
+
+TEST(Iterator, ReadsTheSizeAfreshAtEachStep) {
+    int a = 0;
+    Array array;
+    array.Add(&a);
+    int steps = 0;
+    for ([[maybe_unused]] int* element : Iterator<int*>(&array)) {
+        if (++steps < 1000) {
+            array.Add(&a);
+        }
+    }
+    EXPECT_EQ(steps, 1000);
+
+    Iterator<int*> at(&array);
+    at.Next();
+    array.Empty();
+    EXPECT_TRUE(at.IsAtEnd());
+    EXPECT_EQ(at.GetCurrent(), nullptr);
+    at.Next();
+    array.Add(&a);
+    array.Add(&a);
+    EXPECT_FALSE(at.IsAtEnd());
+    EXPECT_EQ(at.GetCurrent(), &a);
+}
+
+TEST(Iterator, CopiesGoOnFromWhereTheyAre) {
+    int a = 0;
+    int b = 0;
+    Array array;
+    array.Add(&a);
+    array.Add(&b);
+    Iterator<int*> at(&array);
+    at.Next();
+    Iterator<int*> copy(at);
+    EXPECT_EQ(copy.GetCurrent(), &b);
+    at.Next();
+    EXPECT_FALSE(copy.IsAtEnd());
+    copy = Iterator<int*>(&array);
+    EXPECT_EQ(copy.GetCurrent(), &a);
+    std::vector<int*> rest;
+    copy.Next();
+    for (int* element : copy) {
+        rest.push_back(element);
+    }
+    EXPECT_EQ(rest, std::vector<int*>{&b});
+    EXPECT_EQ(copy.GetCurrent(), &b) << "a loop over it does not move it";
+}
+
+} // namespace

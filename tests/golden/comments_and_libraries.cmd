@@ -1,0 +1,30 @@
+SET NETLIST NAME comments_and_libraries
+ADD COMPONENT INV
+ADD PIN INV I Input
+ADD PIN INV O Output
+ADD PORT A Input
+ADD PORT Y Output
+ADD SIGNAL n1
+ADD INSTANCE INV U1
+ADD INSTANCE INV U2
+CONNECT SIGNAL A U1.I
+CONNECT SIGNAL n1 U1.O
+CONNECT SIGNAL n1 U2.I
+CONNECT SIGNAL Y U2.O
+ADD NOTES Two inverters,  one after the other.
+ADD MODULE COMMENT "  Written   by hand. This line is a comment and stays in one piece although it is long."
+ADD SIGNAL COMMENT A the input
+ADD SIGNAL COMMENT n1 between the two
+ADD SIGNAL COMMENT n1 and its second line
+ADD COMPONENT COMMENT INV an inverter
+ADD INSTANCE COMMENT U1 the first
+ADD COMPONENT PIN COMMENT INV.I never written
+ADD INSTANCE PIN COMMENT U1.I never written
+ADD INCLUDE '"defines.vh"'
+ADD INCLUDE defines.vh
+USE DEFAULT LIBRARY false
+ADD LIBRARY ieee
+ADD LIBRARY KESTRA
+ADD USE LIBRARY ieee.std_logic_1164.ALL
+ADD USE LIBRARY KESTRA.Vcomponents.ALL
+SUPPRESS CONFIGURATION

@@ -1,0 +1,1 @@
+// Definitions that a netlist may include; this one defines nothing.
