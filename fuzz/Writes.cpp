@@ -1,0 +1,175 @@
+#include "Writes.h"
+
+#include "Check.h"
+#include "Consistency.h"
+#include "MemoryFiles.h"
+#include "Orn_Hdl/Streams.h"
+#include "Orn_Hdl/Writers.h"
+#include "Port/Ascii.h"
+
+#include <cstddef>
+#include <string_view>
+
+namespace Fuzz {
+
+namespace {
+
+using namespace Orn_Hdl;
+
+enum class Language { Verilog, Vhdl };
+
+void Write(Netlist& netlist, const HdlOptions& options, Language language, OutStream& out) {
+    if (language == Language::Verilog) {
+        VerilogNetlister(out).WriteNetlist(&netlist, options);
+    } else {
+        VhdlNetlister(out).WriteNetlist(&netlist, &options);
+    }
+}
+
+std::string WriteIntoMemory(Netlist& netlist, const HdlOptions& options, Language language) {
+    TextMemOutStream out;
+    Write(netlist, options, language, out);
+    return std::string(out.GetValue().GetView());
+}
+
+std::string WriteIntoFile(Netlist& netlist, const HdlOptions& options, Language language) {
+    MemoryFiles files;
+    TextFileOutStream out("netlist", TextFileOutStream::Replace);
+    Write(netlist, options, language, out);
+    out.Close();
+    Check(out.GetError() == 0 && !files.HasOpenFiles() && files.GetFiles().size() == 1,
+          "a written file is closed and leaves no other behind");
+    return files.GetFiles().begin()->second;
+}
+
+/// Whether an object has this name, or one that spans lines: declarations are then hard to count.
+bool HasConfusingName(const Netlist& netlist, std::string_view keyword) {
+    const auto isConfusing = [keyword](const Object* object) {
+        const std::string_view name = object->GetNameView();
+        return name.find('\n') != std::string_view::npos ||
+               Port::EqualIgnoringCase(name.substr(0, name.find(' ')), keyword);
+    };
+    for (const Signal* signal : netlist.GetSignalIterator()) {
+        if (isConfusing(signal)) {
+            return true;
+        }
+    }
+    for (const Instance* instance : netlist.GetInstanceIterator()) {
+        if (isConfusing(instance)) {
+            return true;
+        }
+    }
+    for (const Component* component : netlist.GetComponentIterator()) {
+        if (isConfusing(component)) {
+            return true;
+        }
+        for (const Pin* pin : component->GetPinIterator()) {
+            if (isConfusing(pin)) {
+                return true;
+            }
+        }
+    }
+    return isConfusing(&netlist);
+}
+
+std::size_t CountLinesThatBegin(std::string_view text, std::string_view beginning) {
+    std::size_t count = 0;
+    while (!text.empty()) {
+        count += text.substr(0, beginning.size()) == beginning ? 1 : 0;
+        const std::size_t end = text.find('\n');
+        text.remove_prefix(end == std::string_view::npos ? text.size() : end + 1);
+    }
+    return count;
+}
+
+void CheckDeclarations(const Netlist& netlist, Language language, const std::string& text) {
+    const std::string keyword = language == Language::Verilog ? "wire" : "signal";
+    if (HasConfusingName(netlist, keyword)) {
+        return;
+    }
+    std::size_t expected = 0;
+    for (const Signal* signal : netlist.GetSignalIterator()) {
+        const std::string_view name = signal->GetNameView();
+        const bool isWritable =
+            !name.empty() && (language == Language::Verilog || !Port::EqualIgnoringCase(name, "open"));
+        expected += isWritable && signal->IsNeededToDeclared() && !signal->IsPort() ? 1 : 0;
+    }
+    Check(CountLinesThatBegin(text, keyword + " ") == expected, "every signal is declared once");
+}
+
+/// The next run of blanks and line ends, or the next character.
+std::string_view NextPiece(std::string_view text) {
+    const std::size_t end = text.find_first_not_of(" \n");
+    const std::size_t blanks = end == std::string_view::npos ? text.size() : end;
+    return text.substr(0, blanks == 0 ? 1 : blanks);
+}
+
+bool IsWhite(std::string_view piece) {
+    return !piece.empty() && (piece[0] == ' ' || piece[0] == '\n');
+}
+
+std::size_t Count(std::string_view text, char c) {
+    std::size_t count = 0;
+    for (const char each : text) {
+        count += each == c ? 1 : 0;
+    }
+    return count;
+}
+
+} // namespace
+
+void CheckSameButForBreaks(const std::string& fileText, const std::string& memoryText) {
+    std::string_view file(fileText);
+    std::string_view memory(memoryText);
+    bool atLineStart = true;
+    while (!file.empty() || !memory.empty()) {
+        const std::string_view inFile = NextPiece(file);
+        const std::string_view inMemory = NextPiece(memory);
+        const std::string_view whiteFile = IsWhite(inFile) ? inFile : std::string_view();
+        const std::string_view whiteMemory = IsWhite(inMemory) ? inMemory : std::string_view();
+        if (whiteFile.empty() && whiteMemory.empty()) {
+            Check(inFile == inMemory, "a file and memory get the same text");
+            file.remove_prefix(1);
+            memory.remove_prefix(1);
+            atLineStart = false;
+            continue;
+        }
+        // A break and indentation add to the blanks; nothing takes any away.
+        const bool mayAdd = atLineStart || whiteFile.find('\n') != std::string_view::npos;
+        Check(mayAdd || whiteFile == whiteMemory, "within a line no blanks are added");
+        // The last line of a file is ended for it.
+        const bool isLast = whiteMemory.size() == memory.size();
+        Check(Count(whiteFile, ' ') >= Count(whiteMemory, ' ') || isLast, "no blank is lost");
+        Check(Count(whiteFile, '\n') >= Count(whiteMemory, '\n'), "no line end is lost");
+        file.remove_prefix(whiteFile.size());
+        memory.remove_prefix(whiteMemory.size());
+        atLineStart = false;
+    }
+}
+
+std::string WriteAgainAndAgain(Netlist& netlist, const HdlOptions& options,
+                               const std::vector<Signal*>& loose) {
+    HdlOptions bare = options;
+    // The banner holds the file's name, which a memory stream does not have.
+    bare.writeHeader = false;
+    std::string all;
+    std::string former;
+    for (int time = 0; time < 3; ++time) {
+        std::string both;
+        for (const Language language : {Language::Verilog, Language::Vhdl}) {
+            const std::string text = WriteIntoMemory(netlist, bare, language);
+            CheckNetlist(netlist, loose);
+            CheckDeclarations(netlist, language, text);
+            both += text;
+            all += text;
+            if (time == 2) {
+                CheckSameButForBreaks(WriteIntoFile(netlist, bare, language), text);
+            }
+        }
+        Check(time < 2 || both == former, "the third write says what the second said");
+        former = both;
+    }
+    return all;
+}
+
+} // namespace Fuzz

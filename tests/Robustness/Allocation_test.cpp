@@ -1,0 +1,181 @@
+// Whichever allocation of a whole run fails: what comes out is std::bad_alloc or a message, nothing
+// leaks, and the engine can be used on and ends.
+#include "Robustness/MidSizedDesign.h"
+#include "Support/EngineScript.h"
+#include "Support/TemporaryFolder.h"
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <cerrno>
+#include <cstdlib>
+#include <new>
+#include <string>
+#include <sys/mman.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#define ORN_HDL_SANITIZED 1
+#endif
+
+namespace {
+
+/// How many allocations succeed before one fails; below zero none fails (any more).
+std::atomic<long> allowed{-1};
+/// Blocks taken and not given back yet.
+std::atomic<long> alive{0};
+
+/// Whether the allocation in hand is the one that fails. There is only one.
+bool Fails() noexcept {
+    return allowed.load() >= 0 && allowed.fetch_sub(1) == 0;
+}
+
+void* Allocate(std::size_t size, std::size_t alignment) {
+    if (Fails()) {
+        throw std::bad_alloc();
+    }
+    const std::size_t rounded = (size + alignment - 1) / alignment * alignment;
+    void* const memory = std::aligned_alloc(alignment, rounded == 0 ? alignment : rounded);
+    if (memory == nullptr) {
+        throw std::bad_alloc();
+    }
+    ++alive;
+    return memory;
+}
+
+void Release(void* memory) noexcept {
+    if (memory != nullptr) {
+        --alive;
+        std::free(memory);
+    }
+}
+
+constexpr std::size_t Usual = alignof(std::max_align_t);
+
+} // namespace
+
+void* operator new(std::size_t size) {
+    return Allocate(size, Usual);
+}
+void* operator new[](std::size_t size) {
+    return Allocate(size, Usual);
+}
+void* operator new(std::size_t size, std::align_val_t alignment) {
+    return Allocate(size, static_cast<std::size_t>(alignment));
+}
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    try {
+        return Allocate(size, Usual);
+    } catch (const std::bad_alloc&) {
+        return nullptr;
+    }
+}
+void operator delete(void* memory) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, const std::nothrow_t&) noexcept {
+    Release(memory);
+}
+void operator delete[](void* memory) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, std::size_t) noexcept {
+    Release(memory);
+}
+void operator delete[](void* memory, std::size_t) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, std::align_val_t) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, std::size_t, std::align_val_t) noexcept {
+    Release(memory);
+}
+
+#if !defined(ORN_HDL_SANITIZED)
+// The library's other two ways to memory; the sanitizers keep these for themselves.
+extern "C" void* __libc_realloc(void* memory, std::size_t size);
+
+extern "C" void* realloc(void* memory, std::size_t size) noexcept {
+    if (Fails()) {
+        errno = ENOMEM;
+        return nullptr;
+    }
+    return __libc_realloc(memory, size);
+}
+
+extern "C" void* mmap(void* address, std::size_t size, int protection, int flags, int file,
+                      off_t offset) noexcept {
+    if (Fails()) {
+        errno = ENOMEM;
+        return MAP_FAILED;
+    }
+    return reinterpret_cast<void*>(
+        syscall(SYS_mmap, address, size, protection, flags, file, offset));
+}
+#endif
+
+namespace {
+
+const std::vector<std::string> Lines = Support::SplitLines(Robustness::MidSizedDesign());
+
+/// Carries out what it can of the design, and writes it in both languages.
+void BuildAndWrite(Orn_Hdl::Model& model, const std::string& file) {
+    std::vector<std::string> lines = Lines;
+    lines.push_back("WRITE VERILOG " + file);
+    lines.push_back("WRITE VHDL " + file);
+    for (const std::string& line : lines) {
+        try {
+            model.ExecuteLine(line);
+        } catch (const Orn_Hdl::Exception&) {
+            // What failed before may be missed now.
+        }
+    }
+}
+
+/// Builds and writes the design in an engine of its own, and once more when an allocation fails.
+/// \return whether one failed.
+bool RunOnce(const std::string& file, long allocations) {
+    allowed = allocations;
+    bool failed = false;
+    try {
+        Orn_Hdl::Engine engine;
+        engine.CreateAndAddModel("top", "");
+        Orn_Hdl::Model& model = *engine.GetModel("top");
+        try {
+            BuildAndWrite(model, file);
+        } catch (const std::bad_alloc&) {
+            failed = true;
+            BuildAndWrite(model, file);
+        }
+    } catch (const std::bad_alloc&) {
+        failed = true;
+    }
+    allowed = -1;
+    return failed;
+}
+
+TEST(Allocation, AnyOneMayFail) {
+    const Support::TemporaryFolder folder;
+    const std::string file = folder / "netlist";
+    // The tables that the process keeps are filled first.
+    ASSERT_FALSE(RunOnce(file, -1));
+    ASSERT_FALSE(RunOnce(file, -1));
+    const int openFiles = Support::CountOpenFiles();
+    long count = 0;
+    for (bool failed = true; failed; ++count) {
+        const long before = alive;
+        failed = RunOnce(file, count);
+        ASSERT_EQ(alive, before) << "allocation " << count << " failed, and something leaked";
+        ASSERT_TRUE(!std::filesystem::is_empty(folder.GetPath()));
+    }
+    EXPECT_GT(count, 200) << "the run makes some allocations";
+    EXPECT_EQ(Support::CountOpenFiles(), openFiles);
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.GetPath()),
+                            std::filesystem::directory_iterator()),
+              1)
+        << "no temporary file stays behind";
+}
+
+} // namespace

@@ -1,0 +1,251 @@
+// A written netlist takes the place of a file as a whole, or not at all.
+#include "Orn_Hdl/Streams.h"
+#include "Support/EngineScript.h"
+#include "Support/TemporaryFolder.h"
+
+#include <gtest/gtest.h>
+
+#include <cerrno>
+#include <cstdlib>
+#include <fcntl.h>
+#include <filesystem>
+#include <stdexcept>
+#include <string>
+#include <sys/stat.h>
+#include <thread>
+#include <unistd.h>
+
+namespace {
+
+using Orn_Hdl::OutStream;
+using Orn_Hdl::TextFileOutStream;
+using Support::ReadWholeFile;
+using Support::WriteWholeFile;
+namespace fs = std::filesystem;
+
+class Replacing : public testing::Test {
+protected:
+    std::string Path(const char* name) const { return folder_ / name; }
+
+    int CountFiles() const {
+        int count = 0;
+        for ([[maybe_unused]] const auto& entry : fs::directory_iterator(folder_.GetPath())) {
+            ++count;
+        }
+        return count;
+    }
+
+    /// Writes "new" to replace a file. \return the error that the stream tells.
+    static int Replace(const std::string& name) {
+        TextFileOutStream out(name.c_str(), TextFileOutStream::Replace);
+        out << "new" << OutStream::NewLine;
+        out.Close();
+        return out.GetError();
+    }
+
+    Support::TemporaryFolder folder_;
+};
+
+TEST_F(Replacing, TheFormerFileStandsUntilTheStreamIsClosed) {
+    WriteWholeFile(Path("file"), "former");
+    TextFileOutStream out(Path("file").c_str(), TextFileOutStream::Replace);
+    ASSERT_TRUE(out.IsOpen());
+    out << std::string(1000000, 'x').c_str() << OutStream::Flush;
+    EXPECT_EQ(ReadWholeFile(Path("file")), "former");
+    out.Close();
+    EXPECT_EQ(out.GetError(), 0);
+    EXPECT_EQ(ReadWholeFile(Path("file")).size(), 1000000u + 8);
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, AStreamThatEndsWithoutCloseChangesNothing) {
+    WriteWholeFile(Path("file"), "former");
+    try {
+        TextFileOutStream out(Path("file").c_str(), TextFileOutStream::Replace);
+        out << "half";
+        throw std::runtime_error("in the middle");
+    } catch (const std::runtime_error&) {
+    }
+    EXPECT_EQ(ReadWholeFile(Path("file")), "former");
+    { TextFileOutStream out(Path("fresh").c_str(), TextFileOutStream::Replace); }
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, OpeningAnotherFileClosesTheFirst) {
+    TextFileOutStream out(Path("first").c_str(), TextFileOutStream::Replace);
+    out << "one";
+    ASSERT_TRUE(out.Open(Path("second").c_str(), false));
+    out << "two";
+    out.Close();
+    EXPECT_EQ(ReadWholeFile(Path("first")), "one\n");
+    EXPECT_EQ(ReadWholeFile(Path("second")), "two\n");
+    EXPECT_EQ(out.GetFileName(), Path("first").c_str());
+}
+
+TEST_F(Replacing, MakesAFileThatIsMissingWithTheUsersPermissions) {
+    const mode_t mask = umask(027);
+    EXPECT_EQ(Replace(Path("file")), 0);
+    umask(mask);
+    EXPECT_EQ(ReadWholeFile(Path("file")), "new\n");
+    EXPECT_EQ(fs::status(Path("file")).permissions(), fs::perms(0640));
+}
+
+TEST_F(Replacing, KeepsThePermissionBits) {
+    for (const unsigned bits : {0600U, 0644U, 0666U, 0755U}) {
+        WriteWholeFile(Path("file"), "former");
+        fs::permissions(Path("file"), fs::perms(bits));
+        EXPECT_EQ(Replace(Path("file")), 0);
+        EXPECT_EQ(fs::status(Path("file")).permissions(), fs::perms(bits));
+    }
+}
+
+TEST_F(Replacing, ASymbolicLinkStaysOne) {
+    fs::create_directory(Path("sub"));
+    WriteWholeFile(Path("sub/file"), "former");
+    fs::create_symlink("sub/link", Path("outer"));
+    fs::create_symlink("file", Path("sub/link"));
+    EXPECT_EQ(Replace(Path("outer")), 0);
+    EXPECT_TRUE(fs::is_symlink(Path("outer")));
+    EXPECT_TRUE(fs::is_symlink(Path("sub/link")));
+    EXPECT_EQ(ReadWholeFile(Path("sub/file")), "new\n");
+    fs::create_symlink(Path("sub/fresh"), Path("dangling"));
+    EXPECT_EQ(Replace(Path("dangling")), 0);
+    EXPECT_TRUE(fs::is_symlink(Path("dangling")));
+    EXPECT_EQ(ReadWholeFile(Path("sub/fresh")), "new\n");
+}
+
+TEST_F(Replacing, ARingOfLinksCannotBeWritten) {
+    fs::create_symlink(Path("b"), Path("a"));
+    fs::create_symlink(Path("a"), Path("b"));
+    EXPECT_EQ(Replace(Path("a")), ELOOP);
+    EXPECT_EQ(CountFiles(), 2);
+}
+
+TEST_F(Replacing, AFolderCannotBeReplaced) {
+    EXPECT_EQ(Replace(folder_.GetPath()), EISDIR);
+    EXPECT_EQ(Replace(Path("missing/file")), ENOENT);
+    EXPECT_EQ(Replace(""), ENOENT);
+    WriteWholeFile(Path("file"), "former");
+    EXPECT_EQ(Replace(Path("file/file")), ENOTDIR);
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, AFolderThatVanishesIsTold) {
+    fs::create_directory(Path("sub"));
+    TextFileOutStream out(Path("sub/file").c_str(), TextFileOutStream::Replace);
+    ASSERT_TRUE(out.IsOpen());
+    fs::remove_all(Path("sub"));
+    out << "text";
+    out.Close();
+    EXPECT_EQ(out.GetError(), ENOENT);
+}
+
+TEST_F(Replacing, AFolderThatComesInBetweenIsTold) {
+    TextFileOutStream out(Path("file").c_str(), TextFileOutStream::Replace);
+    fs::create_directory(Path("file"));
+    out << "text";
+    out.Close();
+    EXPECT_EQ(out.GetError(), EISDIR);
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, NamesMayBeAsLongAsTheSystemAllows) {
+    const std::string longest(255, 'n');
+    EXPECT_EQ(Replace(Path(longest.c_str())), 0);
+    EXPECT_EQ(Replace(Path(longest.c_str())), 0);
+    EXPECT_EQ(Replace(Path((longest + "n").c_str())), ENAMETOOLONG);
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, DevicesAreWrittenDirectly) {
+    EXPECT_EQ(Replace("/dev/null"), 0);
+    EXPECT_TRUE(fs::is_character_file("/dev/null"));
+    EXPECT_EQ(Replace("/dev/full"), ENOSPC);
+    fs::create_symlink("/dev/full", Path("link"));
+    EXPECT_EQ(Replace(Path("link")), ENOSPC);
+    EXPECT_TRUE(fs::is_character_file("/dev/full"));
+}
+
+TEST_F(Replacing, APipeIsWrittenDirectly) {
+    ASSERT_EQ(mkfifo(Path("pipe").c_str(), 0600), 0);
+    std::string received;
+    std::thread reader([&] { received = ReadWholeFile(Path("pipe")); });
+    EXPECT_EQ(Replace(Path("pipe")), 0);
+    reader.join();
+    EXPECT_EQ(received, "new\n");
+    EXPECT_TRUE(fs::is_fifo(Path("pipe")));
+}
+
+TEST_F(Replacing, AnOpenFileOfTheProcessIsWrittenDirectly) {
+    // As /dev/stdout is, when the output of the process goes into a file.
+    const int descriptor = open(Path("file").c_str(), O_RDWR | O_CREAT | O_CLOEXEC, 0600);
+    ASSERT_GE(descriptor, 0);
+    EXPECT_EQ(Replace("/dev/fd/" + std::to_string(descriptor)), 0);
+    char text[8] = {};
+    EXPECT_EQ(read(descriptor, text, sizeof text), 4) << "it is the same file still";
+    EXPECT_STREQ(text, "new\n");
+    close(descriptor);
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+/// While it lives, a process of the superuser, who may write anything, is one of a plain user.
+class PlainUser {
+public:
+    explicit PlainUser(const std::string& folder) : isSuperuser_(geteuid() == 0) {
+        if (isSuperuser_ && (chown(folder.c_str(), Nobody, Nobody) != 0 || seteuid(Nobody) != 0)) {
+            throw std::runtime_error("cannot become a plain user");
+        }
+    }
+    PlainUser(const PlainUser&) = delete;
+    PlainUser& operator=(const PlainUser&) = delete;
+    ~PlainUser() {
+        if (isSuperuser_ && seteuid(0) != 0) {
+            std::abort();
+        }
+    }
+
+private:
+    static constexpr unsigned Nobody = 65534;
+
+    bool isSuperuser_;
+};
+
+TEST_F(Replacing, WhatMayNotBeWrittenIsNotReplaced) {
+    const PlainUser user(folder_.GetPath());
+    WriteWholeFile(Path("file"), "former");
+    fs::permissions(Path("file"), fs::perms(0444));
+    EXPECT_EQ(Replace(Path("file")), EACCES);
+    fs::permissions(Path("file"), fs::perms(0644));
+    fs::permissions(folder_.GetPath(), fs::perms(0555));
+    EXPECT_EQ(Replace(Path("file")), EACCES) << "the folder takes no temporary file";
+    EXPECT_EQ(Replace(Path("fresh")), EACCES);
+    fs::permissions(folder_.GetPath(), fs::perms(0755));
+    EXPECT_EQ(ReadWholeFile(Path("file")), "former");
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, LeavesNoFileOpen) {
+    const int before = Support::CountOpenFiles();
+    Replace(Path("file"));
+    Replace(Path("file"));
+    Replace(folder_.GetPath());
+    Replace("/dev/full");
+    EXPECT_EQ(Support::CountOpenFiles(), before);
+}
+
+TEST_F(Replacing, TheWriteCommandsReplace) {
+    Support::EngineScript script;
+    WriteWholeFile(Path("file"), "former");
+    fs::permissions(Path("file"), fs::perms(0600));
+    for (const char* language : {"VERILOG", "VHDL"}) {
+        script.Run(std::string("WRITE ") + language + " -NOHEADER " + Path("file"));
+        const std::string text = ReadWholeFile(Path("file"));
+        EXPECT_EQ(text.find("former"), std::string::npos);
+        script.Run(std::string("WRITE ") + language + " -APPEND -NOHEADER " + Path("file"));
+        EXPECT_EQ(ReadWholeFile(Path("file")), text + text);
+        EXPECT_EQ(fs::status(Path("file")).permissions(), fs::perms(0600));
+    }
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+} // namespace

@@ -1,0 +1,152 @@
+// Large inputs: done or refused, in memory and time that grow with the input and no faster. Times are
+// not asserted; a step that took quadratic time would not end within the test's limit.
+#include "Support/EngineScript.h"
+#include "Support/TemporaryFolder.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <fstream>
+#include <string>
+
+namespace {
+
+using Support::EngineScript;
+
+std::size_t CountOf(const std::string& text, const std::string& piece) {
+    std::size_t count = 0;
+    for (std::size_t at = text.find(piece); at != std::string::npos;
+         at = text.find(piece, at + piece.size())) {
+        ++count;
+    }
+    return count;
+}
+
+template <class T> int Length(const Orn_Hdl::Iterator<T*>& list) {
+    int count = 0;
+    for ([[maybe_unused]] const T* element : list) {
+        ++count;
+    }
+    return count;
+}
+
+TEST(Sizes, ALineOfAHundredMegabytes) {
+    constexpr std::size_t Size = 100'000'000;
+    EngineScript script;
+    std::string line = "ADD NOTES ";
+    line.resize(Size, 'x');
+    EXPECT_EQ(script.GetFailure(line), "");
+    EXPECT_EQ(script.GetNetlist().GetCommentView().size(), Size - 10 + 1);
+    line.assign(Size, 'x');
+    EXPECT_EQ(script.GetFailure(line), "Command not find.\n");
+    line.assign(Size, ' ');
+    EXPECT_EQ(script.GetFailure(line), "");
+}
+
+TEST(Sizes, ALineOfTenMillionWords) {
+    EngineScript script;
+    std::string line = "ADD NOTES";
+    for (int i = 0; i < 10'000'000; ++i) {
+        line += " x";
+    }
+    EXPECT_EQ(script.GetFailure(line), "");
+    EXPECT_EQ(script.GetNetlist().GetCommentView().size(), 20'000'000u);
+}
+
+TEST(Sizes, ANameOfAMegabyte) {
+    const std::string name(1'000'000, 'n');
+    EngineScript script;
+    script.Run("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U\nADD SIGNAL " + name +
+               "\nADD SIGNAL " + name + "_bus(7:0)\nCONNECT SIGNAL " + name +
+               " U.I\nCONNECT SIGNAL " + name + "_bus(3) " + name + "x");
+    EXPECT_EQ(CountOf(script.Verilog(), name), 6u);
+    EXPECT_EQ(CountOf(script.Vhdl(), name), 6u);
+    const std::string digits(1'000'000, '9');
+    script.Run("ADD SIGNAL wide(" + digits + ":0)");
+    EXPECT_EQ(script.GetModel().GetSignal(("wide(" + digits + ":0)").c_str())->GetWidth(),
+              2147483647);
+}
+
+TEST(Sizes, ACompoundOfAHundredThousandMembers) {
+    constexpr int Members = 100'000;
+    std::string name = "m0";
+    for (int i = 1; i < Members; ++i) {
+        name.append(",m").append(std::to_string(i));
+    }
+    EngineScript script("ADD COMPONENT C\nADD PIN C I(99999:0) input\nADD INSTANCE C U");
+    script.Run("CONNECT SIGNAL " + name + " U.I(99999:0)");
+    const Orn_Hdl::Signal* const compound = script.GetModel().GetSignal(name.c_str());
+    ASSERT_NE(compound, nullptr);
+    EXPECT_EQ(compound->GetWidth(), Members);
+    EXPECT_EQ(CountOf(script.Verilog(), "wire m"), std::size_t(Members));
+    EXPECT_EQ(CountOf(script.Vhdl(), "signal m"), std::size_t(Members));
+}
+
+TEST(Sizes, ABusOfTwoToTheThirtyFirstBits) {
+    EngineScript script;
+    script.Run("ADD COMPONENT C\nADD PIN C I(2147483647:0) input\nADD PIN C O(0:2147483647) output\n"
+               "ADD INSTANCE C U\nADD PORT a(2147483647:0) input\nADD SIGNAL b(0:2147483647)\n"
+               "CONNECT SIGNAL a(2147483647:0) U.I(2147483647:0)\n"
+               "CONNECT SIGNAL b(0:2147483647) U.O(0:2147483647)\n"
+               "CONNECT SIGNAL a(0:2000000000) c(2000000000:0)\n"
+               "ASSIGN CONSTANT c(7) 1");
+    EXPECT_EQ(script.GetModel().GetSignal("a(2147483647:0)")->GetWidth(), 2147483647);
+    EXPECT_EQ(CountOf(script.Verilog(), "[2147483647:0]"), 2u);
+    EXPECT_LT(script.Vhdl().size(), 100'000u);
+}
+
+TEST(Sizes, TwoThousandModelsInOneEngine) {
+    constexpr int Models = 2'000;
+    Orn_Hdl::Engine engine;
+    for (int i = 0; i < Models; ++i) {
+        const std::string name = "model" + std::to_string(i);
+        ASSERT_TRUE(engine.CreateAndAddModel(name.c_str(), ""));
+        engine.Execute(name.c_str(), "ADD SIGNAL s");
+    }
+    EXPECT_FALSE(engine.CreateAndAddModel("MODEL77", ""));
+    for (int i = 0; i < Models; i += 2) {
+        EXPECT_TRUE(engine.RemoveModel(("model" + std::to_string(i)).c_str()));
+    }
+    EXPECT_EQ(engine.GetModel("model0"), nullptr);
+    EXPECT_NE(engine.GetModel("model1"), nullptr);
+}
+
+TEST(Sizes, AMillionCommandsInOneFile) {
+    constexpr int Instances = 330'000;
+    const Support::TemporaryFolder folder;
+    const std::string name = folder / "design.cmd";
+    {
+        std::ofstream file(name);
+        file << "ADD COMPONENT C\nADD PIN C I input\nADD PIN C O output\nADD SIGNAL clock\n";
+        for (int i = 0; i < Instances; ++i) {
+            file << "ADD INSTANCE C U" << i << "\nCONNECT SIGNAL n" << i << " U" << i
+                 << ".O\nCONNECT SIGNAL clock U" << i << ".I\n";
+        }
+    }
+    Orn_Hdl::Engine engine;
+    ASSERT_TRUE(engine.ReadCommandFile("top", name.c_str()));
+    Orn_Hdl::Model& model = *engine.GetModel("top");
+    EXPECT_EQ(model.GetCommandManager()->GetDoneCommandCount(), 4 + 3 * Instances);
+    EXPECT_EQ(Length(model.GetSignal("clock")->GetPinIterator()), Instances);
+    engine.Execute("top", ("WRITE VERILOG -NOHEADER " + (folder / "out.v")).c_str());
+    EXPECT_EQ(CountOf(Support::ReadWholeFile(folder / "out.v"), "wire "),
+              std::size_t(Instances) + 1);
+}
+
+TEST(Sizes, SignalsOnManyListsAreRemovedInAnyOrder) {
+    constexpr int Count = 100'000;
+    EngineScript script;
+    Orn_Hdl::Netlist& netlist = script.GetNetlist();
+    auto* const hub = new Orn_Hdl::ScalarSignal("hub");
+    netlist.Add(hub);
+    for (int i = 0; i < Count; ++i) {
+        auto* const alias = new Orn_Hdl::ScalarSignal(("alias" + std::to_string(i)).c_str());
+        netlist.Add(alias);
+        hub->Connect(alias);
+    }
+    EXPECT_EQ(Length(hub->GetSignalIterator()), Count);
+    netlist.Remove(hub);
+    EXPECT_EQ(Length(netlist.GetSignalIterator()), Count);
+}
+
+} // namespace
