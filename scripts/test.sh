@@ -7,6 +7,8 @@ cd "$(dirname "$0")/.."
 scripts/setup.sh test
 jobs=$(nproc)
 export CMAKE_CXX_COMPILER_LAUNCHER=ccache
+# Paths below this folder do not count, so that another clone finds what this one has compiled.
+export CCACHE_BASEDIR="$PWD" CCACHE_NOHASHDIR=1
 
 step() {
     echo "== $* ($(date +%T))"

@@ -1,0 +1,70 @@
+# What is exported from the library, what `cmake --install` puts down, and the packages made of it.
+# Everything that is installed finds its parts relative to itself, so that a prefix can be moved.
+
+option(ORN_HDL_INSTALL "Install the library and the tool" ${PROJECT_IS_TOP_LEVEL})
+set(ORN_HDL_ZSH_DIR ${CMAKE_INSTALL_DATADIR}/zsh/site-functions CACHE STRING
+    "Where the completion for zsh is installed")
+mark_as_advanced(ORN_HDL_ZSH_DIR)
+
+if(BUILD_SHARED_LIBS AND UNIX AND NOT APPLE)
+  set(orn_hdl_exports ${CMAKE_CURRENT_LIST_DIR}/exports.map)
+  target_link_options(Orn_Hdl PRIVATE LINKER:--version-script=${orn_hdl_exports})
+  set_target_properties(Orn_Hdl PROPERTIES LINK_DEPENDS ${orn_hdl_exports})
+endif()
+
+if(NOT ORN_HDL_INSTALL)
+  return()
+endif()
+
+# The library for those who run programs, and for those who build them.
+set(orn_hdl_cmake_dir ${CMAKE_INSTALL_LIBDIR}/cmake/Orn_Hdl)
+install(TARGETS Orn_Hdl EXPORT Orn_HdlTargets
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT Library NAMELINK_COMPONENT Development
+  ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT Development)
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/include/ DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
+  COMPONENT Development FILES_MATCHING PATTERN "*.h")
+
+install(EXPORT Orn_HdlTargets NAMESPACE Orn_Hdl:: DESTINATION ${orn_hdl_cmake_dir}
+  COMPONENT Development)
+configure_package_config_file(${CMAKE_CURRENT_LIST_DIR}/Orn_HdlConfig.cmake.in
+  ${PROJECT_BINARY_DIR}/Orn_HdlConfig.cmake INSTALL_DESTINATION ${orn_hdl_cmake_dir}
+  NO_SET_AND_CHECK_MACRO)
+write_basic_package_version_file(${PROJECT_BINARY_DIR}/Orn_HdlConfigVersion.cmake
+  COMPATIBILITY SameMajorVersion)
+install(FILES ${PROJECT_BINARY_DIR}/Orn_HdlConfig.cmake
+              ${PROJECT_BINARY_DIR}/Orn_HdlConfigVersion.cmake
+  DESTINATION ${orn_hdl_cmake_dir} COMPONENT Development)
+
+file(RELATIVE_PATH ORN_HDL_PC_PREFIX ${CMAKE_INSTALL_FULL_LIBDIR}/pkgconfig
+     ${CMAKE_INSTALL_PREFIX})
+file(RELATIVE_PATH ORN_HDL_PC_LIBDIR ${CMAKE_INSTALL_PREFIX} ${CMAKE_INSTALL_FULL_LIBDIR})
+file(RELATIVE_PATH ORN_HDL_PC_INCLUDEDIR ${CMAKE_INSTALL_PREFIX} ${CMAKE_INSTALL_FULL_INCLUDEDIR})
+if(BUILD_SHARED_LIBS)
+  set(ORN_HDL_PC_STATIC "")
+else()
+  set(ORN_HDL_PC_STATIC " -DORN_HDL_STATIC")
+endif()
+configure_file(${CMAKE_CURRENT_LIST_DIR}/orn_hdl.pc.in ${PROJECT_BINARY_DIR}/orn_hdl.pc @ONLY)
+install(FILES ${PROJECT_BINARY_DIR}/orn_hdl.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig
+  COMPONENT Development)
+
+install(DIRECTORY ${PROJECT_SOURCE_DIR}/examples DESTINATION ${CMAKE_INSTALL_DOCDIR}
+  COMPONENT Development PATTERN "__pycache__" EXCLUDE)
+
+# The tool and what belongs to it.
+if(TARGET orn-hdl)
+  file(RELATIVE_PATH orn_hdl_libraries ${CMAKE_INSTALL_FULL_BINDIR} ${CMAKE_INSTALL_FULL_LIBDIR})
+  if(BUILD_SHARED_LIBS)
+    set_target_properties(orn-hdl PROPERTIES INSTALL_RPATH "$ORIGIN/${orn_hdl_libraries}")
+  endif()
+  install(TARGETS orn-hdl RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT Tool)
+  set(orn_hdl_share ${PROJECT_SOURCE_DIR}/share)
+  install(DIRECTORY ${orn_hdl_share}/man/ DESTINATION ${CMAKE_INSTALL_MANDIR} COMPONENT Tool)
+  install(DIRECTORY ${orn_hdl_share}/bash-completion ${orn_hdl_share}/vim ${orn_hdl_share}/orn-hdl
+    DESTINATION ${CMAKE_INSTALL_DATADIR} COMPONENT Tool)
+  install(FILES ${orn_hdl_share}/zsh/_orn-hdl DESTINATION ${ORN_HDL_ZSH_DIR} COMPONENT Tool)
+endif()
+
+if(PROJECT_IS_TOP_LEVEL)
+  include(${CMAKE_CURRENT_LIST_DIR}/Package.cmake)
+endif()
