@@ -34,9 +34,11 @@ std::size_t Below(std::uint64_t random, std::size_t limit) {
     return static_cast<std::size_t>((random >> 32) * limit >> 32);
 }
 
-}  // namespace
+} // namespace
 
-std::span<const Component> Design::GetComponents() noexcept { return Components; }
+std::span<const Component> Design::GetComponents() noexcept {
+    return Components;
+}
 
 const Component& Design::GetComponent(std::size_t instance) const noexcept {
     if (instance % 4 == 3) {
@@ -76,4 +78,4 @@ void Design::WriteAttributeValue(Output& out, std::size_t instance) const {
     out << 'R' << instance / 1000 << 'C' << instance % 1000;
 }
 
-}  // namespace bench
+} // namespace bench

@@ -26,7 +26,7 @@ struct Component {
     std::string_view inputs;
     char output;
     bool isFlipFlop;
-    std::string_view function;  ///< of a gate, as genlib writes it
+    std::string_view function; ///< of a gate, as genlib writes it
 };
 
 /// `size` instances of five kinds of gate and a flip-flop. Instance k drives net k; the last nets
@@ -61,4 +61,4 @@ private:
     std::uint64_t seed_;
 };
 
-}  // namespace bench
+} // namespace bench

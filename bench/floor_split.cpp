@@ -31,7 +31,7 @@ std::size_t SplitAndCopy(const bench::FileText& commands, bench::Output& out, st
     return wordCount;
 }
 
-}  // namespace
+} // namespace
 
 int main(int argc, char** argv) {
     if (argc != 4) {

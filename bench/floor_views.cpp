@@ -29,8 +29,7 @@ public:
         Place({Hash(name), index});
     }
 
-    template <typename Objects>
-    Index Find(std::string_view name, const Objects& objects) const {
+    template <typename Objects> Index Find(std::string_view name, const Objects& objects) const {
         const std::uint32_t hash = Hash(name);
         for (std::size_t at = hash & mask_; slots_[at].index != None; at = (at + 1) & mask_) {
             const Slot& slot = slots_[at];
@@ -87,14 +86,14 @@ struct Component {
 
 struct Signal {
     std::string_view name;
-    std::string_view direction;  ///< empty unless it is a port
-    Index firstPin;              ///< head of the list of its pins
+    std::string_view direction; ///< empty unless it is a port
+    Index firstPin;             ///< head of the list of its pins
 };
 
 struct Instance {
     std::string_view name;
     Index component;
-    Index firstPin;  ///< its pins stand side by side
+    Index firstPin; ///< its pins stand side by side
     Index firstAttribute;
 };
 
@@ -254,7 +253,7 @@ private:
     std::vector<Attribute> attributes_;
 };
 
-}  // namespace
+} // namespace
 
 int main(int argc, char** argv) {
     const bool isCompact = argc == 4 && std::string_view(argv[3]) == "--compact";

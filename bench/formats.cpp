@@ -114,10 +114,12 @@ void WriteVerilog(Output& out, const Design& design) {
     });
     out << ");\n";
     ForEachInput(design, [&](std::size_t net) { out << "  input " << Net{design, net} << ";\n"; });
-    ForEachOutput(design,
-                  [&](std::size_t net) { out << "  output " << Net{design, net} << ";\n"; });
-    ForEachInnerNet(design,
-                    [&](std::size_t net) { out << "  wire " << Net{design, net} << ";\n"; });
+    ForEachOutput(design, [&](std::size_t net) {
+        out << "  output " << Net{design, net} << ";\n";
+    });
+    ForEachInnerNet(design, [&](std::size_t net) {
+        out << "  wire " << Net{design, net} << ";\n";
+    });
     ForEachInstance(design, [&](std::size_t index, const Component& component) {
         if (design.HasAttribute(index)) {
             out << "  (* " << AttributeName << " = \"" << AttributeValue{design, index}
@@ -141,8 +143,9 @@ void WriteRtlil(Output& out, const Design& design) {
     ForEachOutput(design, [&](std::size_t net) {
         out << "  wire output " << ++port << " \\" << Net{design, net} << '\n';
     });
-    ForEachInnerNet(design,
-                    [&](std::size_t net) { out << "  wire \\" << Net{design, net} << '\n'; });
+    ForEachInnerNet(design, [&](std::size_t net) {
+        out << "  wire \\" << Net{design, net} << '\n';
+    });
     ForEachInstance(design, [&](std::size_t index, const Component& component) {
         if (design.HasAttribute(index)) {
             out << "  attribute \\" << AttributeName << " \"" << AttributeValue{design, index}
@@ -158,7 +161,9 @@ void WriteRtlil(Output& out, const Design& design) {
 }
 
 /// The number that stands for a net's bit; 0 and 1 are left out by those who write this format.
-std::size_t JsonBit(std::size_t net) { return net + 2; }
+std::size_t JsonBit(std::size_t net) {
+    return net + 2;
+}
 
 void WriteJsonCell(Output& out, const Design& design, std::size_t index,
                    const Component& component) {
@@ -245,8 +250,10 @@ constexpr std::array<Format, 6> Formats = {{
     {"genlib", "the gates that blif names", WriteGenlib},
 }};
 
-}  // namespace
+} // namespace
 
-std::span<const Format> GetFormats() noexcept { return Formats; }
+std::span<const Format> GetFormats() noexcept {
+    return Formats;
+}
 
-}  // namespace bench
+} // namespace bench

@@ -17,4 +17,4 @@ struct Format {
 
 std::span<const Format> GetFormats() noexcept;
 
-}  // namespace bench
+} // namespace bench

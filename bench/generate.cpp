@@ -35,8 +35,7 @@ void PrintUsage() {
     }
 }
 
-template <typename Number>
-Number ParseNumber(std::string_view text) {
+template <typename Number> Number ParseNumber(std::string_view text) {
     Number number = 0;
     const auto result = std::from_chars(text.data(), text.data() + text.size(), number);
     if (result.ec != std::errc() || result.ptr != text.data() + text.size()) {
@@ -81,8 +80,8 @@ Options ParseOptions(int count, char** arguments) {
 
 /// The entry of that name in a list of formats or shapes.
 const auto& Find(const auto& list, std::string_view name) {
-    const auto found = std::ranges::find_if(
-        list, [name](const auto& entry) { return entry.name == name; });
+    const auto found =
+        std::ranges::find_if(list, [name](const auto& entry) { return entry.name == name; });
     if (found == list.end()) {
         throw std::invalid_argument("unknown: " + std::string(name));
     }
@@ -102,7 +101,7 @@ void Generate(const Options& options) {
     out.Flush();
 }
 
-}  // namespace
+} // namespace
 
 int main(int argc, char** argv) {
     try {

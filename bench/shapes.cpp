@@ -83,8 +83,8 @@ void WriteSlices(Output& out, std::size_t size) {
         << size << ":0)\n";
     for (std::size_t k = 0; k < size; k += 2) {
         out << "ADD INSTANCE ONE u" << k << "\nCONNECT SIGNAL d(" << k << ") u" << k << ".A\n";
-        out << "ADD INSTANCE TWO u" << k + 1 << "\nCONNECT SIGNAL d(" << k + 1 << ':' << k
-            << ") u" << k + 1 << ".A(1:0)\n";
+        out << "ADD INSTANCE TWO u" << k + 1 << "\nCONNECT SIGNAL d(" << k + 1 << ':' << k << ") u"
+            << k + 1 << ".A(1:0)\n";
     }
 }
 
@@ -143,8 +143,10 @@ constexpr std::array<Shape, 10> Shapes = {{
     {"comment", "a comment of N bytes", WriteComment},
 }};
 
-}  // namespace
+} // namespace
 
-std::span<const Shape> GetShapes() noexcept { return Shapes; }
+std::span<const Shape> GetShapes() noexcept {
+    return Shapes;
+}
 
-}  // namespace bench
+} // namespace bench

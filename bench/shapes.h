@@ -19,4 +19,4 @@ struct Shape {
 
 std::span<const Shape> GetShapes() noexcept;
 
-}  // namespace bench
+} // namespace bench

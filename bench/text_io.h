@@ -136,4 +136,4 @@ private:
     std::size_t size_ = 0;
 };
 
-}  // namespace bench
+} // namespace bench

@@ -1,5 +1,5 @@
-// Turns the bytes of a fuzz input into choices and texts. At the end of the input every choice is the
-// first one and every text is empty, so any input means something.
+// Turns the bytes of a fuzz input into choices and texts. At the end of the input every choice is
+// the first one and every text is empty, so any input means something.
 #pragma once
 
 #include <algorithm>

@@ -16,8 +16,8 @@ using namespace Orn_Hdl;
 
 template <class T> using Alive = std::unordered_set<const T*>;
 
-template <class T> void CheckList(const Iterator<T*>& list, const Alive<T>& alive, bool unique,
-                                  const char* what) {
+template <class T>
+void CheckList(const Iterator<T*>& list, const Alive<T>& alive, bool unique, const char* what) {
     Alive<T> met;
     for (const T* element : list) {
         Check(element != nullptr, std::string(what) + ": no null");
@@ -172,7 +172,8 @@ void CheckNetlist(const Netlist& netlist, const std::vector<Signal*>& loose) {
 
 void CheckNames(const Netlist& netlist) {
     using std::string_view;
-    CheckFound(netlist.GetSignalIterator(), [&](string_view name) { return netlist.GetSignal(name); });
+    CheckFound(netlist.GetSignalIterator(),
+               [&](string_view name) { return netlist.GetSignal(name); });
     CheckFound(netlist.GetInstanceIterator(),
                [&](string_view name) { return netlist.GetInstance(name); });
     CheckFound(netlist.GetComponentIterator(),

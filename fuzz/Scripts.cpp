@@ -21,31 +21,59 @@ constexpr std::size_t LinesPerCheck = 16;
 constexpr const char* Components[] = {"AND2", "BUF", "and2", "REG", "Wide", "MISSING"};
 constexpr const char* Instances[] = {"U1", "U2", "U10", "u1", "R_1", "MISSING"};
 constexpr const char* Pins[] = {"I", "O", "IO", "D(3:0)", "D[3:0]", "Q(0:1)", "B(2)", "MISSING"};
-constexpr const char* Signals[] = {
-    "A", "B", "Y", "Z", "n1", "N1", "Y_DUMMY", "D(7:0)", "D[3:0]", "D(7:4)", "D(0:3)", "D(2)",
-    "d(7)", "D(15:0)", "D(1:1)", "E(0:7)", "E(3:1)", "E(5)", "F(3:0)", "F(-1:2)", "F(+1)", "A,B",
-    "A,D(3:0)", "D(1),D(0)\\E(7:0)", "D(7:0),D(15:8)", "n1,n1", "D_DUMMY(7:0)", "big(2147483647:0)",
-    "big(99999999999:-1)", "open", "U1_I_CONST_SIGNAL", "D"};
+constexpr const char* Signals[] = {"A",
+                                   "B",
+                                   "Y",
+                                   "Z",
+                                   "n1",
+                                   "N1",
+                                   "Y_DUMMY",
+                                   "D(7:0)",
+                                   "D[3:0]",
+                                   "D(7:4)",
+                                   "D(0:3)",
+                                   "D(2)",
+                                   "d(7)",
+                                   "D(15:0)",
+                                   "D(1:1)",
+                                   "E(0:7)",
+                                   "E(3:1)",
+                                   "E(5)",
+                                   "F(3:0)",
+                                   "F(-1:2)",
+                                   "F(+1)",
+                                   "A,B",
+                                   "A,D(3:0)",
+                                   "D(1),D(0)\\E(7:0)",
+                                   "D(7:0),D(15:8)",
+                                   "n1,n1",
+                                   "D_DUMMY(7:0)",
+                                   "big(2147483647:0)",
+                                   "big(99999999999:-1)",
+                                   "open",
+                                   "U1_I_CONST_SIGNAL",
+                                   "D"};
 constexpr const char* Directions[] = {"input", "output", "bidir", "I", "o", "B", "inout"};
-constexpr const char* Types[] = {"String", "Integer", "Float", "Boolean",
+constexpr const char* Types[] = {"String", "Integer",   "Float", "Boolean",
                                  "Bit",    "BitVector", "User",  "none"};
 constexpr const char* Attributes[] = {"INIT", "Level", "LOC", "BOX_TYPE", "syn_keep", "init"};
 constexpr const char* Values[] = {
-    "1", "0", "8:H:FF", "4:B:1010", "16:O:777777", "HALVEX", "true", "-7", "3.25", "1e400",
-    "\"a text\"", "99999999999", "x\"y", "8:H:", "9999999999:B:1"};
-constexpr const char* Options[] = {"-GENERIC=SYN",   "-GENERIC=NOSYN",       "-GENERIC=NONE",
+    "1",    "0",     "8:H:FF",     "4:B:1010",    "16:O:777777", "HALVEX", "true",          "-7",
+    "3.25", "1e400", "\"a text\"", "99999999999", "x\"y",        "8:H:",   "9999999999:B:1"};
+constexpr const char* Options[] = {"-GENERIC=SYN",    "-GENERIC=NOSYN",       "-GENERIC=NONE",
                                    "-SYNATTR=ASSIGN", "-SYNATTR=ASSIGNNODEC", "-SYNATTR=NONE",
                                    "-GENERIC=x"};
-constexpr const char* Tools[] = {"QSN", "EXEMPLAR", "SYNPLICITY", "SYNOPSYS", "VERILOG2001",
-                                 "PRECISION"};
+constexpr const char* Tools[] = {"QSN",      "EXEMPLAR",    "SYNPLICITY",
+                                 "SYNOPSYS", "VERILOG2001", "PRECISION"};
 constexpr const char* Texts[] = {"word", "two words", "\"quoted text\"", "// */ --", "tab\there"};
 
 constexpr const char* Prelude[] = {
-    "ADD COMPONENT AND2", "ADD PIN AND2 I input", "ADD PIN AND2 O output", "ADD PIN AND2 IO bidir",
-    "ADD COMPONENT REG", "ADD PIN REG D(3:0) input 4:H:A", "ADD PIN REG Q(0:1) output",
-    "ADD PIN REG B(2) input", "ADD PORT A input", "ADD PORT D(7:0) output", "ADD PORT Y output",
-    "ADD PORT E(0:7) input", "ADD INSTANCE AND2 U1", "ADD INSTANCE AND2 U2",
-    "ADD INSTANCE REG R_1", "CONNECT SIGNAL Y U1.O", "CONNECT SIGNAL Y U2.I"};
+    "ADD COMPONENT AND2",        "ADD PIN AND2 I input",   "ADD PIN AND2 O output",
+    "ADD PIN AND2 IO bidir",     "ADD COMPONENT REG",      "ADD PIN REG D(3:0) input 4:H:A",
+    "ADD PIN REG Q(0:1) output", "ADD PIN REG B(2) input", "ADD PORT A input",
+    "ADD PORT D(7:0) output",    "ADD PORT Y output",      "ADD PORT E(0:7) input",
+    "ADD INSTANCE AND2 U1",      "ADD INSTANCE AND2 U2",   "ADD INSTANCE REG R_1",
+    "CONNECT SIGNAL Y U1.O",     "CONNECT SIGNAL Y U2.I"};
 
 /// Fills in the arguments of a command from their description in the catalogue.
 class Filler {

@@ -14,8 +14,8 @@ using Script = std::vector<std::string>;
 
 /// The lines of a text.
 Script SplitScript(std::string_view text);
-/// A script of commands from the catalogue, their arguments filled in by kind, mostly with names that
-/// meet again.
+/// A script of commands from the catalogue, their arguments filled in by kind, mostly with names
+/// that meet again.
 Script MakeScript(Bytes& bytes);
 
 /// Runs a script in two engines, writes both netlists again and again, and checks that all is

@@ -90,8 +90,8 @@ void CheckDeclarations(const Netlist& netlist, Language language, const std::str
     std::size_t expected = 0;
     for (const Signal* signal : netlist.GetSignalIterator()) {
         const std::string_view name = signal->GetNameView();
-        const bool isWritable =
-            !name.empty() && (language == Language::Verilog || !Port::EqualIgnoringCase(name, "open"));
+        const bool isWritable = !name.empty() && (language == Language::Verilog ||
+                                                  !Port::EqualIgnoringCase(name, "open"));
         expected += isWritable && signal->IsNeededToDeclared() && !signal->IsPort() ? 1 : 0;
     }
     Check(CountLinesThatBegin(text, keyword + " ") == expected, "every signal is declared once");

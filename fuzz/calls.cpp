@@ -21,13 +21,32 @@ constexpr int MostWrites = 2;
 /// How many calls are made between two looks at the whole design.
 constexpr int CallsPerCheck = 8;
 
-constexpr const char* Names[] = {"A",      "B",        "n1",     "N1",       "D(7:0)",   "D[3:0]",
-                                 "D(15:0)", "D(0:3)",  "D(2)",   "d(7)",     "E(0:7)",   "E(3:1)",
-                                 "E(5)",   "F(1:1)",   "A,B",    "A,D(3:0)", "n1\\D(2)", "A_DUMMY",
-                                 "D_DUMMY(7:0)", "U1", "open", "", "G(2147483647:-2147483648)"};
+constexpr const char* Names[] = {"A",
+                                 "B",
+                                 "n1",
+                                 "N1",
+                                 "D(7:0)",
+                                 "D[3:0]",
+                                 "D(15:0)",
+                                 "D(0:3)",
+                                 "D(2)",
+                                 "d(7)",
+                                 "E(0:7)",
+                                 "E(3:1)",
+                                 "E(5)",
+                                 "F(1:1)",
+                                 "A,B",
+                                 "A,D(3:0)",
+                                 "n1\\D(2)",
+                                 "A_DUMMY",
+                                 "D_DUMMY(7:0)",
+                                 "U1",
+                                 "open",
+                                 "",
+                                 "G(2147483647:-2147483648)"};
 constexpr const char* PinNames[] = {"I", "O", "D(3:0)", "D(7:0)", "Q(0:1)", "B(2)", ""};
 constexpr const char* Values[] = {"1", "8:H:FF", "4:B:1010", "", "x", "9999999999:B:1"};
-constexpr const char* Types[] = {"String", "Integer", "Float", "Boolean",
+constexpr const char* Types[] = {"String", "Integer",   "Float", "Boolean",
                                  "Bit",    "BitVector", "User"};
 constexpr const char* Comments[] = {"text", "two\nlines", "*/ endmodule", ""};
 
@@ -107,8 +126,7 @@ private:
                                         : At(component->GetPinIterator(), bytes_.Choose(256));
         }
         const Instance* const instance = PickInstance();
-        return instance == nullptr ? nullptr
-                                   : At(instance->GetPinIterator(), bytes_.Choose(256));
+        return instance == nullptr ? nullptr : At(instance->GetPinIterator(), bytes_.Choose(256));
     }
 
     AttributeHolder* PickHolder() {
@@ -479,9 +497,7 @@ private:
         }
     }
 
-    void Write() {
-        Fuzz::WriteAgainAndAgain(GetNetlist(), *model_.GetOptions(), GetLoose());
-    }
+    void Write() { Fuzz::WriteAgainAndAgain(GetNetlist(), *model_.GetOptions(), GetLoose()); }
 
     Fuzz::Bytes& bytes_;
     CommandFactory factory_;

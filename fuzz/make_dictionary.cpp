@@ -1,5 +1,5 @@
-// Prints the fuzzer's dictionary of the command language: its phrases, the words of its arguments, and
-// pieces of names. With --check FILE it tells whether FILE is what it would print.
+// Prints the fuzzer's dictionary of the command language: its phrases, the words of its arguments,
+// and pieces of names. With --check FILE it tells whether FILE is what it would print.
 
 #include "Orn_Hdl/Commands.h"
 
@@ -13,7 +13,8 @@
 
 namespace {
 
-constexpr const char* Pieces[] = {"(7:0)", "[3:0]", "(2)", ",", ".", "\\x0a", "16:H:FF", "2147483647"};
+constexpr const char* Pieces[] = {"(7:0)", "[3:0]", "(2)",     ",",
+                                  ".",     "\\x0a", "16:H:FF", "2147483647"};
 
 /// The words of the argument descriptions that a user may type as they stand.
 void AddLiterals(std::string_view arguments, std::set<std::string>& words) {

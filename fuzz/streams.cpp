@@ -1,10 +1,10 @@
-// The input chooses what is written into a file and into memory: pieces of any length, numbers, line
-// ends, indentation and flushes.
+// The input chooses what is written into a file and into memory: pieces of any length, numbers,
+// line ends, indentation and flushes.
 
+#include "Orn_Hdl/Streams.h"
 #include "Bytes.h"
 #include "Check.h"
 #include "MemoryFiles.h"
-#include "Orn_Hdl/Streams.h"
 #include "Writes.h"
 
 namespace {
@@ -14,8 +14,9 @@ using Orn_Hdl::OutStream;
 using Orn_Hdl::TextFileOutStream;
 using Orn_Hdl::TextMemOutStream;
 
-constexpr const char* Pieces[] = {" ", ", ", ",", ";", "\"", "//", "--", "/*", "-", "/", "a", "word",
-                                  "\n", "a\nb", "  ", "name_of_some_length_in_a_list"};
+constexpr const char* Pieces[] = {
+    " ", ", ", ",", ";",    "\"", "//",   "--", "/*",
+    "-", "/",  "a", "word", "\n", "a\nb", "  ", "name_of_some_length_in_a_list"};
 
 std::string MakePiece(Fuzz::Bytes& bytes) {
     switch (bytes.Choose(4)) {

@@ -3,8 +3,8 @@
 #include "Bytes.h"
 #include "Check.h"
 #include "Orn_Hdl/Commands.h"
-#include "Orn_Hdl/Exception.h"
 #include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Exception.h"
 #include "Port/Ascii.h"
 
 #include <memory>

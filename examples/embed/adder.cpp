@@ -37,8 +37,8 @@ std::string Indexed(const std::string& name, const std::string& index) {
 
 /// A bit of a bus, which is a signal of its own.
 Orn_Hdl::Signal* AddBit(Orn_Hdl::Netlist& netlist, Orn_Hdl::Bus* bus, int bit) {
-    return AddNew<Orn_Hdl::BusIndex>(
-        netlist, Indexed(bus->GetBaseName().CStr(), std::to_string(bit)), bus);
+    return AddNew<Orn_Hdl::BusIndex>(netlist,
+                                     Indexed(bus->GetBaseName().CStr(), std::to_string(bit)), bus);
 }
 
 std::unique_ptr<Orn_Hdl::Netlist> BuildAdder(int width) {
@@ -57,8 +57,7 @@ std::unique_ptr<Orn_Hdl::Netlist> BuildAdder(int width) {
     auto* const a = AddPort<Orn_Hdl::Bus>(*netlist, Indexed("A", range), Polarity::Input);
     auto* const b = AddPort<Orn_Hdl::Bus>(*netlist, Indexed("B", range), Polarity::Input);
     auto* const sum = AddPort<Orn_Hdl::Bus>(*netlist, Indexed("SUM", range), Polarity::Output);
-    Orn_Hdl::Signal* carry =
-        AddPort<Orn_Hdl::ScalarSignal>(*netlist, "CI", Polarity::Input);
+    Orn_Hdl::Signal* carry = AddPort<Orn_Hdl::ScalarSignal>(*netlist, "CI", Polarity::Input);
     Orn_Hdl::Signal* const carryOut =
         AddPort<Orn_Hdl::ScalarSignal>(*netlist, "CO", Polarity::Output);
 
@@ -67,8 +66,7 @@ std::unique_ptr<Orn_Hdl::Netlist> BuildAdder(int width) {
         const Orn_Hdl::Instance& cell =
             *AddNew<Orn_Hdl::Instance>(*netlist, "BIT" + number, fullAdder);
         Orn_Hdl::Signal* const next =
-            bit + 1 == width ? carryOut
-                             : AddNew<Orn_Hdl::ScalarSignal>(*netlist, "CARRY" + number);
+            bit + 1 == width ? carryOut : AddNew<Orn_Hdl::ScalarSignal>(*netlist, "CARRY" + number);
         AddBit(*netlist, a, bit)->Connect(cell.GetPin("A"));
         AddBit(*netlist, b, bit)->Connect(cell.GetPin("B"));
         carry->Connect(cell.GetPin("CI"));

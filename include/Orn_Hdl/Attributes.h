@@ -85,17 +85,13 @@ public:
     /// The generic option as a text.
     Port::StringBase<char> GetGeneric() const;
     /// The generic option.
-    GenericOption GetGenericOption() const noexcept {
-        return static_cast<GenericOption>(generic_);
-    }
+    GenericOption GetGenericOption() const noexcept { return static_cast<GenericOption>(generic_); }
     /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", likewise.
     bool SetSynAttr(const char* text) noexcept;
     /// The synthesis-attribute option as a text.
     Port::StringBase<char> GetSynAttr() const;
     /// The synthesis-attribute option.
-    SynAttrOption GetSynAttrOption() const noexcept {
-        return static_cast<SynAttrOption>(synAttr_);
-    }
+    SynAttrOption GetSynAttrOption() const noexcept { return static_cast<SynAttrOption>(synAttr_); }
 
     /// Whether name, comment, type and both options are equal, and the value texts ignoring case.
     bool operator==(const Attribute& other) const;
@@ -286,9 +282,9 @@ public:
     AttributeHolder& operator=(const AttributeHolder& other);
     virtual ~AttributeHolder();
 
-    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is an attribute
-    /// that has an owner. A second
-    /// attribute of one name is held and iterated too, and `GetAttr` then finds the later one.
+    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is an
+    /// attribute that has an owner. A second attribute of one name is held and iterated too, and
+    /// `GetAttr` then finds the later one.
     virtual void AddAttr(Attribute* attribute);
     /// The attribute of that name, normalised and letter case ignored; null when there is none.
     virtual Attribute* GetAttr(const char* name) const;

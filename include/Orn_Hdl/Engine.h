@@ -34,7 +34,8 @@ class Model;
 /// ignore letter case; a null text reads as "" everywhere. A model bears the name of its netlist,
 /// so SET NETLIST NAME renames it: keep the pointer, not the name, of a model whose commands do so.
 ///
-/// Engines are independent of one another; one engine and its models belong to one thread at a time.
+/// Engines are independent of one another; one engine and its models belong to one thread at a
+/// time.
 class ORN_HDL_API Engine {
 public:
     Engine();

@@ -1,6 +1,6 @@
 /// \file
-/// The design: objects, pins, signals, components, instances, the netlist, and `Model`, every design
-/// operation by name.
+/// The design: objects, pins, signals, components, instances, the netlist, and `Model`, every
+/// design operation by name.
 #pragma once
 
 #include "Orn_Hdl/Model/Component.h"

@@ -97,8 +97,8 @@ class TextMemDst;
 class ORN_HDL_API TextFileOutStream : public OutStream {
 public:
     /// What becomes of the file that is there already. `Replace` is `Overwrite` that happens as a
-    /// whole: the former file stands as it was until `Close` puts the new one in its place, which it
-    /// does only when everything was written. A stream that ends without `Close` drops its text.
+    /// whole: the former file stands as it was until `Close` puts the new one in its place, which
+    /// it does only when everything was written. A stream that ends without `Close` drops its text.
     enum Mode { Overwrite, Append, Replace };
 
     /// A stream without a file.

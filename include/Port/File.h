@@ -30,7 +30,8 @@ public:
     File& operator=(const File&) = delete;
 
     /// Opens a file, closing the one that was open.
-    /// \param fromStart reading and overwriting begin at the first byte, appending (false) at the end.
+    /// \param fromStart reading and overwriting begin at the first byte, appending (false) at the
+    /// end.
     ///        Of no meaning for `Replace`.
     /// \return false when the file cannot be opened; a directory never can.
     bool open(const char* name, Mode mode, bool fromStart);
@@ -46,8 +47,8 @@ public:
     /// Writes all bytes. \return false on a failure.
     bool write(const char* data, std::size_t size);
 
-    /// Reads the next line. \param line receives it without its line end, valid until the next call.
-    /// \return false at the end of the file or on a failure.
+    /// Reads the next line. \param line receives it without its line end, valid until the next
+    /// call. \return false at the end of the file or on a failure.
     bool NextLine(std::string_view& line);
 
     /// The system's error number of the first failure since `open`; 0 when there was none.

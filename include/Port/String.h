@@ -46,7 +46,7 @@ public:
     StringBase& operator+=(const StringBase& text) { return *this += text.GetView(); }
     StringBase& operator+=(Char c) {
         text_ += c;
-    /// \}
+        /// \}
         return *this;
     }
 
@@ -110,7 +110,8 @@ public:
 #if defined(__GNUC__)
     __attribute__((format(printf, 1, 2)))
 #endif
-    static StringBase Format(const char* format, ...);
+    static StringBase
+    Format(const char* format, ...);
 
     friend bool operator==(const StringBase& a, const StringBase& b) noexcept {
         return a.text_ == b.text_;
@@ -118,12 +119,18 @@ public:
     friend bool operator==(const StringBase& a, const Char* b) noexcept {
         return a.text_ == (b == nullptr ? View() : View(b));
     }
-    friend bool operator!=(const StringBase& a, const StringBase& b) noexcept { return !(a == b); }
-    friend bool operator!=(const StringBase& a, const Char* b) noexcept { return !(a == b); }
+    friend bool operator!=(const StringBase& a, const StringBase& b) noexcept {
+        return !(a == b);
+    }
+    friend bool operator!=(const StringBase& a, const Char* b) noexcept {
+        return !(a == b);
+    }
     friend bool operator<(const StringBase& a, const StringBase& b) noexcept {
         return a.text_ < b.text_;
     }
-    friend StringBase operator+(StringBase a, const StringBase& b) { return a += b; }
+    friend StringBase operator+(StringBase a, const StringBase& b) {
+        return a += b;
+    }
 
 private:
     std::basic_string<Char> text_;

@@ -19,7 +19,8 @@ constexpr std::uint32_t BucketCounts[] = {
     100663319, 201326611, 402653189, 805306457, 1610612741, 3221225473, 4294967291};
 
 std::size_t BucketCountFor(std::size_t least) noexcept {
-    const auto* const found = std::lower_bound(std::begin(BucketCounts), std::end(BucketCounts), least);
+    const auto* const found =
+        std::lower_bound(std::begin(BucketCounts), std::end(BucketCounts), least);
     return found == std::end(BucketCounts) ? *std::prev(found) : *found;
 }
 

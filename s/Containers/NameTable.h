@@ -2,8 +2,8 @@
 //
 // All names stand on one singly linked list, ordered by bucket. A name whose bucket is empty is
 // linked in where that order wants it; a name whose bucket is not empty goes directly behind the
-// bucket's first name. Growing takes the list apart from its head and puts each name at the front of
-// its new bucket.
+// bucket's first name. Growing takes the list apart from its head and puts each name at the front
+// of its new bucket.
 #pragma once
 
 #include <cstddef>

@@ -187,7 +187,8 @@ int StringArray::Parse(string_view text, string_view separators, bool skipEmpty,
         return (c == separator && separator != '\0') ||
                (!others.empty() && others.find(c) != string_view::npos);
     };
-    // Pieces are shorter than the text and as many as its separators at most; the buffer grows once.
+    // Pieces are shorter than the text and as many as its separators at most; the buffer grows
+    // once.
     text_.reserve(text_.size() + text.size());
     std::size_t start = text_.size();
     char closing = '\0';

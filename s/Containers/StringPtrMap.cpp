@@ -151,8 +151,7 @@ void* IStringPtrMapBase::GetHashed(std::uint32_t hash, std::string_view name) co
 }
 
 bool IStringPtrMapBase::Contains(std::string_view name) const noexcept {
-    return table_ != nullptr &&
-           table_->Find(HashIgnoringCase(name), name) < table_->entries.size();
+    return table_ != nullptr && table_->Find(HashIgnoringCase(name), name) < table_->entries.size();
 }
 
 void IStringPtrMapBase::Remove(std::string_view name) noexcept {

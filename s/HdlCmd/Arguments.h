@@ -10,8 +10,9 @@
 
 namespace Orn_Hdl {
 
-/// Some texts and eight flags. Millions of done commands are kept, so the texts stand in the command's
-/// own memory, behind the command; only texts that find no room there get a block of their own.
+/// Some texts and eight flags. Millions of done commands are kept, so the texts stand in the
+/// command's own memory, behind the command; only texts that find no room there get a block of
+/// their own.
 ///
 /// It must be the last member of an object that was made with `RoomFor` more bytes than it needs
 /// without arguments.

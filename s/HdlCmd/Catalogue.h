@@ -1,5 +1,5 @@
-// The command language as data: an entry a phrase, from which the factory registers the commands and the
-// documentation is made.
+// The command language as data: an entry a phrase, from which the factory registers the commands
+// and the documentation is made.
 #pragma once
 
 #include "HdlCmd/Arguments.h"

@@ -139,8 +139,8 @@ CommandManager::~CommandManager() {
 
 bool CommandManager::CreateAndExecute(const StringArray& tokens, Model* model,
                                       CommandFactory* factory) {
-    std::unique_ptr<Command> command(
-        factory == nullptr ? nullptr : factory->CreateCommand(model, tokens));
+    std::unique_ptr<Command> command(factory == nullptr ? nullptr
+                                                        : factory->CreateCommand(model, tokens));
     if (command == nullptr) {
         Fail(CommandUnit, __LINE__, "Command not find.\n");
     }

@@ -45,8 +45,8 @@ template <auto Operation> void Apply(Model& model, const Arguments& arguments) {
     CommandDetail::Call(model, Operation, arguments);
 }
 
-/// Calls the operations of the attribute options that were given. Behind the names of the object and
-/// the attribute stand the generic value, then the synthesis-attribute value.
+/// Calls the operations of the attribute options that were given. Behind the names of the object
+/// and the attribute stand the generic value, then the synthesis-attribute value.
 template <auto SetGeneric, auto SetSynAttr>
 void ApplyOptions(Model& model, const Arguments& arguments) {
     if (arguments.HasFlag(GenericGiven)) {

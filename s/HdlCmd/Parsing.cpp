@@ -121,7 +121,8 @@ bool ParseSignal(const StringArray& tokens, Arguments& arguments) {
 
 bool ParseConnection(const StringArray& tokens, Arguments& arguments) {
     const PinPath target(tokens.GetView(3));
-    arguments.Set({tokens.GetView(2), target.owner, target.pin}, target.isPin ? unsigned(OnAPin) : 0U);
+    arguments.Set({tokens.GetView(2), target.owner, target.pin},
+                  target.isPin ? unsigned(OnAPin) : 0U);
     return tokens.GetSize() >= 4;
 }
 

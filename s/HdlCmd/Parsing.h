@@ -1,5 +1,5 @@
-// How the lines of the command language are read: by fixed positions, counted from the first word of
-// the phrase.
+// How the lines of the command language are read: by fixed positions, counted from the first word
+// of the phrase.
 #pragma once
 
 #include "HdlCmd/Arguments.h"

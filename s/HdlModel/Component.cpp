@@ -42,8 +42,8 @@ void PinList::SortByPolarityAndName() {
     }
 }
 
-/// What the instances of a component hold in place of a pointer to it, so that the component can end
-/// before them.
+/// What the instances of a component hold in place of a pointer to it, so that the component can
+/// end before them.
 struct ComponentAnchor {
     const Component* component;
     std::size_t users;
@@ -191,8 +191,8 @@ bool Instance::GetOpenPin(PtrArray<Pin*>& pins, bool inputsOnly) const {
 
 namespace {
 
-/// Whether a signal, or a signal of which it is made up, has a port polarity. Compounds are searched
-/// without recursion: they can be nested to any depth.
+/// Whether a signal, or a signal of which it is made up, has a port polarity. Compounds are
+/// searched without recursion: they can be nested to any depth.
 bool IsOnPort(Signal* signal, int portPolarity) {
     if (signal->GetSignalType() != SignalTypeCompoundBus) {
         return signal->GetPortPolarity().GetValue() == portPolarity;

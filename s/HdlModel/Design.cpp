@@ -43,7 +43,8 @@ void RequireName(int line, const char* name) {
 
 /// Whether a text, and its normalised form too, has a shape; `parse` tells for one of them.
 template <class Parse> bool HasShape(std::string_view text, Parse parse) {
-    return parse(text) && (Names::IsNormalized(text) || parse(Names::NormalizedText(text).GetView()));
+    return parse(text) &&
+           (Names::IsNormalized(text) || parse(Names::NormalizedText(text).GetView()));
 }
 
 bool IsBitName(std::string_view text) {
@@ -84,7 +85,8 @@ struct Model::Implementation {
         : factory(commandFactory), attributeCreators(AttributeFactory::GetCreators()) {}
 };
 
-Model::Model(CommandFactory* factory) : implementation_(std::make_unique<Implementation>(factory)) {}
+Model::Model(CommandFactory* factory)
+    : implementation_(std::make_unique<Implementation>(factory)) {}
 
 Model::~Model() = default;
 
@@ -500,9 +502,8 @@ bool Model::AddAttr(AttributeHolder* holder, const char* name, const char* value
     if (Attribute* present = holder->GetAttr(name)) {
         present->SetValue(value);
     } else {
-        const auto creator =
-            implementation_->attributeCreators.Get(type == nullptr ? Attribute::DEFAULT_ATTRTYPE
-                                                                   : type);
+        const auto creator = implementation_->attributeCreators.Get(
+            type == nullptr ? Attribute::DEFAULT_ATTRTYPE : type);
         if (creator == nullptr) {
             FailInModel(__LINE__, "Invalid attribute type.\n");
         }

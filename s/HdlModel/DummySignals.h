@@ -1,5 +1,5 @@
-// The stand-ins that a netlist makes for ports which are used against their direction: an output port
-// that is read inside, or has several drivers, and an input port that is driven inside.
+// The stand-ins that a netlist makes for ports which are used against their direction: an output
+// port that is read inside, or has several drivers, and an input port that is driven inside.
 #pragma once
 
 #include "Orn_Hdl/Model/Netlist.h"

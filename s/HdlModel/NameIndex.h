@@ -81,7 +81,8 @@ public:
     }
 
 private:
-    /// Twelve bytes, so that a look-up mostly touches one cache line and a million names cost little.
+    /// Twelve bytes, so that a look-up mostly touches one cache line and a million names cost
+    /// little.
     struct Slot {
         std::uint32_t hash = 0;
         unsigned char object[sizeof(T*)] = {};
@@ -101,8 +102,8 @@ private:
     /// The place of a name, or the free place where it would go.
     std::size_t Probe(std::uint32_t hash, std::string_view name) const noexcept {
         std::size_t i = Home(hash);
-        while (!slots_[i].IsFree() && !(slots_[i].hash == hash &&
-                                        EqualFolded(KeyOf()(slots_[i].GetObject()), name))) {
+        while (!slots_[i].IsFree() &&
+               !(slots_[i].hash == hash && EqualFolded(KeyOf()(slots_[i].GetObject()), name))) {
             i = Next(i);
         }
         return i;

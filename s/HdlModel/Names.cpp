@@ -31,9 +31,8 @@ bool IsBase(string_view text) noexcept {
     if (text.empty() || !(Port::IsLetter(text[0]) || text[0] == '_' || text[0] == '\'')) {
         return false;
     }
-    return std::all_of(text.begin() + 1, text.end(), [](char c) {
-        return Port::IsLetter(c) || Port::IsDigit(c) || c == '_';
-    });
+    return std::all_of(text.begin() + 1, text.end(),
+                       [](char c) { return Port::IsLetter(c) || Port::IsDigit(c) || c == '_'; });
 }
 
 bool IsInteger(string_view text) noexcept {
@@ -202,8 +201,8 @@ void NaturalKey::Append(unsigned byte) noexcept {
     }
 }
 
-// Each step must keep the order. A run of digits is coded as 255, its length, and two digits a byte, so
-// that it sorts after every other character, and a longer run after a shorter one.
+// Each step must keep the order. A run of digits is coded as 255, its length, and two digits a
+// byte, so that it sorts after every other character, and a longer run after a shorter one.
 NaturalKey::NaturalKey(string_view name) noexcept {
     constexpr unsigned LastPlainRank = 253;
     for (std::size_t i = 0; i < name.size() && !IsFull();) {

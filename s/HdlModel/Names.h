@@ -1,5 +1,5 @@
-// What names mean: the scanners behind every rule that reads a name. All of them take views, keep no
-// copies, run in one pass without recursion, and so hold up at names of any length.
+// What names mean: the scanners behind every rule that reads a name. All of them take views, keep
+// no copies, run in one pass without recursion, and so hold up at names of any length.
 #pragma once
 
 #include "Port/Ascii.h"

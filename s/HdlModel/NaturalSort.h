@@ -12,9 +12,9 @@
 
 namespace Orn_Hdl {
 
-/// Sorts stably. `rankOf(object)` gives an int. A short array is sorted by the names as they are; of a
-/// long one the keys are made once, and one that is in order already, as after a former write, is only
-/// looked at.
+/// Sorts stably. `rankOf(object)` gives an int. A short array is sorted by the names as they are;
+/// of a long one the keys are made once, and one that is in order already, as after a former write,
+/// is only looked at.
 template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankOf rankOf) {
     const auto isLess = [&rankOf](const T* a, const T* b) {
         const int rankA = rankOf(a);

@@ -56,8 +56,8 @@ struct Netlist::Implementation {
     std::string sourceFileName;
 
     ~Implementation() {
-        // Signals end first: an instance then has nothing to leave. They part all at once, while all
-        // of them are alive.
+        // Signals end first: an instance then has nothing to leave. They part all at once, while
+        // all of them are alive.
         for (Signal* signal : Iterator<Signal*>(&signals)) {
             signal->MarkDying();
         }
@@ -237,9 +237,8 @@ void Netlist::SetBoxTypeAttribute() {
         const Attribute* const level = component->GetAttr("Level");
         if (level != nullptr && Port::EqualIgnoringCase(level->GetValueString(), "HALVEX") &&
             component->GetAttr("BOX_TYPE") == nullptr) {
-            std::unique_ptr<Attribute> boxType(
-                AttributeFactory::GetCreators().Get(Attribute::DEFAULT_ATTRTYPE)("BOX_TYPE",
-                                                                                 "BLACK_BOX"));
+            std::unique_ptr<Attribute> boxType(AttributeFactory::GetCreators().Get(
+                Attribute::DEFAULT_ATTRTYPE)("BOX_TYPE", "BLACK_BOX"));
             boxType->SetSynAttr("ASSIGN");
             component->AddAttr(boxType.release());
         }

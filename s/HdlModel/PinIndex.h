@@ -12,8 +12,8 @@ namespace Orn_Hdl {
 
 class PinList;
 
-/// Holds the first pin of each name. It notices when its list has grown and when any pin anywhere was
-/// renamed, which happens so seldom that building it anew is cheap.
+/// Holds the first pin of each name. It notices when its list has grown and when any pin anywhere
+/// was renamed, which happens so seldom that building it anew is cheap.
 class PinIndex {
 public:
     /// Brings the index up to date with a list and looks a name up.

@@ -249,8 +249,7 @@ bool Signal::HasMultiDriver() const noexcept {
 bool Signal::HasPinOf(int polarity) const noexcept {
     const auto matches = [this, polarity](const Pin* pin) {
         const int value = pin->GetPolarity().GetValue();
-        return pin->GetSignal() == this &&
-               (value == polarity || value == Polarity::BiDirectional);
+        return pin->GetSignal() == this && (value == polarity || value == Polarity::BiDirectional);
     };
     for (const Pin* pin : GetPinIterator()) {
         if (matches(pin)) {
@@ -318,8 +317,7 @@ std::string DummyOfPart(std::string_view name) {
 } // namespace
 
 Port::StringBase<char> ScalarSignal::GetDummySignalName() const {
-    return EndsInDummySuffix(GetNameView()) ? std::string(GetNameView())
-                                            : DummyBase(GetNameView());
+    return EndsInDummySuffix(GetNameView()) ? std::string(GetNameView()) : DummyBase(GetNameView());
 }
 
 void ScalarSignal::GetBaseName(StringSet& names) const {
@@ -370,7 +368,7 @@ int Bus::GetWidth() const {
 
 Port::StringBase<char> Bus::GetDummySignalName() const {
     return EndsInDummySuffix(Names::BeforeParenthesis(GetNameView())) ? std::string(GetNameView())
-                                                                     : DummyOfPart(GetNameView());
+                                                                      : DummyOfPart(GetNameView());
 }
 
 void Bus::GetBaseName(StringSet& names) const {
@@ -480,8 +478,8 @@ bool Bus::IsBusName(const char* name) noexcept {
     return Names::ParseBus(Port::ViewOf(name), parsed);
 }
 
-bool Bus::ParseBusName(const char* name, Port::StringBase<char>& base,
-                       Port::StringBase<char>& left, Port::StringBase<char>& right) {
+bool Bus::ParseBusName(const char* name, Port::StringBase<char>& base, Port::StringBase<char>& left,
+                       Port::StringBase<char>& right) {
     // Copies first: the results may be put where the name stands.
     const Port::StringBase<char> text = name;
     Names::BusName parsed;

@@ -44,8 +44,8 @@ std::string FolderOf(const std::string& name) {
     return name.substr(0, name.rfind('/') + 1);
 }
 
-/// Whether the system serves the name itself. Such names lead to open files and devices by ways that
-/// are no folders, so nothing can be put in their place.
+/// Whether the system serves the name itself. Such names lead to open files and devices by ways
+/// that are no folders, so nothing can be put in their place.
 bool IsServedBySystem(std::string_view name) noexcept {
     constexpr std::string_view devices = "/dev/";
     constexpr std::string_view processes = "/proc/";
@@ -69,8 +69,8 @@ bool FollowLinks(std::string& name) {
     return true;
 }
 
-/// A name that no other file of this process has; short, since the target's may be as long as a name
-/// can be.
+/// A name that no other file of this process has; short, since the target's may be as long as a
+/// name can be.
 std::string TemporaryName(const std::string& folder) {
     static std::atomic<unsigned> count{0};
     return folder + ".orn_hdl_" + std::to_string(getpid()) + "_" + std::to_string(++count);
@@ -294,7 +294,8 @@ Stream& Stream::operator<<(std::string_view text) {
 }
 
 bool Stream::flush() {
-    // After a failure nothing more is sent: a file with a hole in it would be worse than a short one.
+    // After a failure nothing more is sent: a file with a hole in it would be worse than a short
+    // one.
     good_ = good_ && (used_ == 0 || file_.write(buffer_.get(), used_));
     used_ = 0;
     return good_;

@@ -30,9 +30,9 @@ void Free(void* memory) noexcept {
 
 namespace {
 
-/// Pages are as large as the system's huge pages and aligned to them. A netlist is walked in no order
-/// of addresses; with huge pages that costs far fewer address translations, and far fewer faults when
-/// the memory is first used.
+/// Pages are as large as the system's huge pages and aligned to them. A netlist is walked in no
+/// order of addresses; with huge pages that costs far fewer address translations, and far fewer
+/// faults when the memory is first used.
 constexpr std::size_t PageSize = std::size_t(2) << 20;
 
 /// Stands at the start of every page. Pages are aligned to their size, so the page of an object is
@@ -53,8 +53,8 @@ Page* NewPage(std::size_t least, bool isHuge) {
     if (size < least || size + PageSize < size) {
         throw std::bad_alloc();
     }
-    void* const mapped = mmap(nullptr, size + PageSize, PROT_READ | PROT_WRITE,
-                              MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+    void* const mapped =
+        mmap(nullptr, size + PageSize, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
     if (mapped == MAP_FAILED) {
         throw std::bad_alloc();
     }

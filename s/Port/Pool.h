@@ -1,6 +1,6 @@
 // Pages for the millions of small objects of a design. An object costs its own size, rounded up to
-// eight bytes, and nothing else; a page returns to the system when its last object has ended, so what
-// ends as a whole gives its memory back as a whole.
+// eight bytes, and nothing else; a page returns to the system when its last object has ended, so
+// what ends as a whole gives its memory back as a whole.
 #pragma once
 
 #include <cstddef>

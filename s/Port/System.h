@@ -1,5 +1,5 @@
-// The one seam around the operating system's file calls. Everything that opens, reads, writes, closes,
-// renames or removes a file goes through it, so that a test can make the N-th call fail.
+// The one seam around the operating system's file calls. Everything that opens, reads, writes,
+// closes, renames or removes a file goes through it, so that a test can make the N-th call fail.
 #pragma once
 
 #include "Port/Export.h"

@@ -32,8 +32,8 @@ public:
     void WriteView(std::string_view text) override;
 
 private:
-    /// What a search for a place to break has found so far in the line. It goes on where it stopped,
-    /// so a line of any length is searched once.
+    /// What a search for a place to break has found so far in the line. It goes on where it
+    /// stopped, so a line of any length is searched once.
     struct BreakSearch {
         std::size_t searched = 0;
         std::size_t afterSpace = 0;

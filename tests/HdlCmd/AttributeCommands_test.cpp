@@ -13,7 +13,7 @@ using Support::EngineScript;
 
 namespace {
 
-constexpr const char *Design = "ADD COMPONENT AND2\n"
+constexpr const char* Design = "ADD COMPONENT AND2\n"
                                "ADD PIN AND2 I0 Input\n"
                                "ADD PIN AND2 D(3:0) Input\n"
                                "ADD INSTANCE AND2 U1\n"
@@ -21,47 +21,47 @@ constexpr const char *Design = "ADD COMPONENT AND2\n"
 
 /// One kind of object that attributes can be given to: how commands name it, and how it is found.
 struct Target {
-    const char *kind;
-    const char *name;
-    AttributeHolder *(*find)(Model &model);
+    const char* kind;
+    const char* name;
+    AttributeHolder* (*find)(Model& model);
 };
 
-void PrintTo(const Target &target, std::ostream *out) {
+void PrintTo(const Target& target, std::ostream* out) {
     *out << target.kind;
 }
 
 const Target Targets[] = {
-    {"MODULE", "", [](Model &m) -> AttributeHolder * { return m.GetNetlist(); }},
-    {"COMPONENT", "and2", [](Model &m) -> AttributeHolder * { return m.GetComponent("AND2"); }},
-    {"INSTANCE", "u1", [](Model &m) -> AttributeHolder * { return m.GetInstance("U1"); }},
-    {"SIGNAL", "n", [](Model &m) -> AttributeHolder * { return m.GetSignal("N"); }},
+    {"MODULE", "", [](Model& m) -> AttributeHolder* { return m.GetNetlist(); }},
+    {"COMPONENT", "and2", [](Model& m) -> AttributeHolder* { return m.GetComponent("AND2"); }},
+    {"INSTANCE", "u1", [](Model& m) -> AttributeHolder* { return m.GetInstance("U1"); }},
+    {"SIGNAL", "n", [](Model& m) -> AttributeHolder* { return m.GetSignal("N"); }},
     {"COMPONENT PIN", "and2.d[3-0]",
-     [](Model &m) -> AttributeHolder * { return m.GetComponent("AND2")->GetPin("D(3:0)"); }},
+     [](Model& m) -> AttributeHolder* { return m.GetComponent("AND2")->GetPin("D(3:0)"); }},
     {"INSTANCE PIN", "u1.i0",
-     [](Model &m) -> AttributeHolder * { return m.GetInstance("U1")->GetPin("I0"); }},
+     [](Model& m) -> AttributeHolder* { return m.GetInstance("U1")->GetPin("I0"); }},
 };
 
 class AttributeCommands : public testing::TestWithParam<Target> {
 protected:
-    std::string Line(const char *verb, const std::string &what, const std::string &arguments) {
+    std::string Line(const char* verb, const std::string& what, const std::string& arguments) {
         return std::string(verb) + " " + target_.kind + " ATTRIBUTE " + what + " " + target_.name +
                " " + arguments;
     }
-    void Add(const std::string &arguments) { script_.Run(Line("ADD", "", arguments)); }
-    void Set(const char *what, const std::string &arguments) {
+    void Add(const std::string& arguments) { script_.Run(Line("ADD", "", arguments)); }
+    void Set(const char* what, const std::string& arguments) {
         script_.Run(Line("SET", what, arguments));
     }
-    Attribute *Get(const char *name) { return target_.find(script_.GetModel())->GetAttr(name); }
+    Attribute* Get(const char* name) { return target_.find(script_.GetModel())->GetAttr(name); }
     int Count() {
         int count = 0;
-        for ([[maybe_unused]] const Attribute *attribute :
+        for ([[maybe_unused]] const Attribute* attribute :
              target_.find(script_.GetModel())->GetAttrIterator()) {
             ++count;
         }
         return count;
     }
 
-    const Target &target_ = GetParam();
+    const Target& target_ = GetParam();
     EngineScript script_{Design};
 };
 
@@ -86,10 +86,10 @@ TEST_P(AttributeCommands, AValueIsOptional) {
 
 TEST_P(AttributeCommands, AddTakesAType) {
     const struct {
-        const char *type;
+        const char* type;
         Attribute::ValueType valueType;
-        const char *value;
-        const char *stored;
+        const char* value;
+        const char* stored;
     } cases[] = {{"String", Attribute::String, "\"two  words\"", "two  words"},
                  {"integer", Attribute::Integer, "12abc", "12"},
                  {"FLOAT", Attribute::Float, "12.345", "12.345"},
@@ -97,7 +97,7 @@ TEST_P(AttributeCommands, AddTakesAType) {
                  {"bit", Attribute::Bit, "1", "1"},
                  {"BitVector", Attribute::BitVector, "8:H:A5", "A5"},
                  {"USER", Attribute::User, "ready", "ready"}};
-    for (const auto &c : cases) {
+    for (const auto& c : cases) {
         Add(std::string("-Type=") + c.type + " " + c.type + " " + c.value);
         ASSERT_NE(Get(c.type), nullptr) << c.type;
         EXPECT_EQ(Get(c.type)->GetValueType(), c.valueType) << c.type;
@@ -146,7 +146,7 @@ TEST_P(AttributeCommands, SetChangesTheValue) {
 TEST_P(AttributeCommands, SetNamesTheUserType) {
     Add("-TYPE=User STATE idle");
     Set("USERTYPE", "state state_type ignored");
-    const auto *attribute = dynamic_cast<AttributeUser *>(Get("STATE"));
+    const auto* attribute = dynamic_cast<AttributeUser*>(Get("STATE"));
     ASSERT_NE(attribute, nullptr);
     EXPECT_EQ(attribute->GetUserType(), "state_type");
     EXPECT_EQ(attribute->GetValueString(), "idle");
@@ -197,12 +197,12 @@ TEST(InstanceAttributes, AreLookedForOnTheComponentToo) {
                "SET INSTANCE ATTRIBUTE VALUE U1 OWN new\n"
                "SET INSTANCE ATTRIBUTE USERTYPE U1 OWN type\n"
                "SET INSTANCE ATTRIBUTE OPTION U1 OWN -GENERIC=SYN -SYNATTR=ASSIGN");
-    const Component *component = script.GetModel().GetComponent("AND2");
-    const Instance *instance = script.GetModel().GetInstance("U1");
+    const Component* component = script.GetModel().GetComponent("AND2");
+    const Instance* instance = script.GetModel().GetInstance("U1");
     EXPECT_EQ(component->GetAttr("BOTH")->GetValueString(), "c");
     EXPECT_EQ(instance->GetAttr("BOTH")->GetValueString(), "new");
     EXPECT_EQ(instance->GetAttr("OWN"), nullptr);
-    const auto *own = dynamic_cast<AttributeUser *>(component->GetAttr("OWN"));
+    const auto* own = dynamic_cast<AttributeUser*>(component->GetAttr("OWN"));
     EXPECT_EQ(own->GetValueString(), "new");
     EXPECT_EQ(own->GetUserType(), "type");
     EXPECT_EQ(own->GetGeneric(), "SYN");
@@ -228,7 +228,7 @@ TEST(PinAttributes, OfAnInstanceAreItsOwn) {
 TEST(PinNames, AreWhatFollowsTheFirstDot) {
     EngineScript script("ADD COMPONENT C\nADD PIN C A.B Input\nADD PIN C \"\" Input");
     script.Run("ADD COMPONENT PIN COMMENT C.A.B text\nADD COMPONENT PIN COMMENT C. empty");
-    const Component *component = script.GetModel().GetComponent("C");
+    const Component* component = script.GetModel().GetComponent("C");
     EXPECT_EQ(component->GetPin("A.B")->GetComment(), "text\n");
     EXPECT_EQ(component->GetPin("")->GetComment(), "empty\n");
 }
@@ -239,11 +239,11 @@ TEST(ModelAttributes, NullHoldersAreIgnored) {
     CommandFactory factory;
     Model model(&factory);
     const std::string failure = Support::FailureOf([&] {
-        model.AddAttr(static_cast<AttributeHolder *>(nullptr), "A", "v", "String");
-        model.SetAttrValue(static_cast<AttributeHolder *>(nullptr), "A", "v");
-        model.SetGenericAttrValue(static_cast<AttributeHolder *>(nullptr), "A", "SYN");
-        model.SetSynAttrValue(static_cast<AttributeHolder *>(nullptr), "A", "ASSIGN");
-        model.SetUserType(static_cast<AttributeHolder *>(nullptr), "A", "t");
+        model.AddAttr(static_cast<AttributeHolder*>(nullptr), "A", "v", "String");
+        model.SetAttrValue(static_cast<AttributeHolder*>(nullptr), "A", "v");
+        model.SetGenericAttrValue(static_cast<AttributeHolder*>(nullptr), "A", "SYN");
+        model.SetSynAttrValue(static_cast<AttributeHolder*>(nullptr), "A", "ASSIGN");
+        model.SetUserType(static_cast<AttributeHolder*>(nullptr), "A", "t");
     });
     EXPECT_EQ(failure, "");
     EXPECT_EQ(model.GetAttr("A", nullptr), nullptr);
@@ -253,7 +253,7 @@ TEST(ModelAttributes, NullTypesAndValuesHaveDefaults) {
     CommandFactory factory;
     Model model(&factory);
     model.AddModuleAttr("A", nullptr, nullptr);
-    const Attribute *attribute = model.GetAttr("a", model.GetNetlist());
+    const Attribute* attribute = model.GetAttr("a", model.GetNetlist());
     ASSERT_NE(attribute, nullptr);
     EXPECT_EQ(attribute->GetValueType(), Attribute::String);
     EXPECT_EQ(attribute->GetValueString(), "");

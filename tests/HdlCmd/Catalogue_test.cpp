@@ -16,18 +16,18 @@ using Support::EngineScript;
 namespace {
 
 struct Phrase {
-    const char *phrase;
+    const char* phrase;
     /// The arguments of the shortest line that parses.
-    const char *arguments;
+    const char* arguments;
     /// Whether a line that lacks the last of these words is refused.
     bool needsThemAll = true;
 };
 
-void PrintTo(const Phrase &phrase, std::ostream *out) {
+void PrintTo(const Phrase& phrase, std::ostream* out) {
     *out << phrase.phrase;
 }
 
-const std::vector<Phrase> &Phrases() {
+const std::vector<Phrase>& Phrases() {
     static const std::vector<Phrase> phrases = {
         {"NOOP", "", false},
         {"SET NETLIST NAME", "top"},
@@ -94,11 +94,11 @@ const std::vector<Phrase> &Phrases() {
     return phrases;
 }
 
-StringArray Words(const std::string &line) {
+StringArray Words(const std::string& line) {
     return StringArray(line.c_str(), " ", true, "\"\"''");
 }
 
-StringArray WithoutLast(const StringArray &words) {
+StringArray WithoutLast(const StringArray& words) {
     StringArray shorter;
     for (int i = 0; i + 1 < words.GetSize(); ++i) {
         shorter.Add(words.GetAt(i));
@@ -106,13 +106,13 @@ StringArray WithoutLast(const StringArray &words) {
     return shorter;
 }
 
-std::string InvalidArguments(const char *phrase) {
+std::string InvalidArguments(const char* phrase) {
     return std::string(phrase) + ": Invalid Arguments.\n";
 }
 
 class EveryPhrase : public testing::TestWithParam<Phrase> {
 protected:
-    bool Parses(const StringArray &words) {
+    bool Parses(const StringArray& words) {
         const std::unique_ptr<Command> command(factory_.CreateCommand(&model_, words));
         EXPECT_NE(command, nullptr);
         return command != nullptr && command->Parse(words);
@@ -120,14 +120,14 @@ protected:
 
     CommandFactory factory_;
     Model model_{&factory_};
-    const Phrase &phrase_ = GetParam();
+    const Phrase& phrase_ = GetParam();
     const StringArray words_ = Words(std::string(phrase_.phrase) + " " + phrase_.arguments);
 };
 
 } // namespace
 
 TEST(Catalogue, HoldsSixtyOnePhrasesInOrder) {
-    const std::vector<CommandInfo> &catalogue = CommandFactory::GetCatalogue();
+    const std::vector<CommandInfo>& catalogue = CommandFactory::GetCatalogue();
     ASSERT_EQ(Phrases().size(), 61u);
     ASSERT_EQ(catalogue.size(), 61u);
     for (std::size_t i = 0; i < catalogue.size(); ++i) {
@@ -185,13 +185,13 @@ TEST_P(EveryPhrase, NamesItselfAsRegisteredWhenItRefuses) {
         return;
     }
     std::string line = phrase_.phrase;
-    for (char &c : line) {
+    for (char& c : line) {
         c = Port::ToLower(c);
     }
     try {
         model_.Execute(line.c_str());
         FAIL() << line;
-    } catch (const Exception &exception) {
+    } catch (const Exception& exception) {
         EXPECT_EQ(exception.getLocalized(), InvalidArguments(phrase_.phrase));
         EXPECT_EQ(exception.GetModule(), "DesignEntry");
         EXPECT_EQ(exception.GetSourceUnit(), "../s/HdlCmd");
@@ -210,7 +210,7 @@ TEST_P(EveryPhrase, NeedsAModel) {
     try {
         command->Execute();
         FAIL();
-    } catch (const Exception &exception) {
+    } catch (const Exception& exception) {
         EXPECT_EQ(exception.getLocalized(), "Missing Model.\n");
         EXPECT_EQ(exception.GetModule(), "DesignEntry");
         EXPECT_EQ(exception.GetSourceUnit(), "../s/HdlCmd");
@@ -223,8 +223,8 @@ INSTANTIATE_TEST_SUITE_P(Catalogue, EveryPhrase, testing::ValuesIn(Phrases()));
 
 TEST(CommandArguments, OfTheWrongKindAreRefused) {
     const struct {
-        const char *line;
-        const char *phrase;
+        const char* line;
+        const char* phrase;
     } cases[] = {
         {"SET NETLIST NAME \"\" x", "SET NETLIST NAME"},
         {"SET SOURCE FILE \"\" x", "SET SOURCE FILE"},
@@ -278,7 +278,7 @@ TEST(CommandArguments, OfTheWrongKindAreRefused) {
         {"Set Application \"\" x", "Set Application"},
         {"Set Device \"\" x", "Set Device"},
     };
-    for (const auto &c : cases) {
+    for (const auto& c : cases) {
         EngineScript script;
         EXPECT_EQ(script.GetFailure(c.line), InvalidArguments(c.phrase)) << c.line;
         EXPECT_EQ(script.GetDoneCount(), 0) << c.line;

@@ -20,19 +20,19 @@ namespace {
 std::vector<std::string> log;
 int aliveCommands = 0;
 
-std::string Join(const StringArray &tokens) {
+std::string Join(const StringArray& tokens) {
     return std::string(tokens.Concatenate("|").GetView());
 }
 
 /// Notes its life in the log and fails where its first argument says so.
 class LoggedCommand : public Command {
 public:
-    LoggedCommand(Model *model, const char *name) : Command(model), name_(name) { ++aliveCommands; }
+    LoggedCommand(Model* model, const char* name) : Command(model), name_(name) { ++aliveCommands; }
     ~LoggedCommand() override {
         --aliveCommands;
         log.push_back(std::string("delete ") + argument_);
     }
-    bool Parse(const StringArray &tokens) override {
+    bool Parse(const StringArray& tokens) override {
         log.push_back("parse " + Join(tokens));
         argument_ = std::string(tokens.GetAt(1).GetView());
         if (argument_ == "throw-in-parse") {
@@ -49,9 +49,9 @@ public:
             throw std::bad_alloc();
         }
     }
-    const char *GetName() const override { return name_; }
+    const char* GetName() const override { return name_; }
 
-    static Command *Create(Model *model, const StringArray &) {
+    static Command* Create(Model* model, const StringArray&) {
         return new LoggedCommand(model, "Logged Phrase");
     }
 
@@ -62,11 +62,11 @@ private:
         throw exception;
     }
 
-    const char *name_;
+    const char* name_;
     std::string argument_;
 };
 
-StringArray Words(const char *text) {
+StringArray Words(const char* text) {
     return StringArray(text, " ", true, "\"\"''");
 }
 
@@ -78,7 +78,7 @@ protected:
         factory_.AddCommandCreator("LOGGED", &LoggedCommand::Create);
     }
 
-    std::string GetFailure(const char *line) {
+    std::string GetFailure(const char* line) {
         return FailureOf([&] { model_.Execute(line); });
     }
     int GetDoneCount() { return model_.GetCommandManager()->GetDoneCommandCount(); }
@@ -93,8 +93,8 @@ protected:
 
 TEST_F(CommandLine, TokensReachTheCommandAsTheQuotesSay) {
     const struct {
-        const char *line;
-        const char *tokens;
+        const char* line;
+        const char* tokens;
     } cases[] = {
         {"LOGGED a b", "LOGGED|a|b"},
         {"   LOGGED   a    b   ", "LOGGED|a|b"},
@@ -117,7 +117,7 @@ TEST_F(CommandLine, TokensReachTheCommandAsTheQuotesSay) {
         {"LOGGED # no comment", "LOGGED|#|no|comment"},
         {"LOGGED a\\", "LOGGED|a\\"},
     };
-    for (const auto &c : cases) {
+    for (const auto& c : cases) {
         log.clear();
         EXPECT_EQ(GetFailure(c.line), "") << c.line;
         ASSERT_FALSE(log.empty()) << c.line;
@@ -126,7 +126,7 @@ TEST_F(CommandLine, TokensReachTheCommandAsTheQuotesSay) {
 }
 
 TEST_F(CommandLine, BlankLinesDoNothing) {
-    EXPECT_TRUE(model_.Execute(static_cast<const char *>(nullptr)));
+    EXPECT_TRUE(model_.Execute(static_cast<const char*>(nullptr)));
     EXPECT_TRUE(model_.Execute(""));
     EXPECT_TRUE(model_.Execute("      "));
     EXPECT_TRUE(model_.Execute("\"\""));
@@ -160,7 +160,7 @@ TEST_F(CommandLine, WordsCanBeGivenReady) {
 // Phrase look-up
 
 TEST_F(CommandLine, PhrasesIgnoreCase) {
-    for (const char *line : {"add component a", "ADD COMPONENT b", "Add Component c"}) {
+    for (const char* line : {"add component a", "ADD COMPONENT b", "Add Component c"}) {
         EXPECT_EQ(GetFailure(line), "") << line;
     }
     EXPECT_EQ(GetFailure("set application tool"), "");
@@ -187,8 +187,8 @@ TEST_F(CommandLine, ALongPhraseIsFoundPastUnknownPrefixes) {
 }
 
 TEST_F(CommandLine, ArgumentsOfAnyNumberArePartOfTheLookUp) {
-    factory_.AddCommandCreator("LOGGED a b c d e f g h", [](Model *model, const StringArray &) {
-        return static_cast<Command *>(new LoggedCommand(model, "Long Phrase"));
+    factory_.AddCommandCreator("LOGGED a b c d e f g h", [](Model* model, const StringArray&) {
+        return static_cast<Command*>(new LoggedCommand(model, "Long Phrase"));
     });
     std::unique_ptr<Command> longest(factory_.CreateCommand(&model_, "logged A b C d E f G h x"));
     std::unique_ptr<Command> shorter(factory_.CreateCommand(&model_, "LOGGED a b c d e f g x h"));
@@ -208,11 +208,11 @@ TEST_F(CommandLine, AQuotedPhraseIsThePhrase) {
 }
 
 TEST_F(CommandLine, UnknownPhrasesHaveNoCreator) {
-    for (const char *line : {"", "ADD", "COMPONENT ADD", "ADDCOMPONENT", "X NOOP"}) {
+    for (const char* line : {"", "ADD", "COMPONENT ADD", "ADDCOMPONENT", "X NOOP"}) {
         EXPECT_EQ(factory_.GetCommandCreator(line), nullptr) << line;
         EXPECT_EQ(factory_.CreateCommand(&model_, line), nullptr) << line;
     }
-    EXPECT_EQ(factory_.GetCommandCreator(static_cast<const char *>(nullptr)), nullptr);
+    EXPECT_EQ(factory_.GetCommandCreator(static_cast<const char*>(nullptr)), nullptr);
     EXPECT_EQ(factory_.GetCommandCreator(StringArray()), nullptr);
     EXPECT_EQ(factory_.CreateCommand(&model_, StringArray()), nullptr);
 }
@@ -306,7 +306,7 @@ TEST_F(CommandLine, ThePassedOnExceptionKeepsItsPlace) {
     try {
         model_.Execute("LOGGED throw-in-execute");
         FAIL();
-    } catch (const Exception &exception) {
+    } catch (const Exception& exception) {
         EXPECT_EQ(exception.GetModule(), "Module");
         EXPECT_EQ(exception.GetSourceUnit(), "unit");
         EXPECT_EQ(exception.GetRevision(), "revision");
@@ -316,7 +316,7 @@ TEST_F(CommandLine, ThePassedOnExceptionKeepsItsPlace) {
 
 TEST_F(CommandLine, ClearDeletesTheFirstCommandFirst) {
     CommandManager manager;
-    for (const char *line : {"LOGGED a", "LOGGED b", "LOGGED c"}) {
+    for (const char* line : {"LOGGED a", "LOGGED b", "LOGGED c"}) {
         EXPECT_TRUE(manager.CreateAndExecute(Words(line), &model_, &factory_));
     }
     EXPECT_EQ(manager.GetDoneCommandCount(), 3);
@@ -350,12 +350,12 @@ TEST_F(CommandLine, ThousandsOfCommandsAreKept) {
 // The modified flag
 
 TEST_F(CommandLine, OnlyChangesOfTheDesignSetTheModifiedFlag) {
-    const auto isModifiedBy = [&](const char *line) {
+    const auto isModifiedBy = [&](const char* line) {
         model_.SetModifiedFlag(false);
         EXPECT_EQ(GetFailure(line), "") << line;
         return model_.IsModified();
     };
-    for (const char *line : {"ADD COMPONENT AND2",
+    for (const char* line : {"ADD COMPONENT AND2",
                              "ADD PIN AND2 I0 Input",
                              "ADD PIN AND2 D(3:0) Input",
                              "ADD INSTANCE AND2 U1",
@@ -393,7 +393,7 @@ TEST_F(CommandLine, OnlyChangesOfTheDesignSetTheModifiedFlag) {
     const Support::TemporaryFolder folder;
     const std::string verilog = "WRITE VERILOG " + (folder / "a.v");
     const std::string vhdl = "WRITE VHDL " + (folder / "a.vhd");
-    for (const char *line : {"",
+    for (const char* line : {"",
                              "NOOP",
                              "SET NETLIST NAME top",
                              "SET SOURCE FILE top.src",
@@ -425,7 +425,7 @@ TEST_F(CommandLine, OnlyChangesOfTheDesignSetTheModifiedFlag) {
 
 class CommandFile : public CommandLine {
 protected:
-    bool Read(const std::string &text) {
+    bool Read(const std::string& text) {
         Support::WriteWholeFile(file_, text);
         return model_.Read(file_.c_str());
     }
@@ -483,7 +483,7 @@ TEST_F(CommandFile, AnExceptionStopsTheReplayAndKeepsTheFlag) {
 
 TEST_F(CommandFile, AFileThatCannotBeOpenedClearsTheFlag) {
     const std::string missing = folder_ / "missing.cmd";
-    for (const char *name : {static_cast<const char *>(nullptr), "", missing.c_str(),
+    for (const char* name : {static_cast<const char*>(nullptr), "", missing.c_str(),
                              folder_.GetPath().c_str(), "/dev/null/x"}) {
         model_.SetModifiedFlag(true);
         EXPECT_FALSE(model_.Read(name));

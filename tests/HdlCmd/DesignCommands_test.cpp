@@ -13,17 +13,17 @@ using Support::EngineScript;
 
 namespace {
 
-std::vector<std::string> NamesOf(const Iterator<Signal *> &signals) {
+std::vector<std::string> NamesOf(const Iterator<Signal*>& signals) {
     std::vector<std::string> names;
-    for (const Signal *signal : signals) {
+    for (const Signal* signal : signals) {
         names.emplace_back(signal->GetNameView());
     }
     return names;
 }
 
-std::vector<std::string> NamesOf(const Iterator<Pin *> &pins) {
+std::vector<std::string> NamesOf(const Iterator<Pin*>& pins) {
     std::vector<std::string> names;
-    for (const Pin *pin : pins) {
+    for (const Pin* pin : pins) {
         names.emplace_back(pin->GetNameView());
     }
     return names;
@@ -31,7 +31,7 @@ std::vector<std::string> NamesOf(const Iterator<Pin *> &pins) {
 
 using Names = std::vector<std::string>;
 
-constexpr const char *Cells = "ADD COMPONENT AND2\n"
+constexpr const char* Cells = "ADD COMPONENT AND2\n"
                               "ADD PIN AND2 I0 Input\n"
                               "ADD PIN AND2 D(3:0) Input\n"
                               "ADD PIN AND2 K(2) BiDirectional\n"
@@ -40,9 +40,9 @@ constexpr const char *Cells = "ADD COMPONENT AND2\n"
 
 class DesignCommands : public testing::Test {
 protected:
-    Model &GetModel() { return script_.GetModel(); }
-    Signal *GetSignal(const char *name) { return GetModel().GetSignal(name); }
-    Pin *GetPin(const char *name) { return GetModel().GetInstance("U1")->GetPin(name); }
+    Model& GetModel() { return script_.GetModel(); }
+    Signal* GetSignal(const char* name) { return GetModel().GetSignal(name); }
+    Pin* GetPin(const char* name) { return GetModel().GetInstance("U1")->GetPin(name); }
 
     EngineScript script_{Cells};
 };
@@ -67,10 +67,10 @@ TEST_F(DesignCommands, AddComponent) {
 
 TEST_F(DesignCommands, AddPin) {
     script_.Run("ADD PIN and2 Q[1:0] bidir 2:B:01\nADD PIN AND2 C out\nADD PIN AND2 E i \"\" x");
-    const Component *component = GetModel().GetComponent("AND2");
+    const Component* component = GetModel().GetComponent("AND2");
     EXPECT_EQ(NamesOf(component->GetPinIterator()),
               (Names{"I0", "D(3:0)", "K(2)", "O", "Q(1:0)", "C", "E"}));
-    const Pin *bus = component->GetPin("q(1:0)");
+    const Pin* bus = component->GetPin("q(1:0)");
     EXPECT_EQ(bus->GetPinType(), PinTypeBus);
     EXPECT_EQ(bus->GetPolarity(), Polarity(Polarity::BiDirectional));
     EXPECT_EQ(bus->GetDefaultValue().GetValue(), "01");
@@ -87,7 +87,7 @@ TEST_F(DesignCommands, AddPin) {
 
 TEST_F(DesignCommands, AddInstance) {
     script_.Run("ADD INSTANCE and2 u[2] ignored");
-    const Instance *instance = GetModel().GetInstance("U(2)");
+    const Instance* instance = GetModel().GetInstance("U(2)");
     ASSERT_NE(instance, nullptr);
     EXPECT_EQ(instance->GetName(), "u(2)");
     EXPECT_EQ(instance->GetComponent(), GetModel().GetComponent("AND2"));
@@ -150,7 +150,7 @@ TEST_F(DesignCommands, ADotSelectsThePinForm) {
 TEST_F(DesignCommands, AssignConstantToASignal) {
     script_.Run("ASSIGN CONSTANT N 0\nASSIGN CONSTANT B(7:0) 8:h:A5\nASSIGN CONSTANT B(3) \"\" x");
     EXPECT_EQ(GetSignal("N")->GetConstantValue().GetValue(), "0");
-    const BitVectorValue &value = GetSignal("B(7:0)")->GetConstantValue();
+    const BitVectorValue& value = GetSignal("B(7:0)")->GetConstantValue();
     EXPECT_EQ(value.GetValue(), "A5");
     EXPECT_EQ(value.GetBase(), 16);
     EXPECT_EQ(value.GetLength(), 8);
@@ -164,15 +164,15 @@ TEST_F(DesignCommands, AssignConstantToAPin) {
     script_.Run(
         "ASSIGN CONSTANT U1.I0 1\nASSIGN CONSTANT U1.D(3:0) 1010\nASSIGN CONSTANT U1.K(2) 0");
     const struct {
-        const char *pin;
-        const char *signal;
+        const char* pin;
+        const char* signal;
         int type;
-        const char *value;
+        const char* value;
     } cases[] = {{"I0", "U1_I0_CONST_SIGNAL", SignalTypeScalar, "1"},
                  {"D(3:0)", "U1_D_CONST_SIGNAL(3:0)", SignalTypeBus, "1010"},
                  {"K(2)", "U1_K_CONST_SIGNAL(2)", SignalTypeScalar, "0"}};
-    for (const auto &c : cases) {
-        const Signal *signal = GetPin(c.pin)->GetSignal();
+    for (const auto& c : cases) {
+        const Signal* signal = GetPin(c.pin)->GetSignal();
         ASSERT_NE(signal, nullptr) << c.pin;
         EXPECT_EQ(signal->GetName(), c.signal);
         EXPECT_EQ(signal, GetSignal(c.signal));
@@ -258,13 +258,13 @@ TEST_F(DesignCommands, ABitOrSliceSpellsItsBaseNameAsTheBusDoes) {
     EXPECT_EQ(GetSignal("data(+3)")->GetName(), "Data(+3)");
     EXPECT_EQ(GetSignal("data(3:0)")->GetName(), "Data(3:0)");
     EXPECT_EQ(GetSignal("data(3:0)")->GetSignalType(), SignalTypeBusSlice);
-    const Bus *bus = script_.GetNetlist().GetParentBus("DATA");
+    const Bus* bus = script_.GetNetlist().GetParentBus("DATA");
     EXPECT_EQ(NamesOf(bus->GetBusSliceIterator()), (Names{"Data(+3)", "Data(3:0)"}));
 }
 
 TEST_F(DesignCommands, CompoundsAreMadeOfTheirMembers) {
     script_.Run("ADD SIGNAL B(7:0)\nCONNECT SIGNAL A,B(3:0)\\B(7),New,C(2),D(1:0) U1.I0");
-    const auto *compound = dynamic_cast<CompoundBus *>(GetSignal("A,B(3:0)\\B(7),New,C(2),D(1:0)"));
+    const auto* compound = dynamic_cast<CompoundBus*>(GetSignal("A,B(3:0)\\B(7),New,C(2),D(1:0)"));
     ASSERT_NE(compound, nullptr);
     EXPECT_EQ(NamesOf(compound->GetBusMemberIterator()),
               (Names{"A", "B(3:0)", "B(7)", "New", "C(2)", "D(1:0)"}));
@@ -280,7 +280,7 @@ TEST_F(DesignCommands, CompoundsAreMadeOfTheirMembers) {
 
 TEST_F(DesignCommands, ACompoundMayNameOneSignalTwice) {
     script_.Run("CONNECT SIGNAL A,a,A U1.I0");
-    const auto *compound = dynamic_cast<CompoundBus *>(GetSignal("A,a,A"));
+    const auto* compound = dynamic_cast<CompoundBus*>(GetSignal("A,a,A"));
     ASSERT_NE(compound, nullptr);
     ASSERT_EQ(compound->GetSize(), 3);
     EXPECT_EQ(compound->GetAt(0), compound->GetAt(1));
@@ -289,7 +289,7 @@ TEST_F(DesignCommands, ACompoundMayNameOneSignalTwice) {
 
 TEST_F(DesignCommands, EmptyPiecesOfACompoundAreSkipped) {
     script_.Run("CONNECT SIGNAL A,,B\\,C X");
-    const auto *compound = dynamic_cast<CompoundBus *>(GetSignal("A,,B\\,C"));
+    const auto* compound = dynamic_cast<CompoundBus*>(GetSignal("A,,B\\,C"));
     ASSERT_NE(compound, nullptr);
     EXPECT_EQ(NamesOf(compound->GetBusMemberIterator()), (Names{"A", "B", "C"}));
     // One piece alone makes no compound.
@@ -310,7 +310,7 @@ TEST_F(DesignCommands, PinsAreFoundAmongManyAndAmongLateOnes) {
     EXPECT_EQ(script_.GetFailure("ADD PIN wide p150 Input"),
               "Component \"wide\" already has pin \"p150\".\n");
     EXPECT_EQ(script_.GetFailure("CONNECT SIGNAL N Early.p51"), "Pin \"Early.p51\" not found.\n");
-    for (const char *moment : {"before", "after"}) {
+    for (const char* moment : {"before", "after"}) {
         for (int i = 0; i < 200; ++i) {
             const std::string pin = "p" + std::to_string(i);
             EXPECT_EQ(script_.GetFailure("CONNECT SIGNAL N late." + pin), "") << moment << pin;
@@ -336,7 +336,7 @@ TEST_F(DesignCommands, AWiderUseReplacesTheBus) {
                 "CONNECT SIGNAL Q(3:0) U1.I0\n"
                 "CONNECT SIGNAL Q(5) U1.O\n"
                 "CONNECT SIGNAL q(15:0) U1.K(2)");
-    auto *bus = dynamic_cast<Bus *>(GetSignal("Q(15:0)"));
+    auto* bus = dynamic_cast<Bus*>(GetSignal("Q(15:0)"));
     ASSERT_NE(bus, nullptr);
     EXPECT_EQ(bus->GetName(), "Q(15:0)");
     EXPECT_EQ(script_.GetNetlist().GetParentBus("Q"), bus);
@@ -346,7 +346,7 @@ TEST_F(DesignCommands, AWiderUseReplacesTheBus) {
     EXPECT_EQ(bus->GetConstantValue().GetValue(), "");
     EXPECT_EQ(GetPin("K(2)")->GetSignal(), bus);
 
-    auto *slice = dynamic_cast<BusSlice *>(GetSignal("Q(7:0)"));
+    auto* slice = dynamic_cast<BusSlice*>(GetSignal("Q(7:0)"));
     ASSERT_NE(slice, nullptr);
     EXPECT_EQ(slice->GetParentBus(), bus);
     EXPECT_EQ(slice->GetComment(), "");
@@ -357,11 +357,11 @@ TEST_F(DesignCommands, AWiderUseReplacesTheBus) {
     EXPECT_EQ(NamesOf(slice->GetPinIterator()), (Names{"D(3:0)"}));
     EXPECT_EQ(NamesOf(slice->GetSignalIterator()), (Names{"alias"}));
     EXPECT_EQ(*GetSignal("other")->GetSignalIterator().begin(), slice);
-    EXPECT_EQ(dynamic_cast<CompoundBus *>(GetSignal("A,Q(7:0)"))->GetAt(1), slice);
+    EXPECT_EQ(dynamic_cast<CompoundBus*>(GetSignal("A,Q(7:0)"))->GetAt(1), slice);
 
     EXPECT_EQ(NamesOf(bus->GetBusSliceIterator()), (Names{"Q(7:0)", "Q(3:0)", "Q(5)"}));
-    EXPECT_EQ(dynamic_cast<BusSlice *>(GetSignal("Q(3:0)"))->GetParentBus(), bus);
-    EXPECT_EQ(dynamic_cast<BusIndex *>(GetSignal("Q(5)"))->GetParentBus(), bus);
+    EXPECT_EQ(dynamic_cast<BusSlice*>(GetSignal("Q(3:0)"))->GetParentBus(), bus);
+    EXPECT_EQ(dynamic_cast<BusIndex*>(GetSignal("Q(5)"))->GetParentBus(), bus);
     EXPECT_EQ(GetPin("O")->GetSignal(), GetSignal("Q(5)"));
 
     const Names all = NamesOf(script_.GetNetlist().GetSignalIterator());
@@ -376,7 +376,7 @@ TEST_F(DesignCommands, AUseOfTheSameWidthReplacesTheBus) {
     EXPECT_EQ(GetSignal("Q(7:0)")->GetSignalType(), SignalTypeBusSlice);
     script_.Run("CONNECT SIGNAL Q(15:8) X");
     EXPECT_EQ(GetSignal("Q(15:8)")->GetSignalType(), SignalTypeBus);
-    const auto *bus = dynamic_cast<Bus *>(GetSignal("Q(15:8)"));
+    const auto* bus = dynamic_cast<Bus*>(GetSignal("Q(15:8)"));
     EXPECT_EQ(NamesOf(bus->GetBusSliceIterator()), (Names{"Q(0:7)", "Q(7:0)"}));
 }
 
@@ -384,7 +384,7 @@ TEST_F(DesignCommands, APinSetWithoutBeingListedFollowsTheWidening) {
     script_.Run("ASSIGN CONSTANT U1.D(3:0) 4:B:1010\n"
                 "CONNECT SIGNAL U1_D_CONST_SIGNAL(7:0) X");
     EXPECT_EQ(GetSignal("U1_D_CONST_SIGNAL(7:0)")->GetSignalType(), SignalTypeBus);
-    const Signal *slice = GetSignal("U1_D_CONST_SIGNAL(3:0)");
+    const Signal* slice = GetSignal("U1_D_CONST_SIGNAL(3:0)");
     EXPECT_EQ(slice->GetSignalType(), SignalTypeBusSlice);
     EXPECT_EQ(GetPin("D(3:0)")->GetSignal(), slice);
     EXPECT_EQ(slice->GetConstantValue().GetValue(), "1010");
@@ -392,10 +392,10 @@ TEST_F(DesignCommands, APinSetWithoutBeingListedFollowsTheWidening) {
 
 TEST_F(DesignCommands, TheSecondSignalOfAConnectionMayWidenTheFirst) {
     script_.Run("ADD SIGNAL Q(7:0)\nCONNECT SIGNAL Q(1:0) X\nCONNECT SIGNAL Q(7:0) Q(15:0)");
-    const Signal *slice = GetSignal("Q(7:0)");
+    const Signal* slice = GetSignal("Q(7:0)");
     ASSERT_EQ(slice->GetSignalType(), SignalTypeBusSlice);
     EXPECT_EQ(NamesOf(slice->GetSignalIterator()), (Names{"Q(15:0)"}));
-    const auto *bus = dynamic_cast<Bus *>(GetSignal("Q(15:0)"));
+    const auto* bus = dynamic_cast<Bus*>(GetSignal("Q(15:0)"));
     ASSERT_NE(bus, nullptr);
     EXPECT_TRUE(bus->GetSignalIterator().IsAtEnd());
     EXPECT_EQ(NamesOf(bus->GetBusSliceIterator()), (Names{"Q(7:0)", "Q(1:0)"}));
@@ -403,7 +403,7 @@ TEST_F(DesignCommands, TheSecondSignalOfAConnectionMayWidenTheFirst) {
 
 TEST_F(DesignCommands, ALaterMemberOfACompoundMayWidenAnEarlierOne) {
     script_.Run("ADD SIGNAL Q(7:0)\nCONNECT SIGNAL Q(7:0),A,Q(15:0),Q(7:0) U1.I0");
-    const auto *compound = dynamic_cast<CompoundBus *>(GetSignal("Q(7:0),A,Q(15:0),Q(7:0)"));
+    const auto* compound = dynamic_cast<CompoundBus*>(GetSignal("Q(7:0),A,Q(15:0),Q(7:0)"));
     ASSERT_NE(compound, nullptr);
     ASSERT_EQ(compound->GetSize(), 4);
     EXPECT_EQ(compound->GetAt(0)->GetSignalType(), SignalTypeBusSlice);

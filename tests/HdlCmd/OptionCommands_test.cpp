@@ -14,7 +14,7 @@ using VerilogOption = HdlOptions::VerilogOption;
 
 namespace {
 
-void ExpectDefaults(const HdlOptions &options) {
+void ExpectDefaults(const HdlOptions& options) {
     EXPECT_FALSE(options.vhdl.suppressConfiguration);
     EXPECT_FALSE(options.vhdl.flattenBus);
     EXPECT_TRUE(options.vhdl.useDefaultLibrary);
@@ -40,17 +40,17 @@ void ExpectDefaults(const HdlOptions &options) {
 
 /// A command that sets a flag unless its word is "false".
 struct Flag {
-    const char *phrase;
+    const char* phrase;
     bool HdlOptions::VhdlOption::*flag;
 };
 
-void PrintTo(const Flag &flag, std::ostream *out) {
+void PrintTo(const Flag& flag, std::ostream* out) {
     *out << flag.phrase;
 }
 
 class FlagCommands : public testing::TestWithParam<Flag> {
 protected:
-    bool FlagAfter(const std::string &words) {
+    bool FlagAfter(const std::string& words) {
         script_.Run(std::string(GetParam().phrase) + " " + words);
         return script_.GetOptions().vhdl.*GetParam().flag;
     }
@@ -88,12 +88,12 @@ TEST(Options, AreCopiedWhole) {
 
 TEST(Options, SynthesisTypesIgnoreCase) {
     const struct {
-        const char *text;
+        const char* text;
         int type;
     } cases[] = {{"QSN", 0},         {"EXEMPLAR", 1},  {"synplicity", 2}, {"Synopsys", 3},
                  {"VERILOG2001", 4}, {"precision", 5}, {"XYZ", 0},        {"", 0},
                  {"SYNPLICITY ", 0}, {"VERILOG95", 0}};
-    for (const auto &c : cases) {
+    for (const auto& c : cases) {
         VerilogOption option;
         option.synthesisType = VerilogOption::EXEMPLAR;
         option.SetSynthesisType(c.text);
@@ -140,7 +140,7 @@ TEST(OptionCommands, ListsGrow) {
     EngineScript script("ADD INCLUDE a.vh ignored\nADD INCLUDE \"b c.vh\"\nADD INCLUDE a.vh\n"
                         "ADD LIBRARY cells\nADD LIBRARY pads\n"
                         "ADD USE LIBRARY cells.all\nADD USE LIBRARY \"pads . all\"");
-    const HdlOptions &options = script.GetOptions();
+    const HdlOptions& options = script.GetOptions();
     EXPECT_EQ(options.verilog.includePaths.Concatenate("|"), "a.vh|b c.vh|a.vh");
     EXPECT_EQ(options.vhdl.libraries.Concatenate("|"), "cells|pads");
     EXPECT_EQ(options.vhdl.useClauses.Concatenate("|"), "cells.all|pads . all");
@@ -155,7 +155,7 @@ TEST(OptionCommands, SynthesisType) {
 
 TEST(OptionCommands, NameCases) {
     EngineScript script("UPPERCASE Instance\nUPPERCASE SIGANL\nUPPERCASE component ignored");
-    const VerilogOption &option = script.GetOptions().verilog;
+    const VerilogOption& option = script.GetOptions().verilog;
     EXPECT_EQ(option.instanceCase, VerilogOption::UPPERCASE);
     EXPECT_EQ(option.signalCase, VerilogOption::UPPERCASE);
     EXPECT_EQ(option.componentCase, VerilogOption::UPPERCASE);
@@ -182,7 +182,7 @@ TEST(OptionCommands, HeaderTexts) {
                         "Set Device \"big device\" ignored\n"
                         "Set Purpose of  this file\n"
                         "Set Reference see elsewhere");
-    const HdlOptions &options = script.GetOptions();
+    const HdlOptions& options = script.GetOptions();
     EXPECT_EQ(options.application, "the");
     EXPECT_EQ(options.command, "run -x a  b");
     EXPECT_EQ(options.device, "big device");

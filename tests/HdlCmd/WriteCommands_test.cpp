@@ -17,16 +17,16 @@ using Support::ReadWholeFile;
 
 namespace {
 
-class WriteCommands : public testing::TestWithParam<const char *> {
+class WriteCommands : public testing::TestWithParam<const char*> {
 protected:
-    void Write(const std::string &words) {
+    void Write(const std::string& words) {
         script_.Run(std::string("WRITE ") + GetParam() + " " + words);
     }
-    std::string Read(const char *name) { return ReadWholeFile(folder_ / name); }
-    bool Exists(const char *name) { return std::filesystem::exists(folder_ / name); }
+    std::string Read(const char* name) { return ReadWholeFile(folder_ / name); }
+    bool Exists(const char* name) { return std::filesystem::exists(folder_ / name); }
     bool IsVhdl() const { return std::string(GetParam()) == "VHDL"; }
     /// Whether a text opens with the banner's divider.
-    bool HasBanner(const std::string &text) const {
+    bool HasBanner(const std::string& text) const {
         return text.substr(0, 81) == std::string(80, IsVhdl() ? '-' : '/') + "\n";
     }
 
@@ -57,7 +57,7 @@ TEST_P(WriteCommands, TheBannerHoldsWhatTheOptionsSay) {
     Write("./out");
     const std::string prefix = IsVhdl() ? "--" : "//";
     const std::string text = Read("out");
-    for (const char *label : {"Vendor: Halvex\n", "Application : tool\n", "Filename : ./out\n",
+    for (const char* label : {"Vendor: Halvex\n", "Application : tool\n", "Filename : ./out\n",
                               "Timestamp : 01/01/1970 00:00:00\n"}) {
         EXPECT_NE(text.find(label), std::string::npos) << label;
     }

@@ -18,15 +18,15 @@ using Support::WriteWholeFile;
 
 namespace {
 
-std::string FailureOfLine(Engine &engine, const char *line) {
+std::string FailureOfLine(Engine& engine, const char* line) {
     return FailureOf([&] { engine.Execute(line); });
 }
 
-std::string FailureOfLine(Engine &engine, const char *model, const char *line) {
+std::string FailureOfLine(Engine& engine, const char* model, const char* line) {
     return FailureOf([&] { engine.Execute(model, line); });
 }
 
-std::string NameOf(const Model *model) {
+std::string NameOf(const Model* model) {
     return std::string(model->GetName().GetView());
 }
 
@@ -37,7 +37,7 @@ std::string NameOf(const Model *model) {
 TEST(EngineModels, CreatedModelHasItsNameAndSourceFile) {
     Engine engine;
     EXPECT_TRUE(engine.CreateAndAddModel("Top", "top.src"));
-    const Model *model = engine.GetModel("Top");
+    const Model* model = engine.GetModel("Top");
     ASSERT_NE(model, nullptr);
     EXPECT_EQ(model->GetName(), "Top");
     EXPECT_EQ(model->GetSourceFileName(), "top.src");
@@ -204,7 +204,7 @@ TEST(EngineExecute, MissingModelTellsItsOrigin) {
     try {
         engine.Execute("NOOP");
         FAIL() << "nothing was thrown";
-    } catch (const Exception &exception) {
+    } catch (const Exception& exception) {
         EXPECT_EQ(exception.GetModule(), "DesignEntry");
         EXPECT_EQ(exception.GetSourceUnit(), "../s/HdlEngine");
         EXPECT_EQ(exception.GetRevision(), "$Revision: 1.5 $");
@@ -220,7 +220,7 @@ TEST(EngineExecute, TheExceptionOutlivesTheEngine) {
     std::unique_ptr<Exception> kept;
     try {
         engine->Execute("top", "ADD INSTANCE NONE U1");
-    } catch (const Exception &exception) {
+    } catch (const Exception& exception) {
         kept = std::make_unique<Exception>(exception);
     }
     engine.reset();
@@ -232,7 +232,7 @@ TEST(EngineExecute, TheExceptionOutlivesTheEngine) {
 
 class EngineFiles : public testing::Test {
 protected:
-    std::string Write(const char *name, const std::string &text) {
+    std::string Write(const char* name, const std::string& text) {
         const std::string path = folder_ / name;
         WriteWholeFile(path, text);
         return path;
@@ -247,7 +247,7 @@ TEST_F(EngineFiles, ReadingCreatesTheModelAndKeepsTheCurrentOne) {
     engine_.CreateAndAddModel("other", "");
     engine_.UseModel("other");
     EXPECT_TRUE(engine_.ReadCommandFile("fresh", file.c_str()));
-    const Model *model = engine_.GetModel("fresh");
+    const Model* model = engine_.GetModel("fresh");
     ASSERT_NE(model, nullptr);
     EXPECT_EQ(model->GetSourceFileName(), file.c_str());
     EXPECT_NE(model->GetSignal("N"), nullptr);
@@ -266,7 +266,7 @@ TEST_F(EngineFiles, ReadingIntoAModelThatExistsKeepsItsSourceFile) {
     engine_.CreateAndAddModel("top", "first.cmd");
     engine_.Execute("top", "ADD SIGNAL N");
     EXPECT_TRUE(engine_.ReadCommandFile("TOP", file.c_str()));
-    const Model *model = engine_.GetModel("top");
+    const Model* model = engine_.GetModel("top");
     EXPECT_EQ(model->GetSourceFileName(), "first.cmd");
     EXPECT_NE(model->GetSignal("N"), nullptr);
     EXPECT_NE(model->GetSignal("M"), nullptr);
@@ -361,7 +361,7 @@ TEST_F(EngineHeader, HoldsEveryTextInItsPlace) {
         EXPECT_EQ(lines[0], divider);
         EXPECT_EQ(lines[1].substr(0, 3), prefix + " ");
         EXPECT_EQ(lines[2], divider);
-        const char *const labels[] = {"Vendor: Halvex", "Version : ", "Application : app",
+        const char* const labels[] = {"Vendor: Halvex", "Version : ", "Application : app",
                                       "Filename : ", "Timestamp : 01/02/1970 00:00:00"};
         const std::size_t column = lines[5].find(labels[0]);
         ASSERT_NE(column, std::string::npos);

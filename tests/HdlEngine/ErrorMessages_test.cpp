@@ -16,7 +16,7 @@ using Support::EngineScript;
 namespace {
 
 /// The design that every line is tried on.
-constexpr const char *Design = "ADD COMPONENT AND2\n"
+constexpr const char* Design = "ADD COMPONENT AND2\n"
                                "ADD PIN AND2 I0 Input\n"
                                "ADD PIN AND2 D(3:0) Input\n"
                                "ADD PIN AND2 O Output\n"
@@ -32,29 +32,29 @@ constexpr const char *Design = "ADD COMPONENT AND2\n"
                                "ADD INSTANCE PIN ATTRIBUTE U1.I0 PA pv\n";
 
 struct FailingLine {
-    const char *line;
-    const char *message;
+    const char* line;
+    const char* message;
     /// The part of the library that speaks.
-    const char *unit = "../s/HdlModel";
+    const char* unit = "../s/HdlModel";
 };
 
-void PrintTo(const FailingLine &failing, std::ostream *out) {
+void PrintTo(const FailingLine& failing, std::ostream* out) {
     *out << failing.line;
 }
 
 class ModelFailures : public testing::TestWithParam<FailingLine> {};
 class CommandFailures : public testing::TestWithParam<FailingLine> {};
 
-void ExpectFailure(const FailingLine &failing) {
+void ExpectFailure(const FailingLine& failing) {
     EngineScript script(Design);
     const int done = script.GetDoneCount();
     script.GetModel().SetModifiedFlag(false);
     try {
         script.GetEngine().Execute(failing.line);
         FAIL() << "carried out: " << failing.line;
-    } catch (const std::exception &thrown) {
+    } catch (const std::exception& thrown) {
         ASSERT_EQ(typeid(thrown), typeid(Exception));
-        const Exception &exception = dynamic_cast<const Exception &>(thrown);
+        const Exception& exception = dynamic_cast<const Exception&>(thrown);
         EXPECT_EQ(exception.getLocalized(), failing.message);
         EXPECT_STREQ(exception.what(), failing.message);
         EXPECT_EQ(exception.GetModule(), "DesignEntry");
@@ -294,7 +294,7 @@ TEST(ModelNullNames, AreInvalid) {
     Model model(&factory);
     const Polarity input(Polarity::Input);
     model.AddComponent("AND2");
-    const auto expectInvalid = [](auto &&action) {
+    const auto expectInvalid = [](auto&& action) {
         EXPECT_EQ(Support::FailureOf(action), "Invalid Name.\n");
     };
     expectInvalid([&] { model.AddComponent(nullptr); });

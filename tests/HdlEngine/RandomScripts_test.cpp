@@ -28,7 +28,7 @@ using Lines = std::vector<std::string>;
 
 // Generators
 
-std::string OneOf(const std::vector<std::string> &texts) {
+std::string OneOf(const std::vector<std::string>& texts) {
     return *rc::gen::elementOf(texts);
 }
 
@@ -102,18 +102,18 @@ std::string AttributeName() {
 }
 
 /// Two components, five instances, ports and signals of every kind.
-const std::string &Prologue() {
+const std::string& Prologue() {
     static const std::string prologue = [] {
         std::string lines;
-        for (const char *cell : {"C0", "C1"}) {
+        for (const char* cell : {"C0", "C1"}) {
             lines += std::string("ADD COMPONENT ") + cell + "\n";
-            for (const char *pin :
+            for (const char* pin :
                  {"I Input", "J Input", "D(3:0) Input", "E(0:3) Input", "K(2) Input", "O Output",
                   "R Output", "S(3:0) Output", "W BiDirectional"}) {
                 lines += std::string("ADD PIN ") + cell + " " + pin + "\n";
             }
         }
-        for (const char *instance : {"C0 U0", "C1 U1", "C0 U2", "C1 U3", "C0 U4"}) {
+        for (const char* instance : {"C0 U0", "C1 U1", "C0 U2", "C1 U3", "C0 U4"}) {
             lines += std::string("ADD INSTANCE ") + instance + "\n";
         }
         return lines + "ADD SIGNAL B0(7:0)\nADD SIGNAL B1(0:7)\nADD SIGNAL B2(3:3)\n"
@@ -271,7 +271,7 @@ rc::Gen<std::string> WildLine() {
         case 2:
             return *SaneLine();
         default: {
-            const auto &catalogue = CommandFactory::GetCatalogue();
+            const auto& catalogue = CommandFactory::GetCatalogue();
             std::string line =
                 catalogue[*rc::gen::inRange<std::size_t>(0, catalogue.size())].phrase;
             if (line.compare(0, 5, "WRITE") == 0) {
@@ -287,7 +287,7 @@ rc::Gen<std::string> WildLine() {
     });
 }
 
-const std::string &WildPrologue() {
+const std::string& WildPrologue() {
     static const std::string prologue = "ADD COMPONENT C\nADD PIN C I Input\n"
                                         "ADD PIN C D(3:0) Input\nADD PIN C K(1) Output\n"
                                         "ADD PIN C O Output\nADD PIN C W BiDirectional\n"
@@ -305,23 +305,23 @@ struct Outcome {
     std::string vhdl;
     int done = 0;
 
-    friend bool operator==(const Outcome &, const Outcome &) = default;
+    friend bool operator==(const Outcome&, const Outcome&) = default;
 };
 
 /// Runs a script in a folder of its own. Anything but the library's own exception, with a message
 /// that is a line, fails the property.
-Outcome RunScript(const std::string &prologue, const Lines &lines) {
+Outcome RunScript(const std::string& prologue, const Lines& lines) {
     const Support::TemporaryFolder folder;
     const Support::CurrentFolder current(folder.GetPath());
     const Support::EnvironmentVariable time("SOURCE_DATE_EPOCH", "0");
     EngineScript script(prologue);
     Outcome outcome;
     const int before = script.GetDoneCount();
-    for (const std::string &line : lines) {
+    for (const std::string& line : lines) {
         try {
             script.GetEngine().Execute(line.c_str());
             outcome.messages.emplace_back();
-        } catch (const std::exception &thrown) {
+        } catch (const std::exception& thrown) {
             RC_ASSERT(typeid(thrown) == typeid(Exception));
             outcome.messages.emplace_back(thrown.what());
             RC_ASSERT(!outcome.messages.back().empty());
@@ -336,10 +336,10 @@ Outcome RunScript(const std::string &prologue, const Lines &lines) {
 }
 
 /// The names that a written module declares, as ports or as wires.
-Lines DeclaredNames(const std::string &verilog) {
+Lines DeclaredNames(const std::string& verilog) {
     Lines names;
-    for (const char *keyword : {"wire ", "input ", "output ", "inout "}) {
-        for (const std::string &line : Support::LinesThatBegin(verilog, keyword)) {
+    for (const char* keyword : {"wire ", "input ", "output ", "inout "}) {
+        for (const std::string& line : Support::LinesThatBegin(verilog, keyword)) {
             const std::size_t end = line.find(';');
             const std::size_t start = line.rfind(' ', end) + 1;
             names.push_back(line.substr(start, end - start));
@@ -349,22 +349,22 @@ Lines DeclaredNames(const std::string &verilog) {
 }
 
 /// The names that a written architecture declares.
-Lines DeclaredSignals(const std::string &vhdl) {
+Lines DeclaredSignals(const std::string& vhdl) {
     Lines names;
-    for (const std::string &line : Support::LinesThatBegin(vhdl, "signal ")) {
+    for (const std::string& line : Support::LinesThatBegin(vhdl, "signal ")) {
         names.push_back(line.substr(7, line.find(' ', 7) - 7));
     }
     return names;
 }
 
 bool AreDistinct(Lines names) {
-    for (std::string &name : names) {
+    for (std::string& name : names) {
         std::transform(name.begin(), name.end(), name.begin(), Port::ToUpper);
     }
     return std::set<std::string>(names.begin(), names.end()).size() == names.size();
 }
 
-void ExpectDeclaredOnce(const std::string &verilog, const std::string &vhdl) {
+void ExpectDeclaredOnce(const std::string& verilog, const std::string& vhdl) {
     RC_ASSERT(AreDistinct(DeclaredNames(verilog)));
     RC_ASSERT(AreDistinct(DeclaredSignals(vhdl)));
     const Lines assigns = Support::LinesThatBegin(verilog, "assign ");
@@ -372,8 +372,8 @@ void ExpectDeclaredOnce(const std::string &verilog, const std::string &vhdl) {
 }
 
 /// Lines that fail are part of the game: the script goes on after them.
-void RunAll(EngineScript &script, const Lines &lines) {
-    for (const std::string &line : lines) {
+void RunAll(EngineScript& script, const Lines& lines) {
+    for (const std::string& line : lines) {
         script.GetFailure(line);
     }
 }
@@ -407,8 +407,8 @@ RC_GTEST_PROP(RandomScripts, WritingAgainDeclaresNothingTwice, ()) {
     const bool verilogFirst = *rc::gen::arbitrary<bool>();
     const std::string early = verilogFirst ? script.Verilog() : script.Vhdl();
     const std::string late = verilogFirst ? script.Vhdl() : script.Verilog();
-    const std::string &verilog = verilogFirst ? early : late;
-    const std::string &vhdl = verilogFirst ? late : early;
+    const std::string& verilog = verilogFirst ? early : late;
+    const std::string& vhdl = verilogFirst ? late : early;
     ExpectDeclaredOnce(verilog, vhdl);
     for (int i = 0; i < 2; ++i) {
         RC_ASSERT(SortedLines(script.Verilog()) == SortedLines(verilog));
@@ -428,21 +428,21 @@ RC_GTEST_PROP(RandomScripts, CommandsBetweenWritesDeclareNothingTwice, ()) {
 RC_GTEST_PROP(RandomScripts, AFileGivesWhatItsLinesGive, ()) {
     EngineScript script(Prologue());
     Lines carriedOut;
-    for (const std::string &line : *SaneScript()) {
+    for (const std::string& line : *SaneScript()) {
         if (script.GetFailure(line).empty()) {
             carriedOut.push_back(line);
         }
     }
     const std::string lineEnd = *rc::gen::elementOf(Lines{"\n", "\r\n"});
     std::string text;
-    for (const std::string &line : SplitLines(Prologue())) {
+    for (const std::string& line : SplitLines(Prologue())) {
         text += line + lineEnd;
     }
-    for (const std::string &line : carriedOut) {
+    for (const std::string& line : carriedOut) {
         text += line + lineEnd;
     }
     EngineScript lines(Prologue());
-    for (const std::string &line : carriedOut) {
+    for (const std::string& line : carriedOut) {
         // A line that failed may have prepared the ground for a later one.
         RC_PRE(lines.GetFailure(line).empty());
     }

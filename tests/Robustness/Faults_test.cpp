@@ -1,4 +1,5 @@
-// Whichever file call of a whole run fails: nothing is thrown, the failure is told, files are whole.
+// Whichever file call of a whole run fails: nothing is thrown, the failure is told, files are
+// whole.
 #include "Robustness/FailingSystem.h"
 #include "Robustness/MidSizedDesign.h"
 #include "Support/EngineScript.h"
@@ -124,7 +125,8 @@ TEST_F(Faults, EveryCallFromOneOnMayFail) {
     }
 }
 
-/// Calls that are interrupted by a signal every other time, and writes that take seven bytes at most.
+/// Calls that are interrupted by a signal every other time, and writes that take seven bytes at
+/// most.
 class InterruptedSystem : public Port::System {
 public:
     InterruptedSystem() { System::Replace(this); }

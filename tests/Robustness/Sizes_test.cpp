@@ -1,5 +1,5 @@
-// Large inputs: done or refused, in memory and time that grow with the input and no faster. Times are
-// not asserted; a step that took quadratic time would not end within the test's limit.
+// Large inputs: done or refused, in memory and time that grow with the input and no faster. Times
+// are not asserted; a step that took quadratic time would not end within the test's limit.
 #include "Support/EngineScript.h"
 #include "Support/TemporaryFolder.h"
 
@@ -84,12 +84,13 @@ TEST(Sizes, ACompoundOfAHundredThousandMembers) {
 
 TEST(Sizes, ABusOfTwoToTheThirtyFirstBits) {
     EngineScript script;
-    script.Run("ADD COMPONENT C\nADD PIN C I(2147483647:0) input\nADD PIN C O(0:2147483647) output\n"
-               "ADD INSTANCE C U\nADD PORT a(2147483647:0) input\nADD SIGNAL b(0:2147483647)\n"
-               "CONNECT SIGNAL a(2147483647:0) U.I(2147483647:0)\n"
-               "CONNECT SIGNAL b(0:2147483647) U.O(0:2147483647)\n"
-               "CONNECT SIGNAL a(0:2000000000) c(2000000000:0)\n"
-               "ASSIGN CONSTANT c(7) 1");
+    script.Run(
+        "ADD COMPONENT C\nADD PIN C I(2147483647:0) input\nADD PIN C O(0:2147483647) output\n"
+        "ADD INSTANCE C U\nADD PORT a(2147483647:0) input\nADD SIGNAL b(0:2147483647)\n"
+        "CONNECT SIGNAL a(2147483647:0) U.I(2147483647:0)\n"
+        "CONNECT SIGNAL b(0:2147483647) U.O(0:2147483647)\n"
+        "CONNECT SIGNAL a(0:2000000000) c(2000000000:0)\n"
+        "ASSIGN CONSTANT c(7) 1");
     EXPECT_EQ(script.GetModel().GetSignal("a(2147483647:0)")->GetWidth(), 2147483647);
     EXPECT_EQ(CountOf(script.Verilog(), "[2147483647:0]"), 2u);
     EXPECT_LT(script.Vhdl().size(), 100'000u);

@@ -21,7 +21,7 @@ inline std::filesystem::path GoldenFolder() {
 /// The names of all golden designs, sorted.
 inline std::vector<std::string> GoldenNames() {
     std::vector<std::string> names;
-    for (const auto &entry : std::filesystem::directory_iterator(GoldenFolder())) {
+    for (const auto& entry : std::filesystem::directory_iterator(GoldenFolder())) {
         if (entry.path().extension() == ".cmd") {
             names.push_back(entry.path().stem().string());
         }
@@ -30,7 +30,7 @@ inline std::vector<std::string> GoldenNames() {
     return names;
 }
 
-inline std::string GoldenText(const std::string &file) {
+inline std::string GoldenText(const std::string& file) {
     const std::filesystem::path path = GoldenFolder() / file;
     if (!std::filesystem::exists(path)) {
         throw std::runtime_error("no golden file " + file);
@@ -40,8 +40,8 @@ inline std::string GoldenText(const std::string &file) {
 
 /// What a design is in one language once it was written in the other, where that differs: the one
 /// writer renames objects, the other adds some.
-inline std::string GoldenTextAfterOther(const std::string &name, const std::string &other,
-                                        const std::string &extension) {
+inline std::string GoldenTextAfterOther(const std::string& name, const std::string& other,
+                                        const std::string& extension) {
     const std::string file = name + ".after_" + other + extension;
     return std::filesystem::exists(GoldenFolder() / file) ? GoldenText(file)
                                                           : GoldenText(name + extension);
@@ -50,12 +50,12 @@ inline std::string GoldenTextAfterOther(const std::string &name, const std::stri
 /// A model in which a golden design was built.
 class GoldenDesign : public EngineScript {
 public:
-    explicit GoldenDesign(const std::string &name) : EngineScript(GoldenText(name + ".cmd")) {}
+    explicit GoldenDesign(const std::string& name) : EngineScript(GoldenText(name + ".cmd")) {}
 };
 
 /// The lines of a text in sorted order: two netlists that differ in the order of their statements
 /// only have the same.
-inline std::vector<std::string> SortedLines(const std::string &text) {
+inline std::vector<std::string> SortedLines(const std::string& text) {
     std::vector<std::string> lines = SplitLines(text);
     std::sort(lines.begin(), lines.end());
     return lines;

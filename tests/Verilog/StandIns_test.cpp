@@ -23,11 +23,11 @@ using Lines = std::vector<std::string>;
 
 /// What matters of a written netlist: its nets and how they are wired.
 struct Written {
-    explicit Written(const std::string &netlist)
+    explicit Written(const std::string& netlist)
         : wires(LinesThatBegin(netlist, "wire ")), assigns(LinesThatBegin(netlist, "assign ")),
           instances(LinesThatBegin(netlist, "INV ")), text(netlist) {
         // Pins stand on one line here, so a line is a whole instance.
-        for (std::string &line : instances) {
+        for (std::string& line : instances) {
             line = line.substr(4);
         }
     }
@@ -40,18 +40,18 @@ struct Written {
 
 class StandIns : public testing::Test {
 protected:
-    void Run(const std::string &lines) { script_.Run(lines); }
+    void Run(const std::string& lines) { script_.Run(lines); }
     Written Write() {
         script_.GetOptions().onePortPerLine = false;
         return Written(script_.Verilog());
     }
-    Signal *GetSignal(const char *name) { return script_.GetModel().GetSignal(name); }
+    Signal* GetSignal(const char* name) { return script_.GetModel().GetSignal(name); }
 
     EngineScript script_;
 };
 
 /// Whether no line occurs twice.
-bool AreDistinct(const Lines &lines) {
+bool AreDistinct(const Lines& lines) {
     return std::set<std::string>(lines.begin(), lines.end()).size() == lines.size();
 }
 
@@ -140,7 +140,7 @@ TEST_F(StandIns, AreMadeInTheOrderOfTheSetOfNames) {
         "ADD PORT Q Output\n" +
         Inverters({"U1 Az N", "U2 BY N", "U3 C8 N", "U4 Y N", "U5 Q N"}));
     const Lines all = Write().wires;
-    const auto position = [&](const char *line) {
+    const auto position = [&](const char* line) {
         return std::find(all.begin(), all.end(), line) - all.begin();
     };
     EXPECT_LT(position("wire Az_DUMMY;"), position("wire C8_DUMMY;"));

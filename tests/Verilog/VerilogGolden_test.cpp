@@ -44,17 +44,17 @@ TEST_P(VerilogGolden, HasTheBannerBeforeIt) {
     const std::string text = design.Verilog("");
     ASSERT_GT(text.size(), golden.size());
     EXPECT_EQ(text.substr(text.size() - golden.size()), golden);
-    for (const std::string &line :
+    for (const std::string& line :
          Support::SplitLines(text.substr(0, text.size() - golden.size()))) {
         EXPECT_EQ(line.substr(0, 2), "//");
     }
 }
 
 INSTANTIATE_TEST_SUITE_P(Designs, VerilogGolden, testing::ValuesIn(GoldenNames()),
-                         [](const auto &test) { return test.param; });
+                         [](const auto& test) { return test.param; });
 
 /// The synthesis tools whose attributes differ; the default is the design's own golden file.
-class SynthesisDialects : public testing::TestWithParam<const char *> {};
+class SynthesisDialects : public testing::TestWithParam<const char*> {};
 
 TEST_P(SynthesisDialects, AreWrittenToTheByte) {
     GoldenDesign design("synthesis_attributes");
@@ -67,7 +67,7 @@ TEST_P(SynthesisDialects, FallBackToTheDefault) {
     GoldenDesign design("synthesis_attributes");
     design.Run(std::string("SET SYNTHESIS ") + GetParam());
     design.Verilog();
-    for (const char *other : {"QSN", "qsn", "unknown"}) {
+    for (const char* other : {"QSN", "qsn", "unknown"}) {
         design.Run(std::string("SET SYNTHESIS ") + other);
         EXPECT_EQ(design.Verilog(), GoldenText("synthesis_attributes.v"));
     }

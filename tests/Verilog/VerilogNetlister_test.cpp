@@ -18,7 +18,7 @@ namespace {
 
 using Lines = std::vector<std::string>;
 
-std::string WriteToMemory(Netlist *netlist, const HdlOptions &options) {
+std::string WriteToMemory(Netlist* netlist, const HdlOptions& options) {
     TextMemOutStream out;
     VerilogNetlister netlister(out);
     netlister.WriteNetlist(netlist, options);
@@ -31,19 +31,19 @@ HdlOptions WithoutHeader() {
     return options;
 }
 
-Lines Assigns(const std::string &text) {
+Lines Assigns(const std::string& text) {
     return LinesThatBegin(text, "assign ");
 }
 
-Lines Wires(const std::string &text) {
+Lines Wires(const std::string& text) {
     return LinesThatBegin(text, "wire ");
 }
 
-bool Holds(const std::string &text, const std::string &piece) {
+bool Holds(const std::string& text, const std::string& piece) {
     return text.find(piece) != std::string::npos;
 }
 
-constexpr const char *Adder = "ADD COMPONENT ADD4\n"
+constexpr const char* Adder = "ADD COMPONENT ADD4\n"
                               "ADD PIN ADD4 A(3:0) Input\n"
                               "ADD PIN ADD4 CI Input\n"
                               "ADD PIN ADD4 S(3:0) Output\n"
@@ -70,7 +70,7 @@ TEST(VerilogNetlisterTest, AModuleWithoutPortsClosesItsListAtOnce) {
 TEST(VerilogNetlisterTest, EmptyLinesAreEmpty) {
     EngineScript script("ADD MODULE ATTRIBUTE A v\nSET MODULE ATTRIBUTE OPTION A -GENERIC=SYN\n"
                         "ADD PORT A Input\nADD SIGNAL N");
-    for (const std::string &line : Support::SplitLines(script.Verilog())) {
+    for (const std::string& line : Support::SplitLines(script.Verilog())) {
         EXPECT_TRUE(line.empty() || line.find_first_not_of(' ') != std::string::npos);
     }
 }
@@ -157,7 +157,7 @@ TEST(VerilogNetlisterTest, ASignalWithoutANameIsNowhere) {
 TEST(VerilogNetlisterTest, ABusWhoseNameDoesNotParseIsAScalar) {
     EngineScript script;
     script.GetNetlist().Add(new Bus("no_range"));
-    auto *port = new Bus("also none");
+    auto* port = new Bus("also none");
     port->SetPortPolarity(Polarity(Polarity::Input));
     script.GetNetlist().Add(port);
     const std::string text = script.Verilog();
@@ -203,7 +203,7 @@ TEST(VerilogNetlisterTest, ACompoundIsAConcatenation) {
 TEST(VerilogNetlisterTest, ACompoundOfACompoundIsNested) {
     EngineScript script(Adder);
     script.Run("ADD SIGNAL X\nCONNECT SIGNAL A,B Y");
-    auto *outer = new CompoundBus("outer");
+    auto* outer = new CompoundBus("outer");
     outer->AddBusMember(script.GetModel().GetSignal("X"));
     outer->AddBusMember(script.GetModel().GetSignal("A,B"));
     script.GetNetlist().Add(outer);
@@ -311,13 +311,13 @@ TEST(VerilogNetlisterTest, AnInstanceAttributeHidesTheComponentsEvenWhenItIsNotW
 class HierarchicalInit : public testing::Test {
 protected:
     /// A design of one instance that has INIT; its name and the module's INIT vary.
-    std::string Write(const std::string &name, const std::string &moduleLines,
-                      const std::string &generic = "SYN") {
+    std::string Write(const std::string& name, const std::string& moduleLines,
+                      const std::string& generic = "SYN") {
         EngineScript script("ADD COMPONENT C\nADD INSTANCE C U1\n"
                             "ADD INSTANCE ATTRIBUTE U1 INIT own\n"
                             "SET INSTANCE ATTRIBUTE OPTION U1 INIT -GENERIC=" +
                             generic + "\n" + moduleLines);
-        Netlist &netlist = script.GetNetlist();
+        Netlist& netlist = script.GetNetlist();
         netlist.SetName(name.c_str());
         const HdlOptions options = WithoutHeader();
         const std::string text = WriteToMemory(&netlist, options);
@@ -331,13 +331,13 @@ protected:
 };
 
 TEST_F(HierarchicalInit, NeedsAMarkInTheName) {
-    for (const char *name : {"MHALVEX_ADD4", "HHALVEX", "xMHALVEXy", "aHHALVEXb"}) {
+    for (const char* name : {"MHALVEX_ADD4", "HHALVEX", "xMHALVEXy", "aHHALVEXb"}) {
         const std::string text = Write(name, moduleInit_);
         EXPECT_EQ(LinesThatBegin(text, "defparam"), (Lines{"defparam U1.INIT = INIT;"})) << name;
         EXPECT_EQ(LinesThatBegin(text, "parameter"), (Lines{"parameter INIT = \"outer\";"}));
         EXPECT_TRUE(isSet_) << name;
     }
-    for (const char *name : {"mhalvex", "HALVEX", "MHALVE", "Hhalvex"}) {
+    for (const char* name : {"mhalvex", "HALVEX", "MHALVE", "Hhalvex"}) {
         const std::string text = Write(name, moduleInit_);
         EXPECT_EQ(LinesThatBegin(text, "defparam"), (Lines{"defparam U1.INIT = \"own\";"})) << name;
         EXPECT_FALSE(isSet_) << name;

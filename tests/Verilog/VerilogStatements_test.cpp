@@ -21,23 +21,23 @@ protected:
         out_.SetValue("");
         return text;
     }
-    std::string PortDeclaration(const char *name, int polarity) {
+    std::string PortDeclaration(const char* name, int polarity) {
         statements_.WritePortDeclaration(name, Polarity(polarity));
         return Written();
     }
-    std::string SignalDeclaration(const char *name) {
+    std::string SignalDeclaration(const char* name) {
         statements_.WriteSignalDeclaration(name);
         return Written();
     }
-    std::string SignalName(const char *name) {
+    std::string SignalName(const char* name) {
         statements_.WriteSignalName(name);
         return Written();
     }
-    std::string Constant(const char *name, bool singleBit, const char *value) {
+    std::string Constant(const char* name, bool singleBit, const char* value) {
         statements_.WriteConstantSignalAssignment(name, singleBit, BitVectorValue(value));
         return Written();
     }
-    std::string Parameter(Attribute &&attribute) {
+    std::string Parameter(Attribute&& attribute) {
         statements_.WriteParameterStatement(&attribute);
         return Written();
     }
@@ -49,13 +49,13 @@ protected:
 /// Attributes of one object, with their synthesis option.
 class Attributes {
 public:
-    Attributes &Add(const char *name, const char *value, const char *option = "ASSIGN") {
-        auto *attribute = new AttributeString(name, value);
+    Attributes& Add(const char* name, const char* value, const char* option = "ASSIGN") {
+        auto* attribute = new AttributeString(name, value);
         attribute->SetSynAttr(option);
         holder_.AddAttr(attribute);
         return *this;
     }
-    Iterator<Attribute *> Get() const { return holder_.GetAttrIterator(); }
+    Iterator<Attribute*> Get() const { return holder_.GetAttrIterator(); }
 
 private:
     AttributeHolder holder_;
@@ -257,7 +257,7 @@ TEST_F(VerilogStatementsTest, SynopsysAttributes) {
 TEST_F(VerilogStatementsTest, AttributesThatAreAllMarkedNoneAreNothing) {
     const Attributes none = Attributes().Add("A", "1", "NONE").Add("B", "2", "NONE");
     const Attributes empty;
-    for (const Attributes *attributes : {&none, &empty}) {
+    for (const Attributes* attributes : {&none, &empty}) {
         statements_.WriteQSNAttr(attributes->Get(), "U1");
         statements_.WriteExemplarAttr(attributes->Get(), "U1");
         statements_.WritePrecisionAttr(attributes->Get(), "U1");
@@ -270,11 +270,11 @@ TEST_F(VerilogStatementsTest, AttributesThatAreAllMarkedNoneAreNothing) {
 TEST_F(VerilogStatementsTest, NullEntriesOfAListAreSkipped) {
     AttributeString attribute("A", "1");
     attribute.SetSynAttr("ASSIGN");
-    PtrArray<Attribute *> list;
+    PtrArray<Attribute*> list;
     list.Add(nullptr);
     list.Add(&attribute);
     list.Add(nullptr);
-    const Iterator<Attribute *> attributes(&list);
+    const Iterator<Attribute*> attributes(&list);
     statements_.WriteQSNAttr(attributes, "U1");
     statements_.WriteSynplicityAttr(attributes);
     EXPECT_EQ(Written(), "// synthesis attribute A of U1 is \"1\"\n/* synthesis \"A=1\" */");

@@ -44,11 +44,11 @@ TEST_P(VhdlGolden, HasTheBannerBeforeIt) {
     const std::string text = design.Vhdl("");
     ASSERT_GT(text.size(), golden.size());
     EXPECT_EQ(text.substr(text.size() - golden.size()), golden);
-    for (const std::string &line :
+    for (const std::string& line :
          Support::SplitLines(text.substr(0, text.size() - golden.size()))) {
         EXPECT_EQ(line.substr(0, 2), "--");
     }
 }
 
 INSTANTIATE_TEST_SUITE_P(Designs, VhdlGolden, testing::ValuesIn(GoldenNames()),
-                         [](const auto &test) { return test.param; });
+                         [](const auto& test) { return test.param; });

@@ -20,21 +20,21 @@ namespace {
 
 using Lines = std::vector<std::string>;
 
-std::string WriteToMemory(Netlist *netlist, const HdlOptions *options) {
+std::string WriteToMemory(Netlist* netlist, const HdlOptions* options) {
     TextMemOutStream out;
     VhdlNetlister netlister(out);
     netlister.WriteNetlist(netlist, options);
     return std::string(out.GetValue().GetView());
 }
 
-bool Holds(const std::string &text, const std::string &piece) {
+bool Holds(const std::string& text, const std::string& piece) {
     return text.find(piece) != std::string::npos;
 }
 
 /// The assignments of the architecture's body.
-Lines Assigns(const std::string &text) {
+Lines Assigns(const std::string& text) {
     Lines found;
-    for (const std::string &line : SplitLines(Between(text, "\nbegin\n", "\nend BEHAVIORAL;"))) {
+    for (const std::string& line : SplitLines(Between(text, "\nbegin\n", "\nend BEHAVIORAL;"))) {
         if (Holds(line, " <= ")) {
             found.push_back(line.substr(line.find_first_not_of(' ')));
         }
@@ -42,12 +42,12 @@ Lines Assigns(const std::string &text) {
     return found;
 }
 
-Lines Signals(const std::string &text) {
+Lines Signals(const std::string& text) {
     return LinesThatBegin(text, "signal ");
 }
 
 /// The port map of an instance, on one line however long.
-std::string PortMap(EngineScript &script, const std::string &instance) {
+std::string PortMap(EngineScript& script, const std::string& instance) {
     script.GetOptions().onePortPerLine = false;
     const std::string text = WriteToMemory(&script.GetNetlist(), &script.GetOptions());
     const std::string start = "\n" + instance + " : C\nport map ";
@@ -55,7 +55,7 @@ std::string PortMap(EngineScript &script, const std::string &instance) {
     return piece.empty() ? text : piece.substr(start.size());
 }
 
-std::string Cell(const std::string &pins) {
+std::string Cell(const std::string& pins) {
     std::string lines = "ADD COMPONENT C\n";
     const StringArray names(pins.c_str(), " ", true, nullptr);
     for (int i = 0; i < names.GetSize(); ++i) {
@@ -64,7 +64,7 @@ std::string Cell(const std::string &pins) {
     return lines + "ADD INSTANCE C U1\n";
 }
 
-constexpr const char *DefaultLibraries = "library ieee;\n"
+constexpr const char* DefaultLibraries = "library ieee;\n"
                                          "use ieee.std_logic_1164.ALL;\n"
                                          "use ieee.numeric_std.ALL;\n"
                                          "library KESTRA;\n"
@@ -130,7 +130,7 @@ TEST(VhdlNetlisterTest, UserLibrariesComeBeforeTheDefaultOnes) {
 
 TEST(VhdlNetlisterTest, EmptyLinesAreEmpty) {
     EngineScript script("ADD PORT A Input\nADD NOTES x\n" + Inverters({"U1 A Y"}));
-    for (const std::string &line : SplitLines(script.Vhdl())) {
+    for (const std::string& line : SplitLines(script.Vhdl())) {
         EXPECT_TRUE(line.empty() || line.find_first_not_of(' ') != std::string::npos);
     }
 }
@@ -193,7 +193,7 @@ TEST(VhdlNetlisterTest, SignalsNamedOpenOrNothingAreNotDeclared) {
 TEST(VhdlNetlisterTest, ABusWhoseNameDoesNotParseIsAScalar) {
     EngineScript script;
     script.GetNetlist().Add(new Bus("no_range"));
-    auto *port = new Bus("port_bus");
+    auto* port = new Bus("port_bus");
     port->SetPortPolarity(Polarity(Polarity::Input));
     script.GetNetlist().Add(port);
     const std::string text = script.Vhdl();
@@ -266,8 +266,8 @@ TEST(VhdlPortMap, AFormalThatIsNoBusStaysAsItIs) {
 
 TEST(VhdlPortMap, MembersWithoutBitsAreSkipped) {
     EngineScript script(Cell("A(1:0)") + "CONNECT SIGNAL X,Y U1.A(1:0)");
-    auto *compound = dynamic_cast<CompoundBus *>(script.GetModel().GetSignal("X,Y"));
-    auto *empty = new CompoundBus("empty");
+    auto* compound = dynamic_cast<CompoundBus*>(script.GetModel().GetSignal("X,Y"));
+    auto* empty = new CompoundBus("empty");
     script.GetNetlist().Add(empty);
     compound->AddBusMember(empty);
     EXPECT_EQ(PortMap(script, "U1"), "(A(1)=>X, A(0)=>Y)");
@@ -276,9 +276,9 @@ TEST(VhdlPortMap, MembersWithoutBitsAreSkipped) {
 TEST(VhdlPortMap, TemporariesLeaveNoTrace) {
     EngineScript script(Cell("B(0:1)") + "ADD SIGNAL D(7:0)\nCONNECT SIGNAL D(0:1) U1.B(0:1)");
     script.Vhdl();
-    const Bus *bus = script.GetNetlist().GetParentBus("D");
+    const Bus* bus = script.GetNetlist().GetParentBus("D");
     int slices = 0;
-    for (const Signal *slice : bus->GetBusSliceIterator()) {
+    for (const Signal* slice : bus->GetBusSliceIterator()) {
         EXPECT_EQ(slice->GetName(), "D(0:1)");
         ++slices;
     }
@@ -319,7 +319,7 @@ TEST(VhdlAssignments, OfConstantsBitByBit) {
 }
 
 TEST(VhdlAssignments, OfConstantsThatCannotBeWrittenBitByBit) {
-    for (const char *value : {"4:B:101", "4:B:10x0", "4:H:A", "4:O:12", "4:B:10101"}) {
+    for (const char* value : {"4:B:101", "4:B:10x0", "4:H:A", "4:O:12", "4:B:10101"}) {
         EngineScript script("ADD SIGNAL D(7:0)\nASSIGN CONSTANT A,B,C,E " + std::string(value) +
                             "\nASSIGN CONSTANT D(0:3) " + value);
         EXPECT_TRUE(Assigns(script.Vhdl()).empty()) << value;
@@ -336,8 +336,8 @@ TEST(VhdlAssignments, OfAliases) {
 
 TEST(VhdlAssignments, OfAliasesBitByBit) {
     const struct {
-        const char *left;
-        const char *right;
+        const char* left;
+        const char* right;
         Lines lines;
     } cases[] = {
         {"A,B", "D(5:4)", {"A <= D(5);", "B <= D(4);"}},
@@ -354,7 +354,7 @@ TEST(VhdlAssignments, OfAliasesBitByBit) {
         {"A,B,C", "D(5:4)", {"A <= D(5);", "B <= D(4);"}},
         {"D(0:3)", "A,B", {"D(0) <= A;", "D(1) <= B;"}},
     };
-    for (const auto &c : cases) {
+    for (const auto& c : cases) {
         EngineScript script("ADD SIGNAL D(7:0)\nCONNECT SIGNAL " + std::string(c.left) + " " +
                             c.right);
         EXPECT_EQ(Assigns(script.Vhdl()), c.lines) << c.left << " " << c.right;
@@ -533,7 +533,7 @@ TEST(VhdlGenerics, ForSimulationOnlyStandWhollyBetweenTheMarks) {
 
 class VhdlInheritedInit : public testing::Test {
 protected:
-    std::string GenericMap(const char *name, const std::string &lines) {
+    std::string GenericMap(const char* name, const std::string& lines) {
         EngineScript script("ADD COMPONENT C\nADD INSTANCE C U1\n" + lines);
         script.GetNetlist().SetName(name);
         return Between(script.Vhdl(), "generic map", "\n      ;\n");

@@ -23,31 +23,31 @@ protected:
         statements_.WriteBusIndex(first, second);
         return Written();
     }
-    std::string BusText(const char *name) {
+    std::string BusText(const char* name) {
         statements_.WriteBus(name);
         return Written();
     }
-    std::string Port(const char *name, int polarity, int width) {
+    std::string Port(const char* name, int polarity, int width) {
         statements_.WritePortStatement(name, Polarity(polarity), width);
         return Written();
     }
-    std::string Assignment(const char *left, const char *right) {
+    std::string Assignment(const char* left, const char* right) {
         statements_.WriteSignalAssignment(left, right);
         return Written();
     }
-    std::string Constant(const char *name, bool singleBit, const char *value) {
+    std::string Constant(const char* name, bool singleBit, const char* value) {
         statements_.WriteConstantSignalAssignment(name, singleBit, BitVectorValue(value));
         return Written();
     }
-    std::string Generic(Attribute &&attribute) {
+    std::string Generic(Attribute&& attribute) {
         statements_.WriteGenericMapAttrType(&attribute);
         return Written();
     }
-    std::string Declaration(Attribute &&attribute, bool typed, int width) {
+    std::string Declaration(Attribute&& attribute, bool typed, int width) {
         statements_.WriteAttrDeclaration(&attribute, typed, width);
         return Written();
     }
-    std::string AttributeAssignment(Attribute &&attribute, bool typed) {
+    std::string AttributeAssignment(Attribute&& attribute, bool typed) {
         statements_.WriteAttrAssignment(&attribute, "U1", "label", typed);
         return Written();
     }
@@ -56,13 +56,13 @@ protected:
     VhdlStatements statements_{out_};
 };
 
-void Add(AttributeHolder &holder, const char *name, const char *value, const char *option) {
-    auto *attribute = new AttributeString(name, value);
+void Add(AttributeHolder& holder, const char* name, const char* value, const char* option) {
+    auto* attribute = new AttributeString(name, value);
     attribute->SetSynAttr(option);
     holder.AddAttr(attribute);
 }
 
-AttributeUser UserAttribute(const char *name, const char *value, const char *type) {
+AttributeUser UserAttribute(const char* name, const char* value, const char* type) {
     AttributeUser attribute(name, value);
     attribute.SetUserType(type);
     return attribute;
@@ -233,7 +233,7 @@ TEST_F(VhdlStatementsTest, AttributesOfAHolderAreDeclaredOnce) {
     EXPECT_TRUE(declared.Contains("A"));
     EXPECT_FALSE(declared.IContains("C"));
     statements_.WriteAttrDeclaration(&holder, declared, false, 1);
-    statements_.WriteAttrDeclaration(static_cast<const AttributeHolder *>(nullptr), declared, false,
+    statements_.WriteAttrDeclaration(static_cast<const AttributeHolder*>(nullptr), declared, false,
                                      1);
     EXPECT_EQ(Written(), "");
 }
@@ -261,20 +261,20 @@ TEST_F(VhdlStatementsTest, AttributesOfAHolderAreAssignedUnlessMarkedNone) {
     statements_.WriteAttrAssignment(&holder, "N", "signal", false);
     EXPECT_EQ(Written(), "attribute A of N : signal is \"1\";\n"
                          "attribute C of N : signal is \"3\";\n");
-    statements_.WriteAttrAssignment(static_cast<const AttributeHolder *>(nullptr), "N", "signal",
+    statements_.WriteAttrAssignment(static_cast<const AttributeHolder*>(nullptr), "N", "signal",
                                     false);
     EXPECT_EQ(Written(), "");
 }
 
 TEST_F(VhdlStatementsTest, NullAttributesAreNothing) {
-    Attribute *const none = nullptr;
+    Attribute* const none = nullptr;
     statements_.WriteGenericMapAttrType(none);
     statements_.WriteGenericMapAttr(none);
     statements_.WriteGenericMapInitAttr(none);
     WriteVhdlAttrTypeVisitor types(out_);
     WriteVhdlAttrValueVisitor values(out_);
-    for (AttributeVisitor *visitor :
-         {static_cast<AttributeVisitor *>(&types), static_cast<AttributeVisitor *>(&values)}) {
+    for (AttributeVisitor* visitor :
+         {static_cast<AttributeVisitor*>(&types), static_cast<AttributeVisitor*>(&values)}) {
         visitor->VisitAttribute(nullptr);
         visitor->VisitAttributeString(nullptr);
         visitor->VisitAttributeInteger(nullptr);

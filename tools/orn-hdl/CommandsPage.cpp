@@ -101,18 +101,19 @@ Status PrintCommands(const std::vector<std::string>& words) {
 }
 
 Status PrintCommandsPage() {
-    std::string text("# The command language\n"
-                     "\n"
-                     "One command a line. The words of a line are separated by blanks; a word that\n"
-                     "begins with a double or a single quote reaches to the same quote before a blank\n"
-                     "or the line's end, and may hold blanks. Letter case does not matter in the words\n"
-                     "of a command, nor does it tell names apart. Empty lines do nothing.\n"
-                     "\n"
-                     "`<argument>` is needed, `[argument]` may be left out, `...` stands for several\n"
-                     "words.\n"
-                     "\n"
-                     "| Command | Arguments | What it does |\n"
-                     "| --- | --- | --- |\n");
+    std::string text(
+        "# The command language\n"
+        "\n"
+        "One command a line. The words of a line are separated by blanks; a word that\n"
+        "begins with a double or a single quote reaches to the same quote before a blank\n"
+        "or the line's end, and may hold blanks. Letter case does not matter in the words\n"
+        "of a command, nor does it tell names apart. Empty lines do nothing.\n"
+        "\n"
+        "`<argument>` is needed, `[argument]` may be left out, `...` stands for several\n"
+        "words.\n"
+        "\n"
+        "| Command | Arguments | What it does |\n"
+        "| --- | --- | --- |\n");
     for (const CommandInfo& command : Orn_Hdl::CommandFactory::GetCatalogue()) {
         text.append("| ").append(FormatCode(command.phrase));
         text.append(" | ").append(FormatCode(command.arguments));

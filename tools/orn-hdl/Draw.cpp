@@ -43,9 +43,9 @@ using CFile = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
 /// A file of no name that holds a text, to be read from its start.
 CFile MakeTemporaryFile(std::string_view text) {
     CFile file(std::tmpfile(), &std::fclose);
-    if (file != nullptr && (std::fwrite(text.data(), 1, text.size(), file.get()) != text.size() ||
-                            std::fflush(file.get()) != 0 ||
-                            lseek(fileno(file.get()), 0, SEEK_SET) != 0)) {
+    if (file != nullptr &&
+        (std::fwrite(text.data(), 1, text.size(), file.get()) != text.size() ||
+         std::fflush(file.get()) != 0 || lseek(fileno(file.get()), 0, SEEK_SET) != 0)) {
         file.reset();
     }
     return file;

@@ -72,7 +72,8 @@ std::vector<Graph::Part> Graph::GetParts(const Signal& signal) {
 
 void Graph::AddParts(const Signal& signal, std::vector<Part>& parts) {
     if (signal.GetSignalType() == SignalTypeCompoundBus) {
-        for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
+        for (const Signal* member :
+             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
             AddParts(*member, parts);
         }
         return;

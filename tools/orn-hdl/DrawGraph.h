@@ -19,8 +19,8 @@ namespace Tool {
 
 /// The picture of a design or of a part of it. Instances are boxes with their pins, inputs at the
 /// left; ports are arrows; buses are thick. A net with one driver runs from it to every reader; any
-/// other net has a dot, to which its drivers lead. Of nets with very many ends, such as clocks, only
-/// the names are drawn, at the pins.
+/// other net has a dot, to which its drivers lead. Of nets with very many ends, such as clocks,
+/// only the names are drawn, at the pins.
 class Graph {
 public:
     /// \param netlist not owned; it must outlive the graph and not change.
@@ -103,9 +103,7 @@ private:
     void Reach(std::size_t net, bool always, std::vector<std::size_t>& boxes);
     /// Whether a net has too many ends to be drawn as lines.
     static bool IsWide(const Net& net) noexcept;
-    bool IsDrawn(const End& end) const {
-        return end.box == NoBox || boxes_[end.box].drawn;
-    }
+    bool IsDrawn(const End& end) const { return end.box == NoBox || boxes_[end.box].drawn; }
     Sorted Sort(const Net& net) const;
     bool HasDot(const Net& net, const Sorted& sorted) const;
     std::string GetStart(const Net& net, const Sorted& sorted) const;

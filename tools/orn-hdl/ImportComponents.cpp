@@ -155,15 +155,17 @@ void Components::TellLosses(const Type& type) {
     const Path path = context_.GetPath("cells", type.firstCell->name).AddKey("parameters");
     if (!integers.empty()) {
         context_.Warn(path, "the file does not tell integers from vectors of 32 bits; written as "
-                            "bit vectors: " + integers);
+                            "bit vectors: " +
+                                integers);
     }
     if (!reals.empty()) {
-        context_.Warn(path, "the file does not tell real numbers from texts; written as texts: " +
-                                reals);
+        context_.Warn(path,
+                      "the file does not tell real numbers from texts; written as texts: " + reals);
     }
     if (!mixed.empty()) {
         context_.Warn(path, "other cells of the type have values of another kind, which VHDL does "
-                            "not allow: " + mixed);
+                            "not allow: " +
+                                mixed);
     }
 }
 
@@ -288,8 +290,7 @@ void Components::NameParts(Component& component, const Type& type) {
         const Range range = Normalize(port == nullptr ? Range() : port->range, pin.width);
         pin.scalar = pin.width == 1 && range.offset == 0;
         pin.name = pin.scalar ? pin.baseName
-                              : MakeBusName(pin.baseName,
-                                            GetIndex(range, pin.width, pin.width - 1),
+                              : MakeBusName(pin.baseName, GetIndex(range, pin.width, pin.width - 1),
                                             GetIndex(range, pin.width, 0));
     }
 }
@@ -316,9 +317,8 @@ void Components::NameComponents(NameTable& names) {
 
 const Generic& Components::GetGeneric(std::size_t cell, std::string_view parameter) const {
     const std::vector<Generic>& generics = GetOf(cell).generics;
-    return *std::find_if(generics.begin(), generics.end(), [&](const Generic& generic) {
-        return generic.oldName == parameter;
-    });
+    return *std::find_if(generics.begin(), generics.end(),
+                         [&](const Generic& generic) { return generic.oldName == parameter; });
 }
 
 void Components::Emit(Sink& sink) const {

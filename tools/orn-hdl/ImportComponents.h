@@ -44,9 +44,9 @@ struct Component {
 /// type differ in the widths of their pins, or in parameters whose default nobody knows.
 class Components {
 public:
-    /// Checks the cells of the top module against the leaf modules of the design, and chooses names.
-    /// \param names the names that components share with instances and signals.
-    /// \throws Error when a cell has contents, or does not fit its leaf module.
+    /// Checks the cells of the top module against the leaf modules of the design, and chooses
+    /// names. \param names the names that components share with instances and signals. \throws
+    /// Error when a cell has contents, or does not fit its leaf module.
     Components(Design& design, Context& context, NameTable& names);
 
     const std::vector<Component>& GetAll() const noexcept { return components_; }

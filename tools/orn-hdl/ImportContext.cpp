@@ -83,8 +83,9 @@ TypedValue Context::MakeGeneric(const std::string& name, const Value& value) con
                    : TypedValue{name, "BitVector", MakeConstant(MakeTextBits(value.text), false)};
     }
     std::string digits(value.text);
-    std::replace_if(digits.begin(), digits.end(), [](char c) { return c == 'x' || c == 'z'; },
-                    Settle(Unknown) == One ? '1' : '0');
+    std::replace_if(
+        digits.begin(), digits.end(), [](char c) { return c == 'x' || c == 'z'; },
+        Settle(Unknown) == One ? '1' : '0');
     return TypedValue{name, "BitVector", MakeConstant(digits, false)};
 }
 
@@ -106,9 +107,9 @@ TypedValue Context::MakeAttribute(const std::string& name, const Value& value) {
                    : TypedValue{name, "BitVector", MakeConstant(text, false)};
     }
     if (!IsPlainText(text)) {
-        std::replace_if(text.begin(), text.end(),
-                        [](char c) { return c == '\'' || !IsPlainText(std::string_view(&c, 1)); },
-                        '_');
+        std::replace_if(
+            text.begin(), text.end(),
+            [](char c) { return c == '\'' || !IsPlainText(std::string_view(&c, 1)); }, '_');
     }
     return TypedValue{name, "String", text};
 }

@@ -42,9 +42,7 @@ public:
     }
 
     /// What a bit stands for that drives something: itself, or what the user chose for x and z.
-    Bit Settle(Bit bit) const noexcept {
-        return bit >= Unknown && unknownAs_ ? *unknownAs_ : bit;
-    }
+    Bit Settle(Bit bit) const noexcept { return bit >= Unknown && unknownAs_ ? *unknownAs_ : bit; }
     bool IsRefused(Bit bit) const noexcept { return bit >= Unknown && !unknownAs_; }
     [[noreturn]] static void Refuse(Bit bit, const Path& path);
     /// Refuses a parameter's value that holds an x or z which stands for nothing; tells of a text

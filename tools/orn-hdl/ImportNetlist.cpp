@@ -43,8 +43,8 @@ std::string Join(std::string_view owner, std::string_view name) {
 
 Netlist::Netlist(Design& design, Module& top, Context& context)
     : context_(context), top_(top), components_(design, context, names_),
-      nets_(context, OpenConstantOutputs(top, context, components_)),
-      cellNames_(top.cells.size()), sharesConstants_(top.connections.size()) {
+      nets_(context, OpenConstantOutputs(top, context, components_)), cellNames_(top.cells.size()),
+      sharesConstants_(top.connections.size()) {
     if (top.hasMemories) {
         context.Warn(Path("modules").AddKey(top.name).AddKey("memories"),
                      "memories are not imported; map them to cells first");
@@ -257,9 +257,8 @@ void Netlist::EmitAttributes(Sink& sink) const {
                 [&](const TypedValue& value) { sink.AddSignalAttribute(name, value); });
     });
     for (std::size_t c = 0; c < top_.cells.size(); ++c) {
-        forEach(top_.cells[c].attributes, [&](const TypedValue& value) {
-            sink.AddInstanceAttribute(cellNames_[c], value);
-        });
+        forEach(top_.cells[c].attributes,
+                [&](const TypedValue& value) { sink.AddInstanceAttribute(cellNames_[c], value); });
     }
 }
 

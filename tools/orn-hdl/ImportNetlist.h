@@ -44,8 +44,7 @@ private:
     void NameCells();
     std::string GetWantedCellName(std::size_t cell) const;
     void NameAttributes();
-    void NameAttributesOf(std::string_view table, std::string_view owner,
-                          const Span& attributes);
+    void NameAttributesOf(std::string_view table, std::string_view owner, const Span& attributes);
     void SettleConnections();
     bool HasOpenInput(std::size_t cell) const;
     void CheckParameters();

@@ -317,8 +317,8 @@ std::string Nets::GetReference(const Span& bits) const {
         const Bit bit = GetBit(bits, i);
         if (bit == Zero || bit == One) {
             const std::uint32_t constant = constants_[bit - Zero];
-            text += constant == NoIndex ? std::string(bit == One ? "1" : "0")
-                                        : signals_[constant].name;
+            text +=
+                constant == NoIndex ? std::string(bit == One ? "1" : "0") : signals_[constant].name;
             continue;
         }
         if (!IsNet(bit) || homes_[bit].signal == NoIndex) {
@@ -390,8 +390,7 @@ void Nets::EmitPortBits(Sink& sink, const Signal& signal, std::uint32_t index) c
         const Bit bit = GetBit(signal.port->bits, left);
         if (bit == Zero || bit == One) {
             EmitConstant(sink, signal, left);
-        } else if (IsNet(bit) &&
-                   (homes_[bit].signal != index || homes_[bit].position != left)) {
+        } else if (IsNet(bit) && (homes_[bit].signal != index || homes_[bit].position != left)) {
             EmitAlias(sink, signal, left);
         }
     }

@@ -16,8 +16,8 @@
 namespace Tool::Import {
 
 /// Gives every bit that is used one home: a port, or the best of the nets that share it. Output
-/// ports that share a bit with another port become aliases, so that no bit gets a second driver, and
-/// no output port is read for the sake of another.
+/// ports that share a bit with another port become aliases, so that no bit gets a second driver,
+/// and no output port is read for the sake of another.
 class Nets {
 public:
     /// \throws Error when ports contradict each other, or something is driven by an x or z that
@@ -32,8 +32,8 @@ public:
     /// Takes care that `GetReference` can name the constants among the bits.
     void NeedConstants(const Span& bits, NameTable& names);
 
-    /// Whether a connection, given by its index, hangs on nothing: none of its bits has another pin,
-    /// a port, or a name that someone gave it.
+    /// Whether a connection, given by its index, hangs on nothing: none of its bits has another
+    /// pin, a port, or a name that someone gave it.
     bool IsOpen(std::uint32_t connection) const { return open_[connection]; }
     /// Whether a connection consists of constants.
     bool IsConstant(const Span& bits) const;

@@ -55,7 +55,8 @@ private:
 
 class Reader {
 public:
-    Reader(Design& design, bool keepAttributes) : design_(design), keepAttributes_(keepAttributes) {}
+    Reader(Design& design, bool keepAttributes)
+        : design_(design), keepAttributes_(keepAttributes) {}
 
     void Read(std::string text) {
         fileSize_ = text.size();
@@ -222,9 +223,8 @@ private:
 
     Span ReadBits(Module& module, ondemand::value& value) {
         const auto start = static_cast<std::uint32_t>(module.bits.size());
-        ForEachElement(value, [&](ondemand::value& member) {
-            module.bits.push_back(ReadBit(member));
-        });
+        ForEachElement(value,
+                       [&](ondemand::value& member) { module.bits.push_back(ReadBit(member)); });
         return Span{start, static_cast<std::uint32_t>(module.bits.size()) - start};
     }
 
@@ -313,9 +313,9 @@ private:
     void ReadModuleAttributes(Module& module, ondemand::value& value) {
         ForEachField(value, [&](std::string_view key, ondemand::value& attribute) {
             const Value v = ReadValue(attribute);
-            const bool isSet = v.kind == Value::Integer ? v.integer != 0
-                                                        : v.text.find_first_not_of("0xz") !=
-                                                              std::string_view::npos;
+            const bool isSet = v.kind == Value::Integer
+                                   ? v.integer != 0
+                                   : v.text.find_first_not_of("0xz") != std::string_view::npos;
             module.blackBox |= isSet && (key == "blackbox" || key == "whitebox");
             module.top |= isSet && key == "top";
         });
@@ -422,8 +422,7 @@ private:
 
     std::uint32_t GetOrAddPin(CellType& type, std::string_view name) {
         const auto known = type.pinIndex.find(name);
-        return known != type.pinIndex.end() ? known->second
-                                            : type.GetOrAddPin(design_.Keep(name));
+        return known != type.pinIndex.end() ? known->second : type.GetOrAddPin(design_.Keep(name));
     }
 
     /// Enters the pins of the cell that was just read into its type.

@@ -9,9 +9,9 @@
 
 namespace Tool::Import {
 
-/// Reads the text of a whole file. What the importer has no use for is checked to be JSON and dropped.
-/// \param keepAttributes whether the attributes of cells and nets are kept.
-/// \throws Error when the text is not JSON, or not a netlist.
+/// Reads the text of a whole file. What the importer has no use for is checked to be JSON and
+/// dropped. \param keepAttributes whether the attributes of cells and nets are kept. \throws Error
+/// when the text is not JSON, or not a netlist.
 std::unique_ptr<Design> ReadDesign(std::string text, bool keepAttributes);
 
 /// The module to import: the named one, or, when `name` is empty, the one marked as top, or the

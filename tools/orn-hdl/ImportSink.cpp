@@ -104,7 +104,8 @@ void AppendWord(std::string& line, std::string_view word) {
     }
     // A backslash before the closing quote would keep the quote open.
     if (!word.empty() && word.back() == '\\') {
-        throw Error("a text that ends in a backslash and needs quotes cannot stand in a command file");
+        throw Error(
+            "a text that ends in a backslash and needs quotes cannot stand in a command file");
     }
     line += '"';
     for (const char c : word) {

@@ -23,8 +23,8 @@ std::uint64_t GetFileSize(const std::string& file) noexcept {
 } // namespace
 
 Progress::Progress(bool quiet, const std::string& file)
-    : enabled_(!quiet && isatty(STDERR_FILENO) == 1),
-      totalBytes_(enabled_ ? GetFileSize(file) : 0), next_(Clock::now() + Patience) {}
+    : enabled_(!quiet && isatty(STDERR_FILENO) == 1), totalBytes_(enabled_ ? GetFileSize(file) : 0),
+      next_(Clock::now() + Patience) {}
 
 void Progress::Update(std::uint64_t lines, std::uint64_t bytes) {
     if (!IsDue()) {
@@ -32,7 +32,8 @@ void Progress::Update(std::uint64_t lines, std::uint64_t bytes) {
     }
     std::string text = std::to_string(lines) + " lines";
     if (totalBytes_ > 0) {
-        text += ", " + std::to_string(std::min<std::uint64_t>(bytes * 100 / totalBytes_, 100)) + " %";
+        text +=
+            ", " + std::to_string(std::min<std::uint64_t>(bytes * 100 / totalBytes_, 100)) + " %";
     }
     Show(text);
 }

@@ -37,7 +37,6 @@ struct Replayed {
 
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
 /// not write, is reported with its place; unless told to keep going, the replay ends there.
-Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
-                Progress& progress);
+Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress);
 
 } // namespace Tool

@@ -48,9 +48,9 @@ class CommandLine {
 public:
     CommandLine() {
         app_.require_subcommand(1);
-        app_.set_version_flag("--version",
-                              "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
-                              "Print the version and leave");
+        app_.set_version_flag(
+            "--version", "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
+            "Print the version and leave");
         AddRun();
         AddImport();
         AddDraw();
@@ -120,10 +120,10 @@ private:
                                        [this] { return Tool::Draw(draw_); });
         AddFile(command, "FILE", draw_.file, "The command file; - is standard input")->required();
         AddFile(command, "-o", draw_.output, "The SVG file to write")->required();
-        CLI::Option* around =
-            command.add_option("--around", draw_.around,
-                               "Draw only what lies around an instance or signal")
-                ->type_name("NAME");
+        CLI::Option* around = command
+                                  .add_option("--around", draw_.around,
+                                              "Draw only what lies around an instance or signal")
+                                  ->type_name("NAME");
         command.add_option("--depth", draw_.depth, "How many instances away")
             ->type_name("N")
             ->check(CLI::Range(0, 1000))

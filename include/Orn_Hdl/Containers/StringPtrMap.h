@@ -54,9 +54,7 @@ public:
     /// \{
     /// As the operations of the base; a null name is read as "".
     void Add(const char* name, T pointer) { Add(View(name), pointer); }
-    void Add(std::string_view name, T pointer) {
-        IStringPtrMapBase::Add(name, ToUntyped(pointer));
-    }
+    void Add(std::string_view name, T pointer) { IStringPtrMapBase::Add(name, ToUntyped(pointer)); }
     T Get(const char* name) const noexcept { return Get(View(name)); }
     T Get(std::string_view name) const noexcept {
         return FromUntyped(IStringPtrMapBase::Get(name));

@@ -25,8 +25,8 @@ class CommandManager;
 /// modified flag.
 ///
 /// Signals need not be declared: the first use of a name in a connection or constant declares it,
-/// and its form tells what it is: N a scalar signal, D(7:0) a bus or a slice of the bus D, D(2) a bit
-/// of the bus D, A,D(3:0) a compound. Brackets "[]", "{}", "<>" and "()" are one and the same.
+/// and its form tells what it is: N a scalar signal, D(7:0) a bus or a slice of the bus D, D(2) a
+/// bit of the bus D, A,D(3:0) a compound. Brackets "[]", "{}", "<>" and "()" are one and the same.
 class ORN_HDL_API Model {
 public:
     /// \param factory makes the commands; not owned, must outlive the model. Null: no command is
@@ -207,8 +207,8 @@ private:
     bool SetUserType(Attribute* attribute, const char* type);
     bool AddComment(Object& object, const char* text);
 
-    /// These change the netlist without setting the modified flag: the operation that calls them may
-    /// fail yet.
+    /// These change the netlist without setting the modified flag: the operation that calls them
+    /// may fail yet.
     void DeclareSignal(const char* name);
     Signal* GetOrCreateSignal(const char* name);
     Signal* CreateAndAddBusIndexSignal(std::string_view name);

@@ -49,8 +49,12 @@ public:
     /// \{
     /// Look-ups by name, normalised; null when there is none.
     Signal* GetSignal(const char* name) const noexcept { return GetSignal(Port::ViewOf(name)); }
-    Instance* GetInstance(const char* name) const noexcept { return GetInstance(Port::ViewOf(name)); }
-    Component* GetComponent(const char* name) const noexcept { return GetComponent(Port::ViewOf(name)); }
+    Instance* GetInstance(const char* name) const noexcept {
+        return GetInstance(Port::ViewOf(name));
+    }
+    Component* GetComponent(const char* name) const noexcept {
+        return GetComponent(Port::ViewOf(name));
+    }
     Signal* GetSignal(std::string_view name) const noexcept;
     Instance* GetInstance(std::string_view name) const noexcept;
     Component* GetComponent(std::string_view name) const noexcept;

@@ -68,7 +68,8 @@ public:
     /// The opposite of `==`.
     bool operator!=(const Object& other) const noexcept { return !(*this == other); }
 
-    /// Turns every "[", "{" and "<" into "(", every "]", "}" and ">" into ")", and every "-" into ":".
+    /// Turns every "[", "{" and "<" into "(", every "]", "}" and ">" into ")", and every "-" into
+    /// ":".
     static void NormalizeName(Port::StringBase<char>& name);
     /// The normalised text before its first "(" when it holds "(" and ")" and no ","; otherwise the
     /// whole normalised text. Null gives "".
@@ -105,8 +106,8 @@ protected:
     /// The same, null when the object has none.
     ObjectDetails* GetDetails() const noexcept { return details_.get(); }
 
-    /// A direction, as pins and signals have one: -1 to 2 stand in spare bits, where they cost nothing,
-    /// any other number in the details.
+    /// A direction, as pins and signals have one: -1 to 2 stand in spare bits, where they cost
+    /// nothing, any other number in the details.
     int GetDirection() const noexcept {
         const unsigned byte = name_.GetOwnerByte();
         return (byte & OddDirectionBit) != 0 ? GetOddDirection()

@@ -32,7 +32,9 @@ public:
     /// Input, Output, BiDirectional: "in", "O" and "bidir" are directions; "" and "inputs" are not.
     static int GetValue(const char* text) noexcept;
     /// Whether a value is a direction.
-    static bool IsValidValue(int value) noexcept { return value >= Input && value <= BiDirectional; }
+    static bool IsValidValue(int value) noexcept {
+        return value >= Input && value <= BiDirectional;
+    }
 
     /// The value, a `Value` unless another one was set.
     int GetValue() const noexcept { return value_; }
@@ -71,7 +73,8 @@ public:
     void SetName(const char* name) override;
     /// The class, a `PinType`.
     virtual int GetPinType() const = 0;
-    /// A new pin of the same class with the same name, polarity and default value; the caller owns it.
+    /// A new pin of the same class with the same name, polarity and default value; the caller owns
+    /// it.
     virtual Pin* ClonePin() const = 0;
     /// Calls the visit operation of this pin's class, and only that.
     virtual void AcceptPin(PinVisitor& visitor) = 0;

@@ -143,9 +143,7 @@ public:
     explicit ScalarSignal(const char* name) : Signal(name) {}
 
     int GetSignalType() const override { return SignalTypeScalar; }
-    void SetPortPolarity(const Polarity& polarity) override {
-        SetDirection(polarity.GetValue());
-    }
+    void SetPortPolarity(const Polarity& polarity) override { SetDirection(polarity.GetValue()); }
     void AcceptSignal(SignalVisitor& visitor) override;
     Polarity GetPortPolarity() const override { return Polarity(GetDirection()); }
     int GetWidth() const override { return 1; }
@@ -166,9 +164,7 @@ public:
     ~Bus() override;
 
     int GetSignalType() const override { return SignalTypeBus; }
-    void SetPortPolarity(const Polarity& polarity) override {
-        SetDirection(polarity.GetValue());
-    }
+    void SetPortPolarity(const Polarity& polarity) override { SetDirection(polarity.GetValue()); }
     void AcceptSignal(SignalVisitor& visitor) override;
     Polarity GetPortPolarity() const override { return Polarity(GetDirection()); }
     int GetWidth() const override;
@@ -196,7 +192,8 @@ public:
     /// The slices and bits, in order.
     Iterator<Signal*> GetBusSliceIterator() const noexcept { return Iterator<Signal*>(&slices_); }
 
-    /// Whether a normalised text is a base name followed by "(", an integer, ":", an integer and ")".
+    /// Whether a normalised text is a base name followed by "(", an integer, ":", an integer and
+    /// ")".
     static bool IsBusName(const char* name) noexcept;
     /// Splits a bus name into the texts of its base name and indices.
     /// \return false, everything untouched, when it is no bus name.
@@ -207,8 +204,8 @@ public:
     /// Appends the name of each bit, from the left index to the right one.
     /// \return false, the list untouched, when it is no bus name or has more than 1,048,576 bits.
     static bool ParseBusName(const char* name, StringArray& bits);
-    /// Of a bus name, the piece that starts `start` bits from its left and spans `count` bits, in its
-    /// own direction; of any other name, name(start:count).
+    /// Of a bus name, the piece that starts `start` bits from its left and spans `count` bits, in
+    /// its own direction; of any other name, name(start:count).
     static Port::StringBase<char> GetBusSliceName(const char* name, int start, int count);
 
 private:
@@ -273,9 +270,7 @@ public:
 
     int GetSignalType() const override { return SignalTypeBusIndex; }
     /// Sets the bit's own polarity, which shows only without a parent.
-    void SetPortPolarity(const Polarity& polarity) override {
-        SetDirection(polarity.GetValue());
-    }
+    void SetPortPolarity(const Polarity& polarity) override { SetDirection(polarity.GetValue()); }
     void AcceptSignal(SignalVisitor& visitor) override;
     Polarity GetPortPolarity() const override;
     int GetWidth() const override { return 1; }
@@ -342,9 +337,7 @@ public:
     /// The number of members.
     int GetSize() const noexcept { return members_.GetSize(); }
     /// The members, leftmost first.
-    Iterator<Signal*> GetBusMemberIterator() const noexcept {
-        return Iterator<Signal*>(&members_);
-    }
+    Iterator<Signal*> GetBusMemberIterator() const noexcept { return Iterator<Signal*>(&members_); }
 
     /// Whether a normalised text is two or more base, bus or bit names, separated by "," or "\".
     static bool IsCompoundBusName(const char* name) noexcept;
