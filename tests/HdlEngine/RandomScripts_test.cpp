@@ -357,6 +357,16 @@ Lines DeclaredSignals(const std::string& vhdl) {
     return names;
 }
 
+/// The assignments of a written module, each whole however many lines it takes.
+Lines AssignStatements(const std::string& verilog) {
+    Lines statements;
+    for (std::size_t start = verilog.find(" assign "); start != std::string::npos;
+         start = verilog.find(" assign ", start + 1)) {
+        statements.push_back(verilog.substr(start, verilog.find(';', start) - start));
+    }
+    return statements;
+}
+
 bool AreDistinct(Lines names) {
     for (std::string& name : names) {
         std::transform(name.begin(), name.end(), name.begin(), Port::ToUpper);
@@ -367,8 +377,7 @@ bool AreDistinct(Lines names) {
 void ExpectDeclaredOnce(const std::string& verilog, const std::string& vhdl) {
     RC_ASSERT(AreDistinct(DeclaredNames(verilog)));
     RC_ASSERT(AreDistinct(DeclaredSignals(vhdl)));
-    const Lines assigns = Support::LinesThatBegin(verilog, "assign ");
-    RC_ASSERT((std::set<std::string>(assigns.begin(), assigns.end()).size()) == assigns.size());
+    RC_ASSERT(AreDistinct(AssignStatements(verilog)));
 }
 
 /// Lines that fail are part of the game: the script goes on after them.
