@@ -110,9 +110,7 @@ Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
 
 Status Run(const RunOptions& options) {
     Progress progress(options.quiet, options.file);
-    // Left to the end of the process: to take millions of objects down one by one would only delay
-    // it.
-    static Orn_Hdl::Engine& engine = *new Orn_Hdl::Engine;
+    Orn_Hdl::Engine engine;
     const std::string name = GetModelName(options);
     engine.CreateAndAddModel(name.c_str(), options.file.c_str());
     Orn_Hdl::Model& model = *engine.GetModel(name.c_str());
