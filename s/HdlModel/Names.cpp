@@ -193,46 +193,83 @@ int CompareNatural(string_view a, string_view b) noexcept {
     return Rank(a[i]) < Rank(b[i]) ? -1 : 1;
 }
 
-void NaturalKey::Append(unsigned byte) noexcept {
-    if (!IsFull()) {
-        std::uint64_t& half = used_ < sizeof first_ ? first_ : second_;
-        half |= std::uint64_t(byte) << (8 * (7 - used_ % 8));
-        ++used_;
-    }
-}
+namespace {
 
-// Each step must keep the order. A run of digits is coded as 255, its length, and two digits a
-// byte, so that it sorts after every other character, and a longer run after a shorter one.
-NaturalKey::NaturalKey(string_view name) noexcept {
-    constexpr unsigned LastPlainRank = 253;
-    for (std::size_t i = 0; i < name.size() && !IsFull();) {
-        if (Port::IsDigit(name[i])) {
-            i = AppendDigits(name, i);
-            continue;
+/// Gathers the bytes of a sort key. Each step must keep the order.
+class NaturalKeyBytes {
+public:
+    static constexpr unsigned Size = 12;
+
+    bool IsFull() const noexcept { return used_ >= Size; }
+    /// The bytes from `start` on as a number, the first one the highest.
+    template <class Number> Number Get(unsigned start) const noexcept {
+        Number number = 0;
+        for (unsigned i = 0; i < sizeof(Number); ++i) {
+            number = static_cast<Number>(number << 8U | bytes_[start + i]);
         }
-        const unsigned rank = Rank(name[i]);
-        Append(std::min(rank, LastPlainRank + 1));
-        // What has no rank of its own here ends the key.
-        i = rank > LastPlainRank ? name.size() : i + 1;
+        return number;
     }
-}
+    void Append(unsigned byte) noexcept {
+        if (!IsFull()) {
+            bytes_[used_++] = static_cast<unsigned char>(byte);
+        }
+    }
+    /// \return false when the rest must not be added: what has no value of its own ends the key.
+    bool AppendRank(int rank) noexcept {
+        constexpr int FirstPlain = -1;
+        constexpr int LastPlain = FirstPlain + 253;
+        const int clamped = std::clamp(rank, FirstPlain - 1, LastPlain + 1);
+        Append(static_cast<unsigned>(clamped - FirstPlain + 1));
+        return rank >= FirstPlain && rank <= LastPlain;
+    }
+    void AppendName(string_view name) noexcept {
+        constexpr unsigned LastPlainRank = 253;
+        for (std::size_t i = 0; i < name.size() && !IsFull();) {
+            if (Port::IsDigit(name[i])) {
+                i = AppendDigits(name, i);
+                continue;
+            }
+            const unsigned rank = Rank(name[i]);
+            Append(std::min(rank, LastPlainRank + 1));
+            i = rank > LastPlainRank ? name.size() : i + 1;
+        }
+    }
 
-std::size_t NaturalKey::AppendDigits(string_view name, std::size_t start) noexcept {
-    constexpr unsigned DigitMark = 255;
-    constexpr std::size_t LongestRun = 255;
-    const std::size_t run = DigitRun(name, start);
-    Append(DigitMark);
-    Append(static_cast<unsigned>(std::min(run, LongestRun)));
-    if (run >= LongestRun) {
-        return name.size();
+private:
+    /// A run of digits is coded as 255, its length, and two digits a byte, so that it sorts after
+    /// every other character, and a longer run after a shorter one.
+    /// \return the index behind the digits.
+    std::size_t AppendDigits(string_view name, std::size_t start) noexcept {
+        constexpr unsigned DigitMark = 255;
+        constexpr std::size_t LongestRun = 255;
+        const std::size_t run = DigitRun(name, start);
+        Append(DigitMark);
+        Append(static_cast<unsigned>(std::min(run, LongestRun)));
+        if (run >= LongestRun) {
+            return name.size();
+        }
+        const std::size_t end = start + run;
+        for (std::size_t i = start; i < end; i += 2) {
+            const unsigned high = Rank(name[i]) & 15U;
+            const unsigned low = i + 1 < end ? Rank(name[i + 1]) & 15U : 0;
+            Append(high << 4U | low);
+        }
+        return end;
     }
-    const std::size_t end = start + run;
-    for (std::size_t i = start; i < end; i += 2) {
-        const unsigned high = Rank(name[i]) & 15U;
-        const unsigned low = i + 1 < end ? Rank(name[i + 1]) & 15U : 0;
-        Append(high << 4 | low);
+
+    unsigned char bytes_[Size] = {};
+    unsigned used_ = 0;
+};
+
+} // namespace
+
+NaturalKey::NaturalKey(int rank, string_view name, std::uint32_t index) noexcept : index_(index) {
+    NaturalKeyBytes bytes;
+    if (bytes.AppendRank(rank)) {
+        bytes.AppendName(name);
     }
-    return end;
+    first_ = bytes.Get<std::uint64_t>(0);
+    second_ = bytes.Get<std::uint32_t>(sizeof first_);
 }
 
 } // namespace Orn_Hdl::Names

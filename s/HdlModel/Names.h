@@ -111,11 +111,14 @@ inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
 /// Below, at or above zero in natural order: letter case ignored, runs of digits by their value, a
 /// digit after every other character, the end of a name before any character.
 int CompareNatural(std::string_view a, std::string_view b) noexcept;
-/// The start of a name in sixteen bytes: a smaller key sorts first in natural order, equal keys say
-/// nothing.
+
+/// An object to sort, in sixteen bytes: its index, and a key made of its rank and the start of its
+/// name. A smaller key sorts first, by rank, then in natural order; equal keys say nothing.
 class NaturalKey {
 public:
-    explicit NaturalKey(std::string_view name) noexcept;
+    NaturalKey(int rank, std::string_view name, std::uint32_t index) noexcept;
+
+    std::uint32_t GetIndex() const noexcept { return index_; }
 
     friend bool operator!=(const NaturalKey& a, const NaturalKey& b) noexcept {
         return a.first_ != b.first_ || a.second_ != b.second_;
@@ -125,14 +128,9 @@ public:
     }
 
 private:
-    bool IsFull() const noexcept { return used_ == 2 * sizeof(std::uint64_t); }
-    void Append(unsigned byte) noexcept;
-    /// \return the index behind the digits.
-    std::size_t AppendDigits(std::string_view name, std::size_t start) noexcept;
-
-    std::uint64_t first_ = 0;
-    std::uint64_t second_ = 0;
-    unsigned used_ = 0;
+    std::uint64_t first_;
+    std::uint32_t second_;
+    std::uint32_t index_;
 };
 
 } // namespace Orn_Hdl::Names

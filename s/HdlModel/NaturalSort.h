@@ -7,7 +7,6 @@
 #include <algorithm>
 #include <cstdint>
 #include <string_view>
-#include <utility>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -39,27 +38,28 @@ template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankO
     if (sorted == size) {
         return;
     }
-    struct Entry {
-        Names::NaturalKey key;
-        int rank;
-        T* object;
-    };
-    std::vector<Entry> entries;
-    entries.reserve(static_cast<std::size_t>(size));
-    for (T* object : Iterator<T*>(&objects)) {
-        entries.push_back({Names::NaturalKey(object->GetNameView()), rankOf(object), object});
+    const PtrArray<T*> unsorted = objects;
+    std::vector<Names::NaturalKey> keys;
+    keys.reserve(static_cast<std::size_t>(size));
+    for (int i = 0; i < size; ++i) {
+        const T* const object = unsorted.GetAt(i);
+        keys.emplace_back(rankOf(object), object->GetNameView(), static_cast<std::uint32_t>(i));
     }
-    std::stable_sort(entries.begin(), entries.end(), [](const Entry& a, const Entry& b) {
-        if (a.rank != b.rank) {
-            return a.rank < b.rank;
+    const auto objectOf = [&unsorted](const Names::NaturalKey& key) {
+        return unsorted.GetAt(static_cast<int>(key.GetIndex()));
+    };
+    // The index makes every comparison decide, so this order is the stable one.
+    std::sort(keys.begin(), keys.end(), [&](const auto& a, const auto& b) {
+        if (a != b) {
+            return a < b;
         }
-        if (a.key != b.key) {
-            return a.key < b.key;
-        }
-        return Names::CompareNatural(a.object->GetNameView(), b.object->GetNameView()) < 0;
+        const T* const objectA = objectOf(a);
+        const T* const objectB = objectOf(b);
+        return isLess(objectA, objectB) ||
+               (!isLess(objectB, objectA) && a.GetIndex() < b.GetIndex());
     });
     for (int i = 0; i < size; ++i) {
-        objects.SetAt(i, entries[static_cast<std::size_t>(i)].object);
+        objects.SetAt(i, objectOf(keys[static_cast<std::size_t>(i)]));
     }
 }
 
