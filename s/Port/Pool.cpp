@@ -38,17 +38,21 @@ constexpr std::size_t PageSize = std::size_t(2) << 20;
 /// Stands at the start of every page. Pages are aligned to their size, so the page of an object is
 /// found from the object's address.
 struct Page {
-    /// The objects in the page, and one more while a thread still fills it.
+    /// The objects in the page; while a thread still fills it, `Filling` less those that have
+    /// ended.
     std::atomic<std::size_t> users;
     /// Of the whole mapping.
     std::size_t size;
 };
 
+/// More than the objects of any page. The thread that fills a page counts its objects by itself.
+constexpr std::size_t Filling = SIZE_MAX / 2;
+
 constexpr std::size_t HeaderSize = sizeof(Page);
 static_assert(HeaderSize % 8 == 0);
 
 /// Maps memory aligned to `PageSize`: more than is needed, of which the ends are given back.
-Page* NewPage(std::size_t least, bool isHuge) {
+Page* NewPage(std::size_t least, bool isHuge, std::size_t users) {
     const std::size_t size = (least + 4095) / 4096 * 4096;
     if (size < least || size + PageSize < size) {
         throw std::bad_alloc();
@@ -68,11 +72,11 @@ Page* NewPage(std::size_t least, bool isHuge) {
     if (isHuge) {
         madvise(start + before, size, MADV_HUGEPAGE);
     }
-    return ::new (start + before) Page{{1}, size};
+    return ::new (start + before) Page{{users}, size};
 }
 
-void Leave(Page* page) noexcept {
-    if (page->users.fetch_sub(1, std::memory_order_acq_rel) == 1) {
+void Leave(Page* page, std::size_t users) noexcept {
+    if (page->users.fetch_sub(users, std::memory_order_acq_rel) == users) {
         munmap(page, page->size);
     }
 }
@@ -85,27 +89,29 @@ public:
     void* Allocate(std::size_t size) {
         if (size > left_) {
             // The first page stays small in memory until it is filled: most processes need no more.
-            Page* const fresh = NewPage(PageSize, page_ != nullptr);
+            Page* const fresh = NewPage(PageSize, page_ != nullptr, Filling);
             Close();
             page_ = fresh;
             left_ = PageSize - HeaderSize;
         }
         void* const memory = reinterpret_cast<char*>(page_) + (PageSize - left_);
         left_ -= size;
-        page_->users.fetch_add(1, std::memory_order_relaxed);
+        ++objects_;
         return memory;
     }
 
 private:
     void Close() noexcept {
         if (page_ != nullptr) {
-            Leave(page_);
+            Leave(page_, Filling - objects_);
             page_ = nullptr;
         }
+        objects_ = 0;
         left_ = 0;
     }
 
     Page* page_ = nullptr;
+    std::size_t objects_ = 0;
     std::size_t left_ = 0;
 };
 
@@ -119,7 +125,8 @@ void* Allocate(std::size_t size, Kind kind) {
         throw std::bad_alloc();
     }
     if (rounded > PageSize / 8) {
-        return reinterpret_cast<char*>(NewPage(HeaderSize + rounded, false)) + HeaderSize;
+        return reinterpret_cast<char*>(NewPage(HeaderSize + rounded, rounded >= PageSize, 1)) +
+               HeaderSize;
     }
     return fillers[kind].Allocate(rounded);
 }
@@ -127,7 +134,7 @@ void* Allocate(std::size_t size, Kind kind) {
 void Free(void* memory) noexcept {
     if (memory != nullptr) {
         const auto address = reinterpret_cast<std::uintptr_t>(memory);
-        Leave(reinterpret_cast<Page*>(address & ~(std::uintptr_t(PageSize) - 1)));
+        Leave(reinterpret_cast<Page*>(address & ~(std::uintptr_t(PageSize) - 1)), 1);
     }
 }
 

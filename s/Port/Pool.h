@@ -4,6 +4,8 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
+#include <new>
 
 namespace Port::Pool {
 
@@ -15,5 +17,23 @@ enum Kind { DesignObjects, Commands };
 void* Allocate(std::size_t size, Kind kind);
 /// Gives an object's memory back; null is ignored. Any thread may do so.
 void Free(void* memory) noexcept;
+
+/// For standard containers that become large: what is as large as a huge page stands in huge pages.
+template <class T> struct Allocator {
+    using value_type = T;
+
+    Allocator() noexcept = default;
+    template <class Other> explicit Allocator(const Allocator<Other>& /*other*/) noexcept {}
+
+    T* allocate(std::size_t count) {
+        if (count > SIZE_MAX / sizeof(T)) {
+            throw std::bad_alloc();
+        }
+        return static_cast<T*>(Allocate(count * sizeof(T), DesignObjects));
+    }
+    void deallocate(T* memory, std::size_t /*count*/) noexcept { Free(memory); }
+
+    friend bool operator==(const Allocator& /*a*/, const Allocator& /*b*/) noexcept { return true; }
+};
 
 } // namespace Port::Pool
