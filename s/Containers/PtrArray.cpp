@@ -8,7 +8,7 @@
 
 namespace Orn_Hdl {
 
-PtrArrayBase::PtrArrayBase(const PtrArrayBase& other) {
+PtrArrayBase::PtrArrayBase(const PtrArrayBase& other) : PtrArrayBase() {
     *this = other;
 }
 
@@ -29,18 +29,19 @@ PtrArrayBase::~PtrArrayBase() {
 
 void PtrArrayBase::Reallocate(std::size_t capacity) {
     // Indices are signed ints, and so is the largest size.
-    void** const own = IsBorrowed() ? nullptr : items_;
-    void* const items = capacity > static_cast<std::size_t>(INT32_MAX)
-                            ? nullptr
-                            : std::realloc(own, capacity * sizeof(void*));
+    const bool isBorrowed = ownsItems_ == 0;
+    void** const own = isBorrowed ? nullptr : items_;
+    void* const items =
+        capacity > MostElements ? nullptr : std::realloc(own, capacity * sizeof(void*));
     if (items == nullptr) {
         throw std::bad_alloc();
     }
-    if (IsBorrowed() && size_ > 0) {
+    if (isBorrowed && size_ > 0) {
         std::memcpy(items, items_, size_ * sizeof(void*));
     }
     items_ = static_cast<void**>(items);
-    capacity_ = static_cast<std::uint32_t>(capacity);
+    capacity_ = static_cast<std::uint32_t>(capacity) & MostElements;
+    ownsItems_ = 1;
 }
 
 void PtrArrayBase::Grow() {
@@ -56,12 +57,13 @@ void PtrArrayBase::Reserve(int capacity) {
 }
 
 void PtrArrayBase::Empty() noexcept {
-    if (!IsBorrowed()) {
+    if (ownsItems_ != 0) {
         std::free(items_);
     }
     items_ = nullptr;
     size_ = 0;
     capacity_ = 0;
+    ownsItems_ = 0;
 }
 
 void PtrArrayBase::Swap(int i, int j) noexcept {

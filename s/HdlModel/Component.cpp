@@ -113,11 +113,11 @@ public:
                 pointers[made] = pin->CloneInto(block + made * PlaceSize);
             }
         } catch (...) {
-            to.Borrow(pointers, static_cast<int>(made));
+            to.Borrow(pointers, static_cast<int>(made), static_cast<int>(made));
             Destroy(to, block);
             throw;
         }
-        to.Borrow(pointers, from.GetSize());
+        to.Borrow(pointers, from.GetSize(), from.GetSize());
     }
 
     static void DestroyAll(PinList& pins) noexcept {

@@ -24,7 +24,7 @@ Object& Object::operator=(const Object& other) {
         CopyNameFrom(other);
         SetFlag(TypeMask, false);
         SetFlag(other.name_.GetOwnerByte() & TypeMask, true);
-        if (details_ != nullptr || !other.GetCommentView().empty()) {
+        if (GetDetails() != nullptr || !other.GetCommentView().empty()) {
             MakeDetails().comment = other.GetCommentView();
         }
     }
@@ -57,18 +57,11 @@ void Object::SetDirection(int direction) {
 }
 
 int Object::GetOddDirection() const noexcept {
-    return details_->oddDirection;
+    return GetDetails()->oddDirection;
 }
 
 int Object::GetObjectType() const {
     return ObjectTypeAttribute + static_cast<int>(name_.GetOwnerByte() & TypeMask);
-}
-
-ObjectDetails& Object::MakeDetails() {
-    if (details_ == nullptr) {
-        details_ = std::make_unique<ObjectDetails>();
-    }
-    return *details_;
 }
 
 void Object::SetName(const char* name) {
@@ -86,17 +79,19 @@ void Object::CopyNameFrom(const Object& other) {
 }
 
 void Object::KeepKeyName(std::string_view newName) {
-    const bool isOwned = HasFlag(OwnedFlagBit);
-    if (isOwned && (details_ == nullptr || details_->keyName == nullptr) &&
-        !Names::IsNamed(GetNameView(), newName)) {
-        MakeDetails().keyName = std::make_unique<std::string>(GetNameView());
+    if (!HasFlag(OwnedFlagBit) || Names::IsNamed(GetNameView(), newName)) {
+        return;
+    }
+    ObjectDetails& details = MakeDetails();
+    if (details.keyName == nullptr) {
+        details.keyName = std::make_unique<std::string>(GetNameView());
     }
 }
 
 std::string_view Object::GetKeyName() const noexcept {
-    return details_ != nullptr && details_->keyName != nullptr
-               ? std::string_view(*details_->keyName)
-               : GetNameView();
+    const ObjectDetails* const details = GetDetails();
+    return details != nullptr && details->keyName != nullptr ? std::string_view(*details->keyName)
+                                                             : GetNameView();
 }
 
 bool Object::IsNamed(const char* name) const noexcept {
@@ -114,7 +109,8 @@ Port::StringBase<char> Object::GetComment() const {
 }
 
 std::string_view Object::GetCommentView() const noexcept {
-    return details_ == nullptr ? std::string_view() : std::string_view(details_->comment);
+    const ObjectDetails* const details = GetDetails();
+    return details == nullptr ? std::string_view() : std::string_view(details->comment);
 }
 
 bool Object::operator==(const Object& other) const noexcept {

@@ -11,6 +11,8 @@
 namespace Orn_Hdl {
 
 struct ObjectDetails {
+    /// The object's name, without details of its own.
+    ObjectName name;
     std::string comment;
     /// The name under which a netlist finds the object, when it was renamed afterwards.
     std::unique_ptr<std::string> keyName;

@@ -1,7 +1,10 @@
 #include "Orn_Hdl/Model/ObjectName.h"
 
+#include "HdlModel/ObjectDetails.h"
+
 #include <atomic>
 #include <cstring>
+#include <memory>
 #include <new>
 
 namespace Orn_Hdl {
@@ -15,14 +18,37 @@ struct ObjectName::Shared {
 };
 
 ObjectName::Shared* ObjectName::GetShared() const noexcept {
-    Shared* shared = nullptr;
-    std::memcpy(&shared, bytes_, sizeof shared);
-    return shared;
+    return static_cast<Shared*>(GetPointer());
 }
 
-std::string_view ObjectName::SharedView() const noexcept {
-    Shared* const shared = GetShared();
+/// The name itself, which stands in the details when there are any.
+const ObjectName& ObjectName::GetPlain() const noexcept {
+    const ObjectDetails* const details = GetDetails();
+    return details == nullptr ? *this : details->name;
+}
+
+ObjectName& ObjectName::GetPlain() noexcept {
+    ObjectDetails* const details = GetDetails();
+    return details == nullptr ? *this : details->name;
+}
+
+std::string_view ObjectName::LongView() const noexcept {
+    const ObjectName& plain = GetPlain();
+    if (plain.length_ != SharedLength) {
+        return std::string_view(plain.bytes_, plain.length_);
+    }
+    Shared* const shared = plain.GetShared();
     return std::string_view(shared->GetText(), shared->length);
+}
+
+ObjectDetails& ObjectName::MakeDetails() {
+    if (GetDetails() == nullptr) {
+        auto details = std::make_unique<ObjectDetails>();
+        details->name = *this;
+        Release();
+        SetPointer(details.release(), DetailedLength);
+    }
+    return *GetDetails();
 }
 
 void ObjectName::Release() noexcept {
@@ -31,8 +57,10 @@ void ObjectName::Release() noexcept {
         if (shared->users.fetch_sub(1, std::memory_order_acq_rel) == 1) {
             ::operator delete(shared);
         }
-        length_ = 0;
+    } else if (length_ == DetailedLength) {
+        delete GetDetails();
     }
+    length_ = 0;
 }
 
 ObjectName::ObjectName(const ObjectName& other) noexcept : ObjectName() {
@@ -40,33 +68,35 @@ ObjectName::ObjectName(const ObjectName& other) noexcept : ObjectName() {
 }
 
 ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
-    if (this != &other) {
-        if (other.length_ == SharedLength) {
-            other.GetShared()->users.fetch_add(1, std::memory_order_relaxed);
+    ObjectName& to = GetPlain();
+    const ObjectName& from = other.GetPlain();
+    if (&to != &from) {
+        if (from.length_ == SharedLength) {
+            from.GetShared()->users.fetch_add(1, std::memory_order_relaxed);
         }
-        Release();
-        std::memcpy(bytes_, other.bytes_, sizeof bytes_);
-        length_ = other.length_;
+        to.Release();
+        std::memcpy(to.bytes_, from.bytes_, sizeof bytes_);
+        to.length_ = from.length_;
     }
     return *this;
 }
 
 void ObjectName::Assign(std::string_view text) {
+    ObjectName& name = GetPlain();
     if (text.size() <= InlineCapacity) {
         // The text may be part of the name that it replaces.
         char copy[InlineCapacity];
         text.copy(copy, text.size());
-        Release();
-        std::memcpy(bytes_, copy, text.size());
-        length_ = static_cast<std::uint8_t>(text.size());
+        name.Release();
+        std::memcpy(name.bytes_, copy, text.size());
+        name.length_ = static_cast<std::uint8_t>(text.size());
         return;
     }
     void* const memory = ::operator new(sizeof(Shared) + text.size());
     Shared* const shared = ::new (memory) Shared{{1}, text.size()};
     text.copy(shared->GetText(), text.size());
-    Release();
-    std::memcpy(bytes_, &shared, sizeof shared);
-    length_ = SharedLength;
+    name.Release();
+    name.SetPointer(shared, SharedLength);
 }
 
 } // namespace Orn_Hdl

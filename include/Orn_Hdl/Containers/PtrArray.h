@@ -18,7 +18,7 @@ public:
     /// Whether `a` comes before `b`; `context` is the caller's.
     using Less = bool (*)(void* a, void* b, void* context);
 
-    PtrArrayBase() noexcept = default;
+    PtrArrayBase() noexcept : capacity_(0), ownsItems_(0) {}
     PtrArrayBase(const PtrArrayBase& other);
     PtrArrayBase& operator=(const PtrArrayBase& other);
     virtual ~PtrArrayBase();
@@ -60,23 +60,25 @@ protected:
     void RemoveAt(int i) noexcept;
     void Sort(Less less, void* context);
     /// \}
-    /// Fills an empty array from memory that somebody else owns and that outlives the array.
-    void Borrow(void** items, int size) noexcept {
+    /// Lets an empty array use memory that somebody else owns and that outlives the array, until it
+    /// grows beyond it. The first `size` elements are there already.
+    void Borrow(void** items, int size, int capacity) noexcept {
         items_ = items;
         size_ = static_cast<std::uint32_t>(size);
-        capacity_ = 0;
+        capacity_ = static_cast<std::uint32_t>(capacity) & MostElements;
+        ownsItems_ = 0;
     }
 
 private:
+    static constexpr std::uint32_t MostElements = INT32_MAX;
+
     void Grow();
     void Reallocate(std::size_t capacity);
 
-    bool IsBorrowed() const noexcept { return capacity_ == 0; }
-
     void** items_ = nullptr;
     std::uint32_t size_ = 0;
-    /// 0 when the array owns no memory.
-    std::uint32_t capacity_ = 0;
+    std::uint32_t capacity_ : 31;
+    std::uint32_t ownsItems_ : 1;
 };
 
 /// The typed front: `T` is a pointer to an object.
@@ -115,6 +117,17 @@ public:
             },
             &caller);
     }
+};
+
+/// A `PtrArray` with room for its first elements in itself.
+template <class T, int Room> class SmallPtrArray : public PtrArray<T> {
+public:
+    SmallPtrArray() noexcept { this->Borrow(first_, 0, Room); }
+    SmallPtrArray(const SmallPtrArray&) = delete;
+    SmallPtrArray& operator=(const SmallPtrArray&) = delete;
+
+private:
+    void* first_[Room];
 };
 
 /// A `PtrArray` that owns its elements: its destructor deletes them, the last one first. Only the

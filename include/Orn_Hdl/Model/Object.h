@@ -7,8 +7,6 @@
 #include "Port/String.h"
 
 #include <cstddef>
-#include <memory>
-#include <string>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -21,7 +19,6 @@ class Netlist;
 class ObjectVisitor;
 class Pin;
 class Signal;
-struct ObjectDetails;
 
 /// Which kind of thing an `Object` is.
 enum ObjectType {
@@ -51,7 +48,7 @@ public:
 
     /// The name, as a copy.
     Port::StringBase<char> GetName() const { return GetNameView(); }
-    /// The name without a copy, valid until the object is renamed or ends.
+    /// The name without a copy, valid until the object changes or ends.
     std::string_view GetNameView() const noexcept { return name_.GetView(); }
     /// Whether the text, as it stands, equals the name ignoring case.
     bool IsNamed(const char* name) const noexcept;
@@ -102,9 +99,9 @@ protected:
     void CopyNameFrom(const Object& other);
 
     /// The parts that few objects have, made when first asked for.
-    ObjectDetails& MakeDetails();
+    ObjectDetails& MakeDetails() { return name_.MakeDetails(); }
     /// The same, null when the object has none.
-    ObjectDetails* GetDetails() const noexcept { return details_.get(); }
+    ObjectDetails* GetDetails() const noexcept { return name_.GetDetails(); }
 
     /// A direction, as pins and signals have one: -1 to 2 stand in spare bits, where they cost
     /// nothing, any other number in the details.
@@ -136,7 +133,6 @@ private:
     void KeepKeyName(std::string_view newName);
 
     ObjectName name_;
-    std::unique_ptr<ObjectDetails> details_;
 };
 
 /// Visits objects by kind; every operation of the base does nothing.

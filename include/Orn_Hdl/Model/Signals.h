@@ -132,7 +132,8 @@ private:
 
     static constexpr unsigned DyingFlag = 0x10;
 
-    PtrArray<Pin*> pins_;
+    /// Most nets have a driver and a load or two: their pins are listed in the signal itself.
+    SmallPtrArray<Pin*, 3> pins_;
     std::unique_ptr<Links> links_;
 };
 
