@@ -4,16 +4,17 @@
 #pragma once
 
 #include "Orn_Hdl/Containers/StringArray.h"
-#include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Port/Export.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <vector>
 
 namespace Orn_Hdl {
 
 class Model;
+class PhraseTable;
 
 /// One command on one model: parsed from the words of a line, then executed.
 class ORN_HDL_API Command {
@@ -86,7 +87,7 @@ public:
     static const std::vector<CommandInfo>& GetCatalogue();
 
 private:
-    std::shared_ptr<IStringPtrMap<CommandCreator>> creators_;
+    std::shared_ptr<PhraseTable> phrases_;
 };
 
 /// Runs commands and keeps the done ones, which it owns.
@@ -109,6 +110,41 @@ public:
     int GetDoneCommandCount() const noexcept;
     /// Deletes every done command, the first one first.
     void Clear();
+
+private:
+    struct Implementation;
+    std::unique_ptr<Implementation> implementation_;
+};
+
+/// Reads the lines of a command file for a model, split into words. What has come in of the file is
+/// split some lines ahead, so that in a large design the things that a line names are at hand when
+/// it is executed.
+///
+/// \code
+/// CommandReader reader(model);
+/// if (reader.Open("counter.cmd")) {
+///     while (const StringArray* words = reader.Next()) {
+///         model.Execute(*words);
+///     }
+/// }
+/// \endcode
+class ORN_HDL_API CommandReader {
+public:
+    /// \param model not owned, must outlive the reader.
+    explicit CommandReader(Model& model);
+    CommandReader(const CommandReader&) = delete;
+    CommandReader& operator=(const CommandReader&) = delete;
+    ~CommandReader();
+
+    /// Opens a file. \return false when it cannot be opened; a directory never can.
+    bool Open(const char* fileName);
+    /// The words of the next line, none for an empty line; valid until the next call. Null at the
+    /// end of the file or on a failure.
+    const StringArray* Next();
+    /// How many bytes the lines that `Next` has given take in the file.
+    std::uint64_t GetPosition() const noexcept;
+    /// The system's error number of the first failure; 0 when there was none.
+    int GetError() const noexcept;
 
 private:
     struct Implementation;

@@ -34,7 +34,7 @@ constexpr bool EqualIgnoringCase(std::string_view a, std::string_view b) noexcep
         return false;
     }
     for (std::size_t i = 0; i < a.size(); ++i) {
-        if (ToUpper(a[i]) != ToUpper(b[i])) {
+        if (a[i] != b[i] && ToUpper(a[i]) != ToUpper(b[i])) {
             return false;
         }
     }

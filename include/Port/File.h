@@ -50,6 +50,8 @@ public:
     /// Reads the next line. \param line receives it without its line end, valid until the next
     /// call. \return false at the end of the file or on a failure.
     bool NextLine(std::string_view& line);
+    /// As `NextLine`, without reading: false also when the rest of the line has yet to be read.
+    bool NextLineAtHand(std::string_view& line);
 
     /// The system's error number of the first failure since `open`; 0 when there was none.
     int GetError() const noexcept { return error_; }
@@ -61,6 +63,7 @@ private:
     bool OpenToReplace(const char* name);
     bool OpenTemporary(unsigned mode);
     bool FillLineBuffer();
+    std::string_view TakeLine(std::size_t end);
 
     int descriptor_ = -1;
     int error_ = 0;

@@ -161,7 +161,26 @@ int StringArray::Parse(const char* text, const char* separators, bool skipEmpty,
 }
 
 int StringArray::ParseCommandLine(string_view line) {
-    return Parse(line, " ", true, "\"\"''");
+    const int before = GetSize();
+    const std::size_t offset = text_.size();
+    text_.append(line);
+    std::size_t start = 0;
+    for (std::size_t i = 0; i <= line.size(); ++i) {
+        const char c = i < line.size() ? line[i] : ' ';
+        if (c == '"' || c == '\'') {
+            // Only without quotes do the words stand in the line as they are.
+            text_.resize(offset);
+            slots_.resize(static_cast<std::size_t>(before));
+            return Parse(line, " ", true, "\"\"''");
+        }
+        if (c == ' ') {
+            if (i > start) {
+                slots_.push_back({offset + start, i - start});
+            }
+            start = i + 1;
+        }
+    }
+    return GetSize() - before;
 }
 
 namespace {

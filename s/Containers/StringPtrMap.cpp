@@ -25,7 +25,6 @@ struct IStringPtrMapBase::Table {
     std::vector<Entry> entries;
     /// Indices into `entries`, `None` for a free place; a power of two long, at most half full.
     std::vector<std::uint32_t> places;
-    std::size_t longestName = 0;
 
     bool Equal(std::size_t entry, std::uint32_t hash, std::string_view name) const noexcept {
         return entries[entry].hash == hash && Port::EqualIgnoringCase(entries[entry].name, name);
@@ -66,7 +65,6 @@ struct IStringPtrMapBase::Table {
 
     void Insert(std::uint32_t hash, std::string_view name, void* pointer) {
         entries.push_back({hash, std::string(name), pointer});
-        longestName = std::max(longestName, name.size());
         if (entries.size() > MostUnindexed && entries.size() * 2 > places.size()) {
             Rebuild(std::max<std::size_t>(MostUnindexed * 4, places.size() * 2));
         } else if (!places.empty()) {
@@ -139,14 +137,10 @@ void IStringPtrMapBase::Add(std::string_view name, void* pointer) {
 }
 
 void* IStringPtrMapBase::Get(std::string_view name) const noexcept {
-    return table_ == nullptr ? nullptr : GetHashed(HashIgnoringCase(name), name);
-}
-
-void* IStringPtrMapBase::GetHashed(std::uint32_t hash, std::string_view name) const noexcept {
     if (table_ == nullptr) {
         return nullptr;
     }
-    const std::size_t found = table_->Find(hash, name);
+    const std::size_t found = table_->Find(HashIgnoringCase(name), name);
     return found < table_->entries.size() ? table_->entries[found].pointer : nullptr;
 }
 
@@ -169,10 +163,6 @@ bool IStringPtrMapBase::IsEmpty() const noexcept {
 
 void IStringPtrMapBase::Empty() noexcept {
     table_.reset();
-}
-
-std::size_t IStringPtrMapBase::GetLongestName() const noexcept {
-    return table_ == nullptr ? 0 : table_->longestName;
 }
 
 } // namespace Orn_Hdl

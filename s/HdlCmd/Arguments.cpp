@@ -9,8 +9,9 @@ namespace Orn_Hdl {
 
 namespace {
 
-/// Enough for the pointer to a block.
-constexpr std::size_t LeastRoom = 12;
+/// Where in the room the pointer to a block stands: aligned, so that leak checkers see it.
+constexpr std::size_t BlockOffset = 4;
+constexpr std::size_t LeastRoom = BlockOffset + sizeof(char*);
 constexpr std::size_t MostRoom = 4096;
 
 } // namespace
@@ -38,7 +39,7 @@ const char* Arguments::GetTexts() const noexcept {
         return GetRoom();
     }
     const char* block = nullptr;
-    std::memcpy(&block, GetRoom(), sizeof block);
+    std::memcpy(&block, GetRoom() + BlockOffset, sizeof block);
     return block;
 }
 
@@ -48,7 +49,7 @@ char* Arguments::MakePlace(std::size_t size) {
         return GetRoom();
     }
     char* const block = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::Commands));
-    std::memcpy(GetRoom(), &block, sizeof block);
+    std::memcpy(GetRoom() + BlockOffset, &block, sizeof block);
     count_ = OwnBlock;
     return block;
 }

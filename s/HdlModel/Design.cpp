@@ -5,7 +5,6 @@
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Exception.h"
 #include "Port/Ascii.h"
-#include "Port/File.h"
 
 #include <cerrno>
 #include <memory>
@@ -154,18 +153,22 @@ bool Model::Execute(const StringArray& tokens) {
            implementation_->commands.CreateAndExecute(tokens, this, GetCommandFactory());
 }
 
+void Model::Foresee(const StringArray& words) noexcept {
+    implementation_->netlist.Foresee(words);
+}
+
 bool Model::Read(const char* fileName) {
-    Port::File file;
-    if (!file.open(fileName, Port::File::Read, true)) {
+    CommandReader reader(*this);
+    if (!reader.Open(fileName)) {
         SetModifiedFlag(false);
         return false;
     }
     bool result = true;
-    for (std::string_view line; file.NextLine(line);) {
-        result = ExecuteLine(line);
+    while (const StringArray* words = reader.Next()) {
+        result = Execute(*words);
     }
     SetModifiedFlag(false);
-    return result && file.GetError() == 0;
+    return result && reader.GetError() == 0;
 }
 
 bool Model::Write(const char* /*fileName*/) {
@@ -211,8 +214,7 @@ Attribute* Model::GetAttr(const char* name, const AttributeHolder* holder) const
 }
 
 bool Model::IsNamedUsed(const char* name) const {
-    return GetComponent(name) != nullptr || GetInstance(name) != nullptr ||
-           GetSignal(name) != nullptr;
+    return implementation_->netlist.IsNameUsed(ViewOf(name));
 }
 
 bool Model::AddComponent(const char* name) {

@@ -1,10 +1,14 @@
 // An index from names to the objects that bear them. It keeps no names: it asks the objects.
 #pragma once
 
-#include "Containers/Hash.h"
+#include "Containers/FoldedHash.h"
 #include "HdlModel/Names.h"
 #include "Port/Ascii.h"
+#include "Port/Pool.h"
+#include "Port/Prefetch.h"
 
+#include <array>
+#include <cstddef>
 #include <cstdint>
 #include <cstring>
 #include <string_view>
@@ -12,18 +16,24 @@
 
 namespace Orn_Hdl {
 
-/// One character of a name as look-ups compare it: normalised, letter case ignored.
-constexpr char FoldedNameChar(char c) noexcept {
-    return Port::ToUpper(Names::Normalized(c));
+namespace FoldedDetail {
+
+constexpr std::array<unsigned char, 256> MakeTable() noexcept {
+    std::array<unsigned char, 256> table{};
+    for (int c = 0; c < 256; ++c) {
+        table[static_cast<std::size_t>(c)] =
+            static_cast<unsigned char>(Port::ToUpper(Names::Normalized(static_cast<char>(c))));
+    }
+    return table;
 }
 
-inline std::uint32_t HashFolded(std::string_view name) noexcept {
-    NameHash hash;
-    for (const char c : name) {
-        hash.Add(FoldedNameChar(c));
-    }
-    // Names that differ in their last digits alone must not fall into neighbouring places.
-    return hash.GetValue() * 0x9E3779B1U;
+inline constexpr std::array<unsigned char, 256> Table = MakeTable();
+
+} // namespace FoldedDetail
+
+/// One character of a name as look-ups compare it: normalised, letter case ignored.
+inline unsigned char FoldedNameChar(char c) noexcept {
+    return FoldedDetail::Table[static_cast<unsigned char>(c)];
 }
 
 inline bool EqualFolded(std::string_view a, std::string_view b) noexcept {
@@ -31,37 +41,59 @@ inline bool EqualFolded(std::string_view a, std::string_view b) noexcept {
         return false;
     }
     for (std::size_t i = 0; i < a.size(); ++i) {
-        if (FoldedNameChar(a[i]) != FoldedNameChar(b[i])) {
+        if (a[i] != b[i] && FoldedNameChar(a[i]) != FoldedNameChar(b[i])) {
             return false;
         }
     }
     return true;
 }
 
+/// A name to look up, hashed once. Its group sets apart what may bear the same name: it stands in
+/// the two lowest bits of the hash, which say little.
+class NameKey {
+public:
+    static constexpr std::uint32_t GroupMask = 3;
+
+    explicit NameKey(std::string_view name, unsigned group = 0) noexcept
+        : name_(name), hash_((HashFolded(name) & ~GroupMask) | group) {}
+
+    std::string_view GetName() const noexcept { return name_; }
+    std::uint32_t GetHash() const noexcept { return hash_; }
+
+private:
+    std::string_view name_;
+    std::uint32_t hash_;
+};
+
 /// Open addressing with linear probing. `KeyOf` gives an object's name, which must stay equal
 /// (normalised, letter case ignored) as long as the object is in the index.
 template <class T, class KeyOf> class NameIndex {
 public:
-    /// The object of that name; null when there is none.
-    T* Find(std::string_view name) const noexcept {
-        return slots_.empty() ? nullptr : slots_[Probe(HashFolded(name), name)].GetObject();
+    /// The object of that name and group; null when there is none.
+    T* Find(const NameKey& key) const noexcept {
+        return slots_.empty() ? nullptr : slots_[Probe(key, GroupsApart)].GetObject();
+    }
+    /// Whether an object of any group has that name.
+    bool Contains(const NameKey& key) const noexcept {
+        return !slots_.empty() && !slots_[Probe(key, GroupsAlike)].IsFree();
     }
 
-    /// Enters an object, in the place of another of its name.
-    void Add(T* object) {
+    /// Enters an object, in the place of another of its name and group.
+    void Add(T* object, unsigned group = 0) {
         Reserve(count_ + 1);
-        const std::string_view name = KeyOf()(object);
-        const std::uint32_t hash = HashFolded(name);
-        Slot& slot = slots_[Probe(hash, name)];
+        const NameKey key(KeyOf()(object), group);
+        Slot& slot = slots_[Probe(key, GroupsApart)];
         count_ += slot.IsFree() ? 1 : 0;
-        slot.Set(hash, object);
+        slot.Set(key.GetHash(), object);
     }
 
     /// Takes an object out, unless another has taken its place.
-    void Remove(const T* object) noexcept {
-        const std::string_view name = KeyOf()(object);
-        std::size_t hole = slots_.empty() ? 0 : Probe(HashFolded(name), name);
-        if (slots_.empty() || slots_[hole].GetObject() != object) {
+    void Remove(const T* object, unsigned group = 0) noexcept {
+        if (slots_.empty()) {
+            return;
+        }
+        std::size_t hole = Probe(NameKey(KeyOf()(object), group), GroupsApart);
+        if (slots_[hole].GetObject() != object) {
             return;
         }
         // What the freed place lets nearer to its home moves up.
@@ -74,6 +106,20 @@ public:
         slots_[hole] = Slot();
         --count_;
     }
+
+    int GetSize() const noexcept { return static_cast<int>(count_); }
+
+    /// \{
+    /// For looking ahead: asks for the place of a hash, and guesses which object is there.
+    void PrefetchPlace(std::uint32_t hash) const noexcept { Port::Prefetch(&slots_[Home(hash)]); }
+    const T* GuessObject(std::uint32_t hash) const noexcept {
+        std::size_t i = Home(hash);
+        while (!slots_[i].IsFree() && ((slots_[i].hash ^ hash) & GroupsAlike) != 0) {
+            i = Next(i);
+        }
+        return slots_[i].GetObject();
+    }
+    /// \}
 
     void Clear() noexcept {
         slots_.clear();
@@ -99,11 +145,18 @@ private:
         }
     };
 
-    /// The place of a name, or the free place where it would go.
-    std::size_t Probe(std::uint32_t hash, std::string_view name) const noexcept {
-        std::size_t i = Home(hash);
+    using Slots = std::vector<Slot, Port::Pool::Allocator<Slot>>;
+
+    static constexpr std::uint32_t GroupsApart = ~std::uint32_t(0);
+    static constexpr std::uint32_t GroupsAlike = ~NameKey::GroupMask;
+
+    /// The place of a name, or the free place where it would go. `mask` says which bits of the hash
+    /// must agree.
+    std::size_t Probe(const NameKey& key, std::uint32_t mask) const noexcept {
+        std::size_t i = Home(key.GetHash());
         while (!slots_[i].IsFree() &&
-               !(slots_[i].hash == hash && EqualFolded(KeyOf()(slots_[i].GetObject()), name))) {
+               !(((slots_[i].hash ^ key.GetHash()) & mask) == 0 &&
+                 EqualFolded(KeyOf()(slots_[i].GetObject()), key.GetName()))) {
             i = Next(i);
         }
         return i;
@@ -114,7 +167,7 @@ private:
         if (count * 4 <= slots_.size() * 3) {
             return;
         }
-        std::vector<Slot> former(slots_.size() < 16 ? 16 : slots_.size() + slots_.size() / 2);
+        Slots former(slots_.size() < 16 ? 16 : slots_.size() + slots_.size() / 2);
         former.swap(slots_);
         for (const Slot& slot : former) {
             if (!slot.IsFree()) {
@@ -127,7 +180,9 @@ private:
         }
     }
 
+    /// Tells nothing of the group: objects of one name share their home.
     std::size_t Home(std::uint32_t hash) const noexcept {
+        hash &= ~NameKey::GroupMask;
         return static_cast<std::size_t>((std::uint64_t(hash) * slots_.size()) >> 32);
     }
     std::size_t Next(std::size_t i) const noexcept { return i + 1 == slots_.size() ? 0 : i + 1; }
@@ -135,7 +190,7 @@ private:
         return to >= from ? to - from : to + slots_.size() - from;
     }
 
-    std::vector<Slot> slots_;
+    Slots slots_;
     std::size_t count_ = 0;
 };
 

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model/Netlist.h"
 
 #include "HdlModel/DummySignals.h"
+#include "HdlModel/Foresight.h"
 #include "HdlModel/NameIndex.h"
 #include "HdlModel/Names.h"
 #include "HdlModel/NaturalSort.h"
@@ -29,6 +30,20 @@ struct KeyBaseName {
     }
 };
 
+/// Components, instances and signals are found in one index: the operations that keep their names
+/// apart ask for all three at once.
+enum NameGroup : unsigned { ComponentGroup, InstanceGroup, SignalGroup };
+
+constexpr NameGroup GroupOf(const Component* /*component*/) noexcept {
+    return ComponentGroup;
+}
+constexpr NameGroup GroupOf(const Instance* /*instance*/) noexcept {
+    return InstanceGroup;
+}
+constexpr NameGroup GroupOf(const Signal* /*signal*/) noexcept {
+    return SignalGroup;
+}
+
 /// What is removed was mostly added last.
 template <class T> int LastIndexOf(const PtrArray<T*>& objects, const T* object) noexcept {
     int i = objects.GetSize() - 1;
@@ -48,10 +63,9 @@ struct Netlist::Implementation {
     OwnPtrArray<Component*> components;
     OwnPtrArray<Instance*> instances;
     OwnPtrArray<Signal*> signals;
-    NameIndex<Component, KeyName> componentsByName;
-    NameIndex<Instance, KeyName> instancesByName;
-    NameIndex<Signal, KeyName> signalsByName;
+    NameIndex<Object, KeyName> byName;
     NameIndex<Bus, KeyBaseName> busesByBaseName;
+    Foresight foresight;
     DummySignals dummies;
     std::string sourceFileName;
 
@@ -70,23 +84,21 @@ struct Netlist::Implementation {
     }
 
     /// Takes ownership of an object that has no owner. \return false for any other.
-    template <class T, class Index>
-    static bool Take(T* object, OwnPtrArray<T*>& objects, Index& byName) {
+    template <class T> bool Take(T* object, OwnPtrArray<T*>& objects) {
         if (object == nullptr || OwnedFlag::Get(*object)) {
             return false;
         }
         std::unique_ptr<T> taken(object);
         objects.AddNew(object);
         OwnedFlag::Set(*taken.release());
-        byName.Add(object);
+        byName.Add(object, GroupOf(object));
         return true;
     }
 
-    template <class T, class Index>
-    static void Destroy(T* object, OwnPtrArray<T*>& objects, Index& byName) {
+    template <class T> void Destroy(T* object, OwnPtrArray<T*>& objects) {
         const int place = object == nullptr ? -1 : LastIndexOf<T>(objects, object);
         if (place >= 0) {
-            byName.Remove(object);
+            byName.Remove(object, GroupOf(object));
             objects.RemoveAt(place);
             delete object;
         }
@@ -118,19 +130,17 @@ Port::StringBase<char> Netlist::GetSourceFileName() const {
 
 void Netlist::Add(Signal* signal) {
     Implementation& own = *implementation_;
-    if (own.Take(signal, own.signals, own.signalsByName) &&
-        signal->GetSignalType() == SignalTypeBus) {
+    if (own.Take(signal, own.signals) && signal->GetSignalType() == SignalTypeBus) {
         own.busesByBaseName.Add(static_cast<Bus*>(signal));
     }
 }
 
 void Netlist::Add(Instance* instance) {
-    implementation_->Take(instance, implementation_->instances, implementation_->instancesByName);
+    implementation_->Take(instance, implementation_->instances);
 }
 
 void Netlist::Add(Component* component) {
-    implementation_->Take(component, implementation_->components,
-                          implementation_->componentsByName);
+    implementation_->Take(component, implementation_->components);
 }
 
 void Netlist::Remove(Signal* signal) {
@@ -142,34 +152,40 @@ void Netlist::Remove(Signal* signal) {
     if (signal->GetSignalType() == SignalTypeBus) {
         own.busesByBaseName.Remove(static_cast<Bus*>(signal));
     }
-    own.Destroy(signal, own.signals, own.signalsByName);
+    own.Destroy(signal, own.signals);
 }
 
 void Netlist::Remove(Instance* instance) {
-    implementation_->Destroy(instance, implementation_->instances,
-                             implementation_->instancesByName);
+    implementation_->Destroy(instance, implementation_->instances);
 }
 
 void Netlist::Remove(Component* component) {
-    implementation_->Destroy(component, implementation_->components,
-                             implementation_->componentsByName);
+    implementation_->Destroy(component, implementation_->components);
 }
 
 Signal* Netlist::GetSignal(std::string_view name) const noexcept {
-    return implementation_->signalsByName.Find(name);
+    return static_cast<Signal*>(implementation_->byName.Find(NameKey(name, SignalGroup)));
 }
 
 Instance* Netlist::GetInstance(std::string_view name) const noexcept {
-    return implementation_->instancesByName.Find(name);
+    return static_cast<Instance*>(implementation_->byName.Find(NameKey(name, InstanceGroup)));
 }
 
 Component* Netlist::GetComponent(std::string_view name) const noexcept {
-    return implementation_->componentsByName.Find(name);
+    return static_cast<Component*>(implementation_->byName.Find(NameKey(name, ComponentGroup)));
+}
+
+bool Netlist::IsNameUsed(std::string_view name) const noexcept {
+    return implementation_->byName.Contains(NameKey(name));
+}
+
+void Netlist::Foresee(const StringArray& words) noexcept {
+    implementation_->foresight.Note(implementation_->byName, words);
 }
 
 Bus* Netlist::GetParentBus(const char* name) const {
     const Names::NormalizedText normalized(Port::ViewOf(name));
-    return implementation_->busesByBaseName.Find(Names::BaseName(normalized.GetView()));
+    return implementation_->busesByBaseName.Find(NameKey(Names::BaseName(normalized.GetView())));
 }
 
 Iterator<Signal*> Netlist::GetSignalIterator() const noexcept {

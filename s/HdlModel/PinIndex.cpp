@@ -15,11 +15,11 @@ Pin* PinIndex::Find(const PtrArray<Pin*>& pins, std::string_view name) {
     }
     for (; indexed_ < pins.GetSize(); ++indexed_) {
         Pin* const pin = pins.GetAt(indexed_);
-        if (byName_.Find(pin->GetNameView()) == nullptr) {
+        if (byName_.Find(NameKey(pin->GetNameView())) == nullptr) {
             byName_.Add(pin);
         }
     }
-    return byName_.Find(name);
+    return byName_.Find(NameKey(name));
 }
 
 } // namespace Orn_Hdl

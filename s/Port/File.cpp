@@ -268,12 +268,26 @@ bool File::NextLine(std::string_view& line) {
         }
         end = lineBuffer_.size();
     }
-    line = std::string_view(lineBuffer_).substr(lineStart_, end - lineStart_);
+    line = TakeLine(end);
+    return true;
+}
+
+bool File::NextLineAtHand(std::string_view& line) {
+    const std::size_t end = lineBuffer_.find('\n', lineStart_);
+    if (end == std::string::npos) {
+        return false;
+    }
+    line = TakeLine(end);
+    return true;
+}
+
+std::string_view File::TakeLine(std::size_t end) {
+    std::string_view line = std::string_view(lineBuffer_).substr(lineStart_, end - lineStart_);
     lineStart_ = std::min(end + 1, lineBuffer_.size());
     if (!line.empty() && line.back() == '\r') {
         line.remove_suffix(1);
     }
-    return true;
+    return line;
 }
 
 Stream::Stream(File& file) : file_(file), buffer_(new char[BufferSize]) {}

@@ -2,17 +2,9 @@
 #pragma once
 
 #include "Orn_Hdl/Model/Netlist.h"
+#include "Port/Prefetch.h"
 
 namespace Orn_Hdl::Writers {
-
-/// Hints that an object is about to be read.
-inline void Prefetch(const void* object) noexcept {
-#if defined(__GNUC__)
-    __builtin_prefetch(object);
-#else
-    static_cast<void>(object);
-#endif
-}
 
 /// Walks ahead of a reader of instances.
 class InstanceLookahead {
@@ -44,13 +36,13 @@ template <class Visit> void ForEachInstance(const Netlist& netlist, const Visit&
     InstanceLookahead middle(netlist, 8);
     InstanceLookahead near(netlist, 4);
     for (const Instance* instance : netlist.GetInstanceIterator()) {
-        Prefetch(far.Next());
+        Port::Prefetch(far.Next());
         if (const Instance* const coming = middle.Next()) {
-            Prefetch(coming->GetPinIterator().GetCurrent());
+            Port::Prefetch(coming->GetPinIterator().GetCurrent());
         }
         if (const Instance* const coming = near.Next()) {
             for (const Pin* pin : coming->GetPinIterator()) {
-                Prefetch(pin->GetSignal());
+                Port::Prefetch(pin->GetSignal());
             }
         }
         visit(*instance);

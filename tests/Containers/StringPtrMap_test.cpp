@@ -132,15 +132,6 @@ TEST(StringPtrMap, HoldsFunctions) {
     EXPECT_EQ(map.Get("x"), nullptr);
 }
 
-TEST(StringPtrMap, KnowsItsLongestName) {
-    int a = 1;
-    Map map;
-    EXPECT_EQ(map.GetLongestName(), 0u);
-    map.Add("abc", &a);
-    map.Add("ab", &a);
-    EXPECT_EQ(map.GetLongestName(), 3u);
-}
-
 TEST(StringPtrMap, FindsEveryOneOfAHundredThousandNames) {
     std::vector<int> values(100000);
     Map map;

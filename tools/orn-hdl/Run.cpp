@@ -23,15 +23,15 @@ public:
     Replayer(Orn_Hdl::Model& model, const std::string& file, Progress& progress)
         : model_(model), file_(file), progress_(progress) {}
 
-    /// Carries out one line. \return whether all went well.
-    bool ExecuteLine(std::string_view line) {
+    /// Carries out one line; `position` is where it ends in the file. \return whether all went
+    /// well.
+    bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
         ++lines_;
-        bytes_ += line.size() + 1;
         if (lines_ % LinesPerUpdate == 0) {
-            progress_.Update(lines_, bytes_);
+            progress_.Update(lines_, position);
         }
         try {
-            model_.ExecuteLine(line);
+            model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
             Report(WithoutLineEnd(exception.getLocalized().GetView()));
             status_ = Worse(status_, Status::Failed);
@@ -72,7 +72,6 @@ private:
     const std::string& file_;
     Progress& progress_;
     std::uint64_t lines_ = 0;
-    std::uint64_t bytes_ = 0;
     Status status_ = Status::Success;
 };
 
@@ -90,14 +89,13 @@ std::string GetModelName(const RunOptions& options) {
 
 Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
                 Progress& progress) {
-    Port::File input;
-    if (!input.open(SystemFileName(file.c_str()), Port::File::Read, true)) {
+    Orn_Hdl::CommandReader input(model);
+    if (!input.Open(SystemFileName(file.c_str()))) {
         return {ComplainUnreadable(file, input.GetError()), false};
     }
     Replayer replayer(model, file, progress);
-    std::string_view line;
-    while (input.NextLine(line)) {
-        if (!replayer.ExecuteLine(line) && !keepGoing) {
+    while (const Orn_Hdl::StringArray* words = input.Next()) {
+        if (!replayer.Execute(*words, input.GetPosition()) && !keepGoing) {
             return {replayer.GetStatus(), false};
         }
     }
@@ -110,10 +108,12 @@ Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
 
 Status Run(const RunOptions& options) {
     Progress progress(options.quiet, options.file);
-    Orn_Hdl::Engine engine;
+    // The design stands until the process ends, which gives its memory back at once: object by
+    // object that takes a tenth of the time of the whole run.
+    static Orn_Hdl::Engine* const engine = new Orn_Hdl::Engine;
     const std::string name = GetModelName(options);
-    engine.CreateAndAddModel(name.c_str(), options.file.c_str());
-    Orn_Hdl::Model& model = *engine.GetModel(name.c_str());
+    engine->CreateAndAddModel(name.c_str(), options.file.c_str());
+    Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
     const Replayed replayed = Replay(model, options.file, options.keepGoing, progress);
     if (!replayed.complete) {
         return replayed.status;

@@ -34,12 +34,6 @@ public:
     bool IsEmpty() const noexcept;
     /// Takes all names out.
     void Empty() noexcept;
-    /// The length of the longest name that was ever entered.
-    std::size_t GetLongestName() const noexcept;
-
-protected:
-    /// As `Get`, for a caller who has hashed the name (ignoring case) already.
-    void* GetHashed(std::uint32_t hash, std::string_view name) const noexcept;
 
 private:
     struct Table;
@@ -58,9 +52,6 @@ public:
     T Get(const char* name) const noexcept { return Get(View(name)); }
     T Get(std::string_view name) const noexcept {
         return FromUntyped(IStringPtrMapBase::Get(name));
-    }
-    T GetHashed(std::uint32_t hash, std::string_view name) const noexcept {
-        return FromUntyped(IStringPtrMapBase::GetHashed(hash, name));
     }
     bool Contains(const char* name) const noexcept {
         return IStringPtrMapBase::Contains(View(name));

@@ -59,6 +59,8 @@ public:
     Instance* GetInstance(std::string_view name) const noexcept;
     Component* GetComponent(std::string_view name) const noexcept;
     /// \}
+    /// Whether a component, an instance or a signal has that name, normalised.
+    bool IsNameUsed(std::string_view name) const noexcept;
     /// The bus with the base name of a text: D, D(3) and D(7:0) all give the bus D.
     Bus* GetParentBus(const char* name) const;
 
@@ -101,6 +103,8 @@ private:
     friend class Model;
     struct Implementation;
 
+    /// Hints that a command line will be executed some lines later.
+    void Foresee(const StringArray& words) noexcept;
     bool MayHaveFeedBack(bool outputPorts) const;
     void GetFeedBackSignals(bool outputPorts, StringSet& names) const;
     void GetWiredOrOutputSignals(StringSet& names) const;

@@ -1,0 +1,59 @@
+// Looks up ahead of time what coming command lines name.
+#pragma once
+
+#include "HdlModel/NameIndex.h"
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Port/Prefetch.h"
+
+#include <array>
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+/// In a large design what a line names is nowhere near the processor, and waiting for it takes
+/// longer than the line's work. So the coming lines are looked at while others are worked on: first
+/// the places of their names in the index are asked for, and some lines later the objects that
+/// stand there. These are hints alone: that a line may name something else, or nothing, is of no
+/// consequence.
+class Foresight {
+public:
+    /// Takes note of a line that will be executed `Distance` lines later.
+    template <class Index> void Note(const Index& index, const StringArray& words) noexcept {
+        if (index.GetSize() < LeastSize) {
+            return;
+        }
+        Hashes& hashes = coming_[noted_ % Distance];
+        hashes = HashNames(words);
+        ++noted_;
+        for (const std::uint32_t hash : hashes) {
+            index.PrefetchPlace(hash);
+        }
+        for (const std::uint32_t hash : coming_[(noted_ + Distance / 2) % Distance]) {
+            if (const auto* const object = index.GuessObject(hash)) {
+                Port::Prefetch(object);
+                Port::Prefetch(reinterpret_cast<const char*>(object) + CacheLine);
+            }
+        }
+    }
+
+    static constexpr std::size_t Distance = 16;
+
+private:
+    /// What a line can name stands in its third and fourth word.
+    using Hashes = std::array<std::uint32_t, 2>;
+
+    static constexpr int LeastSize = 10000;
+    static constexpr std::size_t CacheLine = 64;
+
+    static Hashes HashNames(const StringArray& words) noexcept {
+        const std::string_view owner = words.GetView(3);
+        return {HashFolded(words.GetView(2)), HashFolded(owner.substr(0, owner.find('.')))};
+    }
+
+    std::array<Hashes, Distance> coming_{};
+    std::size_t noted_ = 0;
+};
+
+} // namespace Orn_Hdl
