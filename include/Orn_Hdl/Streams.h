@@ -6,6 +6,8 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstddef>
+#include <initializer_list>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -26,6 +28,8 @@ public:
     virtual void Write(int number) = 0;
     /// Writes a text of known length; in the base through `Write(const char*)`.
     virtual void WriteView(std::string_view text);
+    /// Writes some texts one after the other; in the base through `WriteView`.
+    virtual void WritePieces(const std::string_view* pieces, std::size_t count);
 
     /// Goes one level deeper.
     void Indent() noexcept { ++indentLevel_; }
@@ -68,6 +72,8 @@ public:
     OutStream& operator<<(int number);
     OutStream& operator<<(Operand operand);
     /// \}
+    /// Writes texts, each as if by itself: a file's lines are broken between them.
+    OutStream& WritePieces(std::initializer_list<std::string_view> pieces);
 
     /// \{
     /// As those of the destination.

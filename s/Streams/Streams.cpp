@@ -18,6 +18,12 @@ void StreamDst::WriteView(std::string_view text) {
     Write(std::string(text).c_str());
 }
 
+void StreamDst::WritePieces(const std::string_view* pieces, std::size_t count) {
+    for (std::size_t i = 0; i < count; ++i) {
+        WriteView(pieces[i]);
+    }
+}
+
 OutStream::OutStream(StreamDst* destination) : destination_(destination) {}
 
 OutStream::~OutStream() = default;
@@ -29,6 +35,13 @@ OutStream& OutStream::operator<<(const char* text) {
 OutStream& OutStream::operator<<(std::string_view text) {
     if (destination_ != nullptr) {
         destination_->WriteView(text);
+    }
+    return *this;
+}
+
+OutStream& OutStream::WritePieces(std::initializer_list<std::string_view> pieces) {
+    if (destination_ != nullptr) {
+        destination_->WritePieces(pieces.begin(), pieces.size());
     }
     return *this;
 }

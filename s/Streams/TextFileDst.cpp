@@ -2,7 +2,10 @@
 
 #include "Port/Ascii.h"
 
+#include <algorithm>
 #include <charconv>
+#include <string>
+#include <utility>
 
 namespace Orn_Hdl {
 
@@ -10,6 +13,7 @@ namespace {
 
 constexpr std::string_view IndentStep = "   ";
 constexpr int ContinuationLevels = 2;
+constexpr std::size_t BufferSize = std::size_t(1) << 18;
 
 Port::File::Mode FileMode(TextFileOutStream::Mode mode) noexcept {
     switch (mode) {
@@ -55,7 +59,7 @@ bool TextFileDst::Open(const char* fileName, TextFileOutStream::Mode mode) {
     Close();
     replaces_ = mode == TextFileOutStream::Replace;
     if (file_.open(fileName, FileMode(mode), mode != TextFileOutStream::Append)) {
-        stream_.emplace(file_);
+        isGood_ = true;
     }
     return IsOpen();
 }
@@ -65,25 +69,48 @@ void TextFileDst::Close() {
         Flush();
         file_.close();
     }
-    stream_.reset();
-    EndBuffer();
-}
-
-void TextFileDst::EndBuffer() {
-    line_.clear();
-    search_ = BreakSearch();
+    buffer_.reset();
+    capacity_ = 0;
+    used_ = 0;
+    StartLine();
 }
 
 void TextFileDst::Flush() {
     if (!IsOpen()) {
         return;
     }
-    if (!line_.empty()) {
+    if (!GetLine().empty()) {
         // The text goes on in a new line, which begins when something is written into it.
-        *stream_ << line_ << "\n";
-        EndBuffer();
+        Append("\n");
+        StartLine();
     }
-    stream_->flush();
+    SendLines();
+}
+
+/// After a failure nothing more is sent: a file with a hole in it would be worse than a short one.
+void TextFileDst::Send(std::string_view text) {
+    isGood_ = isGood_ && (text.empty() || file_.write(text.data(), text.size()));
+}
+
+/// The line in hand moves to the front of the buffer.
+void TextFileDst::SendLines() {
+    Send(std::string_view(buffer_.get(), lineStart_));
+    const std::string_view line = GetLine();
+    std::copy(line.begin(), line.end(), buffer_.get());
+    used_ = line.size();
+    lineStart_ = 0;
+}
+
+void TextFileDst::MakeRoom(std::size_t size) {
+    SendLines();
+    if (size <= capacity_ - used_) {
+        return;
+    }
+    const std::size_t capacity = std::max({BufferSize, capacity_ * 2, used_ + size});
+    std::unique_ptr<char[]> buffer(new char[capacity]);
+    std::copy_n(buffer_.get(), used_, buffer.get());
+    buffer_ = std::move(buffer);
+    capacity_ = capacity;
 }
 
 void TextFileDst::Write(const char* text) {
@@ -99,14 +126,21 @@ void TextFileDst::Write(int number) {
 }
 
 void TextFileDst::WriteView(std::string_view text) {
-    if (!IsOpen()) {
-        return;
+    if (IsOpen()) {
+        WritePiece(text);
     }
+}
+
+void TextFileDst::WritePieces(const std::string_view* pieces, std::size_t count) {
+    if (IsOpen()) {
+        std::for_each(pieces, pieces + count, [this](std::string_view text) { WritePiece(text); });
+    }
+}
+
+inline void TextFileDst::WritePiece(std::string_view text) {
     for (std::size_t end = FindLineFeed(text); end != std::string_view::npos;
          end = FindLineFeed(text)) {
-        BeginLine();
-        *stream_ << line_ << text.substr(0, end + 1);
-        EndBuffer();
+        WriteToLineEnd(text.substr(0, end + 1));
         text.remove_prefix(end + 1);
     }
     if (!text.empty()) {
@@ -114,40 +148,60 @@ void TextFileDst::WriteView(std::string_view text) {
     }
 }
 
-void TextFileDst::AppendIndentation(int extraLevels) {
-    for (int level = GetIndentLevel() + extraLevels; level > 0; --level) {
-        line_ += IndentStep;
-    }
-}
-
-void TextFileDst::BeginLine() {
-    if (line_.empty()) {
-        AppendIndentation(0);
-    }
-}
-
-void TextFileDst::AppendWrapping(std::string_view text) {
+void TextFileDst::WriteToLineEnd(std::string_view text) {
     BeginLine();
-    if (line_.size() + text.size() > Width) {
-        SearchBreak();
-        if (!search_.isComment) {
-            if (search_.afterSpace > 0) {
-                BreakAt(search_.afterSpace);
-            } else if (search_.afterComma > 0) {
-                BreakAt(search_.afterComma);
-            } else if (!search_.inLiteral) {
-                BreakAt(line_.size());
-            }
-        }
+    if (text.size() < BufferSize) {
+        Append(text);
+        StartLine();
+        return;
     }
-    line_ += text;
+    // A text of many megabytes need not go through the buffer.
+    StartLine();
+    SendLines();
+    Send(text);
+}
+
+void TextFileDst::AppendIndentation(int levels) {
+    for (; levels > 0; --levels) {
+        Append(IndentStep);
+    }
+}
+
+inline void TextFileDst::BeginLine() {
+    if (GetLine().empty()) {
+        AppendIndentation(GetIndentLevel());
+    }
+}
+
+inline void TextFileDst::AppendWrapping(std::string_view text) {
+    BeginLine();
+    if (GetLine().size() + text.size() > Width) {
+        Wrap();
+    }
+    Append(text);
+}
+
+/// Breaks the line in hand where it may be broken.
+void TextFileDst::Wrap() {
+    SearchBreak();
+    if (search_.isComment) {
+        return;
+    }
+    if (search_.afterSpace > 0) {
+        BreakAt(search_.afterSpace);
+    } else if (search_.afterComma > 0) {
+        BreakAt(search_.afterComma);
+    } else if (!search_.inLiteral) {
+        BreakAt(GetLine().size());
+    }
 }
 
 void TextFileDst::SearchBreak() {
     BreakSearch& found = search_;
-    for (std::size_t& i = found.searched; i < line_.size() && !found.isComment; ++i) {
-        const char c = line_[i];
-        const char before = i > 0 ? line_[i - 1] : '\0';
+    const std::string_view line = GetLine();
+    for (std::size_t& i = found.searched; i < line.size() && !found.isComment; ++i) {
+        const char c = line[i];
+        const char before = i > 0 ? line[i - 1] : '\0';
         if (c == '"') {
             found.inLiteral = !found.inLiteral;
         } else if (c == ' ' && !found.inLiteral) {
@@ -161,11 +215,12 @@ void TextFileDst::SearchBreak() {
 }
 
 void TextFileDst::BreakAt(std::size_t position) {
-    *stream_ << std::string_view(line_).substr(0, position) << "\n";
-    const std::string rest = line_.substr(position);
-    EndBuffer();
-    AppendIndentation(ContinuationLevels);
-    line_ += rest;
+    const std::string rest(GetLine().substr(position));
+    used_ = lineStart_ + position;
+    Append("\n");
+    StartLine();
+    AppendIndentation(GetIndentLevel() + ContinuationLevels);
+    Append(rest);
 }
 
 } // namespace Orn_Hdl

@@ -4,8 +4,9 @@
 #include "Orn_Hdl/Streams.h"
 #include "Port/File.h"
 
-#include <optional>
-#include <string>
+#include <cstddef>
+#include <cstring>
+#include <memory>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -30,6 +31,7 @@ public:
     void Write(const char* text) override;
     void Write(int number) override;
     void WriteView(std::string_view text) override;
+    void WritePieces(const std::string_view* pieces, std::size_t count) override;
 
 private:
     /// What a search for a place to break has found so far in the line. It goes on where it
@@ -42,18 +44,42 @@ private:
         bool isComment = false;
     };
 
+    std::string_view GetLine() const noexcept {
+        return std::string_view(buffer_.get() + lineStart_, used_ - lineStart_);
+    }
+    void WritePiece(std::string_view text);
+    void WriteToLineEnd(std::string_view text);
     void BeginLine();
     void AppendWrapping(std::string_view text);
+    void Wrap();
     void SearchBreak();
     void BreakAt(std::size_t position);
-    void AppendIndentation(int extraLevels);
-    void EndBuffer();
+    void AppendIndentation(int levels);
+    void Append(std::string_view text) {
+        if (text.size() > capacity_ - used_) {
+            MakeRoom(text.size());
+        }
+        std::memcpy(buffer_.get() + used_, text.data(), text.size());
+        used_ += text.size();
+    }
+    void MakeRoom(std::size_t size);
+    /// Ends the line in hand, of which nothing will change any more.
+    void StartLine() noexcept {
+        lineStart_ = used_;
+        search_ = BreakSearch();
+    }
+    void Send(std::string_view text);
+    void SendLines();
 
     Port::File file_;
     bool replaces_ = false;
-    std::optional<Port::Stream> stream_;
+    bool isGood_ = true;
     Port::StringBase<char> fileName_;
-    std::string line_;
+    /// Lines that wait for being sent to the file, and behind them the line in hand.
+    std::unique_ptr<char[]> buffer_;
+    std::size_t capacity_ = 0;
+    std::size_t used_ = 0;
+    std::size_t lineStart_ = 0;
     BreakSearch search_;
 };
 

@@ -7,6 +7,7 @@
 #include "Orn_Hdl/Streams.h"
 
 #include <cstddef>
+#include <string>
 #include <string_view>
 
 namespace Orn_Hdl::Writers {
@@ -25,22 +26,22 @@ Port::String GetUnquotedValue(const Attribute& attribute);
 /// The bit that a constant gives to a signal of one bit: only a last digit 0 gives "0".
 std::string_view GetSingleBit(const BitVectorValue& value);
 
-inline void PutPiece(OutStream& out, std::string_view text) {
-    out << text;
+inline std::string_view ToPiece(std::string_view text) {
+    return text;
 }
-inline void PutPiece(OutStream& out, const char* text) {
-    out << Port::ViewOf(text);
+inline std::string_view ToPiece(const char* text) {
+    return Port::ViewOf(text);
 }
-inline void PutPiece(OutStream& out, int number) {
-    out << number;
+inline std::string ToPiece(int number) {
+    return std::to_string(number);
 }
 /// Writes texts and numbers, each as a piece of its own: lines are broken between pieces only.
 template <class... Pieces> void Put(OutStream& out, const Pieces&... pieces) {
-    (PutPiece(out, pieces), ...);
+    out.WritePieces({ToPiece(pieces)...});
 }
 /// The same, and the end of the line.
 template <class... Pieces> void PutLine(OutStream& out, const Pieces&... pieces) {
-    (PutPiece(out, pieces), ...);
+    out.WritePieces({ToPiece(pieces)...});
     out << OutStream::NewLine;
 }
 
