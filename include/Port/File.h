@@ -63,7 +63,11 @@ private:
     bool OpenToReplace(const char* name);
     bool OpenTemporary(unsigned mode);
     bool FillLineBuffer();
-    std::string_view TakeLine(std::size_t end);
+    /// What was read behind the last line.
+    std::string_view GetUnread() const noexcept {
+        return std::string_view(lineBuffer_.get() + lineStart_, lineEnd_ - lineStart_);
+    }
+    std::string_view TakeLine(std::size_t length) noexcept;
 
     int descriptor_ = -1;
     int error_ = 0;
@@ -71,8 +75,11 @@ private:
     std::string temporary_;
     /// What it is to replace.
     std::string target_;
-    std::string lineBuffer_;
+    /// What was read and not given yet stands from `lineStart_` to `lineEnd_`.
+    std::unique_ptr<char[]> lineBuffer_;
+    std::size_t lineCapacity_ = 0;
     std::size_t lineStart_ = 0;
+    std::size_t lineEnd_ = 0;
     bool atEnd_ = false;
 };
 

@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Containers/StringArray.h"
 
+#include "Containers/FoldedHash.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"
 
@@ -161,23 +162,32 @@ int StringArray::Parse(const char* text, const char* separators, bool skipEmpty,
 }
 
 int StringArray::ParseCommandLine(string_view line) {
+    // Without quotes the words stand in the line as they are: it is copied as a whole, and looked
+    // through eight characters at a time. A blank behind it ends its last word; what follows fills
+    // the last eight.
+    constexpr std::size_t Step = sizeof(std::uint64_t);
+    constexpr string_view filling(" \0\0\0\0\0\0\0", Step);
     const int before = GetSize();
     const std::size_t offset = text_.size();
-    text_.append(line);
-    std::size_t start = 0;
-    for (std::size_t i = 0; i <= line.size(); ++i) {
-        const char c = i < line.size() ? line[i] : ' ';
-        if (c == '"' || c == '\'') {
-            // Only without quotes do the words stand in the line as they are.
-            text_.resize(offset);
-            slots_.resize(static_cast<std::size_t>(before));
-            return Parse(line, " ", true, "\"\"''");
-        }
-        if (c == ' ') {
-            if (i > start) {
-                slots_.push_back({offset + start, i - start});
+    text_.append(line).append(filling);
+    std::size_t start = offset;
+    for (std::size_t i = offset; i <= offset + line.size(); i += Step) {
+        // Blanks and quotes, and some characters between them that mean nothing.
+        std::uint64_t marks = EightBytes::MarkRange(EightBytes::Load(text_.data() + i), ' ', '\'');
+        for (; marks != 0; marks &= marks - 1) {
+            const std::size_t end = i + EightBytes::FirstMarked(marks);
+            const char c = text_[end];
+            if (c == '"' || c == '\'') {
+                text_.resize(offset);
+                slots_.resize(static_cast<std::size_t>(before));
+                return Parse(line, " ", true, "\"\"''");
             }
-            start = i + 1;
+            if (c == ' ') {
+                if (end > start) {
+                    slots_.push_back({start, end - start});
+                }
+                start = end + 1;
+            }
         }
     }
     return GetSize() - before;

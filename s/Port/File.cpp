@@ -108,8 +108,8 @@ void File::CloseDescriptor() noexcept {
 bool File::open(const char* name, Mode mode, bool fromStart) {
     close();
     error_ = 0;
-    lineBuffer_.clear();
     lineStart_ = 0;
+    lineEnd_ = 0;
     atEnd_ = false;
     name = name == nullptr ? "" : name;
     if (mode == Replace) {
@@ -242,48 +242,55 @@ bool File::FillLineBuffer() {
         return false;
     }
     // The rest of a line that the last piece cut moves to the front.
-    lineBuffer_.erase(0, lineStart_);
+    const std::string_view rest = GetUnread();
+    if (rest.size() + ReadSize > lineCapacity_) {
+        const std::size_t capacity = rest.size() + std::max(ReadSize, rest.size());
+        std::unique_ptr<char[]> larger(new char[capacity]);
+        std::copy(rest.begin(), rest.end(), larger.get());
+        lineBuffer_ = std::move(larger);
+        lineCapacity_ = capacity;
+    } else {
+        std::copy(rest.begin(), rest.end(), lineBuffer_.get());
+    }
     lineStart_ = 0;
-    const std::size_t kept = lineBuffer_.size();
-    lineBuffer_.resize(kept + std::max(ReadSize, kept));
-    const std::size_t count = read(lineBuffer_.data() + kept, lineBuffer_.size() - kept);
-    lineBuffer_.resize(kept + count);
+    lineEnd_ = rest.size();
+    const std::size_t count = read(lineBuffer_.get() + lineEnd_, lineCapacity_ - lineEnd_);
+    lineEnd_ += count;
     atEnd_ = count == 0;
     return !atEnd_;
 }
 
 bool File::NextLine(std::string_view& line) {
-    std::size_t searched = lineStart_;
-    std::size_t end = lineBuffer_.find('\n', searched);
-    while (end == std::string::npos) {
-        searched = lineBuffer_.size() - lineStart_;
+    std::size_t length = GetUnread().find('\n');
+    while (length == std::string_view::npos) {
+        const std::size_t searched = GetUnread().size();
         if (!FillLineBuffer()) {
             break;
         }
-        end = lineBuffer_.find('\n', searched);
+        length = GetUnread().find('\n', searched);
     }
-    if (end == std::string::npos) {
-        if (error_ != 0 || lineStart_ == lineBuffer_.size()) {
+    if (length == std::string_view::npos) {
+        if (error_ != 0 || GetUnread().empty()) {
             return false;
         }
-        end = lineBuffer_.size();
+        length = GetUnread().size();
     }
-    line = TakeLine(end);
+    line = TakeLine(length);
     return true;
 }
 
 bool File::NextLineAtHand(std::string_view& line) {
-    const std::size_t end = lineBuffer_.find('\n', lineStart_);
-    if (end == std::string::npos) {
+    const std::size_t length = GetUnread().find('\n');
+    if (length == std::string_view::npos) {
         return false;
     }
-    line = TakeLine(end);
+    line = TakeLine(length);
     return true;
 }
 
-std::string_view File::TakeLine(std::size_t end) {
-    std::string_view line = std::string_view(lineBuffer_).substr(lineStart_, end - lineStart_);
-    lineStart_ = std::min(end + 1, lineBuffer_.size());
+std::string_view File::TakeLine(std::size_t length) noexcept {
+    std::string_view line = GetUnread().substr(0, length);
+    lineStart_ = std::min(lineStart_ + length + 1, lineEnd_);
     if (!line.empty() && line.back() == '\r') {
         line.remove_suffix(1);
     }

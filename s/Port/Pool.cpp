@@ -115,6 +115,10 @@ private:
     std::size_t left_ = 0;
 };
 
+// Looked up at every allocation: the general way of a shared library would be a call.
+#if defined(__GNUC__)
+[[gnu::tls_model("initial-exec")]]
+#endif
 thread_local Filler fillers[2];
 
 } // namespace

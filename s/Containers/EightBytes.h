@@ -1,0 +1,71 @@
+// Text taken eight characters at a time, in a number.
+#pragma once
+
+#include <bit>
+#include <cstddef>
+#include <cstdint>
+#include <cstring>
+
+namespace Orn_Hdl {
+
+namespace EightBytes {
+
+constexpr std::uint64_t Each(unsigned byte) noexcept {
+    return byte * 0x0101010101010101U;
+}
+
+constexpr std::uint64_t High = Each(0x80);
+
+/// The high bit of each byte that is an ASCII character from `first` to `last`.
+constexpr std::uint64_t MarkRange(std::uint64_t text, char first, char last) noexcept {
+    const std::uint64_t low = text & ~High;
+    const std::uint64_t from = low + Each(0x80U - static_cast<unsigned>(first));
+    const std::uint64_t behind = low + Each(0x7FU - static_cast<unsigned>(last));
+    return from & ~behind & ~text & High;
+}
+
+/// Which byte in memory, counted from 0, is the first that is marked; one is.
+constexpr std::size_t FirstMarked(std::uint64_t marks) noexcept {
+    static_assert(std::endian::native == std::endian::little,
+                  "the first byte in memory is the lowest of a number");
+    return static_cast<std::size_t>(std::countr_zero(marks)) / 8;
+}
+
+/// Letters in upper case.
+constexpr std::uint64_t ToUpper(std::uint64_t text) noexcept {
+    return text - (MarkRange(text, 'a', 'z') >> 2U);
+}
+
+/// The same, with zero in the place of every ASCII character that is neither letter nor digit.
+/// Names that are equal as look-ups compare them stay equal so.
+constexpr std::uint64_t Fold(std::uint64_t text) noexcept {
+    const std::uint64_t upper = ToUpper(text);
+    const std::uint64_t kept =
+        MarkRange(upper, 'A', 'Z') | MarkRange(upper, '0', '9') | (upper & High);
+    return upper & ((kept << 1U) - (kept >> 7U));
+}
+
+inline std::uint64_t Load(const char* text) noexcept {
+    std::uint64_t word = 0;
+    std::memcpy(&word, text, sizeof word);
+    return word;
+}
+
+/// Fewer than eight characters; each of them counts, some of them twice.
+inline std::uint64_t LoadShort(const char* text, std::size_t size) noexcept {
+    std::uint32_t first = 0;
+    std::uint32_t last = 0;
+    if (size >= sizeof first) {
+        std::memcpy(&first, text, sizeof first);
+        std::memcpy(&last, text + size - sizeof last, sizeof last);
+        return first | std::uint64_t(last) << 32U;
+    }
+    const auto at = [text](std::size_t i) {
+        return static_cast<std::uint64_t>(static_cast<unsigned char>(text[i]));
+    };
+    return size == 0 ? 0 : at(0) | at(size / 2) << 8U | at(size - 1) << 16U;
+}
+
+} // namespace EightBytes
+
+} // namespace Orn_Hdl
