@@ -128,6 +128,18 @@ class Draw(ToolTest):
         self.expect(self.run_tool("draw", "d.cmd", "-o", "/dev/full"), FILE,
                     "orn-hdl: cannot write /dev/full: No space left on device\n")
 
+    def test_the_picture_is_replaced_as_a_whole(self) -> None:
+        self.write("d.cmd", INVERTER)
+        self.write("o.svg", "before")
+        with open(self.folder / "o.svg", encoding="latin-1") as former:
+            self.expect(self.run_tool("draw", "d.cmd", "-o", "o.svg"), SUCCESS)
+            self.assertEqual(former.read(), "before")
+        self.assertIn("</svg>", self.read("o.svg"))
+        self.write("o.svg", "before")
+        self.expect(self.run_tool("draw", "d.cmd", "-o", "o.svg", PATH="/nowhere"), FILE,
+                    "orn-hdl: cannot run dot: No such file or directory; install Graphviz\n")
+        self.assertEqual(self.read("o.svg"), "before")
+
     def test_without_graphviz(self) -> None:
         self.write("d.cmd", INVERTER)
         self.expect(self.run_tool("draw", "d.cmd", "-o", "o.svg", PATH="/nowhere"), FILE,

@@ -514,6 +514,36 @@ class Files(ImportTest):
             self.expect(self.run_tool("import", "d.json", option, "no/x"), FILE,
                         "orn-hdl: cannot write no/x: No such file or directory\n")
 
+    def test_a_failure_leaves_every_file_as_it_was(self) -> None:
+        files = ("x.cmd", "x.v", "x.vhd", "x.map")
+        options = ("-o", "--verilog", "--vhdl", "--name-map")
+        for name in files:
+            self.write(name, "before")
+        self.write("d.json", json.dumps(design({"a": port("input", "1")})))
+        arguments = [word for pair in zip(options, files, strict=True) for word in pair]
+        self.assertEqual(self.run_tool("import", "d.json", *arguments).status, FAILED)
+        self.write("d.json", json.dumps(design({"a": port("input", 2)})))
+        for unwritable in ("/dev/full", "no/x"):
+            for others in (("-o", "x.cmd", "--name-map"), ("--name-map", "x.map", "-o"),
+                           ("-o", "x.cmd", "--name-map", "x.map", "--verilog")):
+                outcome = self.run_tool("import", "d.json", *others, unwritable)
+                self.assertEqual(outcome.status, FILE, outcome.err)
+        self.assertEqual([self.read(name) for name in files], ["before"] * 4)
+        self.assertEqual(len(list(self.folder.iterdir())), 5)
+
+    def test_files_are_replaced_as_a_whole(self) -> None:
+        """Nobody ever reads a half-written file: who has the former one open keeps all of it."""
+        self.write("d.json", json.dumps(design({"a": port("input", 2)})))
+        for option in ("-o", "--verilog", "--vhdl", "--name-map"):
+            self.write("x", "before")
+            (self.folder / "link").unlink(missing_ok=True)
+            (self.folder / "link").symlink_to("x")
+            with open(self.folder / "x", encoding="latin-1") as former:
+                self.expect(self.run_tool("import", "d.json", option, "link"), SUCCESS)
+                self.assertEqual(former.read(), "before")
+            self.assertTrue((self.folder / "link").is_symlink())
+            self.assertNotEqual(self.read("x"), "before")
+
     def test_same_on_every_run(self) -> None:
         contents = design(
             {"a": port("input", 2)},

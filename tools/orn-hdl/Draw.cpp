@@ -1,6 +1,7 @@
 #include "Draw.h"
 
 #include "DrawGraph.h"
+#include "Output.h"
 #include "Progress.h"
 #include "Run.h"
 
@@ -97,11 +98,11 @@ Status RunDot(std::string_view graph, std::string& picture) {
 }
 
 Status WritePicture(const std::string& name, std::string_view picture) {
-    Port::File file;
-    bool written = file.open(name.c_str(), Port::File::Overwrite, true) &&
-                   file.write(picture.data(), picture.size());
-    written = file.close() && written;
-    return written ? Status::Success : ComplainUnwritable(name, file.GetError());
+    OutputFile file(name);
+    if (Port::Stream* out = file.GetStream()) {
+        *out << picture;
+    }
+    return file.Commit();
 }
 
 Status DrawNetlist(const Orn_Hdl::Netlist& netlist, const DrawOptions& options) {

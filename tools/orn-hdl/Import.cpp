@@ -52,22 +52,6 @@ std::optional<Bit> GetUnknownAs(const ImportOptions& options) {
     return options.unknownAs == "1" ? One : Zero;
 }
 
-/// Writes a text file through `write`, unless its name is empty.
-template <class Write> Status WriteFile(const std::string& name, Write write) {
-    if (name.empty()) {
-        return Status::Success;
-    }
-    Port::File file;
-    bool written = file.open(name.c_str(), Port::File::Overwrite, true);
-    if (written) {
-        Port::Stream stream(file);
-        write(stream);
-        written = stream.flush();
-        written = file.close() && written;
-    }
-    return written ? Status::Success : ComplainUnwritable(name, file.GetError());
-}
-
 Status WriteNetlists(const Netlist& netlist, const ImportOptions& options) {
     if (options.outputs.verilog.empty() && options.outputs.vhdl.empty()) {
         return Status::Success;
@@ -81,14 +65,23 @@ Status WriteNetlists(const Netlist& netlist, const ImportOptions& options) {
     return WriteOutputs(model, options.outputs, progress);
 }
 
+/// The command file and the name map take their places last: when one of the files fails, neither
+/// does.
 Status WriteAll(const Netlist& netlist, const ImportOptions& options) {
-    const Status commands = WriteFile(options.commandFile, [&](Port::Stream& out) {
-        CommandSink sink(out);
+    OutputFile commands(options.commandFile);
+    if (Port::Stream* out = commands.GetStream()) {
+        CommandSink sink(*out);
         netlist.Emit(sink);
-    });
-    const Status nameMap =
-        WriteFile(options.nameMap, [&](Port::Stream& out) { netlist.WriteNameMap(out); });
-    return Worse(Worse(commands, nameMap), WriteNetlists(netlist, options));
+    }
+    OutputFile nameMap(options.nameMap);
+    if (Port::Stream* out = nameMap.GetStream()) {
+        netlist.WriteNameMap(*out);
+    }
+    Status status = Worse(commands.Flush(), nameMap.Flush());
+    if (status == Status::Success) {
+        status = WriteNetlists(netlist, options);
+    }
+    return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
 
 } // namespace

@@ -28,6 +28,28 @@ Status WriteOutput(Orn_Hdl::Model& model, const char* language, const std::strin
 
 } // namespace
 
+OutputFile::OutputFile(const std::string& name) : name_(name) {
+    if (!name_.empty() &&
+        Check(file_.open(name_.c_str(), Port::File::Replace, true)) == Status::Success) {
+        stream_.emplace(file_);
+    }
+}
+
+Status OutputFile::Check(bool good) {
+    if (!good && status_ == Status::Success) {
+        status_ = ComplainUnwritable(name_, file_.GetError());
+    }
+    return status_;
+}
+
+Status OutputFile::Flush() {
+    return stream_ ? Check(stream_->flush()) : status_;
+}
+
+Status OutputFile::Commit() {
+    return stream_ && Flush() == Status::Success ? Check(file_.close()) : status_;
+}
+
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress) {
     const Status verilog =
         WriteOutput(model, "VERILOG", outputs.verilog, outputs.noHeader, progress);
