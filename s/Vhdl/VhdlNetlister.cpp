@@ -50,6 +50,16 @@ bool IsAliasedByBits(const Signal& signal) {
     return (!Writers::IsSingleBit(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
 }
 
+/// Whether the signal is a slice of one bit of a bus that counts upwards. Its range reads as one
+/// that counts downwards, which VHDL does not let stand for a part of such a bus.
+bool IsBitOfUpwardBus(const Signal& signal) {
+    if (signal.GetSignalType() != SignalTypeBusSlice || signal.GetWidth() != 1) {
+        return false;
+    }
+    const Bus* const parent = static_cast<const BusSlice&>(signal).GetParentBus();
+    return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
+}
+
 /// Appends the names of the signal's bits, leftmost first.
 /// \return false when they cannot be listed.
 bool AddBitNames(const Signal& signal, StringArray& bits) {
@@ -399,6 +409,8 @@ void VhdlNetlister::Writer::WriteInstanceAttrAssignment(const Instance& instance
 void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
     if (IsCompoundOrAgainst(signal)) {
         WriteConstantBits(signal);
+    } else if (StringArray bits; IsBitOfUpwardBus(signal) && AddBitNames(signal, bits)) {
+        statements_.WriteConstantSignalAssignment(bits.GetView(0), true, signal.GetConstantValue());
     } else {
         statements_.WriteConstantSignalAssignment(
             signal.GetNameView(), Writers::IsSingleBit(signal), signal.GetConstantValue());

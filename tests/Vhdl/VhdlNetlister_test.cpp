@@ -326,6 +326,14 @@ TEST(VhdlAssignments, OfConstantsThatCannotBeWrittenBitByBit) {
     }
 }
 
+TEST(VhdlAssignments, OfConstantsOnSlicesOfOneBit) {
+    EngineScript script(
+        "ADD SIGNAL D(7:0)\nADD SIGNAL E(0:7)\nADD SIGNAL F(3:3)\nASSIGN CONSTANT D(5:5) 1:B:1\n"
+        "ASSIGN CONSTANT E(5:5) 1:B:0\nASSIGN CONSTANT E(6:6) 1:H:1\nASSIGN CONSTANT F(3:3) 1:B:1");
+    EXPECT_EQ(Assigns(script.Vhdl()), (Lines{"D(5 downto 5) <= b\"1\";", "E(5) <= '0';",
+                                             "E(6) <= '1';", "F(3 downto 3) <= b\"1\";"}));
+}
+
 TEST(VhdlAssignments, OfAliases) {
     EngineScript script("ADD SIGNAL D(7:0)\nADD SIGNAL E(0:7)\nCONNECT SIGNAL N D(3)\n"
                         "CONNECT SIGNAL D(7:0) E(0:7)\nCONNECT SIGNAL D(5:4) E(1:2)\n"

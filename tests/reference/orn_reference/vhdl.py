@@ -346,20 +346,25 @@ class VhdlNetlister:
             if signal.constant.digits and not _is_nameless(signal.name):
                 if isinstance(signal, CompoundBus) or _runs_against_parent(signal):
                     self._write_constant_bits(signal)
+                elif isinstance(signal, BusSlice) and signal.is_bit_of_upward_bus():
+                    self._write_bit_constant(single_bit(signal.name), signal.constant.digits)
                 else:
                     self._write_constant(signal)
 
     def _write_constant(self, signal: Signal) -> None:
         value = signal.constant
+        if isinstance(signal, (ScalarSignal, BusIndex)):
+            self._write_bit_constant(signal.name, value.digits)
+            return
         self._put_bus(signal.name)
         self._out.put(b" <= ")
-        if isinstance(signal, (ScalarSignal, BusIndex)):
-            self._out.put(b"'", b"0" if value.digits.endswith(b"0") else b"1", b"'")
-        else:
-            if value.has_base_and_length:
-                self._out.put(_base_prefix(value.base))
-            self._out.put(b'"', value.digits, b'"')
-        self._out.put_line(b";")
+        if value.has_base_and_length:
+            self._out.put(_base_prefix(value.base))
+        self._out.put_line(b'"', value.digits, b'"', b";")
+
+    def _write_bit_constant(self, name: bytes, digits: bytes) -> None:
+        self._out.put(name, b" <= ")
+        self._out.put_line(b"'", b"0" if digits.endswith(b"0") else b"1", b"'", b";")
 
     def _write_constant_bits(self, signal: Signal) -> None:
         """Bit by bit where the digits are the bits; else the value cannot be expressed."""
