@@ -47,6 +47,7 @@ LIMITS = [
     _limit("driven_input", verilator="MULTIDRIVEN", yosys="multiple conflicting drivers",
            languages="multiple assignments"),
     _limit("missing_configuration", **_vhdl('unit "cfg_inv1" not found')),
+    _limit("no_ports", **_vhdl("empty interface list")),
     _limit("open_bit", **_vhdl("cannot associate individually with open")),
     _limit("open_input", iverilog="dangling input port", **_vhdl("must be connected")),
     _limit("open_member", iverilog="syntax error", verilator="syntax error",

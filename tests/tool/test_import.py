@@ -50,6 +50,15 @@ class Ports(ImportTest):
         done = self.import_design(design({"a": port("input", 2)}))
         self.assertIn("module top(a);", done.verilog)
 
+    def test_design_without_ports(self) -> None:
+        contents = design({}, {"u": cell("LEAF", "i", I=["0"])})
+        contents["modules"]["top"]["ports"] = {}
+        self.write("d.json", json.dumps(contents))
+        self.expect(self.run_tool("import", "d.json", "--verilog", "x.v"), SUCCESS,
+                    "d.json: warning: modules.top.ports: VHDL does not allow a design without "
+                    "ports\n")
+        self.assertIn("module top();", self.read("x.v"))
+
     def test_output_is_an_input(self) -> None:
         done = self.import_design(design({"a": port("input", 2, 3), "y": port("output", 2, 3)}))
         self.assertEqual(done.lines("CONNECT SIGNAL"), ["y(1:0) a(1:0)"])

@@ -10,9 +10,9 @@ import shutil
 import subprocess
 import unittest
 
-from support import SUCCESS, ToolTest
+from support import SUCCESS
 from test_import_names import FINE_NAMES, ODD_NAMES
-from yosys_json import Json, black_box, cell, design, net, port
+from yosys_json import ImportTest, Json, black_box, cell, design, net, port
 
 FIRST_SEED, LAST_SEED = map(int, os.environ.get("ORN_HDL_SEEDS", "1-30").split("-"))
 
@@ -102,12 +102,13 @@ class Generator:
 
 
 @unittest.skipIf(shutil.which("yosys") is None, "Yosys is not installed")
-class RandomDesigns(ToolTest):
+class RandomDesigns(ImportTest):
     def test_connectivity_survives(self) -> None:
         for seed in range(FIRST_SEED, LAST_SEED + 1):
             with self.subTest(seed=seed):
                 contents = Generator(seed).make()
-                self.compare(contents, self.read_back(contents))
+                before, after = contents["modules"]["top"], self.read_back(contents)
+                self.compare_wiring(before, after["modules"]["top"])
 
     def read_back(self, contents: Json) -> Json:
         """What Yosys reads of the written Verilog."""
@@ -122,45 +123,6 @@ class RandomDesigns(ToolTest):
                         "hierarchy -check -top top; proc; write_json x.json"], cwd=self.folder,
                        check=True, stderr=subprocess.DEVNULL)
         return json.loads(self.read("x.json"))
-
-    def compare(self, before: Json, after: Json) -> None:
-        old, new = before["modules"]["top"], after["modules"]["top"]
-        names = {tuple(line.split("\t")[:2]): line.split("\t")[2]
-                 for line in (self.folder / "x.map").read_text("utf-8").split("\n")[:-1]}
-        partners: dict[int | str, int | str] = {}
-        back: dict[int | str, int | str] = {}
-
-        def meet(place: str, one: int | str, other: int | str) -> None:
-            if isinstance(one, str) or isinstance(other, str):
-                self.assertEqual(one, other, place)
-            self.assertEqual(partners.setdefault(one, other), other, place)
-            self.assertEqual(back.setdefault(other, one), one, place)
-
-        for name, p in old["ports"].items():
-            other = new["ports"][names["port", escape(name)]]
-            for key in ("direction", "offset", "upto"):
-                self.assertEqual(p.get(key), other.get(key), name)
-            for one, two in zip(p["bits"], other["bits"], strict=True):
-                meet(f"port {name}", one, two)
-        self.assertEqual(len(old["cells"]), len(new["cells"]))
-        for name, c in old["cells"].items():
-            other = new["cells"][names["cell", escape(name)]]
-            self.assertEqual(c["type"], other["type"])
-            for pin, bits in c["connections"].items():
-                others = other["connections"].get(pin) or [f"open {name}.{pin}.{i}"
-                                                           for i in range(len(bits))]
-                if isinstance(others[0], str) and others[0].startswith("open"):
-                    # Left open: nothing else may be known to hang on these bits.
-                    others = [partners.get(bit, f"open {bit}") for bit in bits]
-                    self.assertTrue(all(str(o).startswith("open") for o in others), (name, pin))
-                    continue
-                for one, two in zip(bits, others, strict=True):
-                    meet(f"pin {name}.{pin}", one, two)
-
-
-def escape(name: str) -> str:
-    return name.replace("\\", "\\\\").replace("\t", "\\t").replace("\n", "\\n")
-
 
 def make_leaf_modules(contents: Json) -> list[str]:
     """The black boxes of a design as Verilog."""

@@ -86,12 +86,8 @@ class ImportTest(ToolTest):
         commands = self.read("x.cmd").splitlines()
         self.judge_verilog(commands, allowed)
         self.judge_vhdl(allowed)
-        names = {}
-        for line in (self.folder / "x.map").read_text("utf-8").split("\n")[:-1]:
-            kind, old, new = line.split("\t")
-            names[kind, old] = new
         return Imported(commands, self.read("x.verilog"), self.read("x.vhdl"),
-                        outcome.err.splitlines(), names)
+                        outcome.err.splitlines(), self.read_names())
 
     def import_design(self, contents: Json, *options: str, allowed: str = "") -> Imported:
         (self.folder / "d.json").write_text(json.dumps(contents), encoding="utf-8")
@@ -126,6 +122,33 @@ class ImportTest(ToolTest):
                 if not allowed or not re.search(allowed, line)]
         self.assertEqual((done.returncode, said), (0, []), shlex.join(command))
 
+    def read_names(self) -> dict[tuple[str, str], str]:
+        """The name map; of several components of one type, the last."""
+        names = {}
+        for line in (self.folder / "x.map").read_text("utf-8").split("\n")[:-1]:
+            kind, old, new = line.split("\t")
+            names[kind, old] = new
+        return names
+
+    def compare_wiring(self, old: Json, new: Json) -> None:
+        """Compares a module, bit by bit, with what was read of the netlist that it became."""
+        names = self.read_names()
+        wiring = Wiring(self)
+        for name, p in old["ports"].items():
+            other = new["ports"][names["port", escape(name)]]
+            for key in ("direction", "offset", "upto"):
+                self.assertEqual(p.get(key), other.get(key), name)
+            wiring.meet_all(f"port {name}", p["bits"], other["bits"])
+        self.assertEqual(len(old["cells"]), len(new["cells"]))
+        for name, c in old["cells"].items():
+            other = new["cells"][names["cell", escape(name)]]
+            self.assertEqual(re.sub(r"_\d+$", "", names["component", escape(c["type"])]),
+                             re.sub(r"_\d+$", "", other["type"]))
+            for pin, bits in c["connections"].items():
+                _, new_pin = names["pin", escape(f"{c['type']}.{pin}")].split(".")
+                others = other["connections"].get(new_pin.partition("(")[0])
+                wiring.meet_pin(f"{name}.{pin}", bits, others)
+
     def refuse(self, contents: Json | str | bytes, message: str, *options: str) -> None:
         """Expects an import to fail with a message behind the file's name, and to write nothing."""
         path = self.folder / "d.json"
@@ -138,6 +161,40 @@ class ImportTest(ToolTest):
                                 "x.vhd", "--name-map", "x.map", *options)
         self.expect(outcome, 1, f"d.json: error: {message}\n")
         self.assertEqual([p.name for p in self.folder.iterdir() if p.name.startswith("x.")], [])
+
+
+class Wiring:
+    """Pairs the nets of a design with those that were read of its netlist."""
+
+    def __init__(self, test: ImportTest) -> None:
+        self._test = test
+        self._partners: dict[int | str, int | str] = {}
+        self._back: dict[int | str, int | str] = {}
+
+    def meet(self, place: str, one: int | str, other: int | str) -> None:
+        if isinstance(one, str) or isinstance(other, str):
+            self._test.assertEqual(one, other, place)
+        self._test.assertEqual(self._partners.setdefault(one, other), other, place)
+        self._test.assertEqual(self._back.setdefault(other, one), one, place)
+
+    def meet_all(self, place: str, bits: list[int | str], others: list[int | str]) -> None:
+        for one, other in zip(bits, others, strict=True):
+            self.meet(place, one, other)
+
+    def meet_pin(self, place: str, bits: list[int | str],
+                 others: list[int | str] | None) -> None:
+        if others:
+            self.meet_all(f"pin {place}", bits, others)
+            return
+        # Left open: nothing else may be known to hang on these bits.
+        for position, bit in enumerate(bits):
+            nothing = f"open {place}.{position}"
+            self._test.assertEqual(self._partners.setdefault(bit, nothing), nothing, place)
+
+
+def escape(name: str) -> str:
+    """As a field of the name map."""
+    return name.replace("\\", "\\\\").replace("\t", "\\t").replace("\n", "\\n")
 
 
 def make_stubs(commands: list[str]) -> list[str]:

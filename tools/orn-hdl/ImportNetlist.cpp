@@ -49,6 +49,10 @@ Netlist::Netlist(Design& design, Module& top, Context& context)
         context.Warn(Path("modules").AddKey(top.name).AddKey("memories"),
                      "memories are not imported; map them to cells first");
     }
+    if (top.ports.empty()) {
+        context.Warn(Path("modules").AddKey(top.name).AddKey("ports"),
+                     "VHDL does not allow a design without ports");
+    }
     CheckParameters();
     NameDesign();
     NameCells();

@@ -1,0 +1,8 @@
+SET NETLIST NAME no_ports
+ADD NOTES "Nothing leads into the design or out of it."
+ADD COMPONENT INV
+ADD PIN INV I Input
+ADD PIN INV O Output
+ADD INSTANCE INV U1
+CONNECT SIGNAL N U1.I
+CONNECT SIGNAL N U1.O
