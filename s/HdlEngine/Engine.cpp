@@ -1,32 +1,26 @@
 #include "Orn_Hdl/Engine.h"
 
+#include "HdlEngine/ModelRegistry.h"
 #include "HdlModel/Failure.h"
 #include "Options/Keywords.h"
 #include "Orn_Hdl/Commands.h"
-#include "Orn_Hdl/Containers/PtrArray.h"
 #include "Orn_Hdl/Model.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers/NetlistHeader.h"
 #include "Port/Ascii.h"
 
 #include <memory>
+#include <utility>
 
 namespace Orn_Hdl {
 
 struct Engine::Implementation {
     // The models end before the factory that they use.
     CommandFactory factory;
-    OwnPtrArray<Model*> models;
+    ModelRegistry models;
     Model* current = nullptr;
 
-    Model* Find(const char* name) const {
-        for (Model* model : Iterator<Model*>(&models)) {
-            if (Port::EqualIgnoringCase(model->GetNetlist()->GetNameView(), Port::ViewOf(name))) {
-                return model;
-            }
-        }
-        return nullptr;
-    }
+    Model* Find(const char* name) const { return models.Find(Port::ViewOf(name)); }
 
     static void Execute(Model* model, const char* text) {
         if (model == nullptr) {
@@ -47,8 +41,7 @@ bool Engine::CreateAndAddModel(const char* name, const char* sourceFile) {
     std::unique_ptr<Model> model(implementation_->factory.CreateModel());
     model->SetName(name == nullptr ? "" : name);
     model->SetSourceFileName(sourceFile);
-    implementation_->models.AddNew(model.get());
-    model.release();
+    implementation_->models.Add(std::move(model));
     return true;
 }
 
@@ -61,15 +54,11 @@ bool Engine::UseModel(const char* name) {
 }
 
 bool Engine::RemoveModel(const char* name) {
-    const std::unique_ptr<Model> model(implementation_->Find(name));
-    if (model == nullptr) {
-        return false;
-    }
-    if (implementation_->current == model.get()) {
+    const std::unique_ptr<Model> model = implementation_->models.Remove(Port::ViewOf(name));
+    if (model != nullptr && implementation_->current == model.get()) {
         implementation_->current = nullptr;
     }
-    implementation_->models.Remove(model.get());
-    return true;
+    return model != nullptr;
 }
 
 Model* Engine::GetModel(const char* name) const {

@@ -3,6 +3,7 @@
 #include "HdlModel/DummySignals.h"
 #include "HdlModel/Foresight.h"
 #include "HdlModel/NameIndex.h"
+#include "HdlModel/NameListener.h"
 #include "HdlModel/Names.h"
 #include "HdlModel/NaturalSort.h"
 #include "HdlModel/ObjectKey.h"
@@ -68,6 +69,7 @@ struct Netlist::Implementation {
     Foresight foresight;
     DummySignals dummies;
     std::string sourceFileName;
+    NameListener* nameListener = nullptr;
 
     ~Implementation() {
         // Signals end first: an instance then has nothing to leave. They part all at once, while
@@ -118,6 +120,13 @@ void Netlist::AcceptObject(ObjectVisitor& visitor) {
 
 void Netlist::SetName(const char* name) {
     SetNameVerbatim(Port::ViewOf(name));
+    if (implementation_->nameListener != nullptr) {
+        implementation_->nameListener->NameChanged();
+    }
+}
+
+void Netlist::SetNameListener(NameListener* listener) noexcept {
+    implementation_->nameListener = listener;
 }
 
 void Netlist::SetSourceFileName(const char* name) {

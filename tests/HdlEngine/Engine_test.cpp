@@ -133,6 +133,38 @@ TEST(EngineModels, TheFirstOfTwoModelsOfOneNameIsFound) {
     EXPECT_EQ(engine.GetModel("a")->GetSourceFileName(), "second");
 }
 
+TEST(EngineModels, AnyWayOfRenamingIsNoticed) {
+    Engine engine;
+    engine.CreateAndAddModel("a", "first");
+    engine.CreateAndAddModel("b", "second");
+    Model* const first = engine.GetModel("a");
+    Model* const second = engine.GetModel("b");
+    second->SetName("C");
+    EXPECT_EQ(engine.GetModel("b"), nullptr);
+    EXPECT_EQ(engine.GetModel("c"), second);
+    first->GetNetlist()->SetName("c");
+    EXPECT_EQ(engine.GetModel("C"), first);
+    static_cast<Object*>(first->GetNetlist())->SetName("d");
+    EXPECT_EQ(engine.GetModel("c"), second);
+    second->SetName(nullptr);
+    EXPECT_EQ(engine.GetModel("hdl_netlist"), second);
+    first->SetName("HDL_NETLIST");
+    EXPECT_EQ(engine.GetModel("HDL_netlist"), first);
+    EXPECT_TRUE(engine.RemoveModel("hdl_netlist"));
+    EXPECT_TRUE(engine.RemoveModel("hdl_netlist"));
+    EXPECT_FALSE(engine.RemoveModel("hdl_netlist"));
+}
+
+TEST(EngineModels, NamesOfOneHashAreToldApart) {
+    // Each letter counts 33 times the next one: B! and AB differ in both, yet weigh the same.
+    Engine engine;
+    ASSERT_TRUE(engine.CreateAndAddModel("B!", "first"));
+    ASSERT_TRUE(engine.CreateAndAddModel("AB", "second"));
+    EXPECT_EQ(engine.GetModel("ab")->GetSourceFileName(), "second");
+    EXPECT_TRUE(engine.RemoveModel("b!"));
+    EXPECT_EQ(engine.GetModel("ab")->GetSourceFileName(), "second");
+}
+
 TEST(EngineModels, ModelNamesAreNotNormalised) {
     Engine engine;
     engine.CreateAndAddModel("a[3-0]", "");

@@ -96,20 +96,22 @@ TEST(Sizes, ABusOfTwoToTheThirtyFirstBits) {
     EXPECT_LT(script.Vhdl().size(), 100'000u);
 }
 
-TEST(Sizes, TwoThousandModelsInOneEngine) {
-    constexpr int Models = 2'000;
+TEST(Sizes, TenThousandModelsInOneEngine) {
+    constexpr int Models = 10'000;
+    const auto name = [](const char* stem, int i) { return stem + std::to_string(i); };
     Orn_Hdl::Engine engine;
     for (int i = 0; i < Models; ++i) {
-        const std::string name = "model" + std::to_string(i);
-        ASSERT_TRUE(engine.CreateAndAddModel(name.c_str(), ""));
-        engine.Execute(name.c_str(), "ADD SIGNAL s");
+        ASSERT_TRUE(engine.CreateAndAddModel(name("model", i).c_str(), ""));
+        engine.Execute(name("MODEL", i).c_str(), ("SET NETLIST NAME " + name("top", i)).c_str());
+        engine.GetModel(name("Top", i).c_str())->SetName(name("design", i).c_str());
+        engine.Execute(name("design", i).c_str(), "ADD SIGNAL s");
     }
-    EXPECT_FALSE(engine.CreateAndAddModel("MODEL77", ""));
+    EXPECT_FALSE(engine.CreateAndAddModel("DESIGN77", ""));
     for (int i = 0; i < Models; i += 2) {
-        EXPECT_TRUE(engine.RemoveModel(("model" + std::to_string(i)).c_str()));
+        EXPECT_TRUE(engine.RemoveModel(name("design", i).c_str()));
     }
-    EXPECT_EQ(engine.GetModel("model0"), nullptr);
-    EXPECT_NE(engine.GetModel("model1"), nullptr);
+    EXPECT_EQ(engine.GetModel("design0"), nullptr);
+    EXPECT_NE(engine.GetModel("design1"), nullptr);
 }
 
 TEST(Sizes, AMillionCommandsInOneFile) {

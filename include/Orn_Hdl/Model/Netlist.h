@@ -16,6 +16,8 @@
 
 namespace Orn_Hdl {
 
+class NameListener;
+
 /// The module or entity: name, source file name, notes (its comment), attributes, and the
 /// components, instances and signals, which it owns. Names of components, instances and signals are
 /// found ignoring letter case.
@@ -101,10 +103,14 @@ public:
 
 private:
     friend class Model;
+    friend class ModelRegistry;
     struct Implementation;
 
     /// Hints that a command line will be executed some lines later.
     void Foresee(const StringArray& words) noexcept;
+    /// Who is told of a new name; not owned, null for nobody.
+    void SetNameListener(NameListener* listener) noexcept;
+
     bool MayHaveFeedBack(bool outputPorts) const;
     void GetFeedBackSignals(bool outputPorts, StringSet& names) const;
     void GetWiredOrOutputSignals(StringSet& names) const;

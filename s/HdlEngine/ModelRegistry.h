@@ -1,0 +1,55 @@
+// The models of an engine, found by name without asking each of them.
+#pragma once
+
+#include "HdlModel/NameListener.h"
+#include "Orn_Hdl/Model/Design.h"
+
+#include <cstdint>
+#include <map>
+#include <memory>
+#include <set>
+#include <string_view>
+#include <utility>
+
+namespace Orn_Hdl {
+
+/// Owns models, in the order in which they were added. Several may bear the same name, since a
+/// model can be renamed at any time; a look-up gives the first of them.
+class ModelRegistry {
+public:
+    ModelRegistry() = default;
+    ModelRegistry(const ModelRegistry&) = delete;
+    ModelRegistry& operator=(const ModelRegistry&) = delete;
+    /// Deletes the models, the last one first.
+    ~ModelRegistry();
+
+    void Add(std::unique_ptr<Model> model);
+    /// The first model of that name, letter case ignored; null when there is none.
+    Model* Find(std::string_view name) const;
+    /// Takes the first model of that name out; null when there is none.
+    std::unique_ptr<Model> Remove(std::string_view name);
+
+private:
+    /// Models are numbered as they come, so that the keys of one name stand in their order.
+    using Number = std::uint64_t;
+    /// The hash of the name, and the model's number.
+    using Key = std::pair<std::uint32_t, Number>;
+
+    struct Entry final : NameListener {
+        Entry(ModelRegistry& owner, Number number) noexcept;
+        void NameChanged() noexcept override;
+
+        ModelRegistry& registry;
+        /// That of the name under which the model is listed.
+        Key key;
+        std::unique_ptr<Model> model;
+    };
+
+    const Entry* FindEntry(std::string_view name) const;
+
+    std::map<Number, Entry> entries_;
+    std::set<Key> byName_;
+    Number next_ = 0;
+};
+
+} // namespace Orn_Hdl
