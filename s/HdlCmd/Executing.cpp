@@ -1,7 +1,9 @@
 #include "HdlCmd/Executing.h"
 
+#include "HdlModel/Failure.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
+#include "Port/Ascii.h"
 
 namespace Orn_Hdl {
 
@@ -39,10 +41,23 @@ void ExecuteSetSynthesis(Model& model, const Arguments& arguments) {
 
 namespace {
 
+void RequirePermission(const Model& model, const char* fileName) {
+    OutputGuard* const guard = model.GetOutputGuard();
+    if (guard == nullptr) {
+        return;
+    }
+    const Port::StringBase<char> reason = guard->WhyNot(fileName);
+    if (!reason.IsEmpty()) {
+        Fail(CommandUnit, __LINE__, "Cannot write \"%s\": %s.\n",
+             {Port::ViewOf(fileName), reason.GetView()});
+    }
+}
+
 /// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
 /// that is there already is replaced when everything was written, and untouched otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
+    RequirePermission(model, fileName);
     TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
                                                                     : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);

@@ -77,12 +77,15 @@ struct Model::Implementation {
     const IStringPtrMap<AttributeFactory::Creator>& attributeCreators;
     /// The words of the line in hand; kept so that a line costs no allocation.
     StringArray words;
+    OutputGuard* outputGuard = nullptr;
     int writeError = 0;
     Port::StringBase<char> writtenFileName;
 
     explicit Implementation(CommandFactory* commandFactory)
         : factory(commandFactory), attributeCreators(AttributeFactory::GetCreators()) {}
 };
+
+OutputGuard::~OutputGuard() = default;
 
 Model::Model(CommandFactory* factory)
     : implementation_(std::make_unique<Implementation>(factory)) {}
@@ -174,6 +177,14 @@ bool Model::Read(const char* fileName) {
 bool Model::Write(const char* /*fileName*/) {
     SetModifiedFlag(false);
     return true;
+}
+
+void Model::SetOutputGuard(OutputGuard* guard) noexcept {
+    implementation_->outputGuard = guard;
+}
+
+OutputGuard* Model::GetOutputGuard() const noexcept {
+    return implementation_->outputGuard;
 }
 
 void Model::RecordWrite(const char* fileName, int error) {

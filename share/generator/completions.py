@@ -4,7 +4,7 @@ from __future__ import annotations
 
 from language import Language, Option, Subcommand
 
-_FILE_VALUES = ("FILE",)
+_FILE_VALUES = ("FILE", "DIR")
 
 
 def _names(subcommand: Subcommand) -> list[str]:

@@ -190,6 +190,132 @@ class Outputs(ToolTest):
         self.assertIn("module d(A", outcome.out)
 
 
+class WriteRules(ToolTest):
+    """A command file that is not trusted writes below one folder, or nothing."""
+
+    def setUp(self) -> None:
+        super().setUp()
+        (self.folder / "out" / "sub").mkdir(parents=True)
+        (self.folder / "outer").mkdir()
+        self.write("outer/kept", "kept\n")
+
+    def all_files(self) -> set[str]:
+        return {str(path.relative_to(self.folder)) for path in self.folder.rglob("*")
+                if not path.is_dir()}
+
+    def replay(self, *lines: str, folder: str = "out") -> tuple[int, list[str]]:
+        """The status, and the files that the lines made."""
+        self.write("w.cmd", INVERTER + "".join(f"{line}\n" for line in lines))
+        before = self.all_files()
+        outcome = self.run_tool("run", "w.cmd", "--output-dir", folder, "--keep-going")
+        self.errors = [line.partition(" error: ")[2] for line in outcome.err.splitlines()]
+        return outcome.status, sorted(self.all_files() - before)
+
+    def refuse(self, name: str, reason: str = "it leads out of the output folder") -> None:
+        for options in ("", "-APPEND ", "-OVERWRITE ", "-APPEND -NOHEADER "):
+            for language in ("VERILOG", "VHDL"):
+                with self.subTest(name=name, options=options, language=language):
+                    outcome = self.replay(f"WRITE {language} {options}{name}")
+                    self.assertEqual(self.errors, [f'Cannot write "{name}": {reason}.'])
+                    self.assertEqual(outcome, (FAILED, []))
+                    self.assertEqual(self.read("outer/kept"), "kept\n")
+
+    def test_names_begin_in_the_folder(self) -> None:
+        self.assertEqual(self.replay("WRITE VERILOG a.v", "WRITE VHDL ./sub/b.vhd",
+                                     "WRITE VHDL -APPEND sub/b.vhd", "WRITE VERILOG ..c.v"),
+                         (SUCCESS, ["out/..c.v", "out/a.v", "out/sub/b.vhd"]))
+        self.assertIn("Filename : a.v", self.read("out/a.v"))
+        self.assertEqual(self.read("out/sub/b.vhd").count("architecture"), 2)
+
+    def test_files_that_are_there_are_written(self) -> None:
+        self.write("out/a.v", "former\n")
+        self.write("out/b.v", "former\n")
+        self.replay("WRITE VERILOG a.v", "WRITE VERILOG -APPEND b.v")
+        self.assertEqual(self.errors, [])
+        self.assertNotIn("former", self.read("out/a.v"))
+        self.assertTrue(self.read("out/b.v").startswith("former\n"))
+
+    def test_names_that_climb(self) -> None:
+        for name in ("../a.v", "..", "sub/../../a.v", "sub/../a.v", "sub/..", "./../outer/kept",
+                     "../outer/kept", "../out/a.v"):
+            self.refuse(name)
+
+    def test_absolute_names(self) -> None:
+        for name in (self.folder / "outer" / "kept", self.folder / "out" / "a.v", "/dev/stdout",
+                     "//a.v", "/"):
+            self.refuse(str(name))
+
+    def test_links_that_lead_out(self) -> None:
+        (self.folder / "out" / "folder").symlink_to("../outer")
+        (self.folder / "out" / "file").symlink_to(self.folder / "outer" / "kept")
+        (self.folder / "out" / "new").symlink_to("../outer/new")
+        (self.folder / "out" / "again").symlink_to("file")
+        (self.folder / "out" / "loop").symlink_to("loop")
+        (self.folder / "out" / "null").symlink_to("/dev/null")
+        (self.folder / "outx").mkdir()
+        (self.folder / "out" / "beside").symlink_to("../outx")
+        for name in ("folder/kept", "folder/new", "file", "new", "again", "loop", "null",
+                     "folder/../a.v", "sub/../folder/kept", "beside/a.v"):
+            self.refuse(name)
+
+    def test_links_within_the_folder(self) -> None:
+        self.write("out/sub/real.v", "former\n")
+        (self.folder / "out" / "way").symlink_to("sub")
+        (self.folder / "out" / "link.v").symlink_to("way/real.v")
+        self.assertEqual(self.replay("WRITE VERILOG link.v", "WRITE VHDL way/b.vhd"),
+                         (SUCCESS, ["out/sub/b.vhd"]))
+        self.assertTrue((self.folder / "out" / "link.v").is_symlink())
+        self.assertIn("module", self.read("out/sub/real.v"))
+
+    def test_what_is_no_file(self) -> None:
+        os.mkfifo(self.folder / "out" / "pipe")
+        self.refuse("pipe", "it is no regular file")
+        self.assertEqual(self.replay("WRITE VERILOG sub", "WRITE VERILOG no/a.v"), (FILE, []))
+        self.assertEqual(self.errors, ["cannot write sub: Is a directory",
+                                       "cannot write no/a.v: No such file or directory"])
+
+    def test_the_folder_may_be_a_link(self) -> None:
+        (self.folder / "alias").symlink_to("out")
+        self.assertEqual(self.replay("WRITE VERILOG a.v", folder="alias"), (SUCCESS, ["out/a.v"]))
+
+    def test_outputs_of_the_command_line_go_where_they_say(self) -> None:
+        self.write("w.cmd", INVERTER + "WRITE VERILOG a.v\n")
+        for rule in (["--output-dir", "out"], ["--no-write"]):
+            with self.subTest(rule=rule):
+                outcome = self.run_tool("run", "--keep-going", *rule, "w.cmd", "--vhdl", "b.vhd")
+                self.assertEqual(outcome.status, FAILED if rule == ["--no-write"] else SUCCESS)
+                self.assertIn("entity w is", self.read("b.vhd"))
+                (self.folder / "b.vhd").unlink()
+
+    def test_no_write(self) -> None:
+        self.write("w.cmd", INVERTER + "WRITE VERILOG a.v\nWRITE VHDL -APPEND /dev/null\nNOOP\n")
+        before = self.all_files()
+        self.expect(self.run_tool("run", "w.cmd", "--no-write", "--keep-going"), FAILED,
+                    'w.cmd:9: error: Cannot write "a.v": --no-write is in force.\n'
+                    'w.cmd:10: error: Cannot write "/dev/null": --no-write is in force.\n')
+        self.assertEqual(self.all_files(), before)
+
+    def test_a_refused_line_ends_the_replay(self) -> None:
+        self.write("w.cmd", "WRITE VERILOG /a.v\nADD\n")
+        self.expect(self.run_tool("run", "w.cmd", "--output-dir", "out"), FAILED,
+                    'w.cmd:1: error: Cannot write "/a.v": it leads out of the output folder.\n')
+
+    def test_folder_that_cannot_be_entered(self) -> None:
+        self.write("w.cmd", "WRITE VERILOG a.v\n")
+        before = self.all_files()
+        for folder, why in (("none", "No such file or directory"), ("w.cmd", "Not a directory")):
+            self.expect(self.run_tool("run", "w.cmd", "--output-dir", folder, "--vhdl", "b.vhd"),
+                        FILE, f"orn-hdl: cannot write {folder}: {why}\n")
+        self.assertEqual(self.all_files(), before)
+
+    def test_usage(self) -> None:
+        self.write("w.cmd", "WRITE VERILOG a.v\n")
+        for rules in (["--no-write", "--output-dir", "out"], ["--output-dir", ""],
+                      ["--output-dir"]):
+            self.assertEqual(self.run_tool("run", "w.cmd", *rules).status, USAGE)
+        self.assertFalse((self.folder / "a.v").exists())
+
+
 class Usage(ToolTest):
     def expect_usage(self, message: str, *arguments: str) -> None:
         self.expect(self.run_tool(*arguments), USAGE, f"orn-hdl: {message}; --help tells more\n")

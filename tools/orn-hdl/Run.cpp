@@ -6,6 +6,7 @@
 
 #include <cstdint>
 #include <string_view>
+#include <system_error>
 
 namespace Tool {
 
@@ -87,11 +88,17 @@ std::string GetModelName(const RunOptions& options) {
 
 } // namespace
 
-Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing,
-                Progress& progress) {
+Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
+                const WriteRules& rules) {
     Orn_Hdl::CommandReader input(model);
     if (!input.Open(SystemFileName(file.c_str()))) {
         return {ComplainUnreadable(file, input.GetError()), false};
+    }
+    std::optional<RulesInForce> inForce;
+    try {
+        inForce.emplace(model, rules);
+    } catch (const std::system_error& error) {
+        return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false};
     }
     Replayer replayer(model, file, progress);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
@@ -114,7 +121,8 @@ Status Run(const RunOptions& options) {
     const std::string name = GetModelName(options);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
     Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
-    const Replayed replayed = Replay(model, options.file, options.keepGoing, progress);
+    const Replayed replayed =
+        Replay(model, options.file, options.keepGoing, progress, options.writeRules);
     if (!replayed.complete) {
         return replayed.status;
     }

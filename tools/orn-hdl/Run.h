@@ -3,6 +3,7 @@
 
 #include "Output.h"
 #include "Tool.h"
+#include "WriteRules.h"
 
 #include <optional>
 #include <string>
@@ -21,6 +22,7 @@ struct RunOptions {
     /// The name of the model; without one, the file's name without folder and extension.
     std::optional<std::string> model;
     Outputs outputs;
+    WriteRules writeRules;
     /// Go on behind a line that failed.
     bool keepGoing = false;
     bool quiet = false;
@@ -37,6 +39,7 @@ struct Replayed {
 
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
 /// not write, is reported with its place; unless told to keep going, the replay ends there.
-Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress);
+Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
+                const WriteRules& rules = {});
 
 } // namespace Tool

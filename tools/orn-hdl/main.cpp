@@ -43,6 +43,17 @@ void AddOutputs(CLI::App& command, Tool::Outputs& outputs) {
     command.add_flag("--no-header", outputs.noHeader, "Write these netlists without the header");
 }
 
+void AddWriteRules(CLI::App& command, Tool::WriteRules& rules) {
+    CLI::Option* folder =
+        command
+            .add_option("--output-dir", rules.folder,
+                        "Let WRITE lines write below this folder only, where their names begin")
+            ->type_name("DIR")
+            ->check(CheckFileName);
+    command.add_flag("--no-write", rules.noWrite, "Let no WRITE line write anything")
+        ->excludes(folder);
+}
+
 /// The command line: its options, and what to do when they have been read.
 class CommandLine {
 public:
@@ -95,6 +106,7 @@ private:
         AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
+        AddWriteRules(command, run_.writeRules);
         command.add_flag("--keep-going", run_.keepGoing, "Go on behind a line that failed");
         command.add_flag("--quiet", run_.quiet, "Show no progress");
     }

@@ -18,6 +18,20 @@ namespace Orn_Hdl {
 class CommandFactory;
 class CommandManager;
 
+/// Decides which files the write commands of a model may write, for programs that run command files
+/// they do not trust.
+class ORN_HDL_API OutputGuard {
+public:
+    OutputGuard() = default;
+    OutputGuard(const OutputGuard&) = delete;
+    OutputGuard& operator=(const OutputGuard&) = delete;
+    virtual ~OutputGuard();
+    /// Asked before a file is opened.
+    /// \param fileName the file, as the command names it; never null.
+    /// \return an empty text when the file may be written, otherwise why it may not.
+    virtual Port::StringBase<char> WhyNot(const char* fileName) = 0;
+};
+
 /// One design: its netlist, its output options and its done commands.
 ///
 /// Every operation takes plain texts, looks the named objects up, checks them, and throws
@@ -80,6 +94,12 @@ public:
     /// Clears the modified flag and returns true; done commands are kept in memory only.
     bool Write(const char* fileName);
 
+    /// \{
+    /// Who is asked before a write command opens its file. What it refuses fails the command, which
+    /// then changes nothing. Not owned; null, as at first, when every file may be written.
+    void SetOutputGuard(OutputGuard* guard) noexcept;
+    OutputGuard* GetOutputGuard() const noexcept;
+    /// \}
     /// What became of the last netlist that a write command wrote: the file's name and the system's
     /// error number, 0 when every byte was written.
     void RecordWrite(const char* fileName, int error);

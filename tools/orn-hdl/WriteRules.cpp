@@ -1,0 +1,95 @@
+#include "WriteRules.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <system_error>
+
+namespace Tool {
+
+namespace fs = std::filesystem;
+
+namespace {
+
+constexpr const char* Outside = "it leads out of the output folder";
+
+/// Refuses every file.
+class NothingMayBeWritten : public Orn_Hdl::OutputGuard {
+public:
+    Port::StringBase<char> WhyNot(const char* /*fileName*/) override {
+        return "--no-write is in force";
+    }
+};
+
+/// Keeps what is written below one folder, which is the current one as long as this lives.
+class OutputFolder : public Orn_Hdl::OutputGuard {
+public:
+    explicit OutputFolder(const fs::path& folder) : former_(fs::current_path()) {
+        fs::current_path(folder);
+        folder_ = fs::current_path();
+    }
+    ~OutputFolder() override {
+        std::error_code error;
+        fs::current_path(former_, error);
+    }
+
+    Port::StringBase<char> WhyNot(const char* fileName) override;
+
+private:
+    /// Whether a path without links and ".." lies below the folder.
+    bool Holds(const fs::path& path) const {
+        return std::mismatch(folder_.begin(), folder_.end(), path.begin(), path.end()).first ==
+               folder_.end();
+    }
+
+    const fs::path former_;
+    fs::path folder_;
+};
+
+Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
+    const fs::path name(fileName);
+    if (name.has_root_path() || std::find(name.begin(), name.end(), "..") != name.end()) {
+        return Outside;
+    }
+    std::error_code error;
+    const fs::path parent = fs::canonical(folder_ / name.parent_path(), error);
+    if (error) {
+        // There is no such folder: opening the file fails and tells why.
+        return "";
+    }
+    if (!Holds(parent)) {
+        return Outside;
+    }
+    switch (fs::symlink_status(name, error).type()) {
+    case fs::file_type::not_found:
+    case fs::file_type::regular:
+    case fs::file_type::directory:
+        return "";
+    case fs::file_type::symlink: {
+        // A link that leads nowhere yet would make the file to which it leads.
+        const fs::path target = fs::canonical(name, error);
+        return !error && Holds(target) && fs::is_regular_file(target, error) ? "" : Outside;
+    }
+    default:
+        return "it is no regular file";
+    }
+}
+
+std::unique_ptr<Orn_Hdl::OutputGuard> MakeGuard(const WriteRules& rules) {
+    if (rules.noWrite) {
+        return std::make_unique<NothingMayBeWritten>();
+    }
+    return rules.folder ? std::make_unique<OutputFolder>(*rules.folder) : nullptr;
+}
+
+} // namespace
+
+RulesInForce::RulesInForce(Orn_Hdl::Model& model, const WriteRules& rules)
+    : model_(model), guard_(MakeGuard(rules)) {
+    model_.SetOutputGuard(guard_.get());
+}
+
+RulesInForce::~RulesInForce() {
+    model_.SetOutputGuard(nullptr);
+}
+
+} // namespace Tool

@@ -1,0 +1,35 @@
+// What the WRITE lines of a command file may write: for command files that are not trusted.
+#pragma once
+
+#include "Orn_Hdl/Model.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace Tool {
+
+/// The rules, as the command line states them.
+struct WriteRules {
+    /// The only folder below which files may be written, and in which their names begin.
+    std::optional<std::string> folder;
+    /// Nothing may be written.
+    bool noWrite = false;
+};
+
+/// Keeps a model to the rules as long as this lives. With a folder, that is the current folder
+/// meanwhile.
+class RulesInForce {
+public:
+    /// \throws std::system_error when the folder cannot be entered.
+    RulesInForce(Orn_Hdl::Model& model, const WriteRules& rules);
+    RulesInForce(const RulesInForce&) = delete;
+    RulesInForce& operator=(const RulesInForce&) = delete;
+    ~RulesInForce();
+
+private:
+    Orn_Hdl::Model& model_;
+    std::unique_ptr<Orn_Hdl::OutputGuard> guard_;
+};
+
+} // namespace Tool
