@@ -25,18 +25,32 @@ Signal* DummySignals::Find(const Signal* original) const noexcept {
     return found == dummyOf_.end() ? nullptr : found->second;
 }
 
-void DummySignals::Forget(const Signal* signal) {
+/// Whether this memory, or that of another netlist, holds the signal.
+bool DummySignals::IsKept(const Signal& signal) noexcept {
+    return signal.links_ != nullptr && signal.links_->keeper != nullptr;
+}
+
+void DummySignals::Forget(const Signal* signal) noexcept {
     const auto isAbout = [signal](const Entry& entry) {
         return entry.original == signal || entry.dummy == signal;
     };
     const auto end = std::remove_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
         if (isAbout(entry)) {
+            entry.original->links_->keeper = nullptr;
             dummyOf_.erase(entry.original);
             return true;
         }
         return false;
     });
     entries_.erase(end, entries_.end());
+}
+
+void DummySignals::Clear() noexcept {
+    for (const Entry& entry : entries_) {
+        entry.original->links_->keeper = nullptr;
+    }
+    entries_.clear();
+    dummyOf_.clear();
 }
 
 /// The dummy takes the pins that still point at its signal. In the place of an output port it takes
@@ -87,7 +101,9 @@ void DummySignals::ReplaceInCompounds(const Entry& entry) {
 
 void DummySignals::Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs) {
     netlist.Add(dummy);
+    Signal::Links& links = original.MakeLinks();
     entries_.push_back({&original, dummy, forOutputs});
+    links.keeper = this;
     dummyOf_.emplace(&original, dummy);
     TakeOver(entries_.back());
 }
@@ -106,7 +122,7 @@ void DummySignals::MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool for
     for (Signal* part : bus.GetBusSliceIterator()) {
         const int type = part->GetSignalType();
         const bool isPart = type == SignalTypeBusSlice || type == SignalTypeBusIndex;
-        if (!isPart || Find(part) != nullptr || IsNameTaken(netlist, *part)) {
+        if (!isPart || IsKept(*part) || IsNameTaken(netlist, *part)) {
             continue;
         }
         Signal* const partDummy =

@@ -11,9 +11,14 @@
 namespace Orn_Hdl {
 
 /// Remembers which dummy stands in for which signal, so that a netlist can be written any number of
-/// times. It owns nothing: the netlist owns both.
+/// times. It owns nothing: the netlist owns the dummies, and the signals but for slices and bits of
+/// its buses that it was never given.
 class DummySignals {
 public:
+    DummySignals() = default;
+    DummySignals(const DummySignals&) = delete;
+    DummySignals& operator=(const DummySignals&) = delete;
+
     /// Lets each dummy take over what its signal has gained since it was made.
     void Refresh(Netlist& netlist);
     /// Makes dummies for the named signals.
@@ -21,7 +26,9 @@ public:
     ///        ports, which drive their dummies.
     void Make(Netlist& netlist, const StringSet& names, bool forOutputs);
     /// Drops a signal that is about to end, be it a dummy or not.
-    void Forget(const Signal* signal);
+    void Forget(const Signal* signal) noexcept;
+    /// Forgets everything, before the signals of the netlist end.
+    void Clear() noexcept;
 
 private:
     struct Entry {
@@ -37,6 +44,7 @@ private:
     void MakeForCompound(Netlist& netlist, CompoundBus& compound, bool forOutputs);
     /// Adds a dummy to the netlist and to the memory, and lets it take over for the first time.
     void Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs);
+    static bool IsKept(const Signal& signal) noexcept;
     static void TakeOver(const Entry& entry);
     static void Link(const Entry& entry);
     static void ReplaceInCompounds(const Entry& entry);

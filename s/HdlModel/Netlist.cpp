@@ -72,6 +72,7 @@ struct Netlist::Implementation {
     NameListener* nameListener = nullptr;
 
     ~Implementation() {
+        dummies.Clear();
         // Signals end first: an instance then has nothing to leave. They part all at once, while
         // all of them are alive.
         for (Signal* signal : Iterator<Signal*>(&signals)) {

@@ -7,6 +7,8 @@
 
 namespace Orn_Hdl {
 
+class DummySignals;
+
 struct Signal::Links {
     /// The aliases of this signal.
     PtrArray<Signal*> signals;
@@ -14,6 +16,9 @@ struct Signal::Links {
     std::vector<Signal*> referrers;
     /// Pins that point at this signal without being listed.
     std::vector<Pin*> unlistedPins;
+    /// Who remembers that a dummy stands in for this signal, and is told when it ends; null for
+    /// nobody.
+    DummySignals* keeper = nullptr;
 };
 
 } // namespace Orn_Hdl

@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Model/Signals.h"
 
+#include "HdlModel/DummySignals.h"
 #include "HdlModel/Names.h"
 #include "HdlModel/ObjectDetails.h"
 #include "HdlModel/SignalLinks.h"
@@ -47,6 +48,9 @@ void Signal::LeaveAll() noexcept {
     pins_.Empty();
     if (links_ == nullptr) {
         return;
+    }
+    if (links_->keeper != nullptr) {
+        links_->keeper->Forget(this);
     }
     for (Signal* alias : Iterator<Signal*>(&links_->signals)) {
         if (!EndTogether(*this, *alias)) {

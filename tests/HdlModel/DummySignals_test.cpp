@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -425,6 +426,60 @@ TEST_F(DummySignals, OfCompoundsComeAfterAllOthers) {
     EXPECT_EQ(signals.back(), "A_DUMMY,B_DUMMY");
     EXPECT_EQ(NamesOf(dynamic_cast<CompoundBus&>(*Get("A_DUMMY,B_DUMMY")).GetBusMemberIterator()),
               (Names{"A_DUMMY", "B_DUMMY"}));
+}
+
+TEST_F(DummySignals, APartThatNoNetlistHoldsMayEnd) {
+    Bus* const bus = AddBus("D(7:0)", Out);
+    auto part = std::make_unique<BusIndex>("D(3)", bus);
+    part->Connect(AddBuffer("U1")->GetPin("I"));
+    part->Connect(AddBuffer("U2")->GetPin("O"));
+    bus->Connect(AddBuffer("U3")->GetPin("I"));
+    netlist_.CreateVhdlDummySignals();
+    ASSERT_NE(netlist_.GetSignal("D_DUMMY(3)"), nullptr);
+    part.reset();
+    netlist_.CreateVhdlDummySignals();
+    EXPECT_NE(netlist_.GetSignal("D_DUMMY(3)"), nullptr);
+    // A new part of that name gets no second dummy, since the name is taken.
+    const BusIndex again("D(3)", bus);
+    netlist_.CreateVhdlDummySignals();
+    EXPECT_EQ(NamesOf(bus->GetBusSliceIterator()), Names({"D(3)"}));
+}
+
+TEST_F(DummySignals, APartMayOutliveTheNetlist) {
+    auto other = std::make_unique<Netlist>();
+    auto* const bus = new Bus("D(7:0)");
+    bus->SetPortPolarity(Out);
+    other->Add(bus);
+    BusSlice part("D(3:0)", bus);
+    auto* const instance = new Instance("U1", component_);
+    other->Add(instance);
+    bus->Connect(instance->GetPin("I"));
+    other->CreateVhdlDummySignals();
+    ASSERT_NE(other->GetSignal("D_DUMMY(3:0)"), nullptr);
+    other.reset();
+    EXPECT_EQ(part.GetParentBus(), nullptr);
+}
+
+TEST_F(DummySignals, APartOfAnotherNetlistMayEndFirst) {
+    Bus* const bus = AddBus("D(7:0)", Out);
+    auto other = std::make_unique<Netlist>();
+    auto* const otherBus = new Bus("D(7:0)");
+    otherBus->SetPortPolarity(Out);
+    other->Add(otherBus);
+    auto* const instance = new Instance("U1", component_);
+    netlist_.Add(instance);
+    bus->Connect(instance->GetPin("I"));
+    auto* const part = new BusSlice("D(3:0)", bus);
+    other->Add(part);
+    netlist_.CreateVhdlDummySignals();
+    // Moved to the other bus it is remembered by the first netlist still.
+    otherBus->AddBusSlice(part);
+    Instance* const reader = AddBuffer("U2");
+    otherBus->Connect(reader->GetPin("I"));
+    other->CreateVhdlDummySignals();
+    other.reset();
+    netlist_.CreateVhdlDummySignals();
+    EXPECT_EQ(reader->GetPin("I")->GetSignal(), nullptr);
 }
 
 } // namespace
