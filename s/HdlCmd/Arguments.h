@@ -47,4 +47,6 @@ private:
     std::uint8_t flags_ = 0;
 };
 
+static_assert(sizeof(Arguments) == 4, "every kept command holds one");
+
 } // namespace Orn_Hdl

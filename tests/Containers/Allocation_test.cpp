@@ -1,56 +1,19 @@
 // Designs hold hundreds of thousands of containers that stay empty: these must take no memory.
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Containers.h"
+#include "Support/CountedAllocations.h"
 
 #include <gtest/gtest.h>
 
 #include <cstddef>
-#include <cstdlib>
-#include <new>
-
-// GCC sees malloc through the operator below, and then free in the place of delete.
-#pragma GCC diagnostic ignored "-Wmismatched-new-delete"
-
-namespace {
-
-std::size_t allocations = 0;
-
-} // namespace
-
-void* operator new(std::size_t size) {
-    ++allocations;
-    if (void* memory = std::malloc(size == 0 ? 1 : size)) {
-        return memory;
-    }
-    throw std::bad_alloc();
-}
-
-void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
-    ++allocations;
-    return std::malloc(size == 0 ? 1 : size);
-}
-
-void operator delete(void* memory) noexcept {
-    std::free(memory);
-}
-
-void operator delete(void* memory, std::size_t) noexcept {
-    std::free(memory);
-}
-
-void operator delete(void* memory, const std::nothrow_t&) noexcept {
-    std::free(memory);
-}
 
 namespace {
 
 using namespace Orn_Hdl;
 
-/// The number of allocations that an action takes.
+/// The number of blocks that an action takes.
 template <class Action> std::size_t Count(Action action) {
-    const std::size_t before = allocations;
-    action();
-    return allocations - before;
+    return Support::CountAllocations(action).blocks;
 }
 
 TEST(Allocation, IsCounted) {

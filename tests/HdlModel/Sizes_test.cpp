@@ -1,0 +1,39 @@
+// What the objects take of which a design holds millions, to the byte. A larger one must be meant.
+#include "Orn_Hdl/Orn_Hdl.h"
+
+// With another standard library or another word size these are other numbers.
+#if defined(__GLIBCXX__) && defined(__x86_64__) && defined(__LP64__)
+
+namespace {
+
+using namespace Orn_Hdl;
+
+static_assert(sizeof(ObjectName) == 16);
+static_assert(sizeof(Object) == 32);
+static_assert(sizeof(AttributeHolder) == 16);
+
+static_assert(sizeof(PinList) == 32);
+static_assert(sizeof(Instance) == 88);
+static_assert(sizeof(Component) == 88);
+static_assert(sizeof(Pin) == 56);
+static_assert(sizeof(ScalarPin) == 56);
+static_assert(sizeof(BusPin) == 56);
+static_assert(sizeof(BusIndexPin) == 56);
+
+static_assert(sizeof(Signal) == 80);
+static_assert(sizeof(ScalarSignal) == 80);
+static_assert(sizeof(BusIndex) == 88);
+static_assert(sizeof(BusSlice) == 88);
+static_assert(sizeof(Bus) == 104);
+static_assert(sizeof(CompoundBus) == 104);
+
+static_assert(sizeof(Attribute) == 40);
+static_assert(sizeof(AttributeString) == 72);
+static_assert(sizeof(AttributeBitVector) == 88);
+static_assert(sizeof(BitVectorValue) == 48);
+
+static_assert(sizeof(Command) == 16);
+
+} // namespace
+
+#endif

@@ -1,0 +1,80 @@
+/// \file
+/// Counts what a program takes of the heap and maps of the system. This header replaces the global
+/// allocation functions: one source file of a program may include it.
+#pragma once
+
+#include <cstddef>
+#include <cstdlib>
+#include <new>
+
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#define ORN_HDL_SANITIZED 1
+#else
+#include <sys/mman.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+#endif
+
+// GCC sees malloc through the operator below, and then free in the place of delete.
+#pragma GCC diagnostic ignored "-Wmismatched-new-delete"
+
+namespace Support {
+
+/// Since the program started.
+struct AllocationCount {
+    std::size_t blocks = 0; ///< taken from the heap; a block that grows counts each time
+    std::size_t maps = 0;   ///< pages, of any size, that the program has mapped itself
+};
+
+inline AllocationCount allocationCount;
+
+/// What an action takes.
+template <class Action> AllocationCount CountAllocations(Action action) {
+    const AllocationCount before = allocationCount;
+    action();
+    return {allocationCount.blocks - before.blocks, allocationCount.maps - before.maps};
+}
+
+} // namespace Support
+
+void* operator new(std::size_t size) {
+    ++Support::allocationCount.blocks;
+    if (void* memory = std::malloc(size == 0 ? 1 : size)) {
+        return memory;
+    }
+    throw std::bad_alloc();
+}
+
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    ++Support::allocationCount.blocks;
+    return std::malloc(size == 0 ? 1 : size);
+}
+
+void operator delete(void* memory) noexcept {
+    std::free(memory);
+}
+
+void operator delete(void* memory, std::size_t) noexcept {
+    std::free(memory);
+}
+
+void operator delete(void* memory, const std::nothrow_t&) noexcept {
+    std::free(memory);
+}
+
+#if !defined(ORN_HDL_SANITIZED)
+// The library's other two ways to memory; the sanitizers keep these for themselves.
+extern "C" void* __libc_realloc(void* memory, std::size_t size);
+
+extern "C" void* realloc(void* memory, std::size_t size) noexcept {
+    ++Support::allocationCount.blocks;
+    return __libc_realloc(memory, size);
+}
+
+extern "C" void* mmap(void* address, std::size_t size, int protection, int flags, int file,
+                      off_t offset) noexcept {
+    ++Support::allocationCount.maps;
+    return reinterpret_cast<void*>(
+        syscall(SYS_mmap, address, size, protection, flags, file, offset));
+}
+#endif
