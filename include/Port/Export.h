@@ -3,6 +3,10 @@
 /// defines ORN_HDL_STATIC for itself and, through its CMake target, for its users.
 #pragma once
 
+#if defined(_MSVC_LANG) ? _MSVC_LANG < 201703L : __cplusplus < 201703L
+#error "the headers of Orn_Hdl need C++17, for instance -std=c++17"
+#endif
+
 /// \def ORN_HDL_API
 /// Stands in the declaration of everything that is exported.
 #if defined(ORN_HDL_STATIC)
