@@ -19,7 +19,25 @@ def _file_options(language: Language) -> list[str]:
 def _word_options(language: Language) -> list[str]:
     """The options whose value is a word that cannot be completed."""
     return sorted({name for subcommand in language.subcommands for option in subcommand.options
-                   if option.value and option.value not in _FILE_VALUES for name in option.names})
+                   if option.value and option.value not in _FILE_VALUES
+                   and not _choices(option) for name in option.names})
+
+
+def _choices(option: Option) -> list[str]:
+    """The values of an option that takes one of a few: of "0|1" both."""
+    return option.value.split("|") if "|" in (option.value or "") else []
+
+
+def _bash_choices(language: Language) -> str:
+    """A branch for each option that takes one of a few values."""
+    branches = {}
+    for subcommand in language.subcommands:
+        for option in subcommand.options:
+            if _choices(option):
+                branches[" | ".join(option.names)] = " ".join(_choices(option))
+    return "".join(f"        {names})\n            mapfile -t COMPREPLY < "
+                   f"<(compgen -W '{values}' -- \"$word\")\n            return ;;\n"
+                   for names, values in branches.items())
 
 
 def bash(language: Language) -> str:
@@ -56,6 +74,7 @@ _orn_hdl() {{
     text += f"        {' | '.join(_file_options(language))})\n"
     text += "            compopt -o filenames\n"
     text += "            mapfile -t COMPREPLY < <(compgen -f -- \"$word\")\n            return ;;\n"
+    text += _bash_choices(language)
     text += f"        {' | '.join(_word_options(language))})\n            return ;;\n    esac\n"
     text += "    case ${COMP_WORDS[1]} in\n"
     for subcommand in language.subcommands:
@@ -88,6 +107,8 @@ def _zsh_option(option: Option) -> list[str]:
     value = ""
     if option.value:
         action = "_files" if option.value in _FILE_VALUES else ""
+        if _choices(option):
+            action = f"({' '.join(_choices(option))})"
         value = f":{option.value}:{action}"
     others = f"({' '.join(option.names)})" if len(option.names) > 1 else ""
     return [f"'{others}{name}[{_zsh_quote(option.help)}]{value}'" for name in option.names]

@@ -32,6 +32,15 @@ def run(*command: str | Path, **options) -> str:
     return done.stdout
 
 
+def options_of(command: str) -> list[str]:
+    """The options that the help of one of the tool's commands names."""
+    told = re.findall(r"^  (?:(-\w)\b,?)?(--[\w-]+)?", run(TOOL, command, "--help"), re.M)
+    options = sorted({name for names in told for name in names if name})
+    if "--help" not in options:
+        raise AssertionError(f"the help of {command} is not understood")
+    return options
+
+
 class Current(unittest.TestCase):
     def test_files_are_what_the_tool_says(self) -> None:
         run(sys.executable, SHARE / "generator", "--check", TOOL)
@@ -149,7 +158,13 @@ class Bash(unittest.TestCase):
         self.assertEqual(self.complete("co"), ["commands"])
         self.assertEqual(self.complete("run", "--v"), ["--verilog", "--vhdl"])
         self.assertEqual(self.complete("run", "--model", ""), [])
+        self.assertEqual(self.complete("import", "--x-as", ""), ["0", "1"])
         self.assertEqual(self.complete("unknown", ""), [])
+
+    def test_every_option_of_every_command(self) -> None:
+        for command in ("run", "import", "draw", "commands"):
+            with self.subTest(command):
+                self.assertEqual(self.complete(command, "-"), options_of(command))
 
     def test_words_of_the_language(self) -> None:
         self.assertEqual(self.complete("commands", "a"), ["ADD", "ASSIGN"])
@@ -180,6 +195,14 @@ class Zsh(unittest.TestCase):
         self.assertIn("ADD", self.words())
         self.assertEqual(self.words("write"), ["VERILOG", "VHDL"])
         self.assertEqual(self.words("ADD", "component"), ["ATTRIBUTE", "COMMENT", "PIN"])
+
+    def test_every_option_of_every_command(self) -> None:
+        script = (SHARE / "zsh" / "_orn-hdl").read_text()
+        for command in ("run", "import", "draw", "commands"):
+            branch = re.search(rf"^ +{command}\) _arguments(.*?);;$", script, re.M | re.S)[1]
+            named = sorted(re.findall(r"'(?:\(.*?\))?(--?[\w-]+)\[", branch))
+            with self.subTest(command):
+                self.assertEqual(named, options_of(command))
 
     def test_syntax(self) -> None:
         run("zsh", "-n", SHARE / "zsh" / "_orn-hdl")
