@@ -94,13 +94,16 @@ public:
     static const Port::StringBase<char> CurrentTimeString();
     /// The library's version.
     static const Port::StringBase<char> GetVersion();
-    /// The base specifier of a VHDL bit string literal (IEEE 1076-1993, 13.7): "b", "o" or "x".
+    /// The base specifier of a VHDL bit string literal (IEEE 1076-1993, 13.7): "b" for 2, "o" for
+    /// 8, else "x".
     static const Port::StringBase<char> ConvertVhdlBase(int base);
-    /// The base letter of a Verilog sized constant (IEEE 1364, 2.5.1): "b", "o" or "h".
+    /// The base letter of a Verilog sized constant (IEEE 1364, 2.5.1): "b" for 2, "o" for 8,
+    /// else "h".
     static const Port::StringBase<char> ConvertVerilogBase(int base);
     /// Puts "_DUMMY" behind a name, or before its range: D(7:0) gives D_DUMMY(7:0).
     static const Port::StringBase<char> AddDummySuffix(const char* name);
-    /// Takes the quotes off a text that is wholly enclosed in double or in single quotes.
+    /// Takes the quotes off a text that is wholly enclosed in double or in single quotes; null is
+    /// read as "".
     static const Port::StringBase<char> RemoveQuotes(const char* text);
     /// The names of an instance's attributes, then those of its component's that it does not have.
     /// A null instance gives an empty list.

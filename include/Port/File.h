@@ -30,9 +30,8 @@ public:
     File& operator=(const File&) = delete;
 
     /// Opens a file, closing the one that was open.
-    /// \param fromStart reading and overwriting begin at the first byte, appending (false) at the
-    /// end.
-    ///        Of no meaning for `Replace`.
+    /// \param fromStart for `Overwrite`: whether what the file holds is dropped first, or written
+    ///        over from its first byte on. Of no meaning for the other modes.
     /// \return false when the file cannot be opened; a directory never can.
     bool open(const char* name, Mode mode, bool fromStart);
     /// \return false when anything has failed since `open`: what was written may be lost.

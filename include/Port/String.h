@@ -46,9 +46,9 @@ public:
     StringBase& operator+=(const StringBase& text) { return *this += text.GetView(); }
     StringBase& operator+=(Char c) {
         text_ += c;
-        /// \}
         return *this;
     }
+    /// \}
 
     /// \{
     /// The text without a copy, valid until the string changes or ends.

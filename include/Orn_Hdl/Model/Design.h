@@ -118,29 +118,46 @@ public:
     Attribute* GetAttr(const char* name, const AttributeHolder* holder) const;
     /// \}
 
-    /// Components, instances and signals share one name space.
+    /// Declares a component without pins. Components, instances and signals share one name space.
+    /// \throws Exception "Identifier ... already defined.\n" when the name is taken.
     bool AddComponent(const char* name);
-    /// Appends a pin to a component; a default value that is not empty is taken.
+    /// Appends a pin to a component; a default value that is not empty is taken. Instances that are
+    /// there already do not get it.
+    /// \throws Exception "Component ... not found.\n", "Component ... already has pin ...\n".
     bool AddPin(const char* name, const Polarity& polarity, const char* component,
                 const char* defaultValue);
-    /// Places a component.
+    /// Places a component: the instance gets its own copies of the component's pins, all open.
+    /// \throws Exception "Identifier ... already defined.\n", "Component ... not found.\n".
     bool AddInstance(const char* name, const char* component);
-    /// Declares a signal, which is no port.
+    /// Declares a signal, or a bus when the name has a range. It is no port until it is given a
+    /// polarity.
+    /// \throws Exception "Identifier ... already defined.\n", or, for a bus whose base name another
+    ///         bus has, "Signal ... already declared.\n".
     bool AddSignal(const char* name);
-    /// Wires a pin to a signal.
+    /// Wires a pin to a signal, which is declared as by `AddSignal` when it is not there.
+    /// \throws Exception "Signal ... not found.\n" for an instance that is not there, and for a bit
+    ///         of a bus that is not there; "Pin ... not found.\n".
     bool ConnectSignalToPin(const char* signal, const char* instance, const char* pin);
-    /// Makes the second signal an alias of the first.
+    /// Makes the second signal an alias of the first; both are declared likewise.
+    /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
     bool ConnectSignals(const char* first, const char* second);
-    /// Ties a signal to a constant.
+    /// Ties a signal to a constant; it is declared likewise.
+    /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
+    /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
     bool AssignConstantToSignal(const char* signal, const char* value);
     /// Wires a pin to a signal of its own that carries the constant.
+    /// \throws Exception "Signal ... not found.\n" for an instance that is not there, "Pin ... not
+    ///         found.\n".
     bool AssignConstantToPin(const char* instance, const char* pin, const char* value);
 
     /// Adds an attribute, or gives one that is present another value, its type kept.
     /// \param type one of the seven type names; null means "String".
+    /// \return false for a null holder, else true.
+    /// \throws Exception "Invalid attribute type.\n".
     bool AddAttr(AttributeHolder* holder, const char* name, const char* value, const char* type);
     /// \{
-    /// The same on an object by its name.
+    /// The same on an object by its name. What is not there throws "... not found.\n", a null
+    /// attribute name "Invalid Name.\n".
     bool AddModuleAttr(const char* name, const char* value, const char* type);
     bool AddComponentAttr(const char* component, const char* name, const char* value,
                           const char* type);
@@ -154,7 +171,13 @@ public:
     /// \}
 
     /// \{
-    /// Operations on one attribute of a holder; a null holder does nothing.
+    /// Operations on one attribute of a holder: its value; its generic option "NONE", "SYN" or
+    /// "NOSYN"; its synthesis option "NONE", "ASSIGN" or "ASSIGNNODEC"; the name of its type when
+    /// that is User.
+    /// \return false, nothing done, for a null holder, else true.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n" for any other
+    ///         option, "Invalid attribute type.\n" for a type name on an attribute that is not
+    ///         User.
     bool SetAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
     bool SetGenericAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
     bool SetSynAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
@@ -162,7 +185,8 @@ public:
     /// \}
 
     /// \{
-    /// The same by object; an instance's attribute is looked for on its component too.
+    /// The same by the object's name; an instance's attribute is looked for on its component too.
+    /// What is not there throws "... not found.\n".
     bool SetModuleAttrValue(const char* attribute, const char* value);
     bool SetComponentAttrValue(const char* component, const char* attribute, const char* value);
     bool SetInstanceAttrValue(const char* instance, const char* attribute, const char* value);
@@ -205,7 +229,8 @@ public:
     /// Adds a line to the module's comment; null adds nothing.
     bool AddNotes(const char* text);
     /// \{
-    /// The same to the comment of an object by its name.
+    /// The same to the comment of an object by its name; what is not there throws "... not
+    /// found.\n".
     bool AddComponentComment(const char* component, const char* text);
     bool AddInstanceComment(const char* instance, const char* text);
     bool AddSignalComment(const char* signal, const char* text);

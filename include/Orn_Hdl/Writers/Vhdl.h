@@ -32,6 +32,7 @@ public:
     void WriteBus(const char* name);
     /// The clauses for the IEEE packages.
     void WriteIEEELibrary();
+    /// The clauses for the package of cells.
     /// \param guard whether the clauses stand between translate_off and translate_on.
     void WriteKestraLibrary(bool guard);
     /// A library clause for each.
@@ -42,7 +43,8 @@ public:
     void WriteTimeStamp(const char* sourceFileName);
     /// The object's comment, every line behind "-- ".
     void WriteComment(const Object* object);
-    /// \param width the column width to which the name is padded.
+    /// signal NAME : std_logic;
+    /// \param width the column width to which the name is padded, here and below.
     void WriteSignalStatement(const char* name, int width);
     /// The same for a bus.
     void WriteSignalVectorStatement(const char* name, int width);
@@ -50,6 +52,7 @@ public:
     void WritePortStatement(const char* name, const Polarity& polarity, int width);
     /// LEFT <= RIGHT
     void WriteSignalAssignment(const char* left, const char* right);
+    /// NAME <= CONSTANT
     /// \param singleBit writes a character literal, '0' or '1', whatever the value's base.
     void WriteConstantSignalAssignment(const char* name, bool singleBit,
                                        const BitVectorValue& value);
@@ -59,7 +62,8 @@ public:
     void WriteGenericMapAttr(Attribute* attribute);
     /// NAME => NAME, the line left open: passes the entity's generic of that name down.
     void WriteGenericMapInitAttr(Attribute* attribute);
-    /// \param typed whether the attribute has its own type or is a string.
+    /// attribute NAME : TYPE ;
+    /// \param typed whether the attribute has its own type or is a string, here and below.
     void WriteAttrDeclaration(Attribute* attribute, bool typed, int width);
     /// Declares the attributes whose synthesis option is "ASSIGN" and whose names are not in
     /// `declared` yet, and adds these.
