@@ -418,3 +418,37 @@ TEST(Iterator, CopiesGoOnFromWhereTheyAre) {
 }
 
 } // namespace
+
+TEST(SmallPtrArray, KeepsItsElementsWhenItGrowsBeyondItsRoom) {
+    int values[10];
+    Orn_Hdl::SmallPtrArray<int*, 3> array;
+    for (int size = 0; size < 10; ++size) {
+        EXPECT_EQ(array.GetSize(), size);
+        EXPECT_EQ(array.Add(&values[size]), size);
+        for (int i = 0; i <= size; ++i) {
+            EXPECT_EQ(array.GetAt(i), &values[i]);
+        }
+    }
+    array.RemoveAt(0);
+    EXPECT_EQ(array.GetAt(0), &values[1]);
+    array.Empty();
+    EXPECT_TRUE(array.IsEmpty());
+    EXPECT_EQ(array.Add(&values[5]), 0);
+    EXPECT_EQ(array.GetTail(), &values[5]);
+}
+
+TEST(SmallPtrArray, CopiesIntoAnArrayOfAnySize) {
+    int values[4];
+    Orn_Hdl::SmallPtrArray<int*, 3> array;
+    array.Add(&values[0]);
+    array.Add(&values[1]);
+    Orn_Hdl::PtrArray<int*> copy = array;
+    array.SetAt(0, nullptr);
+    EXPECT_EQ(copy.GetSize(), 2);
+    EXPECT_EQ(copy.GetAt(0), &values[0]);
+    copy.Add(&values[2]);
+    copy.Add(&values[3]);
+    static_cast<Orn_Hdl::PtrArray<int*>&>(array) = copy;
+    EXPECT_EQ(array.GetSize(), 4);
+    EXPECT_EQ(array.GetAt(3), &values[3]);
+}

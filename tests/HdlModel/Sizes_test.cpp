@@ -9,27 +9,27 @@ namespace {
 using namespace Orn_Hdl;
 
 static_assert(sizeof(ObjectName) == 16);
-static_assert(sizeof(Object) == 32);
+static_assert(sizeof(Object) == 24);
 static_assert(sizeof(AttributeHolder) == 16);
 
 static_assert(sizeof(PinList) == 32);
-static_assert(sizeof(Instance) == 88);
-static_assert(sizeof(Component) == 88);
-static_assert(sizeof(Pin) == 56);
-static_assert(sizeof(ScalarPin) == 56);
-static_assert(sizeof(BusPin) == 56);
-static_assert(sizeof(BusIndexPin) == 56);
+static_assert(sizeof(Instance) == 80);
+static_assert(sizeof(Component) == 80);
+static_assert(sizeof(Pin) == 48);
+static_assert(sizeof(ScalarPin) == 48);
+static_assert(sizeof(BusPin) == 48);
+static_assert(sizeof(BusIndexPin) == 48);
 
-static_assert(sizeof(Signal) == 80);
-static_assert(sizeof(ScalarSignal) == 80);
-static_assert(sizeof(BusIndex) == 88);
-static_assert(sizeof(BusSlice) == 88);
-static_assert(sizeof(Bus) == 104);
-static_assert(sizeof(CompoundBus) == 104);
+static_assert(sizeof(Signal) == 96);
+static_assert(sizeof(ScalarSignal) == 96);
+static_assert(sizeof(BusIndex) == 104);
+static_assert(sizeof(BusSlice) == 104);
+static_assert(sizeof(Bus) == 120);
+static_assert(sizeof(CompoundBus) == 120);
 
-static_assert(sizeof(Attribute) == 40);
-static_assert(sizeof(AttributeString) == 72);
-static_assert(sizeof(AttributeBitVector) == 88);
+static_assert(sizeof(Attribute) == 32);
+static_assert(sizeof(AttributeString) == 64);
+static_assert(sizeof(AttributeBitVector) == 80);
 static_assert(sizeof(BitVectorValue) == 48);
 
 static_assert(sizeof(Command) == 16);

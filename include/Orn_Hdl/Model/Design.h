@@ -87,6 +87,7 @@ public:
     /// Hints that a line, split, will be executed `ForeseenLines` lines later, so that in a large
     /// design what it names is fetched in the meantime. Changes nothing.
     void Foresee(const StringArray& words) noexcept;
+    /// How many lines `Foresee` looks ahead.
     static constexpr std::size_t ForeseenLines = 16;
     /// Replays a command file and clears the modified flag. An exception of a line ends the replay.
     /// \return false when the file cannot be opened or read.
