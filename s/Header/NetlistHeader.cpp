@@ -2,6 +2,7 @@
 
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Orn_Hdl/Options.h"
+#include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
 #include <array>
@@ -9,6 +10,7 @@
 
 namespace Orn_Hdl {
 
+using Writers::OneLine;
 using Writers::Put;
 using Writers::PutLine;
 
@@ -32,13 +34,6 @@ constexpr std::array<std::string_view, 9> Emblem = {
 };
 /// The line of the emblem, counted from 0, that bears the first label.
 constexpr std::size_t FirstLabelLine = 2;
-
-/// A text for one line of the banner: a line feed would end the comment.
-Port::String OneLine(const Port::String& text) {
-    Port::String line = text;
-    line.ReplaceChars("\n", ' ');
-    return line;
-}
 
 } // namespace
 
@@ -78,8 +73,8 @@ void NetlistHeader::WriteLogo() {
     const std::array<Port::String, 5> labels = {
         "Vendor: Halvex",
         Port::String("Version : ") + HdlUtilities::GetVersion(),
-        Port::String("Application : ") + OneLine(application_),
-        Port::String("Filename : ") + OneLine(fileName_),
+        Port::String("Application : ") + OneLine(application_).GetView(),
+        Port::String("Filename : ") + OneLine(fileName_).GetView(),
         Port::String("Timestamp : ") + HdlUtilities::CurrentTimeString(),
     };
     for (std::size_t line = 0; line < Emblem.size(); ++line) {
@@ -114,7 +109,7 @@ void NetlistHeader::WriteReference() {
 }
 
 void NetlistHeader::WriteLine(const char* label, const Port::StringBase<char>& text) {
-    PutLine(out_, prefix_, label, OneLine(text));
+    PutLine(out_, prefix_, label, OneLine(text).GetView());
 }
 
 void NetlistHeader::WriteSentences(const Port::StringBase<char>& text) {
@@ -134,7 +129,7 @@ void NetlistHeader::WriteSentences(const Port::StringBase<char>& text) {
 
 void NetlistHeader::WriteWord(std::string_view word, int& column) {
     const auto writePiece = [this, &column](std::string_view piece) {
-        Put(out_, piece, " ");
+        Put(out_, OneLine(piece).GetView(), " ");
         column += static_cast<int>(piece.size()) + 1;
     };
     if (word.find('\n') == std::string_view::npos) {
@@ -143,7 +138,7 @@ void NetlistHeader::WriteWord(std::string_view word, int& column) {
     }
     StringArray pieces;
     pieces.Parse(word, "\n", true, std::string_view());
-    PutLine(out_, pieces.GetView(0));
+    PutLine(out_, OneLine(pieces.GetView(0)).GetView());
     BeginSentence(column);
     for (int i = 1; i < pieces.GetSize(); ++i) {
         if (i > 1) {

@@ -2,17 +2,22 @@
 
 #include "HdlModel/Names.h"
 #include "Port/Ascii.h"
+#include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
 namespace Orn_Hdl {
 
 using Port::ViewOf;
 using std::string_view;
+using Writers::OneLine;
 using Writers::Put;
 using Writers::PutLine;
 using namespace std::literals::string_view_literals;
 
 namespace {
+
+/// Stands in the place of what would end a number.
+constexpr char DigitSeparator = '_';
 
 constexpr string_view ListIndentation = "                      "; // 22 blanks
 
@@ -146,7 +151,7 @@ void VerilogStatements::WriteConstant(bool singleBit, const BitVectorValue& valu
         Put(out_, Writers::GetSingleBit(value));
     } else {
         WriteBaseAndLength(value, out_);
-        Put(out_, value.GetValue());
+        Put(out_, OneLine(value.GetValue(), DigitSeparator).GetView());
     }
 }
 
@@ -183,7 +188,7 @@ void VerilogStatements::WriteIncludePath(const StringArray& fileNames) {
     for (int i = 0; i < fileNames.GetSize(); ++i) {
         // One piece of text: a directive must not be broken over two lines.
         Port::String directive("`include \"");
-        directive += HdlUtilities::RemoveQuotes(fileNames.GetAt(i).CStr());
+        directive += OneLine(HdlUtilities::RemoveQuotes(fileNames.GetAt(i).CStr())).GetView();
         directive += "\"";
         PutLine(out_, directive);
     }
@@ -291,7 +296,7 @@ void WriteVerilogAttrValueVisitor::VisitAttributeBitVector(AttributeBitVector* a
     if (attribute != nullptr) {
         const BitVectorValue value = attribute->GetBitVectorValue();
         WriteBaseAndLength(value, out_);
-        Put(out_, value.GetValue());
+        Put(out_, OneLine(value.GetValue(), DigitSeparator).GetView());
     }
 }
 
@@ -303,7 +308,7 @@ void WriteVerilogAttrValueVisitor::VisitAttributeBoolean(AttributeBoolean* attri
 
 void WriteVerilogAttrValueVisitor::VisitAttributeUser(AttributeUser* attribute) {
     if (attribute != nullptr) {
-        Put(out_, "\"", attribute->GetValueString(), "\"");
+        Put(out_, "\"", OneLine(attribute->GetValueString()).GetView(), "\"");
     }
 }
 

@@ -3,6 +3,7 @@
 #include "HdlModel/Names.h"
 #include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
+#include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
 namespace Orn_Hdl {
@@ -184,7 +185,7 @@ void VhdlStatements::WriteConstantSignalAssignment(string_view name, bool single
         Put(out_, "'", Writers::GetSingleBit(value), "'");
     } else {
         WriteBasePrefix(value, out_);
-        Put(out_, "\"", value.GetValue(), "\"");
+        Put(out_, "\"", Writers::OneLine(value.GetValue()).GetView(), "\"");
     }
     PutLine(out_, ";");
 }
@@ -344,7 +345,7 @@ void WriteVhdlAttrValueVisitor::VisitAttributeBitVector(AttributeBitVector* attr
     if (attribute != nullptr) {
         const BitVectorValue value = attribute->GetBitVectorValue();
         WriteBasePrefix(value, out_);
-        Put(out_, "\"", value.GetValue(), "\"");
+        Put(out_, "\"", Writers::OneLine(value.GetValue()).GetView(), "\"");
     }
 }
 

@@ -1,6 +1,7 @@
 #include "Writers/Text.h"
 
 #include "Orn_Hdl/Options.h"
+#include "Writers/OneLine.h"
 
 #include <algorithm>
 #include <string>
@@ -13,7 +14,8 @@ std::string_view GetBaseName(const Pin& pin) {
 }
 
 Port::String GetUnquotedValue(const Attribute& attribute) {
-    return HdlUtilities::RemoveQuotes(attribute.GetValueString().CStr());
+    const Port::String value = HdlUtilities::RemoveQuotes(attribute.GetValueString().CStr());
+    return OneLine(value).GetView();
 }
 
 std::string_view GetSingleBit(const BitVectorValue& value) {
@@ -34,7 +36,7 @@ void WriteCommentLines(OutStream& out, std::string_view prefix, std::string_view
     while (!comment.empty()) {
         const std::size_t end = std::min(comment.find('\n'), comment.size());
         if (end > 0) {
-            out << prefix << comment.substr(0, end) << "\n";
+            out << prefix << OneLine(comment.substr(0, end)).GetView() << "\n";
         }
         comment.remove_prefix(std::min(end + 1, comment.size()));
     }

@@ -20,7 +20,7 @@ inline bool IsOpen(std::string_view name) noexcept {
 /// As `Pin::GetBaseName`, without a copy.
 std::string_view GetBaseName(const Pin& pin);
 
-/// The text of an attribute's value without the quotes around it.
+/// The text of an attribute's value without the quotes around it, on one line.
 Port::String GetUnquotedValue(const Attribute& attribute);
 
 /// The bit that a constant gives to a signal of one bit: only a last digit 0 gives "0".

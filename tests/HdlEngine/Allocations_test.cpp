@@ -103,7 +103,7 @@ INSTANTIATE_TEST_SUITE_P(
         Kind{"ConnectToOneNet", Gate, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL n U#.I0", 0, 2},
         Kind{"ConnectToABit", GateAndBus, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL d(#) U#.O", 0, 9},
         Kind{"ConnectSignals", {}, "ADD SIGNAL a#", "CONNECT SIGNAL a# b#", 3, 10},
-        Kind{"AssignConstant", Gate, "ADD INSTANCE AND2 U#", "ASSIGN CONSTANT U#.I0 1", 6, 8},
+        Kind{"AssignConstant", Gate, "ADD INSTANCE AND2 U#", "ASSIGN CONSTANT U#.I0 1", 7, 8},
         Kind{"AddAttribute", Gate, "ADD INSTANCE AND2 U#", "ADD INSTANCE ATTRIBUTE U# LOC X#Y#", 3,
              7},
         Kind{"AddComment", Gate, "ADD INSTANCE AND2 U#", "ADD INSTANCE COMMENT U# seen", 1, 2}),

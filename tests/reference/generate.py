@@ -29,7 +29,7 @@ DIRECTIONS = ["in", "Input", "I", "out", "OUTPUT", "o", "b", "bidir", "BiDirecti
 ATTRIBUTES = ["LOC", "INIT", "init", "RLOC", "Level", "BOX_TYPE", "IOSTANDARD", "keep",
               "WIDTH", "an_attribute_with_a_rather_long_name", "A[1-0]"]
 VALUES = {
-    "String": ["P1", '"two words"', "'\"quoted\"'", "SLOW", '""', "HALVEX", "halvex",
+    "String": ["P1", '"two words"', "'\"quoted\"'", "SLOW", '""', "HALVEX", "halvex", "a\rb",
                '"a, b, c and a text that is long enough to pass the border of the line, surely"'],
     "Integer": ["0", "12", "-7", "12abc", "99999999999", "+3"],
     "Float": ["5", "12.345", ".5", "3.14159", "-2.50", "1e3", "0x1p4", "1.", "abc"],
@@ -40,7 +40,7 @@ VALUES = {
 }
 CONSTANTS = ["0", "1", "1010", "00001111", "4:B:1010", "8:H:A5", "6:O:17", "1:B:1", "1'b0",
              "x", "101", "10", "FF"]
-TEXTS = ["a comment", '"two  blanks"', "don't panic", '"a \\"quoted\\" word"', "end; // -- /*",
+TEXTS = ["a comment", "a\rreturn", '"two  blanks"', "don't panic", '"a \\"quoted\\" word"', "end; // -- /*",
          "plain", '" lead"', "x" * 90, "many words that together are longer than one line of "
          "the file can be, so that something has to happen to them at the right border"]
 LIBRARIES = ["mylib", "UNISIM", "a_library"]

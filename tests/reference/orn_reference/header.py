@@ -5,6 +5,7 @@ from __future__ import annotations
 import os
 import time
 
+from .containment import on_one_line
 from .options import Options
 from .streams import OutStream
 from .tokenizer import split
@@ -26,7 +27,7 @@ def current_time() -> bytes:
 
 def write_header(out: OutStream, prefix: bytes, design_name: bytes, options: Options) -> None:
     def one_line(text: bytes) -> bytes:
-        return text.replace(b"\n", b" ")
+        return on_one_line(text)
 
     out.put_line(prefix * 40)
     out.put_line(prefix, b" Copyright")
@@ -61,13 +62,13 @@ def _write_sentences(out: OutStream, prefix: bytes, text: bytes) -> None:
 
 def _write_word(out: OutStream, prefix: bytes, word: bytes, column: int) -> int:
     if b"\n" not in word:
-        out.put(word, b" ")
+        out.put(on_one_line(word), b" ")
         return column + len(word) + 1
     first, *others = split(word, b"\n") or [b""]
-    out.put(first, b"\n", prefix, _TEXT_INDENTATION)
+    out.put(on_one_line(first), b"\n", prefix, _TEXT_INDENTATION)
     column = _FIRST_COLUMN
     for number, piece in enumerate(others):
-        out.put(piece, b" ")
+        out.put(on_one_line(piece), b" ")
         column += len(piece) + 1
         if number + 1 < len(others):
             out.put(b"\n", prefix, _TEXT_INDENTATION)

@@ -18,6 +18,7 @@ from .attributes import (
     find_init,
     split_generics,
 )
+from .containment import on_one_line
 from .header import write_header
 from .names import base_name, expand_bus, parse_bus, single_bit, to_brackets
 from .netlist import Netlist
@@ -58,7 +59,7 @@ class VerilogNetlister:
             write_header(self._out, b"//", netlist.name, self._options)
         self._write_comment(netlist)
         for include in self._options.includes:
-            self._out.put_line(b'`include "' + remove_quotes(include) + b'"')
+            self._out.put_line(b'`include "' + on_one_line(remove_quotes(include)) + b'"')
         self._out.put_line(b"`timescale", b" ", b"1ns", b" / ", b"1ps")
         self._out.empty_line()
         self._write_module_head(netlist)
@@ -157,7 +158,7 @@ class VerilogNetlister:
 
     def _write_comment(self, item: HdlObject) -> None:
         for line in item.comment_lines():
-            self._out.put(b"// ", line, b"\n")
+            self._out.put(b"// ", on_one_line(line), b"\n")
 
     # Assignments
 
@@ -268,7 +269,7 @@ class VerilogNetlister:
                 self._write_attribute_line(attribute, name)
 
     def _write_attribute_line(self, attribute: Attribute, owner: bytes) -> None:
-        value = remove_quotes(attribute.value_text())
+        value = on_one_line(remove_quotes(attribute.value_text()))
         name = attribute.name
         forms: dict[bytes, tuple[bytes, ...]] = {
             b"EXEMPLAR": (b"// exemplar attribute ", owner, b" ", name, b" ", value),
@@ -287,7 +288,7 @@ class VerilogNetlister:
             else:
                 self._out.put_line(b", \\")
                 self._out.put(_LIST_INDENTATION)
-            self._out.put(attribute.name, b"=", remove_quotes(attribute.value_text()))
+            self._out.put(attribute.name, b"=", on_one_line(remove_quotes(attribute.value_text())))
         if attributes:
             self._out.put(b'" ', b"*/")
 
@@ -298,7 +299,7 @@ class VerilogNetlister:
             else:
                 self._out.end_line()
                 self._out.put(_LIST_INDENTATION)
-            value = remove_quotes(attribute.value_text())
+            value = on_one_line(remove_quotes(attribute.value_text()))
             self._out.put(attribute.name, b" ", b'"', value, b'"')
         if attributes:
             self._out.put_line(b" */")
@@ -321,17 +322,17 @@ def _base_pieces(value: BitVectorValue) -> tuple[Piece, ...]:
 def _constant_pieces(value: BitVectorValue, is_single_bit: bool) -> tuple[Piece, ...]:
     if is_single_bit:
         return (b"0" if value.digits.endswith(b"0") else b"1",)
-    return *_base_pieces(value), value.digits
+    return *_base_pieces(value), on_one_line(value.digits, b"_")
 
 
 def _value_pieces(attribute: Attribute) -> tuple[Piece, ...]:
     text = attribute.value_text()
     if isinstance(attribute, StringAttribute):
-        return b'"', remove_quotes(text), b'"'
+        return b'"', on_one_line(remove_quotes(text)), b'"'
     if isinstance(attribute, (BooleanAttribute, UserAttribute)):
-        return b'"', text, b'"'
+        return b'"', on_one_line(text), b'"'
     if isinstance(attribute, BitAttribute):
         return b"1'b", text
     if isinstance(attribute, BitVectorAttribute):
-        return *_base_pieces(attribute.value), text
+        return *_base_pieces(attribute.value), on_one_line(text, b"_")
     return (text,)

@@ -19,6 +19,7 @@ from .attributes import (
     find_init,
     split_generics,
 )
+from .containment import on_one_line
 from .containers import StringSet
 from .header import write_header
 from .names import base_name, expand_bus, is_bus, parse_bus, single_bit, slice_name
@@ -99,7 +100,7 @@ class VhdlNetlister:
 
     def _write_comment(self, item: HdlObject) -> None:
         for line in item.comment_lines():
-            self._out.put(b"-- ", line, b"\n")
+            self._out.put(b"-- ", on_one_line(line), b"\n")
 
     # Entity
 
@@ -229,13 +230,13 @@ class VhdlNetlister:
     def _put_value(self, attribute: Attribute) -> None:
         text = attribute.value_text()
         if isinstance(attribute, StringAttribute):
-            self._out.put(b'"', remove_quotes(text), b'"')
+            self._out.put(b'"', on_one_line(remove_quotes(text)), b'"')
         elif isinstance(attribute, BitAttribute):
             self._out.put(b"'", text, b"'")
         elif isinstance(attribute, BitVectorAttribute):
             if attribute.value.has_base_and_length:
                 self._out.put(_base_prefix(attribute.value.base))
-            self._out.put(b'"', text, b'"')
+            self._out.put(b'"', on_one_line(text), b'"')
         elif isinstance(attribute, UserAttribute):
             self._out.put(text or b'""')
         else:
@@ -266,7 +267,7 @@ class VhdlNetlister:
         if self._options.typed_attributes:
             self._put_value(attribute)
         else:
-            self._out.put(b'"', remove_quotes(attribute.value_text()), b'"')
+            self._out.put(b'"', on_one_line(remove_quotes(attribute.value_text())), b'"')
         self._out.put_line(b";")
 
     def _declare_architecture_attributes(self, netlist: Netlist) -> None:
@@ -360,7 +361,7 @@ class VhdlNetlister:
         self._out.put(b" <= ")
         if value.has_base_and_length:
             self._out.put(_base_prefix(value.base))
-        self._out.put_line(b'"', value.digits, b'"', b";")
+        self._out.put_line(b'"', on_one_line(value.digits), b'"', b";")
 
     def _write_bit_constant(self, name: bytes, digits: bytes) -> None:
         self._out.put(name, b" <= ")
