@@ -93,7 +93,8 @@ constexpr CommandEntry SetSynthesisEntry{
 using SetSynthesisCommand = CatalogueCommand<SetSynthesisEntry>;
 
 constexpr CommandEntry UppercaseEntry{{"UPPERCASE", "<instance|siganl|component>",
-                                       "Writes names of that kind in upper case in Verilog."},
+                                       "Writes names of that kind in upper case in Verilog; the "
+                                       "word for signals is spelt siganl."},
                                       ParseUppercase,
                                       ExecuteCase<HdlOptions::VerilogOption::UPPERCASE>};
 using UppercaseCommand = CatalogueCommand<UppercaseEntry>;
