@@ -94,6 +94,16 @@ void PtrArrayBase::SetAt(int i, void* p) {
     items_[index] = p;
 }
 
+void PtrArrayBase::InsertAt(int i, void* p) {
+    if (i < 0 || i > GetSize()) {
+        return;
+    }
+    Add(p);
+    const auto index = static_cast<std::uint32_t>(i);
+    std::memmove(items_ + index + 1, items_ + index, (size_ - index - 1) * sizeof(void*));
+    items_[index] = p;
+}
+
 bool PtrArrayBase::Remove(const void* p) noexcept {
     const int index = GetIndex(p);
     RemoveAt(index);

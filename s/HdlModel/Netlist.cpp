@@ -344,11 +344,7 @@ void Netlist::ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider,
         slice->AssignConstantValue(narrower->GetConstantValue());
     }
     narrower->ReplaceEverywhereBy(slice.get());
-    const PtrArray<Signal*> parts = narrower->slices_;
-    narrower->EmptyBusSlice();
-    for (int i = 0; i < parts.GetSize(); ++i) {
-        wider->AddBusSlice(parts.GetAt(i));
-    }
+    wider->TakeParts(*narrower);
     Remove(narrower);
     Add(wider.release());
     Add(slice.release());

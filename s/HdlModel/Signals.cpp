@@ -5,6 +5,7 @@
 #include "HdlModel/ObjectDetails.h"
 #include "HdlModel/SignalLinks.h"
 #include "Port/Ascii.h"
+#include "Port/Pool.h"
 
 #include <algorithm>
 #include <memory>
@@ -332,12 +333,33 @@ ScalarSignal* ScalarSignal::CreateDummySignal() const {
     return new ScalarSignal(GetDummySignalName().CStr());
 }
 
-Bus** Bus::ParentLink(Signal* signal) noexcept {
+/// The slices and bits of a bus. They know these parts, not the bus: when a wider bus takes its
+/// place, they all get their new parent at once.
+struct Bus::Parts {
+    Bus* bus;
+    PtrArray<Signal*> slices;
+    /// How many of them are signals of other classes, which know no parent.
+    int strangers = 0;
+
+    explicit Parts(Bus* owner) noexcept : bus(owner) {}
+    static void* operator new(std::size_t size) {
+        return Port::Pool::Allocate(size, Port::Pool::DesignObjects);
+    }
+    static void operator delete(void* memory) noexcept { Port::Pool::Free(memory); }
+};
+
+Bus::Bus(const char* name) : Signal(name), parts_(std::make_unique<Parts>(this)) {}
+
+Iterator<Signal*> Bus::GetBusSliceIterator() const noexcept {
+    return Iterator<Signal*>(&parts_->slices);
+}
+
+Bus::Parts** Bus::PartsLink(Signal* signal) noexcept {
     switch (signal->GetSignalType()) {
     case SignalTypeBusSlice:
-        return &static_cast<BusSlice*>(signal)->parent_;
+        return &static_cast<BusSlice*>(signal)->parts_;
     case SignalTypeBusIndex:
-        return &static_cast<BusIndex*>(signal)->parent_;
+        return &static_cast<BusIndex*>(signal)->parts_;
     default:
         return nullptr;
     }
@@ -348,15 +370,17 @@ Bus::~Bus() {
 }
 
 void Bus::LeaveAll() noexcept {
-    for (int i = slices_.GetSize(); i > 0; --i) {
-        Signal* const slice = slices_.GetAt(i - 1);
-        if (Bus** parent = ParentLink(slice)) {
-            *parent = nullptr;
+    PtrArray<Signal*>& slices = parts_->slices;
+    for (int i = slices.GetSize(); i > 0; --i) {
+        Signal* const slice = slices.GetAt(i - 1);
+        if (Parts** parts = PartsLink(slice)) {
+            *parts = nullptr;
         } else if (!EndTogether(*this, *slice)) {
             slice->DropReferrer(this);
         }
     }
-    slices_.Empty();
+    slices.Empty();
+    parts_->strangers = 0;
     Signal::LeaveAll();
 }
 
@@ -425,53 +449,83 @@ void Bus::AddBusSlice(Signal* slice) {
     if (slice == nullptr) {
         return;
     }
-    Bus** const parent = ParentLink(slice);
+    PtrArray<Signal*>& slices = parts_->slices;
+    Parts** const link = PartsLink(slice);
     // A slice or bit knows its parent, so the list need not be searched; anything else that is put
     // here may be listed already.
-    if (parent != nullptr ? *parent == this : slices_.Contains(slice)) {
+    if (link != nullptr ? *link == parts_.get() : slices.Contains(slice)) {
         return;
     }
-    if (parent == nullptr) {
-        AddReference(slices_, slice);
+    if (link == nullptr) {
+        AddReference(slices, slice);
+        ++parts_->strangers;
         return;
     }
-    slices_.Add(slice);
-    if (*parent != nullptr) {
-        (*parent)->RemoveBusSlice(slice);
+    slices.Add(slice);
+    if (*link != nullptr) {
+        (*link)->bus->RemoveBusSlice(slice);
     }
-    *parent = this;
+    *link = parts_.get();
+}
+
+void Bus::TakeParts(Bus& other) {
+    // The other's list changes hands as it is, however long it is; what this one has goes before
+    // it.
+    const std::unique_ptr<Parts> own = std::move(parts_);
+    parts_ = std::make_unique<Parts>(this);
+    parts_.swap(other.parts_);
+    other.parts_->bus = &other;
+    parts_->bus = this;
+    for (int i = 0; parts_->strangers > 0 && i < parts_->slices.GetSize(); ++i) {
+        Signal* const stranger = parts_->slices.GetAt(i);
+        if (PartsLink(stranger) == nullptr) {
+            stranger->NoteReferrer(this);
+            stranger->DropReferrer(&other);
+        }
+    }
+    parts_->strangers += own->strangers;
+    for (int i = 0; i < own->slices.GetSize(); ++i) {
+        Signal* const slice = own->slices.GetAt(i);
+        parts_->slices.InsertAt(i, slice);
+        if (Parts** link = PartsLink(slice)) {
+            *link = parts_.get();
+        }
+    }
 }
 
 void Bus::RemoveBusSlice(Signal* slice) {
-    int i = slices_.GetSize() - 1;
-    while (i >= 0 && slices_.GetAt(i) != slice) {
+    PtrArray<Signal*>& slices = parts_->slices;
+    int i = slices.GetSize() - 1;
+    while (i >= 0 && slices.GetAt(i) != slice) {
         --i;
     }
     if (i < 0) {
         return;
     }
-    slices_.RemoveAt(i);
-    if (Bus** parent = ParentLink(slice)) {
-        *parent = nullptr;
+    slices.RemoveAt(i);
+    if (Parts** link = PartsLink(slice)) {
+        *link = nullptr;
     } else {
+        --parts_->strangers;
         slice->DropReferrer(this);
     }
 }
 
 void Bus::EmptyBusSlice() {
-    while (!slices_.IsEmpty()) {
-        RemoveBusSlice(slices_.GetTail());
+    while (!parts_->slices.IsEmpty()) {
+        RemoveBusSlice(parts_->slices.GetTail());
     }
 }
 
 void Bus::Forget(Signal* signal) noexcept {
     Signal::Forget(signal);
-    slices_.Remove(signal);
+    // Only a stranger tells the bus of its end in this way.
+    parts_->strangers -= parts_->slices.Remove(signal) ? 1 : 0;
 }
 
 void Bus::ReplaceReference(Signal* from, Signal* to) {
     Signal::ReplaceReference(from, to);
-    if (slices_.Contains(from)) {
+    if (parts_->slices.Contains(from)) {
         RemoveBusSlice(from);
         AddBusSlice(to);
     }
@@ -539,11 +593,15 @@ BusSlice::~BusSlice() {
     BusSlice::LeaveAll();
 }
 
+Bus* BusSlice::GetParentBus() const noexcept {
+    return parts_ == nullptr ? nullptr : parts_->bus;
+}
+
 void BusSlice::LeaveAll() noexcept {
-    if (parent_ != nullptr && !EndTogether(*this, *parent_)) {
-        parent_->RemoveBusSlice(this);
+    if (parts_ != nullptr && !EndTogether(*this, *parts_->bus)) {
+        parts_->bus->RemoveBusSlice(this);
     }
-    parent_ = nullptr;
+    parts_ = nullptr;
     Signal::LeaveAll();
 }
 
@@ -555,7 +613,7 @@ void BusSlice::AcceptSignal(SignalVisitor& visitor) {
 }
 
 Polarity BusSlice::GetPortPolarity() const {
-    return parent_ == nullptr ? Polarity() : parent_->GetPortPolarity();
+    return parts_ == nullptr ? Polarity() : parts_->bus->GetPortPolarity();
 }
 
 int BusSlice::GetWidth() const {
@@ -589,12 +647,12 @@ bool BusSlice::IsDownTo() const noexcept {
 }
 
 bool BusSlice::IsSameDirectionAsParent() const noexcept {
-    if (parent_ == nullptr) {
+    if (parts_ == nullptr) {
         return true;
     }
     Names::BusName parsed;
     const bool isOneBit = Names::ParseBus(GetNameView(), parsed) && parsed.IsOneBit();
-    return !isOneBit && IsDownTo() == parent_->IsDownTo();
+    return !isOneBit && IsDownTo() == parts_->bus->IsDownTo();
 }
 
 BusIndex::BusIndex(const char* name, Bus* parent) : Signal(name) {
@@ -607,11 +665,15 @@ BusIndex::~BusIndex() {
     BusIndex::LeaveAll();
 }
 
+Bus* BusIndex::GetParentBus() const noexcept {
+    return parts_ == nullptr ? nullptr : parts_->bus;
+}
+
 void BusIndex::LeaveAll() noexcept {
-    if (parent_ != nullptr && !EndTogether(*this, *parent_)) {
-        parent_->RemoveBusSlice(this);
+    if (parts_ != nullptr && !EndTogether(*this, *parts_->bus)) {
+        parts_->bus->RemoveBusSlice(this);
     }
-    parent_ = nullptr;
+    parts_ = nullptr;
     Signal::LeaveAll();
 }
 
@@ -621,7 +683,7 @@ void BusIndex::AcceptSignal(SignalVisitor& visitor) {
 }
 
 Polarity BusIndex::GetPortPolarity() const {
-    return parent_ == nullptr ? Polarity(GetDirection()) : parent_->GetPortPolarity();
+    return parts_ == nullptr ? Polarity(GetDirection()) : parts_->bus->GetPortPolarity();
 }
 
 Port::StringBase<char> BusIndex::GetDummySignalName() const {

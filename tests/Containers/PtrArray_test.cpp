@@ -452,3 +452,19 @@ TEST(SmallPtrArray, CopiesIntoAnArrayOfAnySize) {
     EXPECT_EQ(array.GetSize(), 4);
     EXPECT_EQ(array.GetAt(3), &values[3]);
 }
+
+TEST(PtrArray, InsertsBeforeAnElementOrBehindTheLast) {
+    int values[4];
+    Array array;
+    array.InsertAt(1, &values[0]);
+    array.InsertAt(-1, &values[0]);
+    EXPECT_TRUE(array.IsEmpty());
+    array.InsertAt(0, &values[2]);
+    array.InsertAt(0, &values[0]);
+    array.InsertAt(1, &values[1]);
+    array.InsertAt(3, &values[3]);
+    ASSERT_EQ(array.GetSize(), 4);
+    for (int i = 0; i < 4; ++i) {
+        EXPECT_EQ(array.GetAt(i), &values[i]);
+    }
+}

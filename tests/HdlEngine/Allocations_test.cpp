@@ -98,7 +98,7 @@ INSTANTIATE_TEST_SUITE_P(
         Kind{"AddInstance", Gate, "", "ADD INSTANCE AND2 U#", 0, 20},
         Kind{"AddPort", {}, "", "ADD PORT p# input", 0, 13},
         Kind{"AddSignal", {}, "", "ADD SIGNAL n#", 0, 13},
-        Kind{"AddBus", {}, "", "ADD SIGNAL n#(7:0)", 0, 21},
+        Kind{"AddBus", {}, "", "ADD SIGNAL n#(7:0)", 0, 22},
         Kind{"ConnectToANewNet", Gate, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL n# U#.O", 0, 8},
         Kind{"ConnectToOneNet", Gate, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL n U#.I0", 0, 2},
         Kind{"ConnectToABit", GateAndBus, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL d(#) U#.O", 0, 9},

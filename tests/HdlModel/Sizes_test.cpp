@@ -24,7 +24,7 @@ static_assert(sizeof(Signal) == 96);
 static_assert(sizeof(ScalarSignal) == 96);
 static_assert(sizeof(BusIndex) == 104);
 static_assert(sizeof(BusSlice) == 104);
-static_assert(sizeof(Bus) == 120);
+static_assert(sizeof(Bus) == 104);
 static_assert(sizeof(CompoundBus) == 120);
 
 static_assert(sizeof(Attribute) == 32);

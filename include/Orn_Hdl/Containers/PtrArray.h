@@ -56,6 +56,7 @@ protected:
         return static_cast<int>(size_++);
     }
     void SetAt(int i, void* p);
+    void InsertAt(int i, void* p);
     bool Remove(const void* p) noexcept;
     void RemoveAt(int i) noexcept;
     void Sort(Less less, void* context);
@@ -98,6 +99,9 @@ public:
     int Add(T p) { return PtrArrayBase::Add(p); }
     /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
     void SetAt(int i, T p) { PtrArrayBase::SetAt(i, p); }
+    /// Puts an element before the one at `i`; an index out of range is ignored, but for that behind
+    /// the last element.
+    void InsertAt(int i, T p) { PtrArrayBase::InsertAt(i, p); }
     /// Removes the first element equal to `p`, keeping the others' order.
     /// \return false when there is none.
     bool Remove(T p) noexcept { return PtrArrayBase::Remove(p); }

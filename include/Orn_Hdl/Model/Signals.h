@@ -161,7 +161,7 @@ public:
 class ORN_HDL_API Bus final : public Signal {
 public:
     /// A null name is read as "".
-    explicit Bus(const char* name) : Signal(name) {}
+    explicit Bus(const char* name);
     ~Bus() override;
 
     int GetSignalType() const override { return SignalTypeBus; }
@@ -191,7 +191,7 @@ public:
     /// Drops all slices and bits, which then have no parent.
     void EmptyBusSlice();
     /// The slices and bits, in order.
-    Iterator<Signal*> GetBusSliceIterator() const noexcept { return Iterator<Signal*>(&slices_); }
+    Iterator<Signal*> GetBusSliceIterator() const noexcept;
 
     /// Whether a normalised text is a base name followed by "(", an integer, ":", an integer and
     /// ")".
@@ -210,16 +210,22 @@ public:
     static Port::StringBase<char> GetBusSliceName(const char* name, int start, int count);
 
 private:
-    /// Where a slice or bit keeps its parent; null for any other signal.
-    static Bus** ParentLink(Signal* signal) noexcept;
+    struct Parts;
+
+    /// Where a slice or bit keeps the parts to which it belongs; null for any other signal.
+    static Parts** PartsLink(Signal* signal) noexcept;
+    /// Takes over all slices and bits of another bus, behind its own.
+    void TakeParts(Bus& other);
 
     void LeaveAll() noexcept override;
     void Forget(Signal* signal) noexcept override;
     void ReplaceReference(Signal* from, Signal* to) override;
 
+    friend class BusIndex;
+    friend class BusSlice;
     friend class Netlist;
 
-    PtrArray<Signal*> slices_;
+    std::unique_ptr<Parts> parts_;
 };
 
 /// A contiguous part of a bus, such as D(3:0) of D(7:0).
@@ -252,14 +258,14 @@ public:
     /// neither does.
     bool IsSameDirectionAsParent() const noexcept;
     /// The bus that lists this; null when there is none.
-    Bus* GetParentBus() const noexcept { return parent_; }
+    Bus* GetParentBus() const noexcept;
 
 private:
     friend class Bus;
 
     void LeaveAll() noexcept override;
 
-    Bus* parent_ = nullptr;
+    Bus::Parts* parts_ = nullptr;
 };
 
 /// One bit of a bus, such as D(2).
@@ -287,7 +293,7 @@ public:
     /// The text of the index; empty when the name is no bit name.
     Port::StringBase<char> GetIndex() const;
     /// The bus that lists this; null when there is none.
-    Bus* GetParentBus() const noexcept { return parent_; }
+    Bus* GetParentBus() const noexcept;
 
     /// Whether a normalised text is a base name followed by "(", an integer and ")".
     static bool IsBusIndexName(const char* name) noexcept;
@@ -301,7 +307,7 @@ private:
 
     void LeaveAll() noexcept override;
 
-    Bus* parent_ = nullptr;
+    Bus::Parts* parts_ = nullptr;
 };
 
 /// A concatenation of signals, leftmost first. It does not own its members.
