@@ -103,12 +103,16 @@ class Draw(ToolTest):
         self.expect(self.run_tool("draw", "d.cmd", "-o", "o.svg", "--around", "U9"), USAGE,
                     "orn-hdl: there is no instance and no signal U9\n")
 
+    def test_many_instances(self) -> None:
+        for count in (200, 1600):
+            self.assertEqual(self.count(self.draw(self.chain(count)), "node"), count + 1)
+
     def test_too_many_instances(self) -> None:
-        self.write("d.cmd", self.chain(3001))
+        self.write("d.cmd", self.chain(5001))
         self.expect(self.run_tool("draw", "d.cmd", "-o", "o.svg"), USAGE,
-                    "orn-hdl: 3001 instances are too many for a picture, 3000 the most; "
+                    "orn-hdl: 5001 instances are too many for a picture, 5000 the most; "
                     "choose a smaller part with --around and --depth\n")
-        self.assertEqual(len(self.texts(self.draw(self.chain(3001), "--around", "U5"))), 4 * 3 + 2)
+        self.assertEqual(len(self.texts(self.draw(self.chain(5001), "--around", "U5"))), 4 * 3 + 2)
 
     def test_empty_design(self) -> None:
         self.assertEqual(self.texts(self.draw("")), [])

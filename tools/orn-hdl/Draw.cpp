@@ -24,7 +24,7 @@ namespace Tool {
 namespace {
 
 /// Graphviz takes minutes for more.
-constexpr std::size_t MostBoxes = 3000;
+constexpr std::size_t MostBoxes = 5000;
 
 /// Stands for a write command that writes nothing: to draw a design is to read its file.
 class NoWriteCommand final : public Orn_Hdl::Command {

@@ -15,6 +15,8 @@ constexpr std::size_t MostEndsDrawn = 32;
 
 /// With more boxes than this, Graphviz is told to take less care, or it takes minutes.
 constexpr std::size_t MostBoxesDrawnWell = 150;
+/// And with more than this, still less.
+constexpr std::size_t MostBoxesDrawnFairly = 1500;
 
 /// A text for a Graphviz string, or, with `record`, for a field of a box. Bytes that no picture can
 /// show become "?".
@@ -402,7 +404,9 @@ std::string Graph::Write() const {
                      "  graph [rankdir=LR, charset=latin1, ranksep=1];\n"
                      "  node [fontname=Helvetica, fontsize=11, height=0.3];\n"
                      "  edge [fontname=Helvetica, fontsize=8, arrowsize=0.5];\n");
-    if (CountBoxes() > MostBoxesDrawnWell) {
+    if (CountBoxes() > MostBoxesDrawnFairly) {
+        text += "  graph [nslimit=0.1, nslimit1=0.1, mclimit=0.02];\n";
+    } else if (CountBoxes() > MostBoxesDrawnWell) {
         text += "  graph [nslimit=0.5, nslimit1=0.5, mclimit=0.1];\n";
     }
     for (std::size_t i = 0; i < boxes_.size(); ++i) {
