@@ -31,6 +31,9 @@ RTL_DESIGNS = [
     _rtl_design("feedback", CLOCK_AND_RESET),
     _rtl_design("ranges", CLOCK_AND_RESET),
     _rtl_design("names", CLOCK_AND_RESET),
+    _rtl_design("lanes", CLOCK_AND_RESET),
+    _rtl_design("regfile", CLOCK_AND_RESET),
+    _rtl_design("wires", Stimulus()),
     _rtl_design("cpu8", Stimulus("clk", {"reset": 1}), EXAMPLES / "cpu8"),
 ]
 
