@@ -46,6 +46,7 @@ _CELL_CLOCK = Stimulus("CLK", {"CLR": 1})
 
 COMMAND_FILES = [
     Design("top", source=EXAMPLES / "and2" / "and2.cmd", yosys_allows=(UNDRIVEN,)),
+    Design("accu4", _CELL_CLOCK, EXAMPLES / "accu4" / "accu4.cmd"),
     Design("counter8", _CELL_CLOCK, EXAMPLES / "counter8" / "counter8.cmd",
            EXAMPLES / "counter8" / "counter8_rtl.v", "counter8_rtl"),
     Design("cpu8", Stimulus("clk", {"reset": 1}), EXAMPLES / "cpu8" / "cpu8.cmd",
