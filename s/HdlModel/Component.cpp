@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <functional>
+#include <unordered_set>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -191,14 +192,13 @@ bool Instance::GetOpenPin(PtrArray<Pin*>& pins, bool inputsOnly) const {
 
 namespace {
 
-/// Whether a signal, or a signal of which it is made up, has a port polarity. Compounds are
-/// searched without recursion: they can be nested to any depth.
+/// Whether a signal, or a signal of which it is made up, has a port polarity.
 bool IsOnPort(Signal* signal, int portPolarity) {
     if (signal->GetSignalType() != SignalTypeCompoundBus) {
         return signal->GetPortPolarity().GetValue() == portPolarity;
     }
     std::vector<const Signal*> rest{signal};
-    std::vector<const Signal*> met;
+    std::unordered_set<const Signal*> met;
     while (!rest.empty()) {
         const Signal* const next = rest.back();
         rest.pop_back();
@@ -206,8 +206,7 @@ bool IsOnPort(Signal* signal, int portPolarity) {
             if (next->GetPortPolarity().GetValue() == portPolarity) {
                 return true;
             }
-        } else if (std::find(met.begin(), met.end(), next) == met.end()) {
-            met.push_back(next);
+        } else if (met.insert(next).second) {
             for (const Signal* member :
                  static_cast<const CompoundBus*>(next)->GetBusMemberIterator()) {
                 rest.push_back(member);

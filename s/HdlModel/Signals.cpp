@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <memory>
+#include <unordered_set>
 
 namespace Orn_Hdl {
 
@@ -809,20 +810,25 @@ CompoundBus* CompoundBus::CreateDummySignal() const {
     return new CompoundBus(GetDummySignalName().CStr());
 }
 
-/// Whether this compound is `from` or is reached through the members of `from`. Without recursion:
-/// compounds can be nested to any depth.
+/// Whether this compound is `from` or is reached through the members of `from`.
 bool CompoundBus::Reaches(const Signal* from) const {
-    if (from->GetSignalType() != SignalTypeCompoundBus) {
+    if (from == this) {
+        return true;
+    }
+    if (from->GetSignalType() != SignalTypeCompoundBus || links_ == nullptr ||
+        links_->referrers.empty()) {
         return false;
     }
     std::vector<const CompoundBus*> rest{static_cast<const CompoundBus*>(from)};
-    for (std::size_t i = 0; i < rest.size(); ++i) {
-        if (rest[i] == this) {
-            return true;
-        }
-        for (const Signal* member : rest[i]->GetBusMemberIterator()) {
-            if (member->GetSignalType() == SignalTypeCompoundBus &&
-                std::find(rest.begin(), rest.end(), member) == rest.end()) {
+    std::unordered_set<const Signal*> met;
+    while (!rest.empty()) {
+        const CompoundBus& next = *rest.back();
+        rest.pop_back();
+        for (const Signal* member : next.GetBusMemberIterator()) {
+            if (member == this) {
+                return true;
+            }
+            if (member->GetSignalType() == SignalTypeCompoundBus && met.insert(member).second) {
                 rest.push_back(static_cast<const CompoundBus*>(member));
             }
         }
@@ -830,20 +836,101 @@ bool CompoundBus::Reaches(const Signal* from) const {
     return false;
 }
 
+/// Whether the compounds that this one contains are few and not nested too deep.
+bool CompoundBus::IsWithinLimits() const {
+    struct Place {
+        const CompoundBus* compound;
+        int level;
+    };
+    int count = 0;
+    std::vector<Place> rest{{this, 1}};
+    while (!rest.empty()) {
+        const Place place = rest.back();
+        rest.pop_back();
+        for (const Signal* member : place.compound->GetBusMemberIterator()) {
+            if (member->GetSignalType() != SignalTypeCompoundBus) {
+                continue;
+            }
+            if (++count > MostCompounds || place.level == MostLevels) {
+                return false;
+            }
+            rest.push_back({static_cast<const CompoundBus*>(member), place.level + 1});
+        }
+    }
+    return true;
+}
+
+/// Appends the compounds that have this one as a member.
+void CompoundBus::GetHolders(std::vector<const CompoundBus*>& holders) const {
+    if (links_ == nullptr) {
+        return;
+    }
+    for (const Signal* referrer : links_->referrers) {
+        if (referrer->GetSignalType() == SignalTypeCompoundBus &&
+            static_cast<const CompoundBus*>(referrer)->members_.Contains(
+                const_cast<CompoundBus*>(this))) {
+            holders.push_back(static_cast<const CompoundBus*>(referrer));
+        }
+    }
+}
+
+/// Whether a compound among the members takes an outermost compound beyond its limits. Only there
+/// need it be asked: what an outermost one contains has less in it.
+bool CompoundBus::LeavesLimits() const {
+    std::vector<const CompoundBus*> rest{this};
+    std::unordered_set<const CompoundBus*> met;
+    while (!rest.empty()) {
+        const CompoundBus* const next = rest.back();
+        rest.pop_back();
+        if (!met.insert(next).second) {
+            continue;
+        }
+        const std::size_t before = rest.size();
+        next->GetHolders(rest);
+        if (rest.size() == before && !next->IsWithinLimits()) {
+            return true;
+        }
+    }
+    return false;
+}
+
+/// Takes a member that is listed already out again, by `takeOut`, when it exceeds a limit or that
+/// cannot be told. \return whether it stays.
+template <class TakeOut>
+bool CompoundBus::KeepWithinLimits(Signal& member, const TakeOut& takeOut) {
+    bool stays = member.GetSignalType() != SignalTypeCompoundBus;
+    try {
+        stays = stays || !LeavesLimits();
+    } catch (...) {
+        takeOut();
+        member.DropReferrer(this);
+        throw;
+    }
+    if (!stays) {
+        takeOut();
+        member.DropReferrer(this);
+    }
+    return stays;
+}
+
 void CompoundBus::AddBusMember(Signal* member) {
     if (member == nullptr || Reaches(member)) {
         return;
     }
     AddReference(members_, member);
+    KeepWithinLimits(*member, [this] { members_.RemoveAt(members_.GetSize() - 1); });
 }
 
 void CompoundBus::SetAt(int index, Signal* member) {
     if (member == nullptr || index < 0 || index >= members_.GetSize() || Reaches(member)) {
         return;
     }
+    Signal* const former = members_.GetAt(index);
     member->NoteReferrer(this);
-    members_.GetAt(index)->DropReferrer(this);
     members_.SetAt(index, member);
+    if (KeepWithinLimits(*member, [&] { members_.SetAt(index, former); })) {
+        former->DropReferrer(this);
+    }
 }
 
 void CompoundBus::Forget(Signal* signal) noexcept {

@@ -1,5 +1,7 @@
 #include "Orn_Hdl/Model.h"
 
+#include "Orn_Hdl/Streams.h"
+#include "Orn_Hdl/Writers.h"
 #include "Support/Names.h"
 
 #include <gtest/gtest.h>
@@ -544,6 +546,130 @@ TEST(CompoundBus, NeverContainsItself) {
     EXPECT_EQ(outer.GetWidth(), 1);
     outer.AddBusMember(&inner);
     EXPECT_EQ(outer.GetWidth(), 2) << "the same member twice is no circle";
+}
+
+/// Compounds, each of which is a member of the one before.
+class NestedCompounds : public testing::Test {
+protected:
+    CompoundBus& AddCompound() {
+        compounds_.push_back(
+            std::make_unique<CompoundBus>(("c" + std::to_string(compounds_.size())).c_str()));
+        return *compounds_.back();
+    }
+
+    ScalarSignal leaf_{"leaf"};
+    std::vector<std::unique_ptr<CompoundBus>> compounds_;
+};
+
+TEST_F(NestedCompounds, FromTheInnermostOut) {
+    CompoundBus* inner = &AddCompound();
+    inner->AddBusMember(&leaf_);
+    for (int level = 1; level < CompoundBus::MostLevels; ++level) {
+        CompoundBus& outer = AddCompound();
+        outer.AddBusMember(inner);
+        ASSERT_EQ(outer.GetSize(), 1) << level;
+        inner = &outer;
+    }
+    EXPECT_EQ(inner->GetWidth(), 1);
+    CompoundBus& tooDeep = AddCompound();
+    tooDeep.AddBusMember(inner);
+    EXPECT_EQ(tooDeep.GetSize(), 0);
+    tooDeep.AddBusMember(&leaf_);
+    tooDeep.SetAt(0, inner);
+    EXPECT_EQ(tooDeep.GetAt(0), &leaf_);
+    inner->SetPortPolarity(Polarity("in"));
+    EXPECT_EQ(inner->GetPortPolarity(), Polarity("in"));
+    EXPECT_EQ(inner->GetDummySignalName(), "leaf_DUMMY");
+    StringSet names;
+    inner->GetBaseName(names);
+    EXPECT_TRUE(names.Contains("leaf"));
+    EXPECT_TRUE(names.Contains("c0"));
+    EXPECT_TRUE(names.Contains("c999"));
+}
+
+TEST_F(NestedCompounds, FromTheOutermostIn) {
+    CompoundBus& outermost = AddCompound();
+    CompoundBus* outer = &outermost;
+    for (int level = 1; level < CompoundBus::MostLevels; ++level) {
+        CompoundBus& inner = AddCompound();
+        outer->AddBusMember(&inner);
+        ASSERT_EQ(outer->GetSize(), 1) << level;
+        outer = &inner;
+    }
+    CompoundBus& tooDeep = AddCompound();
+    tooDeep.AddBusMember(&leaf_);
+    outer->AddBusMember(&tooDeep);
+    EXPECT_EQ(outer->GetSize(), 0);
+    outer->AddBusMember(&leaf_);
+    EXPECT_EQ(outermost.GetWidth(), 1);
+    // What ends makes room.
+    compounds_[1].reset();
+    outer->AddBusMember(&tooDeep);
+    EXPECT_EQ(outer->GetSize(), 2);
+}
+
+TEST_F(NestedCompounds, OfManyOccurrencesAreRefused) {
+    CompoundBus* inner = &AddCompound();
+    inner->AddBusMember(&leaf_);
+    int doublings = 0;
+    for (; doublings < 64; ++doublings) {
+        CompoundBus& outer = AddCompound();
+        outer.AddBusMember(inner);
+        outer.AddBusMember(inner);
+        if (outer.GetSize() < 2) {
+            break;
+        }
+        inner = &outer;
+    }
+    EXPECT_EQ(doublings, 10) << "the last contains 2046 compounds";
+    EXPECT_EQ(inner->GetWidth(), 1 << 10);
+    // One more in the innermost is 1024 more in the last, and fits once.
+    for (int i = 0; i < 3; ++i) {
+        compounds_[0]->AddBusMember(&AddCompound());
+    }
+    EXPECT_EQ(compounds_[0]->GetSize(), 2);
+    // Other members do not count.
+    compounds_[0]->AddBusMember(&leaf_);
+    EXPECT_EQ(inner->GetWidth(), 2 << 10);
+}
+
+TEST_F(NestedCompounds, SideBySide) {
+    CompoundBus& outer = AddCompound();
+    for (int i = 0; i <= CompoundBus::MostCompounds; ++i) {
+        outer.AddBusMember(&AddCompound());
+    }
+    EXPECT_EQ(outer.GetSize(), CompoundBus::MostCompounds);
+}
+
+TEST_F(NestedCompounds, NeverOverflowTheStack) {
+    // Of five thousand that are to be nested, each thousand is.
+    Netlist netlist("top");
+    auto* const component = new Component("C");
+    component->AddPin("I", Polarity("in"), "");
+    netlist.Add(component);
+    auto* inner = new CompoundBus("c0");
+    netlist.Add(inner);
+    for (int i = 1; i < 5000; ++i) {
+        auto* const outer = new CompoundBus(("c" + std::to_string(i)).c_str());
+        netlist.Add(outer);
+        outer->AddBusMember(inner);
+        inner = outer;
+    }
+    auto* const leaf = new ScalarSignal("leaf");
+    leaf->SetPortPolarity(Polarity("out"));
+    netlist.Add(leaf);
+    static_cast<CompoundBus*>(netlist.GetSignal("c0"))->AddBusMember(leaf);
+    auto* const instance = new Instance("U", component);
+    netlist.Add(instance);
+    netlist.GetSignal("c999")->Connect(instance->GetPin("I"));
+    netlist.GetSignal("c999")->Connect(netlist.GetSignal("c500"));
+    for (int i = 0; i < 2; ++i) {
+        TextMemOutStream out;
+        VerilogNetlister(out).WriteNetlist(&netlist, HdlOptions());
+        HdlOptions options;
+        VhdlNetlister(out).WriteNetlist(&netlist, &options);
+        EXPECT_GE(out.GetValue().GetIndexOfString("I=>leaf"), 0);
+    }
 }
 
 TEST(BaseNames, OfEachKindOfSignal) {

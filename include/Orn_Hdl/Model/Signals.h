@@ -12,6 +12,7 @@
 #include "Port/String.h"
 
 #include <memory>
+#include <vector>
 
 namespace Orn_Hdl {
 
@@ -311,8 +312,15 @@ private:
 };
 
 /// A concatenation of signals, leftmost first. It does not own its members.
+///
+/// Compounds may contain compounds, within limits: what would exceed one is not added.
 class ORN_HDL_API CompoundBus final : public Signal {
 public:
+    /// How deep compounds can be nested, the outermost one counted.
+    static constexpr int MostLevels = 1000;
+    /// How many compounds one can contain, at all levels, each counted wherever it occurs.
+    static constexpr int MostCompounds = 4000;
+
     /// A compound without members; a null name is read as "".
     explicit CompoundBus(const char* name) : Signal(name) {}
     /// As above, with members, which are added as `AddBusMember` does.
@@ -334,10 +342,10 @@ public:
     /// A new compound without members; the caller owns it.
     CompoundBus* CreateDummySignal() const;
 
-    /// Appends a member. Null is skipped, and so is a signal that is, or contains, this compound.
+    /// Appends a member. Null is skipped, and so is a signal that is, or contains, this compound,
+    /// and a compound that would exceed a limit.
     void AddBusMember(Signal* member);
-    /// Replaces a member; an index out of range, null, and a signal that is, or contains, this
-    /// compound change nothing.
+    /// Replaces a member; an index out of range, and what `AddBusMember` skips, change nothing.
     void SetAt(int index, Signal* member);
     /// The member at an index; null when there is none.
     Signal* GetAt(int index) const noexcept { return members_.GetAt(index); }
@@ -354,6 +362,10 @@ public:
 
 private:
     bool Reaches(const Signal* from) const;
+    bool IsWithinLimits() const;
+    bool LeavesLimits() const;
+    template <class TakeOut> bool KeepWithinLimits(Signal& member, const TakeOut& takeOut);
+    void GetHolders(std::vector<const CompoundBus*>& holders) const;
     void LeaveAll() noexcept override;
     void Forget(Signal* signal) noexcept override;
     void ReplaceReference(Signal* from, Signal* to) override;
