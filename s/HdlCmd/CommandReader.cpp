@@ -13,6 +13,8 @@ struct CommandReader::Implementation {
     };
 
     static constexpr std::size_t Distance = Model::ForeseenLines;
+    /// Room for a line as long as this is kept for the next.
+    static constexpr std::uint64_t LongLine = 1 << 20;
 
     explicit Implementation(Model& owner) noexcept : model(owner) {}
 
@@ -51,6 +53,10 @@ bool CommandReader::Open(const char* fileName) {
 const StringArray* CommandReader::Next() {
     Implementation& own = *implementation_;
     if (own.isInHand) {
+        Implementation::Line& done = own.lines[own.first];
+        if (done.bytes > Implementation::LongLine) {
+            done.words = StringArray();
+        }
         own.first = (own.first + 1) % Implementation::Distance;
         --own.count;
         own.isInHand = false;

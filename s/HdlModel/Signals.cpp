@@ -471,27 +471,36 @@ void Bus::AddBusSlice(Signal* slice) {
 
 void Bus::TakeParts(Bus& other) {
     // The other's list changes hands as it is, however long it is; what this one has goes before
-    // it.
-    const std::unique_ptr<Parts> own = std::move(parts_);
-    parts_ = std::make_unique<Parts>(this);
-    parts_.swap(other.parts_);
-    other.parts_->bus = &other;
-    parts_->bus = this;
-    for (int i = 0; parts_->strangers > 0 && i < parts_->slices.GetSize(); ++i) {
-        Signal* const stranger = parts_->slices.GetAt(i);
-        if (PartsLink(stranger) == nullptr) {
-            stranger->NoteReferrer(this);
-            stranger->DropReferrer(&other);
+    // it. What can fail for want of memory comes first.
+    auto own = std::make_unique<Parts>(this);
+    PtrArray<Signal*>& slices = other.parts_->slices;
+    int inserted = 0;
+    try {
+        for (; inserted < parts_->slices.GetSize(); ++inserted) {
+            slices.InsertAt(inserted, parts_->slices.GetAt(inserted));
         }
+    } catch (...) {
+        for (; inserted > 0; --inserted) {
+            slices.RemoveAt(0);
+        }
+        throw;
     }
-    parts_->strangers += own->strangers;
-    for (int i = 0; i < own->slices.GetSize(); ++i) {
-        Signal* const slice = own->slices.GetAt(i);
-        parts_->slices.InsertAt(i, slice);
+    own.swap(parts_);
+    parts_.swap(other.parts_);
+    parts_->bus = this;
+    other.parts_->bus = &other;
+    for (Signal* slice : Iterator<Signal*>(&own->slices)) {
         if (Parts** link = PartsLink(slice)) {
             *link = parts_.get();
         }
     }
+    for (int i = inserted; parts_->strangers > 0 && i < slices.GetSize(); ++i) {
+        if (PartsLink(slices.GetAt(i)) == nullptr) {
+            slices.GetAt(i)->NoteReferrer(this);
+            slices.GetAt(i)->DropReferrer(&other);
+        }
+    }
+    parts_->strangers += own->strangers;
 }
 
 void Bus::RemoveBusSlice(Signal* slice) {
