@@ -27,3 +27,6 @@ ctest --preset asan -j "$jobs" --exclude-regex '^(flow|install|docs|judges|packa
 
 step "tests"
 ctest --preset release -j "$jobs"
+
+step "fuzzing"
+fuzz/run 60
