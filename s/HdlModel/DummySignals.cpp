@@ -86,11 +86,12 @@ void DummySignals::ReplaceInCompounds(const Entry& entry) {
         return;
     }
     const std::vector<Signal*> referrers = entry.original->links_->referrers;
-    for (Signal* referrer : referrers) {
-        if (referrer->GetSignalType() != SignalTypeCompoundBus) {
+    // The last first: that is where the original, which forgets each of them, looks first.
+    for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
+        if ((*referrer)->GetSignalType() != SignalTypeCompoundBus) {
             continue;
         }
-        CompoundBus& compound = static_cast<CompoundBus&>(*referrer);
+        CompoundBus& compound = static_cast<CompoundBus&>(**referrer);
         for (int i = 0; i < compound.GetSize(); ++i) {
             if (compound.GetAt(i) == entry.original) {
                 compound.SetAt(i, entry.dummy);
