@@ -14,6 +14,9 @@ step() {
     echo "== $* ($(date +%T))"
 }
 
+step "formatting and static checks"
+scripts/lint.sh --quick
+
 step "optimised build"
 cmake --preset release
 cmake --build --preset release -j "$jobs"

@@ -135,12 +135,14 @@ private:
 
         T* GetObject() const noexcept {
             T* pointer = nullptr;
+            // The pointer itself is copied. NOLINTNEXTLINE(bugprone-sizeof-expression)
             std::memcpy(&pointer, object, sizeof pointer);
             return pointer;
         }
         bool IsFree() const noexcept { return GetObject() == nullptr; }
         void Set(std::uint32_t newHash, T* newObject) noexcept {
             hash = newHash;
+            // NOLINTNEXTLINE(bugprone-sizeof-expression)
             std::memcpy(object, &newObject, sizeof newObject);
         }
     };

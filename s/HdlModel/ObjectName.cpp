@@ -67,6 +67,7 @@ ObjectName::ObjectName(const ObjectName& other) noexcept : ObjectName() {
     *this = other;
 }
 
+// Itself is told apart behind the details. NOLINTNEXTLINE(bugprone-unhandled-self-assignment)
 ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
     ObjectName& to = GetPlain();
     const ObjectName& from = other.GetPlain();

@@ -36,6 +36,8 @@ Pin::Pin(const char* name, const Polarity& polarity) : Object(ObjectTypePin) {
     SetPolarity(polarity);
 }
 
+// A copy has neither attributes nor comment.
+// NOLINTNEXTLINE(bugprone-copy-constructor-init,readability-redundant-member-init)
 Pin::Pin(const Pin& other) : Object(ObjectTypePin), AttributeHolder() {
     CopyNameFrom(other);
     SetPolarity(other.GetPolarity());

@@ -138,6 +138,7 @@ void* Allocate(std::size_t size, Kind kind) {
 void Free(void* memory) noexcept {
     if (memory != nullptr) {
         const auto address = reinterpret_cast<std::uintptr_t>(memory);
+        // The page around the address. NOLINTNEXTLINE(performance-no-int-to-ptr)
         Leave(reinterpret_cast<Page*>(address & ~(std::uintptr_t(PageSize) - 1)), 1);
     }
 }

@@ -117,6 +117,7 @@ template <class Char> StringBase<Char> StringBase<Char>::Format(const char* form
     va_start(arguments, format);
     std::va_list again;
     va_copy(again, arguments);
+    // It begins three lines above. NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized)
     const int length = std::vsnprintf(nullptr, 0, format, arguments);
     va_end(arguments);
     std::string text(length < 0 ? 0 : static_cast<std::size_t>(length), '\0');

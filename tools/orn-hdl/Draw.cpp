@@ -17,6 +17,7 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
+// Not every system declares it. NOLINTNEXTLINE(readability-redundant-declaration)
 extern char** environ;
 
 namespace Tool {
