@@ -17,7 +17,8 @@ targets=("${programs[@]/#/orn_hdl_}")
 cmake --build --preset release --target "${targets[@]/%/_tests}"
 for program in "${programs[@]}"; do
     echo "== $program"
+    # Programs that count allocations have operators of their own, of which valgrind replaces some.
     RC_PARAMS="seed=20261120 max_success=5" valgrind --quiet --error-exitcode=9 --leak-check=full \
-        --errors-for-leak-kinds=definite,possible \
+        --errors-for-leak-kinds=definite,possible --show-mismatched-frees=no \
         "build/release/tests/orn_hdl_${program}_tests" --gtest_brief=1
 done

@@ -483,8 +483,9 @@ TEST_F(CommandFile, AnExceptionStopsTheReplayAndKeepsTheFlag) {
 
 TEST_F(CommandFile, AFileThatCannotBeOpenedClearsTheFlag) {
     const std::string missing = folder_ / "missing.cmd";
-    for (const char* name : {static_cast<const char*>(nullptr), "", missing.c_str(),
-                             folder_.GetPath().c_str(), "/dev/null/x"}) {
+    const std::string folder = folder_.GetPath();
+    for (const char* name :
+         {static_cast<const char*>(nullptr), "", missing.c_str(), folder.c_str(), "/dev/null/x"}) {
         model_.SetModifiedFlag(true);
         EXPECT_FALSE(model_.Read(name));
         EXPECT_FALSE(model_.IsModified());
