@@ -68,6 +68,7 @@ public:
     /// Writes a text, a number or an operand; a null text writes nothing.
     OutStream& operator<<(const char* text);
     OutStream& operator<<(const Port::StringBase<char>& text) { return *this << text.GetView(); }
+    OutStream& operator<<(const std::string& text) { return *this << std::string_view(text); }
     OutStream& operator<<(std::string_view text);
     OutStream& operator<<(int number);
     OutStream& operator<<(Operand operand);

@@ -90,6 +90,17 @@ TEST_F(CommandReaderTest, OpensAnotherFileInTheMiddleOfOne) {
     EXPECT_EQ(reader_.GetPosition(), 2u);
 }
 
+TEST_F(CommandReaderTest, LinesOfMegabytesStandBesideShortOnes) {
+    std::string text;
+    Lines expected;
+    for (int i = 0; i < 40; ++i) {
+        const std::string word(i % 7 == 0 ? 2000000 : 3, static_cast<char>('a' + i % 26));
+        text += "NOOP " + word + "\n";
+        expected.push_back({"NOOP", word});
+    }
+    EXPECT_TRUE(Read(text) == expected);
+}
+
 TEST_F(CommandReaderTest, WhatCannotBeOpenedHasNoLines) {
     EXPECT_EQ(reader_.Next(), nullptr);
     EXPECT_FALSE(reader_.Open((folder_ / "absent").c_str()));

@@ -102,9 +102,9 @@ INSTANTIATE_TEST_SUITE_P(
         Kind{"ConnectToANewNet", Gate, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL n# U#.O", 0, 8},
         Kind{"ConnectToOneNet", Gate, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL n U#.I0", 0, 2},
         Kind{"ConnectToABit", GateAndBus, "ADD INSTANCE AND2 U#", "CONNECT SIGNAL d(#) U#.O", 0, 9},
-        Kind{"ConnectSignals", {}, "ADD SIGNAL a#", "CONNECT SIGNAL a# b#", 3, 10},
+        Kind{"ConnectSignals", {}, "ADD SIGNAL a#", "CONNECT SIGNAL a# b#", 4, 10},
         Kind{"AssignConstant", Gate, "ADD INSTANCE AND2 U#", "ASSIGN CONSTANT U#.I0 1", 7, 8},
-        Kind{"AddAttribute", Gate, "ADD INSTANCE AND2 U#", "ADD INSTANCE ATTRIBUTE U# LOC X#Y#", 3,
+        Kind{"AddAttribute", Gate, "ADD INSTANCE AND2 U#", "ADD INSTANCE ATTRIBUTE U# LOC X#Y#", 4,
              7},
         Kind{"AddComment", Gate, "ADD INSTANCE AND2 U#", "ADD INSTANCE COMMENT U# seen", 1, 2}),
     [](const testing::TestParamInfo<Kind>& kind) { return std::string(kind.param.name); });

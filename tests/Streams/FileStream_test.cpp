@@ -433,6 +433,22 @@ TEST(FileStream, WritesMegabytes) {
     EXPECT_EQ(text.find_first_not_of("x\n"), std::string::npos);
 }
 
+TEST(FileStream, WritesTextsOfMegabytesInTheirPlace) {
+    const std::string large(3000000, 'x');
+    const std::string text = Written([&](TextFileOutStream& out) {
+        out.Indent();
+        out << large + "\n";
+        out << "a ";
+        out << large + "\n" + large + "\nb";
+        out << large;
+        out << "\n";
+        out << "c" << OutStream::NewLine;
+    });
+    // The last of them does not end its line, which is broken before it, at its only blanks.
+    EXPECT_TRUE(text == "   " + large + "\n   a " + large + "\n   " + large + "\n   \n         b" +
+                            large + "\n   c\n");
+}
+
 TEST(FileStream, TakesALineOfAMillionPiecesInReasonableTime) {
     const std::string text = Written([](TextFileOutStream& out) {
         out << "// ";
