@@ -52,22 +52,33 @@ struct Names {
 
 constexpr int Batch = 100'000;
 
-/// Instances of a gate of three pins, in a netlist that grows from none to a batch.
-void AddInstance(benchmark::State& state) {
-    const Names names(Batch);
+/// Times `measure` on a model that was made ready by `prepare`, anew each time; making it and
+/// taking it down is not timed.
+template <class Prepare, class Measure>
+void TimeOnFreshModels(benchmark::State& state, const Prepare& prepare, const Measure& measure) {
     for (auto _ : state) {
         state.PauseTiming();
         {
             Model model(nullptr);
-            bench::AddGate(model, "AND2", 2);
+            prepare(model);
             state.ResumeTiming();
-            for (const std::string& name : names.instances) {
-                model.AddInstance(name.c_str(), "AND2");
-            }
+            measure(model);
             state.PauseTiming();
         }
         state.ResumeTiming();
     }
+}
+
+/// Instances of a gate of three pins, in a netlist that grows from none to a batch.
+void AddInstance(benchmark::State& state) {
+    const Names names(Batch);
+    TimeOnFreshModels(
+        state, [](Model& model) { bench::AddGate(model, "AND2", 2); },
+        [&](Model& model) {
+            for (const std::string& name : names.instances) {
+                model.AddInstance(name.c_str(), "AND2");
+            }
+        });
     state.SetItemsProcessed(state.iterations() * Batch);
 }
 BENCHMARK(AddInstance)->Unit(benchmark::kMillisecond);
@@ -75,20 +86,17 @@ BENCHMARK(AddInstance)->Unit(benchmark::kMillisecond);
 /// One pin of every instance, in order, each to a net that its connection declares.
 void ConnectPin(benchmark::State& state) {
     const Names names(Batch);
-    for (auto _ : state) {
-        state.PauseTiming();
-        {
-            Model model(nullptr);
+    TimeOnFreshModels(
+        state,
+        [](Model& model) {
             bench::AddGate(model, "AND2", 2);
             bench::AddInstances(model, "AND2", Batch);
-            state.ResumeTiming();
+        },
+        [&](Model& model) {
             for (std::size_t i = 0; i < names.nets.size(); ++i) {
                 model.ConnectSignalToPin(names.nets[i].c_str(), names.instances[i].c_str(), "O");
             }
-            state.PauseTiming();
-        }
-        state.ResumeTiming();
-    }
+        });
     state.SetItemsProcessed(state.iterations() * Batch);
 }
 BENCHMARK(ConnectPin)->Unit(benchmark::kMillisecond);
@@ -97,19 +105,14 @@ BENCHMARK(ConnectPin)->Unit(benchmark::kMillisecond);
 void SortNaturally(benchmark::State& state) {
     Names names(static_cast<int>(state.range(0)));
     std::shuffle(names.instances.begin(), names.instances.end(), std::mt19937(1));
-    for (auto _ : state) {
-        state.PauseTiming();
-        {
-            Netlist netlist;
+    TimeOnFreshModels(
+        state,
+        [&](Model& model) {
             for (const std::string& name : names.instances) {
-                netlist.Add(new Instance(name.c_str(), nullptr));
+                model.GetNetlist()->Add(new Instance(name.c_str(), nullptr));
             }
-            state.ResumeTiming();
-            netlist.SortNetlist();
-            state.PauseTiming();
-        }
-        state.ResumeTiming();
-    }
+        },
+        [](Model& model) { model.GetNetlist()->SortNetlist(); });
     state.SetItemsProcessed(state.iterations() * state.range(0));
 }
 BENCHMARK(SortNaturally)->Arg(1'000)->Arg(100'000)->Unit(benchmark::kMicrosecond);

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model/Design.h"
 
 #include "HdlModel/Failure.h"
+#include "HdlModel/Foresight.h"
 #include "HdlModel/Names.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Exception.h"
@@ -155,6 +156,8 @@ bool Model::Execute(const StringArray& tokens) {
     return tokens.IsEmpty() ||
            implementation_->commands.CreateAndExecute(tokens, this, GetCommandFactory());
 }
+
+static_assert(Model::ForeseenLines == Foresight::Distance);
 
 void Model::Foresee(const StringArray& words) noexcept {
     implementation_->netlist.Foresee(words);

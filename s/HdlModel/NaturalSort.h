@@ -15,12 +15,13 @@ namespace Orn_Hdl {
 /// of a long one the keys are made once, and one that is in order already, as after a former write,
 /// is only looked at.
 template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankOf rankOf) {
-    const auto isLess = [&rankOf](const T* a, const T* b) {
+    const auto compare = [&rankOf](const T* a, const T* b) {
         const int rankA = rankOf(a);
         const int rankB = rankOf(b);
-        return rankA != rankB ? rankA < rankB
-                              : Names::CompareNatural(a->GetNameView(), b->GetNameView()) < 0;
+        return rankA != rankB ? (rankA < rankB ? -1 : 1)
+                              : Names::CompareNatural(a->GetNameView(), b->GetNameView());
     };
+    const auto isLess = [&compare](const T* a, const T* b) { return compare(a, b) < 0; };
     constexpr int Short = 8;
     const int size = objects.GetSize();
     if (size <= Short) {
@@ -53,10 +54,8 @@ template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankO
         if (a != b) {
             return a < b;
         }
-        const T* const objectA = objectOf(a);
-        const T* const objectB = objectOf(b);
-        return isLess(objectA, objectB) ||
-               (!isLess(objectB, objectA) && a.GetIndex() < b.GetIndex());
+        const int order = compare(objectOf(a), objectOf(b));
+        return order != 0 ? order < 0 : a.GetIndex() < b.GetIndex();
     });
     for (int i = 0; i < size; ++i) {
         objects.SetAt(i, objectOf(keys[static_cast<std::size_t>(i)]));

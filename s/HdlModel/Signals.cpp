@@ -907,17 +907,19 @@ bool CompoundBus::LeavesLimits() const {
 /// cannot be told. \return whether it stays.
 template <class TakeOut>
 bool CompoundBus::KeepWithinLimits(Signal& member, const TakeOut& takeOut) {
+    const auto undo = [&] {
+        takeOut();
+        member.DropReferrer(this);
+    };
     bool stays = member.GetSignalType() != SignalTypeCompoundBus;
     try {
         stays = stays || !LeavesLimits();
     } catch (...) {
-        takeOut();
-        member.DropReferrer(this);
+        undo();
         throw;
     }
     if (!stays) {
-        takeOut();
-        member.DropReferrer(this);
+        undo();
     }
     return stays;
 }
