@@ -1,4 +1,4 @@
-// Runs a fuzz target over files and the files in folders, without a fuzzer.
+// Runs a fuzz target over files and the files below folders, without a fuzzer.
 
 #include <cstddef>
 #include <cstdint>
@@ -34,9 +34,11 @@ int main(int argc, char** argv) {
             ++count;
             continue;
         }
-        for (const auto& entry : std::filesystem::directory_iterator(argv[i])) {
-            RunFile(entry.path());
-            ++count;
+        for (const auto& entry : std::filesystem::recursive_directory_iterator(argv[i])) {
+            if (entry.is_regular_file()) {
+                RunFile(entry.path());
+                ++count;
+            }
         }
     }
     std::printf("%d inputs\n", count);
