@@ -51,7 +51,7 @@ public:
         }
     }
 
-    void Run() const {
+    void Run() {
         for (const Component* component : components_) {
             CheckPins(component->GetPinIterator());
         }
@@ -85,7 +85,7 @@ private:
         }
     }
 
-    void CheckSignal(const Signal& signal) const {
+    void CheckSignal(const Signal& signal) {
         CheckList(signal.GetPinIterator(), pins_, true, "a signal's pins");
         CheckList(signal.GetSignalIterator(), signals_, true, "a signal's aliases");
         Check(!Contains(signal.GetSignalIterator(), &signal), "a signal is no alias of itself");
@@ -93,8 +93,7 @@ private:
         signal.GetPortPolarity();
         signal.GetDummySignalName();
         signal.HasMultiDriver();
-        StringSet names;
-        signal.GetBaseName(names);
+        signal.GetBaseName(names_);
         switch (signal.GetSignalType()) {
         case SignalTypeBus:
             return CheckBus(static_cast<const Bus&>(signal));
@@ -153,6 +152,7 @@ private:
     Alive<Signal> signals_;
     Alive<Component> components_;
     Alive<Pin> pins_;
+    StringSet names_;
 };
 
 template <class T, class Find> void CheckFound(const Iterator<T*>& objects, Find find) {

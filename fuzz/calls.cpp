@@ -497,7 +497,7 @@ private:
         }
     }
 
-    void Write() { Fuzz::WriteAgainAndAgain(GetNetlist(), *model_.GetOptions(), GetLoose()); }
+    void Write() { Fuzz::WriteWithChecks(GetNetlist(), *model_.GetOptions(), GetLoose()); }
 
     Fuzz::Bytes& bytes_;
     CommandFactory factory_;

@@ -61,8 +61,8 @@ void CheckImport(const Import::Netlist& netlist) {
     Fuzz::CheckNames(*direct.GetNetlist());
     Model replayed(&factory);
     Replay(replayed, WriteCommands(netlist));
-    Check(Fuzz::WriteAgainAndAgain(*direct.GetNetlist(), *direct.GetOptions()) ==
-              Fuzz::WriteAgainAndAgain(*replayed.GetNetlist(), *replayed.GetOptions()),
+    Check(Fuzz::WriteWithChecks(*direct.GetNetlist(), *direct.GetOptions()) ==
+              Fuzz::WriteThreeTimes(*replayed.GetNetlist(), *replayed.GetOptions()),
           "the command file makes the same netlist");
 }
 
