@@ -9,6 +9,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <new>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -41,6 +42,20 @@ public:
     static void* operator new(std::size_t size);
     /// Gives the memory back.
     static void operator delete(void* memory) noexcept;
+    /// \{
+    /// For classes of larger alignment: as without these pages.
+    static void* operator new(std::size_t size, std::align_val_t alignment) {
+        return ::operator new(size, alignment);
+    }
+    static void operator delete(void* memory, std::align_val_t alignment) noexcept {
+        ::operator delete(memory, alignment);
+    }
+    /// \}
+    /// \{
+    /// In place: takes and gives back nothing.
+    static void* operator new(std::size_t, void* place) noexcept { return place; }
+    static void operator delete(void*, void*) noexcept {}
+    /// \}
 
 private:
     Model* model_;

@@ -48,7 +48,7 @@ char* Arguments::MakePlace(std::size_t size) {
     if (size <= room_) {
         return GetRoom();
     }
-    char* const block = static_cast<char*>(Port::Pool::Allocate(size, Port::Pool::Commands));
+    char* const block = static_cast<char*>(Port::Pool::AllocatePacked(size, Port::Pool::Commands));
     std::memcpy(GetRoom() + BlockOffset, &block, sizeof block);
     count_ = OwnBlock;
     return block;

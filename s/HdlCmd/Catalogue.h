@@ -4,6 +4,7 @@
 
 #include "HdlCmd/Arguments.h"
 #include "Orn_Hdl/Commands.h"
+#include "Port/Pool.h"
 
 #include <new>
 #include <string>
@@ -38,7 +39,8 @@ public:
         const std::size_t room =
             Arguments::RoomFor(tokens, std::char_traits<char>::length(Entry.info.phrase));
         // The arguments are the last member, with nothing between them and the base.
-        void* const memory = Command::operator new(sizeof(Command) + sizeof(Arguments) + room);
+        void* const memory = Port::Pool::AllocatePacked(sizeof(Command) + sizeof(Arguments) + room,
+                                                        Port::Pool::Commands);
         return ::new (memory) CatalogueCommand(model, room);
     }
 

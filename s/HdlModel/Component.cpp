@@ -104,8 +104,8 @@ public:
         if (count == 0) {
             return;
         }
-        auto* const block = static_cast<char*>(
-            Port::Pool::Allocate(count * (PlaceSize + sizeof(void*)), Port::Pool::DesignObjects));
+        auto* const block = static_cast<char*>(Port::Pool::AllocatePacked(
+            count * (PlaceSize + sizeof(void*)), Port::Pool::DesignObjects));
         void** const pointers = reinterpret_cast<void**>(block + count * PlaceSize);
         std::size_t made = 0;
         try {

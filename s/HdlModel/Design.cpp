@@ -2,7 +2,9 @@
 
 #include "HdlModel/Failure.h"
 #include "HdlModel/Foresight.h"
+#include "HdlModel/MakePacked.h"
 #include "HdlModel/Names.h"
+#include "HdlModel/ObjectKey.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Exception.h"
 #include "Port/Ascii.h"
@@ -266,7 +268,7 @@ bool Model::AddInstance(const char* name, const char* componentName) {
     if (component == nullptr) {
         FailInModel(__LINE__, "Component \"%s\" not found.\n", {ViewOf(componentName)});
     }
-    implementation_->netlist.Add(new Instance(name, component));
+    implementation_->netlist.Add(MakePacked<Instance>(name, component).release());
     SetModifiedFlag(true);
     return true;
 }
@@ -292,7 +294,7 @@ void Model::DeclareSignal(const char* name) {
     if (isBus) {
         netlist.Add(new Bus(name));
     } else {
-        netlist.Add(new ScalarSignal(name));
+        netlist.Add(MakePacked<ScalarSignal>(name).release());
     }
 }
 
@@ -419,8 +421,9 @@ bool Model::ConnectSignals(const char* firstName, const char* secondName) {
     if (created == nullptr) {
         FailSignalNotFound(__LINE__, firstName);
     }
-    // The second name may widen the bus that the first one named; its name then is a slice's.
-    const std::string storedName(created->GetNameView());
+    // The second name may widen the bus that the first one named, which is then a slice's name. The
+    // netlist goes on finding a renamed signal by the name under which it took it.
+    const std::string storedName(ObjectKey::Get(*created));
     Signal* const second = GetOrCreateSignal(secondName);
     if (second == nullptr) {
         FailSignalNotFound(__LINE__, secondName);

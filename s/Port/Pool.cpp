@@ -22,6 +22,10 @@ void* Allocate(std::size_t size, Kind /*kind*/) {
     return ::operator new(size);
 }
 
+void* AllocatePacked(std::size_t size, Kind /*kind*/) {
+    return ::operator new(size);
+}
+
 void Free(void* memory) noexcept {
     ::operator delete(memory);
 }
@@ -49,7 +53,7 @@ struct Page {
 constexpr std::size_t Filling = SIZE_MAX / 2;
 
 constexpr std::size_t HeaderSize = sizeof(Page);
-static_assert(HeaderSize % 8 == 0);
+static_assert(HeaderSize % 16 == 0);
 
 /// Maps memory aligned to `PageSize`: more than is needed, of which the ends are given back.
 Page* NewPage(std::size_t least, bool isHuge, std::size_t users) {
@@ -86,7 +90,8 @@ class Filler {
 public:
     ~Filler() { Close(); }
 
-    void* Allocate(std::size_t size) {
+    /// \param size a multiple of eight.
+    void* AllocatePacked(std::size_t size) {
         if (size > left_) {
             // The first page stays small in memory until it is filled: most processes need no more.
             Page* const fresh = NewPage(PageSize, page_ != nullptr, Filling);
@@ -98,6 +103,14 @@ public:
         left_ -= size;
         ++objects_;
         return memory;
+    }
+
+    void* Allocate(std::size_t size) {
+        // What is left is a multiple of eight, and of sixteen in a fresh page.
+        if (size % 16 == 0 && left_ % 16 != 0) {
+            left_ -= 8;
+        }
+        return AllocatePacked(size);
     }
 
 private:
@@ -121,18 +134,31 @@ private:
 #endif
 thread_local Filler fillers[2];
 
-} // namespace
+/// What is larger has pages to itself.
+constexpr std::size_t MostInFiller = PageSize / 8;
 
-void* Allocate(std::size_t size, Kind kind) {
+std::size_t RoundUp(std::size_t size) {
     const std::size_t rounded = (size + 7) / 8 * 8;
     if (rounded < size) {
         throw std::bad_alloc();
     }
-    if (rounded > PageSize / 8) {
-        return reinterpret_cast<char*>(NewPage(HeaderSize + rounded, rounded >= PageSize, 1)) +
-               HeaderSize;
-    }
-    return fillers[kind].Allocate(rounded);
+    return rounded;
+}
+
+void* AllocatePage(std::size_t size) {
+    return reinterpret_cast<char*>(NewPage(HeaderSize + size, size >= PageSize, 1)) + HeaderSize;
+}
+
+} // namespace
+
+void* Allocate(std::size_t size, Kind kind) {
+    const std::size_t rounded = RoundUp(size);
+    return rounded > MostInFiller ? AllocatePage(rounded) : fillers[kind].Allocate(rounded);
+}
+
+void* AllocatePacked(std::size_t size, Kind kind) {
+    const std::size_t rounded = RoundUp(size);
+    return rounded > MostInFiller ? AllocatePage(rounded) : fillers[kind].AllocatePacked(rounded);
 }
 
 void Free(void* memory) noexcept {

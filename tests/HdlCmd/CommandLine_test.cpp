@@ -6,6 +6,7 @@
 
 #include <gtest/gtest.h>
 
+#include <cstdint>
 #include <memory>
 #include <new>
 #include <string>
@@ -337,6 +338,26 @@ TEST_F(CommandLine, TheManagersEndDeletesItsCommands) {
         EXPECT_EQ(manager.GetDoneCommandCount(), 2);
         EXPECT_EQ(aliveCommands, 2);
     }
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, ACommandMayBeOfAClassOfAnyAlignment) {
+    struct alignas(16) Aligned : LoggedCommand {
+        using LoggedCommand::LoggedCommand;
+    };
+    struct alignas(256) FarAligned : LoggedCommand {
+        using LoggedCommand::LoggedCommand;
+    };
+    for (int i = 0; i < 20; ++i) {
+        const auto odd = std::make_unique<LoggedCommand>(&model_, "odd");
+        const auto aligned = std::make_unique<Aligned>(&model_, "aligned");
+        EXPECT_EQ(reinterpret_cast<std::uintptr_t>(aligned.get()) % 16, 0U);
+        const auto farAligned = std::make_unique<FarAligned>(&model_, "far aligned");
+        EXPECT_EQ(reinterpret_cast<std::uintptr_t>(farAligned.get()) % 256, 0U);
+    }
+    alignas(LoggedCommand) unsigned char place[sizeof(LoggedCommand)];
+    Command* const inPlace = new (place) LoggedCommand(&model_, "in place");
+    inPlace->~Command();
     EXPECT_EQ(aliveCommands, 0);
 }
 

@@ -6,6 +6,8 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
+#include <cstdint>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -96,6 +98,27 @@ TEST(Object, AssignmentFromAnObjectWithoutACommentTakesTheCommentAway) {
     thing = plain;
     EXPECT_EQ(thing.GetComment(), "");
     EXPECT_TRUE(thing == plain);
+}
+
+/// Things of a class that needs such an alignment, each in an odd place behind smaller ones.
+template <std::size_t Alignment> void ExpectAligned() {
+    struct alignas(Alignment) Aligned : Thing {
+        char data[Alignment] = {};
+    };
+    std::vector<std::unique_ptr<Object>> things;
+    for (int i = 0; i < 50; ++i) {
+        things.push_back(std::make_unique<Orn_Hdl::Component>("C"));
+        things.push_back(std::make_unique<Thing>());
+        things.push_back(std::make_unique<Aligned>());
+        EXPECT_EQ(reinterpret_cast<std::uintptr_t>(things.back().get()) % Alignment, 0U);
+    }
+}
+
+TEST(Object, MayBeOfAClassOfAnyAlignment) {
+    ExpectAligned<8>();
+    ExpectAligned<16>();
+    ExpectAligned<64>();
+    ExpectAligned<4096>();
 }
 
 TEST(Object, IsEqualWhenNameCommentAndTypeAre) {

@@ -7,6 +7,7 @@
 #include "Port/String.h"
 
 #include <cstddef>
+#include <new>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -80,6 +81,15 @@ public:
     static void* operator new(std::size_t size);
     /// Gives the memory back.
     static void operator delete(void* memory) noexcept;
+    /// \{
+    /// For classes of larger alignment: as without these pages.
+    static void* operator new(std::size_t size, std::align_val_t alignment) {
+        return ::operator new(size, alignment);
+    }
+    static void operator delete(void* memory, std::align_val_t alignment) noexcept {
+        ::operator delete(memory, alignment);
+    }
+    /// \}
     /// \{
     /// In place: takes and gives back nothing.
     static void* operator new(std::size_t, void* place) noexcept { return place; }
