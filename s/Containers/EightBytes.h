@@ -36,15 +36,6 @@ constexpr std::uint64_t ToUpper(std::uint64_t text) noexcept {
     return text - (MarkRange(text, 'a', 'z') >> 2U);
 }
 
-/// The same, with zero in the place of every ASCII character that is neither letter nor digit.
-/// Names that are equal as look-ups compare them stay equal so.
-constexpr std::uint64_t Fold(std::uint64_t text) noexcept {
-    const std::uint64_t upper = ToUpper(text);
-    const std::uint64_t kept =
-        MarkRange(upper, 'A', 'Z') | MarkRange(upper, '0', '9') | (upper & High);
-    return upper & ((kept << 1U) - (kept >> 7U));
-}
-
 inline std::uint64_t Load(const char* text) noexcept {
     std::uint64_t word = 0;
     std::memcpy(&word, text, sizeof word);

@@ -1,4 +1,5 @@
-// The one hash of the library: h = h * 33 + byte from 5381, bytes taken as signed, in 32 bits.
+// The hash that decides the order of names in a set: h = h * 33 + byte from 5381, bytes taken as
+// signed, in 32 bits.
 #pragma once
 
 #include "Port/Ascii.h"

@@ -1,6 +1,6 @@
 #include "Orn_Hdl/Containers/StringArray.h"
 
-#include "Containers/FoldedHash.h"
+#include "Containers/EightBytes.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"
 

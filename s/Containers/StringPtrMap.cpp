@@ -1,6 +1,6 @@
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 
-#include "Containers/Hash.h"
+#include "Containers/HashByEights.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
@@ -127,7 +127,7 @@ void IStringPtrMapBase::Add(std::string_view name, void* pointer) {
     if (table_ == nullptr) {
         table_ = std::make_unique<Table>();
     }
-    const std::uint32_t hash = HashIgnoringCase(name);
+    const std::uint32_t hash = HashUpperByEights(name);
     const std::size_t found = table_->Find(hash, name);
     if (found < table_->entries.size()) {
         table_->entries[found].pointer = pointer;
@@ -140,17 +140,18 @@ void* IStringPtrMapBase::Get(std::string_view name) const noexcept {
     if (table_ == nullptr) {
         return nullptr;
     }
-    const std::size_t found = table_->Find(HashIgnoringCase(name), name);
+    const std::size_t found = table_->Find(HashUpperByEights(name), name);
     return found < table_->entries.size() ? table_->entries[found].pointer : nullptr;
 }
 
 bool IStringPtrMapBase::Contains(std::string_view name) const noexcept {
-    return table_ != nullptr && table_->Find(HashIgnoringCase(name), name) < table_->entries.size();
+    return table_ != nullptr &&
+           table_->Find(HashUpperByEights(name), name) < table_->entries.size();
 }
 
 void IStringPtrMapBase::Remove(std::string_view name) noexcept {
     if (table_ != nullptr) {
-        const std::size_t found = table_->Find(HashIgnoringCase(name), name);
+        const std::size_t found = table_->Find(HashUpperByEights(name), name);
         if (found < table_->entries.size()) {
             table_->Erase(found);
         }

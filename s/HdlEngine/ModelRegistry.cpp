@@ -1,6 +1,6 @@
 #include "HdlEngine/ModelRegistry.h"
 
-#include "Containers/Hash.h"
+#include "Containers/HashByEights.h"
 #include "Port/Ascii.h"
 
 #include <iterator>
@@ -10,7 +10,7 @@ namespace Orn_Hdl {
 namespace {
 
 std::uint32_t HashOfName(const Model& model) noexcept {
-    return HashIgnoringCase(model.GetNetlist()->GetNameView());
+    return HashUpperByEights(model.GetNetlist()->GetNameView());
 }
 
 } // namespace
@@ -48,7 +48,7 @@ void ModelRegistry::Add(std::unique_ptr<Model> model) {
 }
 
 const ModelRegistry::Entry* ModelRegistry::FindEntry(std::string_view name) const {
-    const std::uint32_t hash = HashIgnoringCase(name);
+    const std::uint32_t hash = HashUpperByEights(name);
     for (auto key = byName_.lower_bound(Key(hash, 0)); key != byName_.end() && key->first == hash;
          ++key) {
         const Entry& entry = entries_.at(key->second);

@@ -49,7 +49,7 @@ private:
 
     static Hashes HashNames(const StringArray& words) noexcept {
         const std::string_view owner = words.GetView(3);
-        return {HashFolded(words.GetView(2)), HashFolded(owner.substr(0, owner.find('.')))};
+        return {HashName(words.GetView(2)), HashName(owner.substr(0, owner.find('.')))};
     }
 
     std::array<Hashes, Distance> coming_{};

@@ -1,7 +1,7 @@
 // An index from names to the objects that bear them. It keeps no names: it asks the objects.
 #pragma once
 
-#include "Containers/FoldedHash.h"
+#include "Containers/HashByEights.h"
 #include "HdlModel/Names.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
@@ -48,6 +48,28 @@ inline bool EqualFolded(std::string_view a, std::string_view b) noexcept {
     return true;
 }
 
+/// Eight characters of a name as look-ups compare them.
+inline std::uint64_t FoldEightNameChars(std::uint64_t text) noexcept {
+    using namespace EightBytes;
+    // Few names have characters that are normalised: brackets, which differ from braces in one bit,
+    // angle brackets and the minus. The bit makes a few others look like these.
+    const std::uint64_t alike = text | Each(0x20);
+    const std::uint64_t marks =
+        MarkRange(alike, '{', '}') | MarkRange(alike, '<', '>') | MarkRange(alike, '-', '-');
+    if (marks == 0) {
+        return ToUpper(text);
+    }
+    std::uint64_t folded = 0;
+    for (unsigned shift = 0; shift < 64; shift += 8) {
+        folded |= std::uint64_t(FoldedNameChar(static_cast<char>(text >> shift))) << shift;
+    }
+    return folded;
+}
+
+inline std::uint32_t HashName(std::string_view name) noexcept {
+    return HashByEights(name, FoldEightNameChars);
+}
+
 /// A name to look up, hashed once. Its group sets apart what may bear the same name: it stands in
 /// the two lowest bits of the hash, which say little.
 class NameKey {
@@ -55,7 +77,7 @@ public:
     static constexpr std::uint32_t GroupMask = 3;
 
     explicit NameKey(std::string_view name, unsigned group = 0) noexcept
-        : name_(name), hash_((HashFolded(name) & ~GroupMask) | group) {}
+        : name_(name), hash_((HashName(name) & ~GroupMask) | group) {}
 
     std::string_view GetName() const noexcept { return name_; }
     std::uint32_t GetHash() const noexcept { return hash_; }

@@ -26,10 +26,6 @@ std::uint64_t Load(const std::string& text) {
     return EightBytes::Load(text.data());
 }
 
-bool IsLetterOrDigit(unsigned char c) {
-    return (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z');
-}
-
 } // namespace
 
 TEST(EightBytes, MarksARange) {
@@ -58,21 +54,6 @@ TEST(EightBytes, TurnsLettersIntoUpperCase) {
             c = c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c;
         }
         ASSERT_EQ(upper, Load(text));
-    });
-}
-
-TEST(EightBytes, FoldsWhatNamesDoNotDifferIn) {
-    ForEachText([](std::string text) {
-        const std::uint64_t folded = EightBytes::Fold(Load(text));
-        for (char& c : text) {
-            const unsigned char byte = static_cast<unsigned char>(c);
-            if (!IsLetterOrDigit(byte) && byte < 0x80) {
-                c = '\0';
-            } else if (c >= 'a' && c <= 'z') {
-                c = static_cast<char>(c - 'a' + 'A');
-            }
-        }
-        ASSERT_EQ(folded, Load(text));
     });
 }
 

@@ -1,4 +1,5 @@
-// The hash of names and words that are looked up without regard to letter case.
+// The hash of names and words that are looked up without regard to letter case, where its order
+// does not show.
 #pragma once
 
 #include "Containers/EightBytes.h"
@@ -10,17 +11,18 @@
 namespace Orn_Hdl {
 
 /// Takes eight characters a step, since every look-up hashes a name; what is left over at the end
-/// is taken together with characters before it. Names that differ in ASCII characters other than
-/// letters and digits alone have one hash.
-inline std::uint32_t HashFolded(std::string_view name) noexcept {
+/// is taken together with characters before it.
+/// \param fold gives what to hash in the place of eight characters; characters that are equal to a
+///        look-up have to become the same, each in its place.
+template <class Fold> inline std::uint32_t HashByEights(std::string_view name, Fold fold) noexcept {
     using namespace EightBytes;
     constexpr std::size_t Step = sizeof(std::uint64_t);
     constexpr std::uint64_t Factor = 0x9E3779B97F4A7C15U;
     const char* text = name.data();
     std::size_t left = name.size();
     std::uint64_t hash = left;
-    const auto mix = [&hash](std::uint64_t word) {
-        hash = (hash ^ Fold(word)) * Factor;
+    const auto mix = [&hash, fold](std::uint64_t word) {
+        hash = (hash ^ fold(word)) * Factor;
         hash ^= hash >> 32U;
     };
     for (; left > Step; left -= Step, text += Step) {
@@ -29,6 +31,11 @@ inline std::uint32_t HashFolded(std::string_view name) noexcept {
     const bool isShort = name.size() < Step;
     mix(isShort ? LoadShort(text, left) : Load(text + left - Step));
     return static_cast<std::uint32_t>(hash * Factor >> 32U);
+}
+
+/// Letter case ignored.
+inline std::uint32_t HashUpperByEights(std::string_view name) noexcept {
+    return HashByEights(name, [](std::uint64_t text) { return EightBytes::ToUpper(text); });
 }
 
 } // namespace Orn_Hdl
