@@ -191,7 +191,7 @@ void TextFileDst::Wrap() {
         BreakAt(search_.afterSpace);
     } else if (search_.afterComma > 0) {
         BreakAt(search_.afterComma);
-    } else if (!search_.inLiteral) {
+    } else if (!search_.inLiteral && !search_.inEscapingLiteral) {
         BreakAt(GetLine().size());
     }
 }
@@ -202,13 +202,16 @@ void TextFileDst::SearchBreak() {
     for (std::size_t& i = found.searched; i < line.size() && !found.isComment; ++i) {
         const char c = line[i];
         const char before = i > 0 ? line[i - 1] : '\0';
+        const bool isOutside = !found.inLiteral && !found.inEscapingLiteral;
         if (c == '"') {
             found.inLiteral = !found.inLiteral;
-        } else if (c == ' ' && !found.inLiteral) {
+            found.inEscapingLiteral = found.inEscapingLiteral == found.isEscaped;
+        } else if (c == ' ' && isOutside) {
             found.afterSpace = i + 1;
-        } else if (c == ',' && !found.inLiteral) {
+        } else if (c == ',' && isOutside) {
             found.afterComma = i + 1;
         }
+        found.isEscaped = c == '\\' && !found.isEscaped;
         found.isComment = (c == '/' && before == '/') || (c == '-' && before == '-') ||
                           (c == '*' && before == '/');
     }

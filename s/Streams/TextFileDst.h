@@ -40,7 +40,12 @@ private:
         std::size_t searched = 0;
         std::size_t afterSpace = 0;
         std::size_t afterComma = 0;
+        /// Between double quotes, a quote behind a backslash being one like any other, as in
+        /// VHDL...
         bool inLiteral = false;
+        /// ... or being a character of the literal, as in Verilog.
+        bool inEscapingLiteral = false;
+        bool isEscaped = false;
         bool isComment = false;
     };
 

@@ -238,6 +238,19 @@ TEST(FileStream, ABreakNeverFallsInsideALiteralThatIsStillOpen) {
               "\"" + half + " " + half + "\";\n");
 }
 
+TEST(FileStream, ABreakNeverFallsInsideALiteralThatHoldsAnEscapedQuote) {
+    const std::string half(45, 'n');
+    EXPECT_EQ(Written([&](TextFileOutStream& out) {
+                  out << "x \"a \\\" b, " << half.c_str() << "\"" << half.c_str() << ";\n";
+              }),
+              "x \n      \"a \\\" b, " + half + "\"" + half + ";\n");
+    // An escaped backslash escapes nothing.
+    EXPECT_EQ(Written([&](TextFileOutStream& out) {
+                  out << "x \"a \\\\\" b, " << half.c_str() << half.c_str() << ";\n";
+              }),
+              "x \"a \\\\\" b, \n      " + half + half + ";\n");
+}
+
 TEST(FileStream, FlushEndsTheLine) {
     const TemporaryFolder folder;
     const std::string name = folder / "text";

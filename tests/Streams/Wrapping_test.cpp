@@ -40,7 +40,7 @@ public:
         }
     }
 
-    bool IsInsideLiteral() const { return std::count(line_.begin(), line_.end(), '"') % 2 != 0; }
+    bool IsInsideLiteral() const { return IsInsideLiteral(line_.size()); }
 
     const std::string& GetFile() const { return file_; }
 
@@ -75,17 +75,30 @@ private:
         line_ += text;
     }
 
+    /// Whether the place lies between quotes, be those counted that stand behind a backslash, or
+    /// not.
+    bool IsInsideLiteral(std::size_t place) const {
+        int all = 0;
+        int plain = 0;
+        for (std::size_t i = 0; i < place; ++i) {
+            std::size_t backslashes = 0;
+            while (backslashes < i && line_[i - backslashes - 1] == '\\') {
+                ++backslashes;
+            }
+            all += line_[i] == '"' ? 1 : 0;
+            plain += line_[i] == '"' && backslashes % 2 == 0 ? 1 : 0;
+        }
+        return all % 2 != 0 || plain % 2 != 0;
+    }
+
     /// The length of the line up to its last such character outside literals, 0 when it has none.
     std::size_t EndOfLast(char wanted) const {
-        std::size_t end = 0;
-        bool inside = false;
-        for (std::size_t i = 0; i < line_.size(); ++i) {
-            inside = inside != (line_[i] == '"');
-            if (line_[i] == wanted && !inside) {
-                end = i + 1;
+        for (std::size_t i = line_.size(); i > 0; --i) {
+            if (line_[i - 1] == wanted && !IsInsideLiteral(i - 1)) {
+                return i;
             }
         }
-        return end;
+        return 0;
     }
 
     void BreakSomewhere() {
@@ -241,14 +254,14 @@ void CompareAllSequences(const std::vector<Step>& alphabet, std::size_t length,
 }
 
 const std::vector<Step>& NastySteps() {
-    static const std::vector<Step> steps{
-        {Step::Write, "a"},    {Step::Write, " "},
-        {Step::Write, ","},    {Step::Write, "\""},
-        {Step::Write, "-"},    {Step::Write, "/"},
-        {Step::Write, "*"},    {Step::Write, "b\nc"},
-        {Step::Write, "\n"},   {Step::Write, ", d"},
-        {Step::Number, "-12"}, {Step::Write, "\"e f,g\""},
-        {Step::Flush, ""},     {Step::Write, std::string(85, 'y')}};
+    static const std::vector<Step> steps{{Step::Write, "a"},    {Step::Write, " "},
+                                         {Step::Write, ","},    {Step::Write, "\""},
+                                         {Step::Write, "-"},    {Step::Write, "/"},
+                                         {Step::Write, "*"},    {Step::Write, "b\nc"},
+                                         {Step::Write, "\n"},   {Step::Write, ", d"},
+                                         {Step::Number, "-12"}, {Step::Write, "\"e f,g\""},
+                                         {Step::Flush, ""},     {Step::Write, std::string(85, 'y')},
+                                         {Step::Write, "\\"}};
     return steps;
 }
 
@@ -256,6 +269,7 @@ TEST(Wrapping, AgreesWithASlowLayoutOnAllShortSequencesNearTheEdge) {
     CompareAllSequences(NastySteps(), 3,
                         {"", Fill("", 79), Fill("", 80), Fill("a b,", 78), Fill("a,b", 78),
                          Fill("a \"b c,d\"", 78), Fill("a,\"b ", 78), Fill("\"a ", 79),
+                         Fill("a \"b \\\" c", 78), Fill("a \"b \\\\\" c", 78),
                          Fill("a -", 78) + "-", "   " + Fill("", 70)});
 }
 
@@ -278,7 +292,7 @@ rc::Gen<std::vector<Step>> AnySteps(bool plain) {
         return gen::scale(0.4, gen::container<std::string>(gen::elementOf(std::move(alphabet))));
     };
     const auto write =
-        gen::map(pieceOf(plain ? "abcdef,; " : "abcd  ,\"-/*\n"), [](std::string text) {
+        gen::map(pieceOf(plain ? "abcdef,; " : "abcd  ,\"\\-/*\n"), [](std::string text) {
             return Step{Step::Write, std::move(text)};
         });
     const auto number = gen::map(gen::arbitrary<int>(), [](int value) {

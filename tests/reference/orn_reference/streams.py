@@ -2,7 +2,7 @@
 
 from __future__ import annotations
 
-from typing import Union
+from typing import Optional, Union
 
 WIDTH = 80
 INDENTATION = b"   "
@@ -12,19 +12,27 @@ COMMENT_MARKS = (b"//", b"--", b"/*")
 Piece = Union[bytes, int]
 
 
-def _break_position(line: bytes) -> int:
-    """The last blank outside double quotes, else the last such comma, else the end."""
+def _break_position(line: bytes) -> Optional[int]:
+    """The last blank outside double quotes, else the last such comma, else the end; none
+    within a literal.
+
+    A quote behind a backslash ends a literal in VHDL and does not in Verilog: what either takes for
+    a part of a literal is left whole.
+    """
     found = {0x20: -1, 0x2C: -1}
-    quoted = False
+    quoted = quoted_in_verilog = escaped = False
     for position, character in enumerate(line):
         if character == 0x22:
             quoted = not quoted
-        elif not quoted and character in found:
+            if not escaped:
+                quoted_in_verilog = not quoted_in_verilog
+        elif not (quoted or quoted_in_verilog) and character in found:
             found[character] = position
+        escaped = character == 0x5C and not escaped
     for position in found.values():
         if position >= 0:
             return position
-    return len(line) - 1
+    return None if quoted or quoted_in_verilog else len(line) - 1
 
 
 class OutStream:
@@ -84,7 +92,9 @@ class OutStream:
         self._start_line()
         is_comment = any(mark in self._line for mark in COMMENT_MARKS)
         if not is_comment and len(self._line) + len(text) > WIDTH:
-            self._break(_break_position(self._line))
+            position = _break_position(self._line)
+            if position is not None:
+                self._break(position)
         self._line += text
 
     def _start_line(self) -> None:
