@@ -9,6 +9,8 @@
 #include "Writers/Text.h"
 
 #include <algorithm>
+#include <cstdint>
+#include <optional>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -60,22 +62,50 @@ bool IsBitOfUpwardBus(const Signal& signal) {
     return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
 }
 
-/// Appends the names of the signal's bits, leftmost first.
-/// \return false when they cannot be listed.
-bool AddBitNames(const Signal& signal, StringArray& bits) {
+/// How many bits the signal has; nothing when they cannot be listed.
+std::optional<std::int64_t> CountBits(const Signal& signal) {
     if (Writers::IsSingleBit(signal)) {
-        bits.Add(signal.GetName());
-        return true;
+        return 1;
     }
     if (signal.GetSignalType() != SignalTypeCompoundBus) {
-        return Bus::ParseBusName(signal.GetName().CStr(), bits);
+        Names::BusName parsed;
+        const bool isListable = Names::ParseBus(signal.GetNameView(), parsed) &&
+                                parsed.GetBits() <= Names::MostExpandedBits;
+        return isListable ? std::optional(parsed.GetBits()) : std::nullopt;
     }
+    std::int64_t count = 0;
     for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-        if (!AddBitNames(*member, bits)) {
-            return false;
+        const std::optional<std::int64_t> ofMember = CountBits(*member);
+        if (!ofMember) {
+            return std::nullopt;
+        }
+        count += *ofMember;
+    }
+    return count;
+}
+
+/// Appends the names of the signal's bits, which can be listed, leftmost first, until there are
+/// `most` names.
+void AddBitNames(const Signal& signal, std::int64_t most, StringArray& bits) {
+    if (bits.GetSize() >= most) {
+        return;
+    }
+    if (Writers::IsSingleBit(signal)) {
+        bits.Add(signal.GetName());
+        return;
+    }
+    Names::BusName parsed;
+    if (signal.GetSignalType() == SignalTypeCompoundBus) {
+        for (const Signal* member :
+             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
+            AddBitNames(*member, most, bits);
+        }
+    } else if (Names::ParseBus(signal.GetNameView(), parsed)) {
+        const std::int64_t count = std::min(parsed.GetBits(), most - bits.GetSize());
+        for (std::int64_t i = 0; i < count; ++i) {
+            bits.Add(Names::WithIndex(parsed.base, parsed.IndexAt(i)));
         }
     }
-    return true;
 }
 
 bool IsBinary(string_view digits) {
@@ -409,7 +439,9 @@ void VhdlNetlister::Writer::WriteInstanceAttrAssignment(const Instance& instance
 void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
     if (IsCompoundOrAgainst(signal)) {
         WriteConstantBits(signal);
-    } else if (StringArray bits; IsBitOfUpwardBus(signal) && AddBitNames(signal, bits)) {
+    } else if (IsBitOfUpwardBus(signal)) {
+        StringArray bits;
+        AddBitNames(signal, 1, bits);
         statements_.WriteConstantSignalAssignment(bits.GetView(0), true, signal.GetConstantValue());
     } else {
         statements_.WriteConstantSignalAssignment(
@@ -421,11 +453,13 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
 void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     const string_view digits = value.GetValue();
-    StringArray bits;
-    if (value.GetBase() != 2 || !IsBinary(digits) || !AddBitNames(signal, bits) ||
-        digits.size() != static_cast<std::size_t>(bits.GetSize())) {
+    const std::optional<std::int64_t> count = CountBits(signal);
+    if (value.GetBase() != 2 || !IsBinary(digits) || !count ||
+        digits.size() != static_cast<std::size_t>(*count)) {
         return;
     }
+    StringArray bits;
+    AddBitNames(signal, *count, bits);
     for (int i = 0; i < bits.GetSize(); ++i) {
         if (IsWritable(bits.GetView(i))) {
             const Port::String digit(digits.substr(static_cast<std::size_t>(i), 1));
@@ -436,14 +470,21 @@ void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
 }
 
 void VhdlNetlister::Writer::WriteAlias(const Signal& signal, const Signal& alias) {
-    StringArray bits;
-    StringArray aliasBits;
-    if ((IsAliasedByBits(signal) || IsAliasedByBits(alias)) && AddBitNames(signal, bits) &&
-        AddBitNames(alias, aliasBits)) {
-        WriteAliasBits(bits, aliasBits);
-    } else {
-        statements_.WriteSignalAssignment(signal.GetNameView(), alias.GetNameView());
+    if (IsAliasedByBits(signal) || IsAliasedByBits(alias)) {
+        const std::optional<std::int64_t> count = CountBits(signal);
+        const std::optional<std::int64_t> aliasCount = CountBits(alias);
+        // What is listed stands in memory, so the narrower side may not be too wide either.
+        const std::int64_t narrower = std::min(count.value_or(0), aliasCount.value_or(0));
+        if (count && aliasCount && narrower <= Names::MostExpandedBits) {
+            StringArray bits;
+            StringArray aliasBits;
+            AddBitNames(signal, narrower, bits);
+            AddBitNames(alias, narrower, aliasBits);
+            WriteAliasBits(bits, aliasBits);
+            return;
+        }
     }
+    statements_.WriteSignalAssignment(signal.GetNameView(), alias.GetNameView());
 }
 
 void VhdlNetlister::Writer::WriteAliasBits(const StringArray& bits, const StringArray& aliasBits) {

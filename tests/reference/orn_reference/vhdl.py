@@ -22,7 +22,15 @@ from .attributes import (
 from .containment import on_one_line
 from .containers import StringSet
 from .header import write_header
-from .names import base_name, expand_bus, is_bus, parse_bus, single_bit, slice_name
+from .names import (
+    MAX_EXPANDED_BITS,
+    base_name,
+    expand_bus,
+    is_bus,
+    parse_bus,
+    single_bit,
+    slice_name,
+)
 from .netlist import Netlist, has_level_halvex, longest_attribute_name, longest_name
 from .objects import (
     BIDIRECTIONAL,
@@ -392,7 +400,11 @@ class VhdlNetlister:
         if _needs_bits(left) or _needs_bits(right):
             left_bits = _bits_of(left)
             right_bits = _bits_of(right)
-        if left_bits is None or right_bits is None:
+        if (
+            left_bits is None
+            or right_bits is None
+            or min(len(left_bits), len(right_bits)) > MAX_EXPANDED_BITS
+        ):
             self._put_bus(left.name)
             self._out.put(b" <= ")
             self._put_bus(right.name)
