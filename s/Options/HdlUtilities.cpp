@@ -1,3 +1,4 @@
+#include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Orn_Hdl/Model/Component.h"
 #include "Orn_Hdl/Options.h"
 #include "Orn_Hdl/Streams.h"
@@ -62,13 +63,18 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
     if (instance == nullptr) {
         return names;
     }
-    for (const Attribute* attribute : instance->GetAttrIterator()) {
+    IStringPtrMap<const Attribute*> known;
+    const auto add = [&names, &known](const Attribute* attribute) {
         names.Add(attribute->GetName());
+        known.Add(attribute->GetNameView(), attribute);
+    };
+    for (const Attribute* attribute : instance->GetAttrIterator()) {
+        add(attribute);
     }
     if (const Component* component = instance->GetComponent()) {
         for (const Attribute* attribute : component->GetAttrIterator()) {
-            if (!names.IContains(attribute->GetName())) {
-                names.Add(attribute->GetName());
+            if (!known.Contains(attribute->GetName().CStr())) {
+                add(attribute);
             }
         }
     }

@@ -1,5 +1,7 @@
 #include "Writers/Generics.h"
 
+#include "Orn_Hdl/Containers/StringPtrMap.h"
+
 namespace Orn_Hdl::Writers {
 
 namespace {
@@ -37,17 +39,21 @@ Attribute* GenericAttrs::FindInit() const {
 
 void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes) {
     attributes.Empty();
+    const Component* const component = instance.GetComponent();
+    const bool canHide = component != nullptr && component->HasAttrs();
+    // By their present names: the instance goes on finding a renamed attribute by its former one.
+    IStringPtrMap<const Attribute*> hiding;
     for (Attribute* attribute : instance.GetAttrIterator()) {
         attributes.Add(attribute);
+        if (canHide) {
+            hiding.Add(attribute->GetNameView(), attribute);
+        }
     }
-    const Component* const component = instance.GetComponent();
-    if (component == nullptr) {
-        return;
-    }
-    const bool canHide = instance.HasAttrs();
-    for (Attribute* attribute : component->GetAttrIterator()) {
-        if (!canHide || instance.GetAttr(attribute->GetName().CStr()) == nullptr) {
-            attributes.Add(attribute);
+    if (canHide) {
+        for (Attribute* attribute : component->GetAttrIterator()) {
+            if (!hiding.Contains(attribute->GetName().CStr())) {
+                attributes.Add(attribute);
+            }
         }
     }
 }

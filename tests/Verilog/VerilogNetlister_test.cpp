@@ -308,6 +308,17 @@ TEST(VerilogNetlisterTest, AnInstanceAttributeHidesTheComponentsEvenWhenItIsNotW
     EXPECT_TRUE(Holds(script.Verilog(), "\n   C U1 ();\nendmodule\n"));
 }
 
+TEST(VerilogNetlisterTest, AnInstanceAttributeHidesTheComponentsByItsPresentName) {
+    EngineScript script("ADD COMPONENT C\nADD INSTANCE C U1\n"
+                        "ADD COMPONENT ATTRIBUTE C A component\n"
+                        "SET COMPONENT ATTRIBUTE OPTION C A -GENERIC=SYN\n"
+                        "ADD INSTANCE ATTRIBUTE U1 B instance");
+    Instance* const instance = script.GetNetlist().GetInstance("U1");
+    EXPECT_FALSE(Holds(script.Verilog(), "\n   C U1 ();\nendmodule\n"));
+    instance->GetAttr("B")->SetName("a");
+    EXPECT_TRUE(Holds(script.Verilog(), "\n   C U1 ();\nendmodule\n"));
+}
+
 class HierarchicalInit : public testing::Test {
 protected:
     /// A design of one instance that has INIT; its name and the module's INIT vary.
