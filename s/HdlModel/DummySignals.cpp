@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <memory>
 #include <string>
+#include <unordered_set>
 
 namespace Orn_Hdl {
 
@@ -25,29 +26,46 @@ Signal* DummySignals::Find(const Signal* original) const noexcept {
     return found == dummyOf_.end() ? nullptr : found->second;
 }
 
-/// Whether this memory, or that of another netlist, holds the signal.
-bool DummySignals::IsKept(const Signal& signal) noexcept {
-    return signal.links_ != nullptr && signal.links_->keeper != nullptr;
+/// Whether the signal has a dummy already, or is none of this memory's business: the memory of
+/// another netlist knows it.
+bool DummySignals::IsKeptAsOriginal(const Signal& signal) const noexcept {
+    const DummySignals* const keeper = signal.links_ == nullptr ? nullptr : signal.links_->keeper;
+    return keeper != nullptr && (keeper != this || Find(&signal) != nullptr);
+}
+
+void DummySignals::Keep(Signal& signal) {
+    Signal::Links& links = signal.MakeLinks();
+    links.keeper = this;
+    ++links.timesKept;
+}
+
+void DummySignals::Release(Signal& signal) noexcept {
+    Signal::Links& links = *signal.links_;
+    if (--links.timesKept == 0) {
+        links.keeper = nullptr;
+    }
 }
 
 void DummySignals::Forget(const Signal* signal) noexcept {
-    const auto isAbout = [signal](const Entry& entry) {
-        return entry.original == signal || entry.dummy == signal;
-    };
+    if (signal->links_ == nullptr || signal->links_->keeper != this) {
+        return;
+    }
     const auto end = std::remove_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
-        if (isAbout(entry)) {
-            entry.original->links_->keeper = nullptr;
-            dummyOf_.erase(entry.original);
-            return true;
+        if (entry.original != signal && entry.dummy != signal) {
+            return false;
         }
-        return false;
+        dummyOf_.erase(entry.original);
+        Release(*entry.original);
+        Release(*entry.dummy);
+        return true;
     });
     entries_.erase(end, entries_.end());
 }
 
 void DummySignals::Clear() noexcept {
     for (const Entry& entry : entries_) {
-        entry.original->links_->keeper = nullptr;
+        Release(*entry.original);
+        Release(*entry.dummy);
     }
     entries_.clear();
     dummyOf_.clear();
@@ -62,12 +80,12 @@ void DummySignals::TakeOver(const Entry& entry) {
     if (!entry.forOutputs) {
         return;
     }
-    for (int i = 0; original.links_ != nullptr && i < original.links_->signals.GetSize();) {
-        Signal* const alias = original.links_->signals.GetAt(i);
-        if (alias == &dummy) {
-            ++i;
-        } else {
-            original.Disconnect(alias);
+    PtrArray<Signal*>& aliases = original.links_->signals;
+    for (int i = aliases.GetSize() - 1; i >= 0; --i) {
+        Signal* const alias = aliases.GetAt(i);
+        if (alias != &dummy) {
+            aliases.RemoveAt(i);
+            alias->DropReferrer(&original);
         }
     }
     if (!original.GetConstantValue().GetValue().IsEmpty()) {
@@ -81,20 +99,30 @@ void DummySignals::Link(const Entry& entry) {
     driven->Connect(driven == entry.original ? entry.dummy : entry.original);
 }
 
-void DummySignals::ReplaceInCompounds(const Entry& entry) {
-    if (entry.original->links_ == nullptr) {
-        return;
-    }
-    const std::vector<Signal*> referrers = entry.original->links_->referrers;
-    // The last first: that is where the original, which forgets each of them, looks first.
-    for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
-        if ((*referrer)->GetSignalType() != SignalTypeCompoundBus) {
-            continue;
+/// Puts the dummies in the place of their signals in all compounds that have one of these signals
+/// as a member; each compound is gone through once. \param firstEntry whose signals, and those of
+/// the entries behind it, tell the compounds.
+void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
+    std::unordered_set<const Signal*> met;
+    for (std::size_t i = firstEntry; i < entries_.size(); ++i) {
+        const std::vector<Signal*> referrers = entries_[i].original->links_->referrers;
+        // The last first: that is where the original, which forgets each of them, looks first.
+        for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
+            if ((*referrer)->GetSignalType() == SignalTypeCompoundBus &&
+                met.insert(*referrer).second) {
+                ReplaceMembers(static_cast<CompoundBus&>(**referrer), which);
+            }
         }
-        CompoundBus& compound = static_cast<CompoundBus&>(**referrer);
-        for (int i = 0; i < compound.GetSize(); ++i) {
-            if (compound.GetAt(i) == entry.original) {
-                compound.SetAt(i, entry.dummy);
+    }
+}
+
+void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
+    // From the end, for the same reason.
+    for (int i = compound.GetSize() - 1; i >= 0; --i) {
+        const Signal* const member = compound.GetAt(i);
+        if (which == Members::All || member->GetSignalType() != SignalTypeCompoundBus) {
+            if (Signal* dummy = Find(member)) {
+                compound.SetAt(i, dummy);
             }
         }
     }
@@ -102,9 +130,12 @@ void DummySignals::ReplaceInCompounds(const Entry& entry) {
 
 void DummySignals::Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs) {
     netlist.Add(dummy);
-    Signal::Links& links = original.MakeLinks();
+    // What can fail for want of memory comes first: both are told of their end from here on.
+    original.MakeLinks();
+    dummy->MakeLinks();
     entries_.push_back({&original, dummy, forOutputs});
-    links.keeper = this;
+    Keep(original);
+    Keep(*dummy);
     dummyOf_.emplace(&original, dummy);
     TakeOver(entries_.back());
 }
@@ -116,14 +147,13 @@ void DummySignals::MakeForScalar(Netlist& netlist, ScalarSignal& signal, bool fo
     }
     Adopt(netlist, signal, signal.CreateDummySignal(), forOutputs);
     Link(entries_.back());
-    ReplaceInCompounds(entries_.back());
 }
 
 void DummySignals::MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool forOutputs) {
     for (Signal* part : bus.GetBusSliceIterator()) {
         const int type = part->GetSignalType();
         const bool isPart = type == SignalTypeBusSlice || type == SignalTypeBusIndex;
-        if (!isPart || IsKept(*part) || IsNameTaken(netlist, *part)) {
+        if (!isPart || IsKeptAsOriginal(*part) || IsNameTaken(netlist, *part)) {
             continue;
         }
         Signal* const partDummy =
@@ -131,7 +161,6 @@ void DummySignals::MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool for
                 ? static_cast<Signal*>(static_cast<BusSlice*>(part)->CreateDummySignal(&dummy))
                 : static_cast<BusIndex*>(part)->CreateDummySignal(&dummy);
         Adopt(netlist, *part, partDummy, forOutputs);
-        ReplaceInCompounds(entries_.back());
     }
 }
 
@@ -144,7 +173,6 @@ void DummySignals::MakeForBus(Netlist& netlist, Bus& bus, bool forOutputs) {
     Bus* const dummy = bus.CreateDummySignal();
     Adopt(netlist, bus, dummy, forOutputs);
     Link(entries_.back());
-    ReplaceInCompounds(entries_.back());
     MakeForParts(netlist, bus, *dummy, forOutputs);
 }
 
@@ -161,6 +189,7 @@ void DummySignals::MakeForCompound(Netlist& netlist, CompoundBus& compound, bool
 }
 
 void DummySignals::Make(Netlist& netlist, const StringSet& names, bool forOutputs) {
+    const std::size_t firstEntry = entries_.size();
     std::vector<CompoundBus*> compounds;
     for (StringSetIterator i = names.GetBeginPos(); i != names.GetEndPos(); ++i) {
         Signal* const signal = netlist.GetSignal(i.GetView());
@@ -173,6 +202,7 @@ void DummySignals::Make(Netlist& netlist, const StringSet& names, bool forOutput
             MakeForBus(netlist, *bus, forOutputs);
         }
     }
+    ReplaceInCompounds(firstEntry, Members::NoCompounds);
     for (CompoundBus* compound : compounds) {
         MakeForCompound(netlist, *compound, forOutputs);
     }
@@ -183,12 +213,12 @@ void DummySignals::Refresh(Netlist& netlist) {
     for (std::size_t i = 0; i < entries_.size(); ++i) {
         const Entry entry = entries_[i];
         TakeOver(entry);
-        ReplaceInCompounds(entry);
         if (entry.original->GetSignalType() == SignalTypeBus) {
             MakeForParts(netlist, static_cast<Bus&>(*entry.original),
                          static_cast<Bus&>(*entry.dummy), entry.forOutputs);
         }
     }
+    ReplaceInCompounds(0, Members::All);
 }
 
 } // namespace Orn_Hdl

@@ -4,6 +4,7 @@
 
 #include "Orn_Hdl/Model/Netlist.h"
 
+#include <cstddef>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
@@ -44,10 +45,14 @@ private:
     void MakeForCompound(Netlist& netlist, CompoundBus& compound, bool forOutputs);
     /// Adds a dummy to the netlist and to the memory, and lets it take over for the first time.
     void Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs);
-    static bool IsKept(const Signal& signal) noexcept;
+    void Keep(Signal& signal);
+    static void Release(Signal& signal) noexcept;
+    bool IsKeptAsOriginal(const Signal& signal) const noexcept;
     static void TakeOver(const Entry& entry);
     static void Link(const Entry& entry);
-    static void ReplaceInCompounds(const Entry& entry);
+    enum class Members { All, NoCompounds };
+    void ReplaceInCompounds(std::size_t firstEntry, Members which);
+    void ReplaceMembers(CompoundBus& compound, Members which);
 
     /// In the order in which the dummies were made.
     std::vector<Entry> entries_;

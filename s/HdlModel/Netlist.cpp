@@ -45,13 +45,20 @@ constexpr NameGroup GroupOf(const Signal* /*signal*/) noexcept {
     return SignalGroup;
 }
 
-/// What is removed was mostly added last.
-template <class T> int LastIndexOf(const PtrArray<T*>& objects, const T* object) noexcept {
-    int i = objects.GetSize() - 1;
-    while (i >= 0 && objects.GetAt(i) != object) {
-        --i;
+/// Below zero when the object is not there. What is removed was mostly added last, or is removed in
+/// the order in which it was added: both ends are searched at once.
+template <class T> int PlaceOf(const PtrArray<T*>& objects, const T* object) noexcept {
+    int first = 0;
+    int last = objects.GetSize() - 1;
+    for (; first <= last; ++first, --last) {
+        if (objects.GetAt(last) == object) {
+            return last;
+        }
+        if (objects.GetAt(first) == object) {
+            return first;
+        }
     }
-    return i;
+    return -1;
 }
 
 int ToLength(std::size_t length) noexcept {
@@ -98,14 +105,23 @@ struct Netlist::Implementation {
         return true;
     }
 
-    template <class T> void Destroy(T* object, OwnPtrArray<T*>& objects) {
-        const int place = object == nullptr ? -1 : LastIndexOf<T>(objects, object);
+    template <class T> void Remove(T* object, OwnPtrArray<T*>& objects) {
+        const int place = object == nullptr ? -1 : PlaceOf<T>(objects, object);
         if (place >= 0) {
+            Forget(object);
             byName.Remove(object, GroupOf(object));
             objects.RemoveAt(place);
             delete object;
         }
     }
+
+    void Forget(Signal* signal) noexcept {
+        dummies.Forget(signal);
+        if (signal->GetSignalType() == SignalTypeBus) {
+            busesByBaseName.Remove(static_cast<Bus*>(signal));
+        }
+    }
+    void Forget(Object* /*object*/) noexcept {}
 };
 
 Netlist::Netlist(const char* name)
@@ -154,23 +170,15 @@ void Netlist::Add(Component* component) {
 }
 
 void Netlist::Remove(Signal* signal) {
-    Implementation& own = *implementation_;
-    if (signal == nullptr || LastIndexOf<Signal>(own.signals, signal) < 0) {
-        return;
-    }
-    own.dummies.Forget(signal);
-    if (signal->GetSignalType() == SignalTypeBus) {
-        own.busesByBaseName.Remove(static_cast<Bus*>(signal));
-    }
-    own.Destroy(signal, own.signals);
+    implementation_->Remove(signal, implementation_->signals);
 }
 
 void Netlist::Remove(Instance* instance) {
-    implementation_->Destroy(instance, implementation_->instances);
+    implementation_->Remove(instance, implementation_->instances);
 }
 
 void Netlist::Remove(Component* component) {
-    implementation_->Destroy(component, implementation_->components);
+    implementation_->Remove(component, implementation_->components);
 }
 
 Signal* Netlist::GetSignal(std::string_view name) const noexcept {
@@ -275,11 +283,20 @@ bool Netlist::MayHaveFeedBack(bool outputPorts) const {
     const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
     const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;
     for (const Signal* signal : GetSignalIterator()) {
+        const int type = signal->GetSignalType();
         // A compound has a polarity of its own only when its members agree; any member counts here.
-        const bool isCandidate = signal->GetSignalType() == SignalTypeCompoundBus ||
-                                 signal->GetPortPolarity().GetValue() == portPolarity;
-        if (isCandidate && signal->HasPinOf(pinPolarity)) {
+        const bool isCandidate =
+            type == SignalTypeCompoundBus || signal->GetPortPolarity().GetValue() == portPolarity;
+        if ((isCandidate && signal->HasPinOf(pinPolarity)) || signal->HasLooseCompound()) {
             return true;
+        }
+        if (isCandidate && type == SignalTypeBus) {
+            // The netlist need not hold the parts of its buses.
+            for (const Signal* part : static_cast<const Bus*>(signal)->GetBusSliceIterator()) {
+                if (part->HasPinOf(pinPolarity) || part->HasLooseCompound()) {
+                    return true;
+                }
+            }
         }
     }
     return false;

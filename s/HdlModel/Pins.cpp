@@ -93,9 +93,20 @@ bool Pin::IsListedBy(const Signal* signal) const noexcept {
         return HasFlag(ListedFlag);
     }
     const ObjectDetails* const details = GetDetails();
-    return details != nullptr &&
-           std::find(details->formerSignals.begin(), details->formerSignals.end(), signal) !=
-               details->formerSignals.end();
+    if (details == nullptr) {
+        return false;
+    }
+    // Whichever side knows fewer of the other tells.
+    const auto& former = details->formerSignals;
+    if (former.size() <= static_cast<std::size_t>(signal->pins_.GetSize())) {
+        return std::find(former.begin(), former.end(), signal) != former.end();
+    }
+    for (const Pin* pin : signal->GetPinIterator()) {
+        if (pin == this) {
+            return true;
+        }
+    }
+    return false;
 }
 
 void Pin::NoteUnlisted(Signal* signal) noexcept {
@@ -103,7 +114,11 @@ void Pin::NoteUnlisted(Signal* signal) noexcept {
         SetFlag(ListedFlag, false);
     } else if (ObjectDetails* details = GetDetails()) {
         auto& former = details->formerSignals;
-        former.erase(std::remove(former.begin(), former.end(), signal), former.end());
+        const auto found = std::find(former.begin(), former.end(), signal);
+        if (found != former.end()) {
+            *found = former.back();
+            former.pop_back();
+        }
     }
 }
 
@@ -124,7 +139,9 @@ void Pin::Connect(Signal* signal) {
 void Pin::PrepareToLeave() {
     if (signal_ != nullptr && HasFlag(ListedFlag)) {
         auto& former = MakeDetails().formerSignals;
-        former.reserve(former.size() + 1);
+        if (former.size() == former.capacity()) {
+            former.reserve(std::max<std::size_t>(1, former.size() * 2));
+        }
     }
 }
 

@@ -16,9 +16,11 @@ struct Signal::Links {
     std::vector<Signal*> referrers;
     /// Pins that point at this signal without being listed.
     std::vector<Pin*> unlistedPins;
-    /// Who remembers that a dummy stands in for this signal, and is told when it ends; null for
-    /// nobody.
+    /// Who remembers this signal, as a dummy or as one for which a dummy stands in, and is told
+    /// when it ends; null for nobody.
     DummySignals* keeper = nullptr;
+    /// How often it does.
+    int timesKept = 0;
 };
 
 } // namespace Orn_Hdl

@@ -3,6 +3,7 @@
 #include "HdlModel/DummySignals.h"
 #include "HdlModel/Names.h"
 #include "HdlModel/ObjectDetails.h"
+#include "HdlModel/ObjectKey.h"
 #include "HdlModel/SignalLinks.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
@@ -266,6 +267,14 @@ bool Signal::HasPinOf(int polarity) const noexcept {
            std::any_of(links_->unlistedPins.begin(), links_->unlistedPins.end(), matches);
 }
 
+bool Signal::HasLooseCompound() const noexcept {
+    const auto isLooseCompound = [](const Signal* referrer) {
+        return referrer->GetSignalType() == SignalTypeCompoundBus && !OwnedFlag::Get(*referrer);
+    };
+    return links_ != nullptr &&
+           std::any_of(links_->referrers.begin(), links_->referrers.end(), isLooseCompound);
+}
+
 void Signal::ReplaceReference(Signal* from, Signal* to) {
     const int index = links_ == nullptr ? -1 : links_->signals.GetIndex(from);
     if (index < 0) {
@@ -289,9 +298,10 @@ void Signal::ReplaceEverywhereBy(Signal* other) {
     for (Pin* pin : pins) {
         pin->Connect(other);
     }
+    // The last first: that is where this signal, which forgets each of them, looks first.
     const std::vector<Signal*> referrers = links_->referrers;
-    for (Signal* referrer : referrers) {
-        referrer->ReplaceReference(this, other);
+    for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
+        (*referrer)->ReplaceReference(this, other);
     }
 }
 

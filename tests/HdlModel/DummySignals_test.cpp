@@ -428,6 +428,32 @@ TEST_F(DummySignals, OfCompoundsComeAfterAllOthers) {
               (Names{"A_DUMMY", "B_DUMMY"}));
 }
 
+TEST_F(DummySignals, AreMadeForUsesThroughPartsAndCompoundsThatNoNetlistHolds) {
+    Bus* const bus = AddBus("D(7:0)", Out);
+    Bus* const driven = AddBus("E(7:0)", In);
+    ScalarSignal* const scalar = AddScalar("Y", Out);
+    {
+        BusIndex bit("D(3)", bus);
+        bit.Connect(AddBuffer("U1")->GetPin("I"));
+        netlist_.CreateVhdlDummySignals();
+        EXPECT_NE(Get("D_DUMMY(7:0)"), nullptr);
+        EXPECT_NE(Get("D_DUMMY(3)"), nullptr);
+    }
+    {
+        BusSlice slice("E(3:0)", driven);
+        slice.Connect(AddBuffer("U2")->GetPin("O"));
+        netlist_.CreateVerilogDummySignals();
+        EXPECT_NE(Get("E_DUMMY(7:0)"), nullptr);
+    }
+    CompoundBus compound("Y,A");
+    compound.AddBusMember(scalar);
+    compound.AddBusMember(AddScalar("A"));
+    compound.Connect(AddBuffer("U3")->GetPin("I"));
+    netlist_.CreateVhdlDummySignals();
+    EXPECT_NE(Get("Y_DUMMY"), nullptr);
+    EXPECT_EQ(compound.GetAt(0), Get("Y_DUMMY"));
+}
+
 TEST_F(DummySignals, APartThatNoNetlistHoldsMayEnd) {
     Bus* const bus = AddBus("D(7:0)", Out);
     auto part = std::make_unique<BusIndex>("D(3)", bus);

@@ -204,6 +204,16 @@ TEST_F(ModelTest, ConnectSignalToPinNamesWhatIsMissing) {
                   [&] { model_.ConnectSignalToPin("N1", nullptr, "A"); });
 }
 
+TEST_F(ModelTest, ConnectSignalsKnowsARenamedSignalByTheNameUnderWhichItWasAdded) {
+    model_.AddSignal("A");
+    model_.AddSignal("B");
+    Signal* const renamed = Get("A");
+    renamed->SetName("B");
+    ExpectChange([&] { return model_.ConnectSignals("A", "X"); });
+    EXPECT_EQ(NamesOf(renamed->GetSignalIterator()), Names{"X"});
+    EXPECT_EQ(NamesOf(Get("B")->GetSignalIterator()), Names());
+}
+
 TEST_F(ModelTest, ConnectSignalsIsOneWay) {
     ExpectChange([&] { return model_.ConnectSignals("A", "B"); });
     EXPECT_EQ(Signals(), (Names{"A", "B"}));

@@ -159,4 +159,114 @@ TEST(Sizes, SignalsOnManyListsAreRemovedInAnyOrder) {
     EXPECT_EQ(Length(netlist.GetSignalIterator()), Count);
 }
 
+/// A line that names so many things in a row.
+template <class Name> std::string Row(int count, Name name) {
+    std::string row;
+    for (int i = 0; i < count; ++i) {
+        row.append(i == 0 ? "" : ",").append(name(i));
+    }
+    return row;
+}
+
+TEST(Sizes, NamesThatDifferInPunctuationAlone) {
+    EngineScript script;
+    std::string lines;
+    for (unsigned i = 0; i < 1U << 16U; ++i) {
+        std::string name = "n";
+        for (unsigned bit = 1; bit < 1U << 16U; bit *= 2) {
+            name += (i & bit) == 0 ? "_" : "$";
+        }
+        lines.append("ADD SIGNAL ").append(name).append("\n");
+        lines.append("ADD MODULE ATTRIBUTE ").append(name).append(" 1\n");
+    }
+    script.Run(lines);
+    EXPECT_EQ(Length(script.GetNetlist().GetSignalIterator()), 1 << 16);
+}
+
+TEST(Sizes, ManyBusesAreWidened) {
+    constexpr int Count = 30'000;
+    EngineScript script;
+    std::string lines;
+    for (const char* range : {"(3:0)", "(7:0)"}) {
+        for (int i = 0; i < Count; ++i) {
+            lines += "CONNECT SIGNAL b" + std::to_string(i) + range + " x\n";
+        }
+    }
+    script.Run(lines);
+    EXPECT_EQ(Length(script.GetNetlist().GetSignalIterator()), 2 * Count + 1);
+}
+
+TEST(Sizes, APinIsWiredToManyNets) {
+    constexpr int Count = 60'000;
+    EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U");
+    std::string lines;
+    for (int time = 0; time < 2; ++time) {
+        for (int i = 0; i < Count; ++i) {
+            lines += "CONNECT SIGNAL n" + std::to_string(i) + " U.I\n";
+        }
+    }
+    script.Run(lines);
+    EXPECT_EQ(Length(script.GetModel().GetSignal("n0")->GetPinIterator()), 1);
+}
+
+TEST(Sizes, ACompoundOfOutputPortsThatIsReadInside) {
+    constexpr int Count = 100'000;
+    EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD PIN C J input\nADD PIN C K input\n"
+                        "ADD INSTANCE C U\nADD PORT y output\nADD PORT d(100000:0) output");
+    std::string lines;
+    for (int i = 0; i < Count; ++i) {
+        lines += "ADD PORT p" + std::to_string(i) + " output\n";
+    }
+    script.Run(lines);
+    script.Run("CONNECT SIGNAL " + Row(Count, [](int) { return std::string("y"); }) + " U.I");
+    script.Run("CONNECT SIGNAL " +
+               Row(Count, [](int i) { return "d(" + std::to_string(i) + ")"; }) + " U.J");
+    script.Run("CONNECT SIGNAL " + Row(Count, [](int i) { return "p" + std::to_string(i); }) +
+               " U.K");
+    EXPECT_EQ(CountOf(script.Vhdl(), "  signal p"), std::size_t(Count));
+}
+
+TEST(Sizes, AnOutputPortThatIsReadInsideHasManyAliases) {
+    constexpr int Count = 200'000;
+    EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U\n"
+                        "ADD PORT y output\nCONNECT SIGNAL y U.I");
+    std::string lines;
+    for (int i = 0; i < Count; ++i) {
+        lines += "CONNECT SIGNAL y a" + std::to_string(i) + "\n";
+    }
+    script.Run(lines);
+    EXPECT_EQ(CountOf(script.Vhdl(), "y_DUMMY <= a"), std::size_t(Count));
+}
+
+TEST(Sizes, AWideCompoundIsAliasedWithABit) {
+    const std::string wide = Row(200, [](int) { return std::string("d(1048575:0)"); });
+    EngineScript script;
+    script.Run("ADD SIGNAL d(1048575:0)\nCONNECT SIGNAL x " + wide + "\nCONNECT SIGNAL " + wide +
+               " y\nASSIGN CONSTANT " + wide + " 10");
+    const std::string text = script.Vhdl();
+    EXPECT_LT(text.size(), 10'000U);
+    EXPECT_EQ(CountOf(text, "x <= d(1048575);"), 1U);
+    EXPECT_EQ(CountOf(text, "d(1048575) <= y;"), 1U);
+}
+
+TEST(Sizes, SignalsAreRemovedInTheOrderInWhichTheyWereAdded) {
+    constexpr int Count = 30'000;
+    EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U");
+    std::string lines;
+    for (int i = 0; i < Count; ++i) {
+        const std::string number = std::to_string(i);
+        lines += "ADD PORT p" + number + " output\nCONNECT SIGNAL p" + number + " U.I\n";
+        lines +=
+            "ADD INSTANCE C U" + number + "\nCONNECT SIGNAL p" + number + " U" + number + ".I\n";
+    }
+    script.Run(lines);
+    Orn_Hdl::Netlist& netlist = script.GetNetlist();
+    netlist.CreateVhdlDummySignals();
+    for (int i = 0; i < Count; ++i) {
+        netlist.Remove(netlist.GetInstance("U" + std::to_string(i)));
+        netlist.Remove(netlist.GetSignal("p" + std::to_string(i)));
+    }
+    EXPECT_EQ(Length(netlist.GetSignalIterator()), Count);
+}
+
 } // namespace

@@ -128,6 +128,8 @@ private:
     void TakeCommentOf(const Signal& other);
     /// Whether a pin of that polarity, or a bidirectional one, points at this signal.
     bool HasPinOf(int polarity) const noexcept;
+    /// Whether a compound that no netlist holds has this signal as a member.
+    bool HasLooseCompound() const noexcept;
     virtual void ReplaceReference(Signal* from, Signal* to);
     void MarkDying() noexcept { SetFlag(DyingFlag, true); }
 
