@@ -26,8 +26,9 @@ std::size_t BucketCountFor(std::size_t least) noexcept {
 
 } // namespace
 
-NameTable::NameTable(const NameTable& other)
-    : ignoringCase_(other.ignoringCase_), buckets_(other.buckets_.size()) {
+// Copies into a table that is whole, so that what was copied ends when the rest finds no memory.
+NameTable::NameTable(const NameTable& other) : NameTable(other.ignoringCase_) {
+    buckets_.resize(other.buckets_.size());
     Node** tail = &head_;
     for (const Node* node = other.head_; node != nullptr; node = node->next) {
         *tail = new Node{nullptr, node->hash, node->name};

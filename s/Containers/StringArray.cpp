@@ -120,8 +120,9 @@ void StringArray::SetAt(int i, const Port::StringBase<char>& text) {
     }
     Slot& slot = slots_[index];
     if (text.GetLength() > slot.length) {
-        slot.start = text_.size();
+        const std::size_t start = text_.size();
         text_.append(text.GetView());
+        slot.start = start;
     } else {
         text_.replace(slot.start, text.GetLength(), text.GetView());
     }

@@ -56,9 +56,10 @@ struct ComponentAnchor {
     }
 };
 
-Component::Component(const char* name)
-    : Object(ObjectTypeComponent), anchor_(new ComponentAnchor{this, 1}) {
+Component::Component(const char* name) : Object(ObjectTypeComponent), anchor_(nullptr) {
     Object::SetName(name);
+    // Last: nobody would give it back if the name found no memory.
+    anchor_ = new ComponentAnchor{this, 1};
 }
 
 Component::~Component() {

@@ -755,7 +755,9 @@ bool BusIndex::ParseBusIndexName(const char* name, Port::StringBase<char>& base,
     return true;
 }
 
-CompoundBus::CompoundBus(const char* name, const PtrArray<Signal*>& members) : Signal(name) {
+// The members are added to a compound that is whole: when one of them finds no memory, it ends as
+// any other does, and leaves those that it has.
+CompoundBus::CompoundBus(const char* name, const PtrArray<Signal*>& members) : CompoundBus(name) {
     for (int i = 0; i < members.GetSize(); ++i) {
         AddBusMember(members.GetAt(i));
     }

@@ -1,5 +1,5 @@
-// Whichever allocation of a whole run fails: what comes out is std::bad_alloc or a message, nothing
-// leaks, and the engine can be used on and ends.
+// Whichever allocation of a whole run, or of making one object, fails: what comes out is
+// std::bad_alloc or a message, nothing leaks, and the engine can be used on and ends.
 #include "Robustness/MidSizedDesign.h"
 #include "Support/EngineScript.h"
 #include "Support/TemporaryFolder.h"
@@ -9,6 +9,7 @@
 #include <atomic>
 #include <cerrno>
 #include <cstdlib>
+#include <memory>
 #include <new>
 #include <string>
 #include <sys/mman.h>
@@ -154,6 +155,70 @@ bool RunOnce(const std::string& file, long allocations) {
     }
     allowed = -1;
     return failed;
+}
+
+/// Carries out an action again and again, its first allocation failing, then its second, and so on,
+/// until none is left that could fail.
+template <class Action> void FailInTurn(const Action& action) {
+    bool failed = true;
+    for (long count = 0; failed; ++count) {
+        const long before = alive;
+        allowed = count;
+        try {
+            action();
+            failed = false;
+        } catch (const std::bad_alloc&) {
+            // Whatever it left behind is counted below.
+        }
+        allowed = -1;
+        ASSERT_EQ(alive, before) << "allocation " << count << " failed, and something leaked";
+        ASSERT_TRUE(failed || count > 0) << "the action makes some allocations";
+    }
+}
+
+constexpr const char* LongName = "a name that is too long for the object that bears it";
+
+TEST(Allocation, AComponentThatIsNotMadeLeavesNothingBehind) {
+    FailInTurn([] { const Orn_Hdl::Component component(LongName); });
+}
+
+TEST(Allocation, ACompoundThatIsNotMadeIsForgottenByItsMembers) {
+    Orn_Hdl::PtrArray<Orn_Hdl::Signal*> members;
+    FailInTurn([&] {
+        // These end after the compound that could not be made.
+        const auto first = std::make_unique<Orn_Hdl::ScalarSignal>("A");
+        const auto second = std::make_unique<Orn_Hdl::ScalarSignal>("B");
+        members.Empty();
+        members.Add(first.get());
+        members.Add(second.get());
+        const auto compound = std::make_unique<Orn_Hdl::CompoundBus>("A,B", members);
+    });
+    members.Empty();
+}
+
+TEST(Allocation, ASetThatIsNotCopiedLeavesNothingBehind) {
+    Orn_Hdl::StringSet set;
+    for (const char* name : {"A", "b", LongName}) {
+        set.Add(name);
+    }
+    FailInTurn([&] { const Orn_Hdl::StringSet copy(set); });
+}
+
+TEST(Allocation, ATextThatFindsNoRoomLeavesTheListAsItWas) {
+    Orn_Hdl::StringArray texts;
+    texts.Add("first");
+    texts.Add("second");
+    const Port::String longer(std::string(1000, 'x'));
+    FailInTurn([&] {
+        Orn_Hdl::StringArray copy = texts;
+        try {
+            copy.SetAt(0, longer);
+        } catch (const std::bad_alloc&) {
+            EXPECT_EQ(copy.GetView(0), "first");
+            EXPECT_EQ(copy.GetView(1), "second");
+            throw;
+        }
+    });
 }
 
 TEST(Allocation, AnyOneMayFail) {
