@@ -79,12 +79,12 @@ void TextFileDst::Flush() {
     if (!IsOpen()) {
         return;
     }
-    if (!GetLine().empty()) {
-        // The text goes on in a new line, which begins when something is written into it.
-        Append("\n");
-        StartLine();
-    }
+    // The text goes on in a new line, which begins when something is written into it. The line end
+    // is not put into the buffer, which could have to grow: this also runs when a stream ends.
+    const bool endsLine = !GetLine().empty();
+    StartLine();
     SendLines();
+    Send(endsLine ? "\n" : "");
 }
 
 /// After a failure nothing more is sent: a file with a hole in it would be worse than a short one.
