@@ -26,7 +26,7 @@ cmake --preset asan
 cmake --build --preset asan -j "$jobs"
 
 step "tests under AddressSanitizer and UndefinedBehaviorSanitizer"
-ctest --preset asan -j "$jobs" --exclude-regex '^(flow|install|docs|judges|packaging|bench)\.'
+ctest --preset asan -j "$jobs" --exclude-regex '^(flow|install|docs|judges)\.'
 
 step "tests"
 ctest --preset release -j "$jobs"
