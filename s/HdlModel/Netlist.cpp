@@ -7,6 +7,7 @@
 #include "HdlModel/Names.h"
 #include "HdlModel/NaturalSort.h"
 #include "HdlModel/ObjectKey.h"
+#include "HdlModel/Primitives.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
@@ -268,9 +269,7 @@ void Netlist::ConnectOpenPinToDummy() {
 
 void Netlist::SetBoxTypeAttribute() {
     for (Component* component : GetComponentIterator()) {
-        const Attribute* const level = component->GetAttr("Level");
-        if (level != nullptr && Port::EqualIgnoringCase(level->GetValueString(), "HALVEX") &&
-            component->GetAttr("BOX_TYPE") == nullptr) {
+        if (IsPrimitive(*component) && component->GetAttr("BOX_TYPE") == nullptr) {
             std::unique_ptr<Attribute> boxType(AttributeFactory::GetCreators().Get(
                 Attribute::DEFAULT_ATTRTYPE)("BOX_TYPE", "BLACK_BOX"));
             boxType->SetSynAttr("ASSIGN");

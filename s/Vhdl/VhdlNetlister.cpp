@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Vhdl.h"
 
 #include "HdlModel/Names.h"
+#include "HdlModel/Primitives.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/Generics.h"
@@ -110,12 +111,6 @@ void AddBitNames(const Signal& signal, std::int64_t most, StringArray& bits) {
 
 bool IsBinary(string_view digits) {
     return digits.find_first_not_of("01") == string_view::npos;
-}
-
-/// Cells of the primitive library need no configuration.
-bool NeedsConfiguration(const Component& component) {
-    const Attribute* const level = component.GetAttr("Level");
-    return level == nullptr || !Names::IsNamed(level->GetValueString().GetView(), "HALVEX");
 }
 
 } // namespace
@@ -543,8 +538,9 @@ void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
     PutLine(out_, "for", " ", "BEHAVIORAL");
     out_.Indent();
     for (const Component* component : netlist_.GetComponentIterator()) {
+        // Cells of the primitive library need no configuration.
         const std::vector<const Instance*>& placed = instances.GetInstances(component);
-        if (!placed.empty() && NeedsConfiguration(*component)) {
+        if (!placed.empty() && !IsPrimitive(*component)) {
             WriteConfigurationItem(*component, placed);
         }
     }
