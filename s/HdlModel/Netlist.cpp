@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Model/Netlist.h"
 
+#include "Containers/PlaceOf.h"
 #include "HdlModel/DummySignals.h"
 #include "HdlModel/Foresight.h"
 #include "HdlModel/NameIndex.h"
@@ -44,22 +45,6 @@ constexpr NameGroup GroupOf(const Instance* /*instance*/) noexcept {
 }
 constexpr NameGroup GroupOf(const Signal* /*signal*/) noexcept {
     return SignalGroup;
-}
-
-/// Below zero when the object is not there. What is removed was mostly added last, or is removed in
-/// the order in which it was added: both ends are searched at once.
-template <class T> int PlaceOf(const PtrArray<T*>& objects, const T* object) noexcept {
-    int first = 0;
-    int last = objects.GetSize() - 1;
-    for (; first <= last; ++first, --last) {
-        if (objects.GetAt(last) == object) {
-            return last;
-        }
-        if (objects.GetAt(first) == object) {
-            return first;
-        }
-    }
-    return -1;
 }
 
 int ToLength(std::size_t length) noexcept {

@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Model/Signals.h"
 
+#include "Containers/PlaceOf.h"
 #include "HdlModel/DummySignals.h"
 #include "HdlModel/Names.h"
 #include "HdlModel/ObjectDetails.h"
@@ -23,14 +24,6 @@ template <class T> void EraseOne(std::vector<T*>& list, const T* element) noexce
         *found = list.back();
         list.pop_back();
     }
-}
-
-int LastIndexOf(const PtrArray<Pin*>& pins, const Pin* pin) noexcept {
-    int i = pins.GetSize() - 1;
-    while (i >= 0 && pins.GetAt(i) != pin) {
-        --i;
-    }
-    return i;
 }
 
 } // namespace
@@ -116,7 +109,7 @@ void Signal::RemoveUnlistedPin(const Pin* pin) noexcept {
 }
 
 void Signal::Unlist(Pin* pin) noexcept {
-    pins_.RemoveAt(LastIndexOf(pins_, pin));
+    pins_.RemoveAt(PlaceOf<Pin>(pins_, pin));
 }
 
 void Signal::Connect(Pin* pin) {
@@ -515,14 +508,11 @@ void Bus::TakeParts(Bus& other) {
 
 void Bus::RemoveBusSlice(Signal* slice) {
     PtrArray<Signal*>& slices = parts_->slices;
-    int i = slices.GetSize() - 1;
-    while (i >= 0 && slices.GetAt(i) != slice) {
-        --i;
-    }
-    if (i < 0) {
+    const int place = PlaceOf<Signal>(slices, slice);
+    if (place < 0) {
         return;
     }
-    slices.RemoveAt(i);
+    slices.RemoveAt(place);
     if (Parts** link = PartsLink(slice)) {
         *link = nullptr;
     } else {
