@@ -13,6 +13,9 @@ namespace Orn_Hdl::Names {
 /// The most bits that one name is ever expanded into.
 constexpr std::int64_t MostExpandedBits = 1048576;
 
+/// What the name of a signal that stands in for another one ends in.
+constexpr std::string_view DummySuffix = "_DUMMY";
+
 /// One character of a name in its normalised form.
 constexpr char Normalized(char c) noexcept {
     switch (c) {

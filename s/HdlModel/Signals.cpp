@@ -305,7 +305,7 @@ void ScalarSignal::AcceptSignal(SignalVisitor& visitor) {
 
 namespace {
 
-constexpr std::string_view DummySuffix = "_DUMMY";
+using Names::DummySuffix;
 
 bool EndsInDummySuffix(std::string_view name) noexcept {
     return name.size() >= DummySuffix.size() &&

@@ -1,3 +1,4 @@
+#include "HdlModel/Names.h"
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Orn_Hdl/Model/Component.h"
 #include "Orn_Hdl/Options.h"
@@ -37,10 +38,10 @@ const Text HdlUtilities::AddDummySuffix(const char* name) {
     const std::size_t open = text.find('(');
     const std::size_t close = text.find(')');
     if (open == std::string_view::npos || close == std::string_view::npos) {
-        return std::string(text).append("_DUMMY");
+        return std::string(text).append(Names::DummySuffix);
     }
     std::string result(text.substr(0, open));
-    result.append("_DUMMY");
+    result.append(Names::DummySuffix);
     if (close > open) {
         result.append(text.substr(open, close - open + 1));
     }
