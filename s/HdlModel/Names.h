@@ -1,5 +1,5 @@
-// What names mean: the scanners behind every rule that reads a name. All of them take views, keep
-// no copies, run in one pass without recursion, and so hold up at names of any length.
+// What names mean: the scanners behind every rule that reads a name. All of them take views and run
+// in one pass without recursion, and so hold up at names of any length.
 #pragma once
 
 #include "Port/Ascii.h"
@@ -40,7 +40,10 @@ void Normalize(std::string& name) noexcept;
 /// A normalised view of a text, copied only when the text is not normalised already.
 class NormalizedText {
 public:
+    /// \param text must outlive this.
     explicit NormalizedText(std::string_view text);
+    NormalizedText(const NormalizedText&) = delete;
+    NormalizedText& operator=(const NormalizedText&) = delete;
     std::string_view GetView() const noexcept { return view_; }
 
 private:
