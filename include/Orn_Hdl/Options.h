@@ -109,8 +109,8 @@ public:
     /// A null instance gives an empty list.
     static const StringArray GetAttrNames(const Instance* instance);
     /// Writes the header banner.
-    /// \param commentStyle true for VHDL comments, false for Verilog's.
-    static void WriteHeader(const Port::StringBase<char>& designName, bool commentStyle,
+    /// \param vhdlComments true for VHDL comments, false for Verilog's.
+    static void WriteHeader(const Port::StringBase<char>& designName, bool vhdlComments,
                             const HdlOptions& options, OutStream& out);
 };
 

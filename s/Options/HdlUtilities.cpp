@@ -82,12 +82,12 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
     return names;
 }
 
-void HdlUtilities::WriteHeader(const Text& designName, bool commentStyle, const HdlOptions& options,
+void HdlUtilities::WriteHeader(const Text& designName, bool vhdlComments, const HdlOptions& options,
                                OutStream& out) {
     const auto* const file = dynamic_cast<const TextFileOutStream*>(&out);
     NetlistHeader(options.application, file == nullptr ? Text() : file->GetFileName(),
                   options.command, designName, options.device, options.purpose, options.reference,
-                  commentStyle, out)
+                  vhdlComments, out)
         .Write();
 }
 
