@@ -6,9 +6,7 @@
 #include <cstdint>
 #include <cstring>
 
-namespace Orn_Hdl {
-
-namespace EightBytes {
+namespace Orn_Hdl::EightBytes {
 
 constexpr std::uint64_t Each(unsigned byte) noexcept {
     return byte * 0x0101010101010101U;
@@ -57,6 +55,4 @@ inline std::uint64_t LoadShort(const char* text, std::size_t size) noexcept {
     return size == 0 ? 0 : at(0) | at(size / 2) << 8U | at(size - 1) << 16U;
 }
 
-} // namespace EightBytes
-
-} // namespace Orn_Hdl
+} // namespace Orn_Hdl::EightBytes

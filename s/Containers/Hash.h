@@ -1,5 +1,5 @@
-// The hash that decides the order of names in a set: h = h * 33 + byte from 5381, bytes taken as
-// signed, in 32 bits.
+// The hash that the walk order of `NameTable` is made of: h = h * 33 + byte from 5381, bytes taken
+// as signed, in 32 bits. Look-ups whose order nobody sees use `HashByEights`, which is faster.
 #pragma once
 
 #include "Port/Ascii.h"
