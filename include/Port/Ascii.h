@@ -41,6 +41,19 @@ constexpr bool EqualIgnoringCase(std::string_view a, std::string_view b) noexcep
     return true;
 }
 
+/// Below, at or above zero as one text sorts before, with or after another, the case of ASCII
+/// letters ignored and bytes taken as unsigned.
+constexpr int OrderIgnoringCase(std::string_view a, std::string_view b) noexcept {
+    for (std::size_t i = 0; i < a.size() && i < b.size(); ++i) {
+        const auto x = static_cast<unsigned char>(ToUpper(a[i]));
+        const auto y = static_cast<unsigned char>(ToUpper(b[i]));
+        if (x != y) {
+            return x < y ? -1 : 1;
+        }
+    }
+    return a.size() == b.size() ? 0 : (a.size() < b.size() ? -1 : 1);
+}
+
 /// The text of a possibly null pointer: null reads as the empty text.
 constexpr std::string_view ViewOf(const char* text) noexcept {
     return text == nullptr ? std::string_view() : std::string_view(text);

@@ -18,18 +18,7 @@ int ToIndex(std::size_t position) noexcept {
 } // namespace
 
 template <class Char> int StringBase<Char>::Compare(View other, CompareType type) const noexcept {
-    if (type == CompareExact) {
-        return GetView().compare(other);
-    }
-    const std::size_t common = std::min(text_.size(), other.size());
-    for (std::size_t i = 0; i < common; ++i) {
-        const auto a = static_cast<unsigned char>(ToUpper(text_[i]));
-        const auto b = static_cast<unsigned char>(ToUpper(other[i]));
-        if (a != b) {
-            return a < b ? -1 : 1;
-        }
-    }
-    return text_.size() == other.size() ? 0 : (text_.size() < other.size() ? -1 : 1);
+    return type == CompareExact ? GetView().compare(other) : OrderIgnoringCase(GetView(), other);
 }
 
 template <class Char> int StringBase<Char>::GetIndexOfFirstChar(Char c) const noexcept {

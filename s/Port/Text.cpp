@@ -118,16 +118,7 @@ int stricmp(const char* a, const char* b) noexcept {
 }
 
 int strnicmp(const char* a, const char* b, std::size_t count) noexcept {
-    const std::string_view first = ViewOf(a).substr(0, count);
-    const std::string_view second = ViewOf(b).substr(0, count);
-    for (std::size_t i = 0; i < first.size() && i < second.size(); ++i) {
-        const auto x = static_cast<unsigned char>(ToUpper(first[i]));
-        const auto y = static_cast<unsigned char>(ToUpper(second[i]));
-        if (x != y) {
-            return x < y ? -1 : 1;
-        }
-    }
-    return first.size() == second.size() ? 0 : (first.size() < second.size() ? -1 : 1);
+    return OrderIgnoringCase(ViewOf(a).substr(0, count), ViewOf(b).substr(0, count));
 }
 
 bool strmatch(const char* text, const char* pattern) noexcept {
