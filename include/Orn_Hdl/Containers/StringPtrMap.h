@@ -2,10 +2,9 @@
 /// `IStringPtrMap<T>`, a map from a name, letter case ignored, to a pointer that it does not own.
 #pragma once
 
+#include "Port/Ascii.h"
 #include "Port/Export.h"
 
-#include <cstddef>
-#include <cstdint>
 #include <memory>
 #include <string_view>
 #include <type_traits>
@@ -47,22 +46,19 @@ public:
 
     /// \{
     /// As the operations of the base; a null name is read as "".
-    void Add(const char* name, T pointer) { Add(View(name), pointer); }
+    void Add(const char* name, T pointer) { Add(Port::ViewOf(name), pointer); }
     void Add(std::string_view name, T pointer) { IStringPtrMapBase::Add(name, ToUntyped(pointer)); }
-    T Get(const char* name) const noexcept { return Get(View(name)); }
+    T Get(const char* name) const noexcept { return Get(Port::ViewOf(name)); }
     T Get(std::string_view name) const noexcept {
         return FromUntyped(IStringPtrMapBase::Get(name));
     }
     bool Contains(const char* name) const noexcept {
-        return IStringPtrMapBase::Contains(View(name));
+        return IStringPtrMapBase::Contains(Port::ViewOf(name));
     }
-    void Remove(const char* name) noexcept { IStringPtrMapBase::Remove(View(name)); }
+    void Remove(const char* name) noexcept { IStringPtrMapBase::Remove(Port::ViewOf(name)); }
     /// \}
 
 private:
-    static std::string_view View(const char* name) noexcept {
-        return name == nullptr ? std::string_view() : std::string_view(name);
-    }
     static void* ToUntyped(T pointer) noexcept {
         if constexpr (std::is_function<std::remove_pointer_t<T>>::value) {
             return reinterpret_cast<void*>(pointer);
