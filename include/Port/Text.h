@@ -4,6 +4,7 @@
 
 #include "Port/Export.h"
 
+#include <cstddef>
 #include <string_view>
 
 namespace Port {

@@ -6,6 +6,7 @@
 #include "Port/String.h"
 
 #include <memory>
+#include <string_view>
 
 namespace Orn_Hdl {
 

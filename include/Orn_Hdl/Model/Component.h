@@ -10,6 +10,7 @@
 #include "Port/String.h"
 
 #include <memory>
+#include <string_view>
 
 namespace Orn_Hdl {
 

@@ -8,6 +8,8 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <string_view>
+
 namespace Orn_Hdl {
 
 class BusIndexPin;
