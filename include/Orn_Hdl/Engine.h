@@ -72,7 +72,8 @@ public:
     /// Whether a word is reserved in Verilog (IEEE 1364-1995, annex B; without "force"), in this
     /// letter case.
     static bool IsVerilogKeyword(const char* word);
-    /// Writes a file that holds only the header banner.
+    /// Writes a file that holds only the header banner. Null texts are read as "". Nothing tells
+    /// whether the file could be written: `NetlistHeader` on a stream of one's own does.
     /// \param vhdlComments true for VHDL comments, false for Verilog's.
     static void WriteHalvexHeader(const char* application, const char* command,
                                   const char* designName, const char* device, const char* purpose,

@@ -37,7 +37,7 @@ public:
 /// Every operation takes plain texts, looks the named objects up, checks them, and throws
 /// `Orn_Hdl::Exception` with a fixed message when a check fails; nothing that was done before is
 /// undone. A null name reads as "" in every look-up. Operations that change the design set the
-/// modified flag.
+/// modified flag, but for `SetName` and `SetSourceFileName`.
 ///
 /// Signals need not be declared: the first use of a name in a connection or constant declares it,
 /// and its form tells what it is: N a scalar signal, D(7:0) a bus or a slice of the bus D, D(2) a
