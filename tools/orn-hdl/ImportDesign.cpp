@@ -1,5 +1,7 @@
 #include "ImportDesign.h"
 
+#include "Port/Ascii.h"
+
 #include <algorithm>
 
 namespace Tool::Import {
@@ -7,10 +9,7 @@ namespace Tool::Import {
 namespace {
 
 bool IsPlainKey(std::string_view key) noexcept {
-    const auto isPlain = [](char c) {
-        return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') ||
-               c == '_';
-    };
+    const auto isPlain = [](char c) { return Port::IsLetter(c) || Port::IsDigit(c) || c == '_'; };
     return !key.empty() && std::all_of(key.begin(), key.end(), isPlain);
 }
 

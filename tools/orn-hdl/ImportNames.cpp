@@ -11,13 +11,8 @@ namespace Tool::Import {
 
 namespace {
 
-constexpr bool IsLetter(char c) noexcept {
-    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
-}
-
-constexpr bool IsDigit(char c) noexcept {
-    return c >= '0' && c <= '9';
-}
+using Port::IsDigit;
+using Port::IsLetter;
 
 /// Words that Verilog gained after IEEE 1364-1995, SystemVerilog's included (IEEE 1800-2017, annex
 /// B), and "force". A blank stands before and behind each.
@@ -57,11 +52,7 @@ constexpr std::string_view ReservedEnds[] = {"_dummy", "_const_signal", "_opensi
 
 std::string ToLower(std::string_view text) {
     std::string result(text);
-    for (char& c : result) {
-        if (c >= 'A' && c <= 'Z') {
-            c = static_cast<char>(c - 'A' + 'a');
-        }
-    }
+    std::transform(result.begin(), result.end(), result.begin(), Port::ToLower);
     return result;
 }
 
