@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <string_view>
 #include <system_error>
+#include <utility>
 
 namespace Tool {
 
@@ -118,7 +119,7 @@ Status Run(const RunOptions& options) {
     // The design stands until the process ends, which gives its memory back at once: object by
     // object that takes a tenth of the time of the whole run.
     static Orn_Hdl::Engine* engine = nullptr;
-    delete engine; // An earlier run's.
+    delete std::exchange(engine, nullptr); // An earlier run's.
     engine = new Orn_Hdl::Engine;
     const std::string name = GetModelName(options);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
