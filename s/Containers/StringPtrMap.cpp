@@ -64,10 +64,13 @@ struct IStringPtrMapBase::Table {
     }
 
     void Insert(std::uint32_t hash, std::string_view name, void* pointer) {
-        entries.push_back({hash, std::string(name), pointer});
-        if (entries.size() > MostUnindexed && entries.size() * 2 > places.size()) {
+        // The places come first: an entry that found none would be removed in vain.
+        const std::size_t count = entries.size() + 1;
+        if (count > MostUnindexed && count * 2 > places.size()) {
             Rebuild(std::max<std::size_t>(MostUnindexed * 4, places.size() * 2));
-        } else if (!places.empty()) {
+        }
+        entries.push_back({hash, std::string(name), pointer});
+        if (!places.empty()) {
             Place(static_cast<std::uint32_t>(entries.size() - 1));
         }
     }

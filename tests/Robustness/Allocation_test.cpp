@@ -221,6 +221,26 @@ TEST(Allocation, ATextThatFindsNoRoomLeavesTheListAsItWas) {
     });
 }
 
+TEST(Allocation, ANameThatFindsNoPlaceIsNotInTheMap) {
+    int object = 0;
+    Orn_Hdl::IStringPtrMap<int*> names;
+    // As many as have places before there must be more of them.
+    for (int i = 0; i < 16; ++i) {
+        names.Add(("N" + std::to_string(i)).c_str(), &object);
+    }
+    FailInTurn([&] {
+        Orn_Hdl::IStringPtrMap<int*> copy(names);
+        try {
+            copy.Add(LongName, &object);
+        } catch (const std::bad_alloc&) {
+            copy.Add(LongName, &object);
+            copy.Remove(LongName);
+            EXPECT_FALSE(copy.Contains(LongName));
+            throw;
+        }
+    });
+}
+
 TEST(Allocation, AnyOneMayFail) {
     const Support::TemporaryFolder folder;
     const std::string file = folder / "netlist";
