@@ -119,7 +119,8 @@ public:
     ///         "PHRASE: Invalid Arguments.\n" when the arguments do not parse, or whatever the
     ///         command throws; the command is then deleted.
     bool CreateAndExecute(const StringArray& tokens, Model* model, CommandFactory* factory);
-    /// Takes ownership. Null is ignored.
+    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is a
+    /// command that is kept already.
     void AddDoneCommand(Command* command);
     /// How many done commands are kept.
     int GetDoneCommandCount() const noexcept;

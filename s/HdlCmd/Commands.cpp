@@ -112,9 +112,13 @@ bool CommandManager::CreateAndExecute(const StringArray& tokens, Model* model,
 }
 
 void CommandManager::AddDoneCommand(Command* command) {
-    if (command != nullptr && !implementation_->GetDone().Contains(command)) {
-        implementation_->GetDone().Add(command);
+    if (command == nullptr ||
+        (implementation_->done != nullptr && implementation_->done->Contains(command))) {
+        return;
     }
+    std::unique_ptr<Command> taken(command);
+    implementation_->GetDone().Add(command);
+    taken.release();
 }
 
 int CommandManager::GetDoneCommandCount() const noexcept {

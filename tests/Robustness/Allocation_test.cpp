@@ -241,6 +241,26 @@ TEST(Allocation, ANameThatFindsNoPlaceIsNotInTheMap) {
     });
 }
 
+TEST(Allocation, ADoneCommandThatIsNotKeptEnds) {
+    int ended = 0;
+    struct Done final : Orn_Hdl::Command {
+        explicit Done(int& count) noexcept : Command(nullptr), ended(count) {}
+        ~Done() override { ++ended; }
+        bool Parse(const Orn_Hdl::StringArray& /*tokens*/) override { return true; }
+        void Execute() override {}
+        const char* GetName() const override { return "DONE"; }
+        int& ended;
+    };
+    int made = 0;
+    FailInTurn([&] {
+        Orn_Hdl::CommandManager manager;
+        auto* const done = new Done(ended);
+        ++made;
+        manager.AddDoneCommand(done);
+    });
+    EXPECT_EQ(ended, made);
+}
+
 TEST(Allocation, AnyOneMayFail) {
     const Support::TemporaryFolder folder;
     const std::string file = folder / "netlist";
