@@ -9,9 +9,13 @@
 
 /// \def ORN_HDL_API
 /// Stands in the declaration of everything that is exported.
+/// \def ORN_HDL_LOCAL
+/// Stands in the declaration of what an exported class keeps to itself.
 #if defined(ORN_HDL_STATIC)
 #define ORN_HDL_API
+#define ORN_HDL_LOCAL
 #elif defined(_WIN32)
+#define ORN_HDL_LOCAL
 #if defined(ORN_HDL_BUILD)
 #define ORN_HDL_API __declspec(dllexport)
 #else
@@ -19,4 +23,5 @@
 #endif
 #else
 #define ORN_HDL_API __attribute__((visibility("default")))
+#define ORN_HDL_LOCAL __attribute__((visibility("hidden")))
 #endif

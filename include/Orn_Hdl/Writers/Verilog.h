@@ -120,7 +120,7 @@ public:
     void WriteNetlist(Netlist* netlist, const HdlOptions& options);
 
 private:
-    class Writer;
+    class ORN_HDL_LOCAL Writer;
 
     OutStream& out_;
     std::unique_ptr<VerilogStatements> statements_;

@@ -147,7 +147,7 @@ public:
     void WriteNetlist(Netlist* netlist, const HdlOptions* options);
 
 private:
-    class Writer;
+    class ORN_HDL_LOCAL Writer;
 
     OutStream& out_;
     std::unique_ptr<VhdlStatements> statements_;
