@@ -100,6 +100,9 @@ public:
         return !slots_.empty() && !slots_[Probe(key, GroupsAlike)].IsFree();
     }
 
+    /// Makes sure that the next object can be entered without taking memory.
+    void MakeRoom() { Reserve(count_ + 1); }
+
     /// Enters an object, in the place of another of its name and group.
     void Add(T* object, unsigned group = 0) {
         Reserve(count_ + 1);

@@ -79,16 +79,18 @@ struct Netlist::Implementation {
         components.DeleteAll();
     }
 
-    /// Takes ownership of an object that has no owner. \return false for any other.
-    template <class T> bool Take(T* object, OwnPtrArray<T*>& objects) {
+    /// Takes ownership of an object that has no owner, and of no other.
+    template <class T> void Take(T* object, OwnPtrArray<T*>& objects) {
         if (object == nullptr || OwnedFlag::Get(*object)) {
-            return false;
+            return;
         }
+        // What can fail for want of memory comes first: what is held is found.
         std::unique_ptr<T> taken(object);
+        MakeRoomFor(object);
         objects.AddNew(object);
         OwnedFlag::Set(*taken.release());
         byName.Add(object, GroupOf(object));
-        return true;
+        Enter(object);
     }
 
     template <class T> void Remove(T* object, OwnPtrArray<T*>& objects) {
@@ -101,13 +103,28 @@ struct Netlist::Implementation {
         }
     }
 
+    void MakeRoomFor(const Object* /*object*/) { byName.MakeRoom(); }
+    void MakeRoomFor(const Signal* signal) {
+        byName.MakeRoom();
+        if (signal->GetSignalType() == SignalTypeBus) {
+            busesByBaseName.MakeRoom();
+        }
+    }
+
+    void Enter(Object* /*object*/) {}
+    void Enter(Signal* signal) {
+        if (signal->GetSignalType() == SignalTypeBus) {
+            busesByBaseName.Add(static_cast<Bus*>(signal));
+        }
+    }
+
+    void Forget(Object* /*object*/) noexcept {}
     void Forget(Signal* signal) noexcept {
         dummies.Forget(signal);
         if (signal->GetSignalType() == SignalTypeBus) {
             busesByBaseName.Remove(static_cast<Bus*>(signal));
         }
     }
-    void Forget(Object* /*object*/) noexcept {}
 };
 
 Netlist::Netlist(const char* name)
@@ -141,10 +158,7 @@ Port::StringBase<char> Netlist::GetSourceFileName() const {
 }
 
 void Netlist::Add(Signal* signal) {
-    Implementation& own = *implementation_;
-    if (own.Take(signal, own.signals) && signal->GetSignalType() == SignalTypeBus) {
-        own.busesByBaseName.Add(static_cast<Bus*>(signal));
-    }
+    implementation_->Take(signal, implementation_->signals);
 }
 
 void Netlist::Add(Instance* instance) {

@@ -241,6 +241,28 @@ TEST(Allocation, ANameThatFindsNoPlaceIsNotInTheMap) {
     });
 }
 
+TEST(Allocation, WhatANetlistHoldsIsFound) {
+    FailInTurn([] {
+        Orn_Hdl::Netlist netlist;
+        try {
+            for (int i = 0; i < 40; ++i) {
+                const std::string number = std::to_string(i);
+                netlist.Add(new Orn_Hdl::Component(("C" + number).c_str()));
+                netlist.Add(new Orn_Hdl::Bus(("B" + number + "(3:0)").c_str()));
+            }
+        } catch (const std::bad_alloc&) {
+            for (const Orn_Hdl::Component* component : netlist.GetComponentIterator()) {
+                EXPECT_EQ(netlist.GetComponent(component->GetNameView()), component);
+            }
+            for (const Orn_Hdl::Signal* bus : netlist.GetSignalIterator()) {
+                EXPECT_EQ(netlist.GetSignal(bus->GetNameView()), bus);
+                EXPECT_EQ(netlist.GetParentBus(bus->GetName().CStr()), bus);
+            }
+            throw;
+        }
+    });
+}
+
 TEST(Allocation, ADoneCommandThatIsNotKeptEnds) {
     int ended = 0;
     struct Done final : Orn_Hdl::Command {
