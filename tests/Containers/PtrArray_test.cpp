@@ -322,6 +322,37 @@ TEST(OwnPtrArray, IgnoresAPointerThatItHolds) {
     EXPECT_EQ(ended.size(), 2u);
 }
 
+TEST(OwnPtrArray, InsertsAPointerOnlyOnce) {
+    std::vector<int> ended;
+    {
+        Owner owner;
+        Mortal* first = new Heir(1, ended);
+        Mortal* second = new Heir(2, ended);
+        Mortal* third = new Heir(3, ended);
+        owner.InsertAt(0, third);
+        owner.InsertAt(0, first);
+        owner.InsertAt(1, second);
+        for (int i = -1; i < 5; ++i) {
+            owner.InsertAt(i, first);
+            owner.InsertAt(i, third);
+        }
+        EXPECT_EQ(ElementsOf(owner), (std::vector<Mortal*>{first, second, third}));
+        owner.InsertAt(1, nullptr);
+        owner.InsertAt(1, nullptr);
+        EXPECT_EQ(owner.GetSize(), 5) << "nulls are owned by nobody";
+        // What it has let go of is new to it again.
+        owner.RemoveAt(0);
+        owner.InsertAt(4, first);
+        EXPECT_EQ(ElementsOf(owner),
+                  (std::vector<Mortal*>{nullptr, nullptr, second, third, first}));
+        owner.SetAt(2, nullptr);
+        owner.SetAt(0, second);
+        EXPECT_EQ(ElementsOf(owner),
+                  (std::vector<Mortal*>{second, nullptr, nullptr, third, first}));
+    }
+    EXPECT_EQ(ended, (std::vector<int>{1, 3, 2}));
+}
+
 TEST(OwnPtrArray, DeletesAllOnRequest) {
     std::vector<int> ended;
     Owner owner;

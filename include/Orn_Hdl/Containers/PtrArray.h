@@ -135,7 +135,8 @@ private:
 };
 
 /// A `PtrArray` that owns its elements: its destructor deletes them, the last one first. Only the
-/// destructor deletes; `Empty`, `Remove`, `RemoveTail` and `SetAt` let go of what they drop.
+/// destructor and `DeleteAll` delete; `Empty`, `Remove`, `RemoveAt`, `RemoveTail` and `SetAt` let
+/// go of what they drop.
 template <class T> class OwnPtrArray : public PtrArray<T> {
 public:
     OwnPtrArray() noexcept = default;
@@ -156,6 +157,12 @@ public:
     void SetAt(int i, T p) {
         if (p == nullptr || this->GetIndex(p) < 0) {
             PtrArray<T>::SetAt(i, p);
+        }
+    }
+    /// As `PtrArray::InsertAt`; a pointer that the array holds already is ignored.
+    void InsertAt(int i, T p) {
+        if (p == nullptr || this->GetIndex(p) < 0) {
+            PtrArray<T>::InsertAt(i, p);
         }
     }
     /// Deletes every element, the last one first.
