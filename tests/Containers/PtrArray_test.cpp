@@ -146,6 +146,40 @@ TEST(PtrArray, SwapOutOfRangeOrWithItselfChangesNothing) {
     EXPECT_TRUE(empty.IsEmpty());
 }
 
+TEST(PtrArrayBase, IsAnArrayOfUntypedPointers) {
+    int values[4] = {0, 1, 2, 3};
+    Orn_Hdl::PtrArrayBase array;
+    EXPECT_EQ(array.GetAt(0), nullptr);
+    EXPECT_EQ(array.GetTail(), nullptr);
+    EXPECT_FALSE(array.Contains(nullptr));
+    EXPECT_EQ(array.Add(&values[2]), 0);
+    array.SetAt(2, &values[0]);
+    EXPECT_TRUE(array.Contains(nullptr));
+    array.SetAt(1, &values[1]);
+    array.InsertAt(0, &values[3]);
+    EXPECT_EQ(array.GetIndex(&values[1]), 2);
+    EXPECT_EQ(array.GetIndex(&array), -1);
+    EXPECT_TRUE(array.Contains(&values[3]));
+    EXPECT_FALSE(array.Contains(nullptr));
+    int calls = 0;
+    array.Sort(
+        [](void* a, void* b, void* context) {
+            ++*static_cast<int*>(context);
+            return *static_cast<int*>(a) < *static_cast<int*>(b);
+        },
+        &calls);
+    EXPECT_GT(calls, 0);
+    for (int i = 0; i < 4; ++i) {
+        EXPECT_EQ(array.GetAt(i), &values[i]);
+    }
+    EXPECT_TRUE(array.Remove(&values[1]));
+    EXPECT_FALSE(array.Remove(&values[1]));
+    array.RemoveAt(0);
+    EXPECT_EQ(array.GetSize(), 2);
+    EXPECT_EQ(array.GetAt(0), &values[2]);
+    EXPECT_EQ(array.GetTail(), &values[3]);
+}
+
 TEST(PtrArray, CopiesHoldTheSamePointers) {
     int a = 0;
     int b = 0;

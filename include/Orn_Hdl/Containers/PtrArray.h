@@ -27,8 +27,36 @@ public:
     int GetSize() const noexcept { return static_cast<int>(size_); }
     /// Whether there are none.
     bool IsEmpty() const noexcept { return size_ == 0; }
+    /// The element at `i`; null for an index out of range.
+    void* GetAt(int i) const noexcept {
+        return i < 0 || static_cast<std::uint32_t>(i) >= size_ ? nullptr : items_[i];
+    }
+    /// The last element; null when there is none.
+    void* GetTail() const noexcept { return size_ == 0 ? nullptr : items_[size_ - 1]; }
+    /// The index of the first element equal to `p`, or -1.
+    int GetIndex(const void* p) const noexcept;
+    /// Whether an element is equal to `p`.
+    bool Contains(const void* p) const noexcept { return GetIndex(p) >= 0; }
     /// Makes room for `capacity` elements in all.
     void Reserve(int capacity);
+    /// Appends. \return the index of the new element.
+    int Add(void* p) {
+        if (size_ >= capacity_) {
+            Grow();
+        }
+        items_[size_] = p;
+        return static_cast<int>(size_++);
+    }
+    /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
+    void SetAt(int i, void* p);
+    /// Puts an element before the one at `i`; an index out of range is ignored, but for that behind
+    /// the last element.
+    void InsertAt(int i, void* p);
+    /// Removes the first element equal to `p`, keeping the others' order.
+    /// \return false when there is none.
+    bool Remove(const void* p) noexcept;
+    /// Removes the element at `i`, keeping the others' order; an index out of range is ignored.
+    void RemoveAt(int i) noexcept;
     /// Drops all elements without deleting them.
     void Empty() noexcept;
     /// Drops the last element without deleting it; an empty array stays as it is.
@@ -39,28 +67,10 @@ public:
     }
     /// Exchanges two elements; an index out of range changes nothing.
     void Swap(int i, int j) noexcept;
+    /// Sorts stably with the caller's less-than predicate, which receives `context`.
+    void Sort(Less less, void* context);
 
 protected:
-    /// \{
-    /// The untyped operations behind those of `PtrArray`.
-    void* GetAt(int i) const noexcept {
-        return i < 0 || static_cast<std::uint32_t>(i) >= size_ ? nullptr : items_[i];
-    }
-    void* GetTail() const noexcept { return size_ == 0 ? nullptr : items_[size_ - 1]; }
-    int GetIndex(const void* p) const noexcept;
-    int Add(void* p) {
-        if (size_ >= capacity_) {
-            Grow();
-        }
-        items_[size_] = p;
-        return static_cast<int>(size_++);
-    }
-    void SetAt(int i, void* p);
-    void InsertAt(int i, void* p);
-    bool Remove(const void* p) noexcept;
-    void RemoveAt(int i) noexcept;
-    void Sort(Less less, void* context);
-    /// \}
     /// Lets an empty array use memory that somebody else owns and that outlives the array, until it
     /// grows beyond it. The first `size` elements are there already.
     void Borrow(void** items, int size, int capacity) noexcept {
@@ -87,28 +97,17 @@ template <class T> class PtrArray : public PtrArrayBase {
 public:
     static_assert(std::is_pointer<T>::value, "the array holds pointers");
 
-    /// The element at `i`; null for an index out of range.
+    /// \{
+    /// As the operations of the base, with `T` in place of the untyped pointer.
     T GetAt(int i) const noexcept { return static_cast<T>(PtrArrayBase::GetAt(i)); }
-    /// The last element; null when there is none.
     T GetTail() const noexcept { return static_cast<T>(PtrArrayBase::GetTail()); }
-    /// The index of the first element equal to `p`, or -1.
     int GetIndex(T p) const noexcept { return PtrArrayBase::GetIndex(p); }
-    /// Whether an element is equal to `p`.
     bool Contains(T p) const noexcept { return GetIndex(p) >= 0; }
-    /// Appends. \return the index of the new element.
     int Add(T p) { return PtrArrayBase::Add(p); }
-    /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
     void SetAt(int i, T p) { PtrArrayBase::SetAt(i, p); }
-    /// Puts an element before the one at `i`; an index out of range is ignored, but for that behind
-    /// the last element.
     void InsertAt(int i, T p) { PtrArrayBase::InsertAt(i, p); }
-    /// Removes the first element equal to `p`, keeping the others' order.
-    /// \return false when there is none.
     bool Remove(T p) noexcept { return PtrArrayBase::Remove(p); }
-    /// Removes the element at `i`, keeping the others' order; an index out of range is ignored.
     void RemoveAt(int i) noexcept { PtrArrayBase::RemoveAt(i); }
-
-    /// Sorts stably with the caller's less-than predicate, which receives `context`.
     void Sort(bool (*less)(T a, T b, void* context), void* context) {
         struct Caller {
             bool (*less)(T, T, void*);
@@ -121,6 +120,7 @@ public:
             },
             &caller);
     }
+    /// \}
 };
 
 /// A `PtrArray` with room for its first elements in itself.
