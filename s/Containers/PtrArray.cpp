@@ -87,7 +87,11 @@ void PtrArrayBase::SetAt(int i, void* p) {
     }
     const auto index = static_cast<std::uint32_t>(i);
     if (index >= size_) {
-        Reserve(i == INT32_MAX ? i : i + 1);
+        if (index == MostElements) {
+            // The size that this asks for is no int.
+            throw std::bad_alloc();
+        }
+        Reserve(i + 1);
         std::fill(items_ + size_, items_ + index, nullptr);
         size_ = index + 1;
     }

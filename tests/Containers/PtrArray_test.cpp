@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <climits>
 #include <memory>
+#include <new>
 #include <type_traits>
 #include <utility>
 #include <vector>
@@ -72,6 +73,14 @@ TEST(PtrArray, SetAtPastTheEndFillsWithNulls) {
     array.SetAt(-1, &a);
     array.SetAt(INT_MIN, &a);
     EXPECT_EQ(array.GetSize(), 5);
+}
+
+TEST(PtrArray, TheLargestIndexIsBeyondEveryArray) {
+    int a = 0;
+    Array array;
+    array.Add(&a);
+    EXPECT_THROW(array.SetAt(INT_MAX, &a), std::bad_alloc);
+    EXPECT_EQ(ElementsOf(array), std::vector<int*>{&a});
 }
 
 TEST(PtrArray, SetAtFillsWithNullsWhatElementsHeldBefore) {
