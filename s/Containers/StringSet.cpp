@@ -32,9 +32,11 @@ StringSet::StringSet(const StringSet& other)
       keepingCase_(std::make_unique<NameTable>(*other.keepingCase_)) {}
 
 StringSet& StringSet::operator=(const StringSet& other) {
-    StringSet copy(other);
-    std::swap(ignoringCase_, copy.ignoringCase_);
-    std::swap(keepingCase_, copy.keepingCase_);
+    if (this != &other) {
+        StringSet copy(other);
+        std::swap(ignoringCase_, copy.ignoringCase_);
+        std::swap(keepingCase_, copy.keepingCase_);
+    }
     return *this;
 }
 

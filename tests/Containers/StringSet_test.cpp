@@ -282,8 +282,11 @@ TEST(StringSet, AssignmentToItselfChangesNothing) {
     set.Add("b");
     set.Add("a");
     StringSet& same = set;
+    StringSetIterator at = set.GetBeginPos();
     set = same;
     EXPECT_EQ(NamesOf(set), (Names{"a", "b"}));
+    ASSERT_EQ(at, set.GetBeginPos()) << "positions stay valid";
+    EXPECT_EQ(++at, ++set.GetBeginPos());
     StringSet empty;
     set = empty;
     EXPECT_TRUE(set.IsEmpty());
