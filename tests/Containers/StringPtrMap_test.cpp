@@ -1,10 +1,13 @@
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 
+#include "Port/String.h"
+
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
 #include <map>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -56,6 +59,50 @@ TEST(StringPtrMap, ReadsNullAsTheEmptyName) {
     EXPECT_TRUE(map.Contains(nullptr));
     map.Remove(nullptr);
     EXPECT_FALSE(map.Contains(""));
+}
+
+/// Calls every operation with a name of some type.
+template <class Map, class Pointer, class Name>
+void ExpectToTake(const Name& name, Pointer pointer) {
+    Map map;
+    map.Add(name, pointer);
+    EXPECT_EQ(map.Get(name), pointer);
+    EXPECT_TRUE(map.Contains(name));
+    map.Remove(name);
+    EXPECT_FALSE(map.Contains(name));
+    EXPECT_TRUE(map.IsEmpty());
+}
+
+template <class Map, class Pointer> void ExpectToTakeNamesOfAnyType(Pointer pointer) {
+    char characters[] = "name";
+    ExpectToTake<Map>(static_cast<const char*>(characters), pointer);
+    ExpectToTake<Map>(static_cast<char*>(characters), pointer);
+    ExpectToTake<Map>(characters, pointer);
+    ExpectToTake<Map>(std::string("name"), pointer);
+    ExpectToTake<Map>(std::string_view("name"), pointer);
+    ExpectToTake<Map>(Port::String("name"), pointer);
+    ExpectToTake<Map>(static_cast<const char*>(nullptr), pointer);
+    ExpectToTake<Map>(static_cast<char*>(nullptr), pointer);
+    ExpectToTake<Map>(nullptr, pointer);
+}
+
+TEST(StringPtrMap, TakesNamesOfAnyType) {
+    int value = 1;
+    ExpectToTakeNamesOfAnyType<Map>(&value);
+    ExpectToTakeNamesOfAnyType<Orn_Hdl::IStringPtrMapBase>(static_cast<void*>(&value));
+}
+
+TEST(StringPtrMapBase, ReadsNullAsTheEmptyName) {
+    const char* const none = nullptr;
+    int value = 1;
+    Orn_Hdl::IStringPtrMapBase map;
+    EXPECT_EQ(map.Get(none), nullptr);
+    EXPECT_FALSE(map.Contains(none));
+    map.Remove(none);
+    map.Add(none, &value);
+    EXPECT_EQ(map.Get(""), &value);
+    map.Remove("");
+    EXPECT_FALSE(map.Contains(none));
 }
 
 TEST(StringPtrMap, HoldsNullPointers) {

@@ -21,14 +21,27 @@ public:
     IStringPtrMapBase& operator=(const IStringPtrMapBase& other);
     virtual ~IStringPtrMapBase();
 
+    /// \{
     /// Enters a name, or gives a name that is present another pointer: it keeps its first spelling.
+    /// Here and below a null name is read as "".
     void Add(std::string_view name, void* pointer);
+    void Add(const char* name, void* pointer) { Add(Port::ViewOf(name), pointer); }
+    /// \}
+    /// \{
     /// The pointer of a name, null when the name is absent.
     void* Get(std::string_view name) const noexcept;
+    void* Get(const char* name) const noexcept { return Get(Port::ViewOf(name)); }
+    /// \}
+    /// \{
     /// Whether the name is present.
     bool Contains(std::string_view name) const noexcept;
+    bool Contains(const char* name) const noexcept { return Contains(Port::ViewOf(name)); }
+    /// \}
+    /// \{
     /// Takes a name out; an absent one changes nothing.
     void Remove(std::string_view name) noexcept;
+    void Remove(const char* name) noexcept { Remove(Port::ViewOf(name)); }
+    /// \}
     /// Whether there are no names.
     bool IsEmpty() const noexcept;
     /// Takes all names out.
@@ -45,17 +58,13 @@ public:
     static_assert(std::is_pointer<T>::value, "the map holds pointers");
 
     /// \{
-    /// As the operations of the base; a null name is read as "".
-    void Add(const char* name, T pointer) { Add(Port::ViewOf(name), pointer); }
+    /// As the operations of the base, with `T` in place of the untyped pointer.
     void Add(std::string_view name, T pointer) { IStringPtrMapBase::Add(name, ToUntyped(pointer)); }
-    T Get(const char* name) const noexcept { return Get(Port::ViewOf(name)); }
+    void Add(const char* name, T pointer) { Add(Port::ViewOf(name), pointer); }
     T Get(std::string_view name) const noexcept {
         return FromUntyped(IStringPtrMapBase::Get(name));
     }
-    bool Contains(const char* name) const noexcept {
-        return IStringPtrMapBase::Contains(Port::ViewOf(name));
-    }
-    void Remove(const char* name) noexcept { IStringPtrMapBase::Remove(Port::ViewOf(name)); }
+    T Get(const char* name) const noexcept { return Get(Port::ViewOf(name)); }
     /// \}
 
 private:
