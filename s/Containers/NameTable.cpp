@@ -11,6 +11,8 @@ namespace Orn_Hdl {
 namespace {
 
 constexpr std::size_t FirstRequest = 100;
+/// How many buckets are looked at in the time of one step along the list.
+constexpr std::size_t BucketsAStep = 8;
 
 constexpr std::uint32_t BucketCounts[] = {
     53,        97,        193,       389,       769,        1543,       3079,
@@ -85,12 +87,19 @@ bool NameTable::Insert(std::string_view name) {
 }
 
 NameTable::Node** NameTable::LinkInto(std::size_t bucket) noexcept {
+    // Mostly the bucket before it is near. In a table that once held many more names the list is
+    // shorter than the way there.
+    const std::size_t least = bucket - std::min(bucket, BucketsAStep * count_);
     std::size_t lower = bucket;
-    while (lower > 0 && buckets_[lower - 1] == nullptr) {
+    while (lower > least && buckets_[lower - 1] == nullptr) {
         --lower;
     }
-    if (lower == 0) {
-        return &head_;
+    if (lower == least) {
+        Node** link = &head_;
+        while (*link != nullptr && BucketOf((*link)->hash) < bucket) {
+            link = &(*link)->next;
+        }
+        return link;
     }
     Node* last = buckets_[--lower];
     while (last->next != nullptr && BucketOf(last->next->hash) == lower) {

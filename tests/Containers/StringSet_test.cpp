@@ -242,6 +242,40 @@ TEST(StringSet, RemovalAndEmptyingNeverShrinkTheTable) {
     EXPECT_EQ(NamesOf(pair.set), pair.slow.Walk());
 }
 
+TEST(StringSet, OrderOfFewNamesWhereOnceWereMany) {
+    Pair pair;
+    for (int i = 0; i < 30000; ++i) {
+        pair.Add("n" + std::to_string(i));
+    }
+    pair.Empty();
+    EXPECT_EQ(pair.slow.Walk(), Names());
+    for (int i = 0; i < 1500; ++i) {
+        // The names crowd together here and there.
+        pair.Add("m" + std::to_string(i * i % 1009));
+        pair.Add(MakeCollidingNames(1)[0] + static_cast<char>('a' + i % 26));
+        if (i % 3 == 0) {
+            pair.Remove("m" + std::to_string(i * 7 % 1009));
+        }
+        ASSERT_EQ(NamesOf(pair.set), pair.slow.Walk()) << i;
+    }
+}
+
+TEST(StringSet, FewNamesTakeLittleTimeWhereOnceWereMany) {
+    // This name's bucket is one of the last; to look through the empty ones before it each time
+    // would take half an hour.
+    StringSet set;
+    for (int i = 0; i < 800000; ++i) {
+        set.Add("n" + std::to_string(i));
+    }
+    set.Empty();
+    set.Add("x");
+    for (int i = 0; i < 2000000; ++i) {
+        set.Add("last999");
+        set.Remove("last999");
+    }
+    EXPECT_EQ(NamesOf(set), Names{"x"});
+}
+
 TEST(StringSet, CopiesKeepBucketCountAndOrder) {
     Pair original;
     for (int i = 0; i < 400; ++i) {
