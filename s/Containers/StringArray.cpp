@@ -110,6 +110,27 @@ void StringArray::Add(const StringArray& other) {
     }
 }
 
+/// Lets the buffer take so many characters more. Where it would grow for that, the texts move to a
+/// new one instead and what none of them uses stays behind. The new one is large enough that the
+/// texts set until the next move pay for it.
+void StringArray::MakeRoom(std::size_t length) {
+    if (length <= text_.capacity() - text_.size()) {
+        return;
+    }
+    std::size_t used = length;
+    for (const Slot& slot : slots_) {
+        used += slot.length;
+    }
+    std::string kept;
+    kept.reserve(used * 2 + slots_.size());
+    for (Slot& slot : slots_) {
+        const std::size_t start = kept.size();
+        kept.append(text_, slot.start, slot.length);
+        slot.start = start;
+    }
+    text_ = std::move(kept);
+}
+
 void StringArray::SetAt(int i, const Port::StringBase<char>& text) {
     if (i < 0) {
         return;
@@ -120,6 +141,7 @@ void StringArray::SetAt(int i, const Port::StringBase<char>& text) {
     }
     Slot& slot = slots_[index];
     if (text.GetLength() > slot.length) {
+        MakeRoom(text.GetLength());
         const std::size_t start = text_.size();
         text_.append(text.GetView());
         slot.start = start;

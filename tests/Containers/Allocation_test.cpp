@@ -81,4 +81,24 @@ TEST(Allocation, SplittingALineTakesAHandfulHoweverManyWordsItHas) {
     EXPECT_EQ(array.GetSize(), 15);
 }
 
+TEST(Allocation, ATextThatIsSetAgainAndAgainTakesTheRoomOfOne) {
+    const Port::String longer(std::string(1000, 'x'));
+    const Port::String other(std::string(900, 'y'));
+    StringArray array;
+    array.Add("first");
+    array.Add(longer);
+    array.SetAt(3, "last");
+    const auto taken = Support::CountAllocations([&] {
+        for (int i = 0; i < 10000; ++i) {
+            array.SetAt(1, longer);
+            array.SetAt(1, "s");
+            array.SetAt(2, other);
+            array.SetAt(2, "");
+        }
+    });
+    EXPECT_LT(taken.largest, 10000u);
+    EXPECT_LT(taken.blocks, 20000u) << "less than one for each text that finds no room";
+    EXPECT_EQ(array.Concatenate("|"), "first|s||last");
+}
+
 } // namespace

@@ -20,10 +20,11 @@
 
 namespace Support {
 
-/// Since the program started.
+/// Since the program started; the largest block since a count began.
 struct AllocationCount {
-    std::size_t blocks = 0; ///< taken from the heap; a block that grows counts each time
-    std::size_t maps = 0;   ///< pages, of any size, that the program has mapped itself
+    std::size_t blocks = 0;  ///< taken from the heap; a block that grows counts each time
+    std::size_t maps = 0;    ///< pages, of any size, that the program has mapped itself
+    std::size_t largest = 0; ///< bytes of the largest block
 };
 
 inline AllocationCount allocationCount;
@@ -31,14 +32,24 @@ inline AllocationCount allocationCount;
 /// What an action takes.
 template <class Action> AllocationCount CountAllocations(Action action) {
     const AllocationCount before = allocationCount;
+    allocationCount.largest = 0;
     action();
-    return {allocationCount.blocks - before.blocks, allocationCount.maps - before.maps};
+    return {allocationCount.blocks - before.blocks, allocationCount.maps - before.maps,
+            allocationCount.largest};
+}
+
+/// Counts a block of the heap.
+inline void CountBlock(std::size_t size) noexcept {
+    ++allocationCount.blocks;
+    if (size > allocationCount.largest) {
+        allocationCount.largest = size;
+    }
 }
 
 } // namespace Support
 
 void* operator new(std::size_t size) {
-    ++Support::allocationCount.blocks;
+    Support::CountBlock(size);
     if (void* memory = std::malloc(size == 0 ? 1 : size)) {
         return memory;
     }
@@ -46,7 +57,7 @@ void* operator new(std::size_t size) {
 }
 
 void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
-    ++Support::allocationCount.blocks;
+    Support::CountBlock(size);
     return std::malloc(size == 0 ? 1 : size);
 }
 
@@ -67,7 +78,7 @@ void operator delete(void* memory, const std::nothrow_t&) noexcept {
 extern "C" void* __libc_realloc(void* memory, std::size_t size);
 
 extern "C" void* realloc(void* memory, std::size_t size) noexcept {
-    ++Support::allocationCount.blocks;
+    Support::CountBlock(size);
     return __libc_realloc(memory, size);
 }
 

@@ -94,6 +94,7 @@ private:
     };
 
     int AddView(std::string_view text);
+    void MakeRoom(std::size_t length);
     void ClosePiece(std::size_t start);
 
     std::string text_;
