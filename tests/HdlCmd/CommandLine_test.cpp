@@ -148,6 +148,39 @@ TEST_F(CommandLine, ALineEndsAtItsFirstNul) {
     EXPECT_TRUE(model_.ExecuteLine(std::string_view("\0MAKE COFFEE", 12)));
 }
 
+TEST_F(CommandLine, AnArgumentEndsAtItsFirstNul) {
+    StringArray words = Words("CONNECT SIGNAL");
+    for (const std::string_view name : {std::string_view("N\0x", 3), std::string_view("M\0", 2)}) {
+        words.Add(Port::String(name));
+    }
+    EXPECT_TRUE(model_.Execute(words));
+    const Signal* const n = model_.GetSignal("N");
+    const Signal* const m = model_.GetSignal("M");
+    ASSERT_NE(n, nullptr);
+    ASSERT_NE(m, nullptr);
+    EXPECT_EQ(n->GetName(), "N");
+    EXPECT_EQ(m->GetName(), "M");
+    EXPECT_EQ(model_.GetSignal("x"), nullptr);
+
+    words = Words("ADD SIGNAL COMMENT N");
+    words.Add(Port::String(std::string_view("te\0xt", 5)));
+    words.Add("more");
+    EXPECT_TRUE(model_.Execute(words));
+    EXPECT_EQ(n->GetComment(), "te\n");
+
+    for (std::size_t size = 1; size <= 40; ++size) {
+        for (std::size_t end = 0; end <= size; ++end) {
+            std::string text = std::string(size, '\xff').append("x");
+            text[end] = '\0';
+            text.resize(size);
+            words = Words("Set Purpose");
+            words.Add(Port::String(text));
+            EXPECT_TRUE(model_.Execute(words));
+            ASSERT_EQ(model_.GetOptions()->purpose, std::string(end, '\xff')) << size;
+        }
+    }
+}
+
 TEST_F(CommandLine, WordsCanBeGivenReady) {
     StringArray words;
     words.Add("add");
