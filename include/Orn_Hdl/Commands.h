@@ -120,7 +120,8 @@ public:
     ///         command throws; the command is then deleted.
     bool CreateAndExecute(const StringArray& tokens, Model* model, CommandFactory* factory);
     /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is a
-    /// command that is kept already.
+    /// command that is kept already or that this manager is carrying out: it is kept when it is
+    /// done.
     void AddDoneCommand(Command* command);
     /// How many done commands are kept.
     int GetDoneCommandCount() const noexcept;

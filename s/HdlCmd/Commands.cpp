@@ -78,8 +78,12 @@ const std::vector<CommandInfo>& CommandFactory::GetCatalogue() {
 }
 
 struct CommandManager::Implementation {
+    struct Running;
+
     /// Null while there are none.
     std::unique_ptr<PtrArray<Command*>> done;
+    /// The innermost of the commands that are being carried out, since one may run another.
+    const Running* innermost = nullptr;
 
     PtrArray<Command*>& GetDone() {
         if (done == nullptr) {
@@ -87,6 +91,20 @@ struct CommandManager::Implementation {
         }
         return *done;
     }
+};
+
+/// A command from before it is parsed until it is kept or deleted.
+struct CommandManager::Implementation::Running {
+    explicit Running(Implementation& manager) noexcept : own(manager), outer(manager.innermost) {
+        own.innermost = this;
+    }
+    Running(const Running&) = delete;
+    Running& operator=(const Running&) = delete;
+    ~Running() { own.innermost = outer; }
+
+    Implementation& own;
+    const Running* outer;
+    const Command* command = nullptr;
 };
 
 CommandManager::CommandManager() : implementation_(std::make_unique<Implementation>()) {}
@@ -97,11 +115,13 @@ CommandManager::~CommandManager() {
 
 bool CommandManager::CreateAndExecute(const StringArray& tokens, Model* model,
                                       CommandFactory* factory) {
+    Implementation::Running running(*implementation_);
     std::unique_ptr<Command> command(factory == nullptr ? nullptr
                                                         : factory->CreateCommand(model, tokens));
     if (command == nullptr) {
         Fail(CommandUnit, __LINE__, "Command not find.\n");
     }
+    running.command = command.get();
     if (!command->Parse(tokens)) {
         Fail(CommandUnit, __LINE__, "%s: Invalid Arguments.\n", {Port::ViewOf(command->GetName())});
     }
@@ -115,6 +135,12 @@ void CommandManager::AddDoneCommand(Command* command) {
     if (command == nullptr ||
         (implementation_->done != nullptr && implementation_->done->Contains(command))) {
         return;
+    }
+    for (const auto* running = implementation_->innermost; running != nullptr;
+         running = running->outer) {
+        if (running->command == command) {
+            return;
+        }
     }
     std::unique_ptr<Command> taken(command);
     implementation_->GetDone().Add(command);

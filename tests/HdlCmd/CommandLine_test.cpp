@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <new>
 #include <string>
@@ -20,6 +21,8 @@ namespace {
 /// What the commands of these tests did and saw; each test begins with an empty log.
 std::vector<std::string> log;
 int aliveCommands = 0;
+/// What a command with the argument "act" does.
+std::function<void(Command&)> action;
 
 std::string Join(const StringArray& tokens) {
     return std::string(tokens.Concatenate("|").GetView());
@@ -43,6 +46,9 @@ public:
     }
     void Execute() override {
         log.push_back("execute " + argument_);
+        if (argument_ == "act") {
+            action(*this);
+        }
         if (argument_ == "throw-in-execute") {
             ThrowException();
         }
@@ -76,6 +82,7 @@ protected:
     CommandLine() {
         log.clear();
         aliveCommands = 0;
+        action = nullptr;
         factory_.AddCommandCreator("LOGGED", &LoggedCommand::Create);
     }
 
@@ -391,6 +398,66 @@ TEST_F(CommandLine, ACommandMayBeOfAClassOfAnyAlignment) {
     alignas(LoggedCommand) unsigned char place[sizeof(LoggedCommand)];
     Command* const inPlace = new (place) LoggedCommand(&model_, "in place");
     inPlace->~Command();
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, ACommandThatKeepsItselfIsKeptOnce) {
+    action = [this](Command& command) {
+        model_.GetCommandManager()->AddDoneCommand(&command);
+        EXPECT_TRUE(model_.Execute("LOGGED inner"));
+        model_.GetCommandManager()->AddDoneCommand(&command);
+    };
+    EXPECT_TRUE(model_.Execute("LOGGED act"));
+    EXPECT_EQ(GetDoneCount(), 2);
+    EXPECT_EQ(aliveCommands, 2);
+    log.clear();
+    model_.GetCommandManager()->Clear();
+    EXPECT_EQ(log, (std::vector<std::string>{"delete inner", "delete act"}));
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, ACommandThatKeepsItselfAndFailsIsDeleted) {
+    action = [this](Command& command) {
+        model_.GetCommandManager()->AddDoneCommand(&command);
+        model_.Execute("LOGGED throw-in-execute");
+    };
+    EXPECT_EQ(GetFailure("LOGGED act"), "as described\n");
+    EXPECT_EQ(GetDoneCount(), 0);
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, AnInnerCommandMayKeepTheOuterOne) {
+    Command* outer = nullptr;
+    action = [&](Command& command) {
+        if (outer == nullptr) {
+            outer = &command;
+            EXPECT_TRUE(model_.Execute("LOGGED act"));
+        }
+        model_.GetCommandManager()->AddDoneCommand(outer);
+    };
+    EXPECT_TRUE(model_.Execute("LOGGED act"));
+    EXPECT_EQ(GetDoneCount(), 2);
+    EXPECT_EQ(aliveCommands, 2);
+    model_.GetCommandManager()->Clear();
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, ACommandMayClearTheDoneOnes) {
+    action = [this](Command& command) {
+        model_.GetCommandManager()->AddDoneCommand(&command);
+        model_.GetCommandManager()->Clear();
+        EXPECT_EQ(GetDoneCount(), 0);
+        EXPECT_EQ(aliveCommands, 1) << "the one that is being carried out stays";
+        model_.GetCommandManager()->AddDoneCommand(LoggedCommand::Create(nullptr, StringArray()));
+        model_.Execute("LOGGED inner");
+    };
+    EXPECT_TRUE(model_.Execute("LOGGED a"));
+    EXPECT_TRUE(model_.Execute("LOGGED act"));
+    EXPECT_EQ(GetDoneCount(), 3);
+    EXPECT_EQ(aliveCommands, 3);
+    EXPECT_TRUE(model_.Execute("LOGGED b"));
+    EXPECT_EQ(GetDoneCount(), 4);
+    model_.GetCommandManager()->Clear();
     EXPECT_EQ(aliveCommands, 0);
 }
 
