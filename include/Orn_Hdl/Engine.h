@@ -41,7 +41,7 @@ public:
     Engine();
     Engine(const Engine&) = delete;
     Engine& operator=(const Engine&) = delete;
-    /// Deletes every model, the last one first.
+    /// Deletes every model, the last one first. None of them may be carrying out a command.
     ~Engine();
 
     /// Makes a model; it does not become the current one.
@@ -50,7 +50,10 @@ public:
     bool CreateAndAddModel(const char* name, const char* sourceFile);
     /// Makes a model the current one. \return false when there is none of that name.
     bool UseModel(const char* name);
-    /// Deletes a model. \return false when there is none of that name.
+    /// Deletes a model. One that is carrying out a command, which may be the caller, is no longer
+    /// the engine's from here on, and ends when the outermost line or file that it carries out is
+    /// through.
+    /// \return false when there is none of that name.
     bool RemoveModel(const char* name);
     /// The model of that name, null when there is none. The engine owns it.
     Model* GetModel(const char* name) const;

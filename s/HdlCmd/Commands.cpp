@@ -3,6 +3,7 @@
 #include "HdlCmd/Catalogue.h"
 #include "HdlCmd/PhraseTable.h"
 #include "HdlModel/Failure.h"
+#include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
 #include "Orn_Hdl/Model/Design.h"
 #include "Port/Ascii.h"
@@ -115,6 +116,8 @@ CommandManager::~CommandManager() {
 
 bool CommandManager::CreateAndExecute(const StringArray& tokens, Model* model,
                                       CommandFactory* factory) {
+    // The command may remove its model from the engine, and this manager is the model's.
+    const Model::Use use(model);
     Implementation::Running running(*implementation_);
     std::unique_ptr<Command> command(factory == nullptr ? nullptr
                                                         : factory->CreateCommand(model, tokens));

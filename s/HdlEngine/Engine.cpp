@@ -54,11 +54,15 @@ bool Engine::UseModel(const char* name) {
 }
 
 bool Engine::RemoveModel(const char* name) {
-    const std::unique_ptr<Model> model = implementation_->models.Remove(Port::ViewOf(name));
-    if (model != nullptr && implementation_->current == model.get()) {
+    std::unique_ptr<Model> model = implementation_->models.Remove(Port::ViewOf(name));
+    if (model == nullptr) {
+        return false;
+    }
+    if (implementation_->current == model.get()) {
         implementation_->current = nullptr;
     }
-    return model != nullptr;
+    Model::Delete(std::move(model));
+    return true;
 }
 
 Model* Engine::GetModel(const char* name) const {

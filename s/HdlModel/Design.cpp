@@ -3,6 +3,7 @@
 #include "HdlModel/Failure.h"
 #include "HdlModel/Foresight.h"
 #include "HdlModel/MakePacked.h"
+#include "HdlModel/ModelUse.h"
 #include "HdlModel/Names.h"
 #include "HdlModel/ObjectKey.h"
 #include "Orn_Hdl/Commands.h"
@@ -95,6 +96,13 @@ Model::Model(CommandFactory* factory)
 
 Model::~Model() = default;
 
+void Model::Delete(std::unique_ptr<Model> model) noexcept {
+    if (model != nullptr && model->uses_ > 0) {
+        model->endsUnused_ = true;
+        static_cast<void>(model.release());
+    }
+}
+
 bool Model::IsModified() const noexcept {
     return implementation_->modified;
 }
@@ -144,6 +152,7 @@ bool Model::Execute(const char* text) {
 }
 
 bool Model::ExecuteLine(std::string_view line) {
+    const Use use(this);
     line = line.substr(0, line.find('\0'));
     // A command may run another line, so the words in hand are taken out while they are in use.
     StringArray words = std::move(implementation_->words);
@@ -166,6 +175,7 @@ void Model::Foresee(const StringArray& words) noexcept {
 }
 
 bool Model::Read(const char* fileName) {
+    const Use use(this);
     CommandReader reader(*this);
     if (!reader.Open(fileName)) {
         SetModifiedFlag(false);

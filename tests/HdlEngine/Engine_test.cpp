@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <string>
 #include <type_traits>
 #include <vector>
@@ -109,6 +110,117 @@ TEST(EngineModels, RemovalOfAnotherModelKeepsTheCurrentOne) {
     EXPECT_EQ(FailureOfLine(engine, "ADD SIGNAL N"), "");
     EXPECT_NE(engine.GetModel("b")->GetSignal("N"), nullptr);
     EXPECT_FALSE(engine.RemoveModel("a"));
+}
+
+namespace {
+
+/// What the command "REMOVE" of the tests below does, when it is carried out and when it ends.
+std::function<void(Model&)> removal;
+std::function<void(Model&)> farewell;
+int endedRemovers = 0;
+
+class Remover : public Command {
+public:
+    using Command::Command;
+    ~Remover() override {
+        ++endedRemovers;
+        if (farewell) {
+            farewell(*GetModel());
+        }
+    }
+    bool Parse(const StringArray& /*tokens*/) override { return true; }
+    void Execute() override { removal(*GetModel()); }
+    const char* GetName() const override { return "REMOVE"; }
+
+    static Command* Create(Model* model, const StringArray& /*tokens*/) {
+        return new Remover(model);
+    }
+};
+
+/// An engine with a model "top" that the command "REMOVE" removes; then it goes on with it.
+class RemovalFromWithin : public testing::Test {
+protected:
+    RemovalFromWithin() {
+        engine_.CreateAndAddModel("top", "");
+        engine_.UseModel("top");
+        engine_.GetModel("top")->GetCommandFactory()->AddCommandCreator("REMOVE", &Remover::Create);
+        endedRemovers = 0;
+        farewell = nullptr;
+        removal = [this](Model& model) {
+            EXPECT_TRUE(engine_.RemoveModel("top"));
+            EXPECT_EQ(engine_.GetModel("top"), nullptr);
+            EXPECT_FALSE(engine_.RemoveModel("top"));
+            EXPECT_TRUE(engine_.CreateAndAddModel("top", "another")) << "the name is free";
+            model.Execute("ADD SIGNAL N");
+            model.SetName("other");
+            EXPECT_EQ(engine_.GetModel("other"), nullptr);
+            EXPECT_NE(model.GetSignal("N"), nullptr);
+        };
+    }
+    ~RemovalFromWithin() override {
+        EXPECT_EQ(endedRemovers, 1) << "the model has ended, with its commands";
+        EXPECT_EQ(engine_.GetModel("top")->GetSourceFileName(), "another");
+        EXPECT_EQ(FailureOfLine(engine_, "NOOP"), "Missing Model.\n");
+        EXPECT_TRUE(engine_.RemoveModel("top"));
+    }
+
+    Engine engine_;
+};
+
+} // namespace
+
+TEST_F(RemovalFromWithin, OfALine) {
+    engine_.Execute("REMOVE");
+}
+
+TEST_F(RemovalFromWithin, OfALineOfTheModel) {
+    EXPECT_TRUE(engine_.GetModel("top")->Execute("REMOVE"));
+}
+
+TEST_F(RemovalFromWithin, OfWords) {
+    EXPECT_TRUE(engine_.GetModel("top")->Execute(StringArray("REMOVE", " ", true, nullptr)));
+}
+
+TEST_F(RemovalFromWithin, OfWordsGivenToTheManager) {
+    Model* const model = engine_.GetModel("top");
+    EXPECT_TRUE(model->GetCommandManager()->CreateAndExecute(
+        StringArray("REMOVE", " ", true, nullptr), model, model->GetCommandFactory()));
+}
+
+TEST_F(RemovalFromWithin, OfACommandThatFails) {
+    removal = [remove = removal](Model& model) {
+        remove(model);
+        model.Execute("UNKNOWN");
+    };
+    EXPECT_EQ(FailureOfLine(engine_, "REMOVE"), "Command not find.\n");
+}
+
+TEST_F(RemovalFromWithin, OfALineWithinALine) {
+    int depth = 0;
+    removal = [&depth, remove = removal](Model& model) {
+        if (++depth < 3) {
+            model.Execute("REMOVE");
+            EXPECT_NE(model.GetSignal("N"), nullptr) << "the outer command still has its model";
+            EXPECT_EQ(endedRemovers, 0);
+        } else {
+            remove(model);
+        }
+    };
+    engine_.Execute("REMOVE");
+    EXPECT_EQ(endedRemovers, 3);
+    endedRemovers -= 2;
+}
+
+TEST_F(RemovalFromWithin, OfAModelThatIsUsedOnceMoreWhenItEnds) {
+    farewell = [](Model& model) { EXPECT_TRUE(model.Execute("")); };
+    engine_.Execute("REMOVE");
+}
+
+TEST_F(RemovalFromWithin, OfACommandFile) {
+    const TemporaryFolder folder;
+    const std::string file = folder / "lines.cmd";
+    WriteWholeFile(file, "ADD SIGNAL M\nREMOVE\nCONNECT SIGNAL N M\n");
+    EXPECT_TRUE(engine_.ReadCommandFile("top", file.c_str())) << "its other lines are done, too";
 }
 
 TEST(EngineModels, ARenamedModelIsFoundByItsNewName) {

@@ -15,10 +15,10 @@ LAYERS = {
     "portability": r"Port/|Orn_Hdl/Exception\.h|HdlModel/Failure\.",
     "containers": r"(Orn_Hdl/)?Containers(/|\.)",
     "streams": r"(Orn_Hdl/)?Streams(/|\.)",
-    "design": r"Orn_Hdl/Attributes\.h|Orn_Hdl/Model/(?!Design\.)|HdlModel/(?!Design\.)",
+    "design": r"Orn_Hdl/Attributes\.h|Orn_Hdl/Model/(?!Design\.)|HdlModel/(?!Design\.|ModelUse\.)",
     "options": r"(Orn_Hdl/)?Options(/|\.)",
     "writers": r"(Orn_Hdl/)?Writers(/|\.)|Header/|Verilog/|Vhdl/",
-    "model": r"Orn_Hdl/Model(/Design)?\.h|HdlModel/Design\.",
+    "model": r"Orn_Hdl/Model(/Design)?\.h|HdlModel/(Design|ModelUse)\.",
     "commands": r"Orn_Hdl/Commands\.h|HdlCmd/",
     "engine": r"Orn_Hdl/(Engine|Orn_Hdl)\.h|HdlEngine/",
 }

@@ -17,6 +17,7 @@ namespace Orn_Hdl {
 
 class CommandFactory;
 class CommandManager;
+class Engine;
 
 /// Decides which files the write commands of a model may write, for programs that run command files
 /// they do not trust.
@@ -240,7 +241,14 @@ public:
     /// \}
 
 private:
+    friend class CommandManager;
+    friend class Engine;
     struct Implementation;
+    class Use;
+
+    /// Deletes a model, or, while there is a `Use` of it, leaves that to the last one. Null is
+    /// ignored.
+    static void Delete(std::unique_ptr<Model> model) noexcept;
 
     bool IsNamedUsed(const char* name) const;
     Component* FindComponent(const char* name) const;
@@ -272,6 +280,9 @@ private:
     bool AssignConstant(Pin* pin, const char* value, const char* instance);
 
     std::unique_ptr<Implementation> implementation_;
+    /// How many uses there are, and whether the last one deletes the model.
+    unsigned uses_ = 0;
+    bool endsUnused_ = false;
 };
 
 } // namespace Orn_Hdl
