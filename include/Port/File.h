@@ -51,6 +51,8 @@ public:
     bool NextLine(std::string_view& line);
     /// As `NextLine`, without reading: false also when the rest of the line has yet to be read.
     bool NextLineAtHand(std::string_view& line);
+    /// How many bytes the last line given takes in the file, its line end included.
+    std::size_t GetLineSize() const noexcept { return lineSize_; }
 
     /// The system's error number of the first failure since `open`; 0 when there was none.
     int GetError() const noexcept { return error_; }
@@ -79,6 +81,7 @@ private:
     std::size_t lineCapacity_ = 0;
     std::size_t lineStart_ = 0;
     std::size_t lineEnd_ = 0;
+    std::size_t lineSize_ = 0;
     bool atEnd_ = false;
 };
 

@@ -20,7 +20,7 @@ struct CommandReader::Implementation {
 
     void Split(std::string_view text) {
         Line& line = lines[(first + count) % Distance];
-        line.bytes = text.size() + 1;
+        line.bytes = file.GetLineSize();
         line.words.Empty();
         line.words.ParseCommandLine(text.substr(0, text.find('\0')));
         ++count;

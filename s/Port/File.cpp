@@ -110,6 +110,7 @@ bool File::open(const char* name, Mode mode, bool fromStart) {
     error_ = 0;
     lineStart_ = 0;
     lineEnd_ = 0;
+    lineSize_ = 0;
     atEnd_ = false;
     name = name == nullptr ? "" : name;
     if (mode == Replace) {
@@ -290,7 +291,8 @@ bool File::NextLineAtHand(std::string_view& line) {
 
 std::string_view File::TakeLine(std::size_t length) noexcept {
     std::string_view line = GetUnread().substr(0, length);
-    lineStart_ = std::min(lineStart_ + length + 1, lineEnd_);
+    lineSize_ = std::min(length + 1, GetUnread().size());
+    lineStart_ += lineSize_;
     if (!line.empty() && line.back() == '\r') {
         line.remove_suffix(1);
     }

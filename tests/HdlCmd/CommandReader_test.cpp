@@ -9,6 +9,7 @@
 #include <cstdint>
 #include <fcntl.h>
 #include <string>
+#include <string_view>
 #include <sys/stat.h>
 #include <unistd.h>
 #include <utility>
@@ -69,14 +70,26 @@ TEST_F(CommandReaderTest, ALineEndsAtItsFirstNul) {
 }
 
 TEST_F(CommandReaderTest, TellsHowFarItIs) {
-    Support::WriteWholeFile(name_, "NOOP\n\nADD SIGNAL a\n");
-    ASSERT_TRUE(reader_.Open(name_.c_str()));
-    std::vector<std::uint64_t> positions{reader_.GetPosition()};
-    while (reader_.Next() != nullptr) {
-        positions.push_back(reader_.GetPosition());
+    const struct {
+        std::string_view text;
+        std::vector<std::uint64_t> positions;
+    } files[] = {{"NOOP\n\nADD SIGNAL a\n", {0, 5, 6, 19}},
+                 {"NOOP\r\n\r\nADD SIGNAL a\r\n", {0, 6, 8, 22}},
+                 {"NOOP\nADD SIGNAL a", {0, 5, 17}},
+                 {"NOOP\r\nADD SIGNAL a\r", {0, 6, 19}},
+                 {"\r", {0, 1}},
+                 {"\n", {0, 1}},
+                 {"", {0}}};
+    for (const auto& file : files) {
+        Support::WriteWholeFile(name_, file.text);
+        ASSERT_TRUE(reader_.Open(name_.c_str()));
+        std::vector<std::uint64_t> positions{reader_.GetPosition()};
+        while (reader_.Next() != nullptr) {
+            positions.push_back(reader_.GetPosition());
+        }
+        EXPECT_EQ(positions, file.positions) << testing::PrintToString(file.text);
+        EXPECT_EQ(reader_.GetError(), 0);
     }
-    EXPECT_EQ(positions, (std::vector<std::uint64_t>{0, 5, 6, 19}));
-    EXPECT_EQ(reader_.GetError(), 0);
 }
 
 TEST_F(CommandReaderTest, OpensAnotherFileInTheMiddleOfOne) {
