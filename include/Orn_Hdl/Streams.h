@@ -106,6 +106,7 @@ public:
     /// What becomes of the file that is there already. `Replace` is `Overwrite` that happens as a
     /// whole: the former file stands as it was until `Close` puts the new one in its place, which
     /// it does only when everything was written. A stream that ends without `Close` drops its text.
+    /// `Port::File::Mode` tells which files are written directly all the same.
     enum Mode { Overwrite, Append, Replace };
 
     /// A stream without a file.

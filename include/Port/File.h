@@ -20,8 +20,9 @@ public:
     /// `Replace` is `Overwrite` that takes effect as a whole: what is written goes into a temporary
     /// file in the same folder, which `close` puts in the place of the named one when nothing has
     /// failed. Until then, and after any failure, the former file stands as it was; its permission
-    /// bits are kept, and a symbolic link stays one. Devices, pipes and other files that are not
-    /// regular are written directly.
+    /// bits are kept, and a symbolic link stays one. Written directly, as by `Overwrite`, are
+    /// devices, pipes and other files that are not regular, a file that has more than one name, and
+    /// one that may be written in a folder that takes no new file.
     enum Mode { Read = 1, Overwrite = 2, Append = 6, Replace = 10 };
 
     File() noexcept = default;
@@ -62,7 +63,8 @@ private:
     bool OpenDescriptor(const char* name, int flags, unsigned mode);
     void CloseDescriptor() noexcept;
     bool OpenToReplace(const char* name);
-    bool OpenTemporary(unsigned mode);
+    int OpenTemporary(unsigned mode);
+    bool OpenTarget();
     bool FillLineBuffer();
     /// What was read behind the last line.
     std::string_view GetUnread() const noexcept {

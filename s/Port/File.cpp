@@ -69,6 +69,11 @@ bool FollowLinks(std::string& name) {
     return true;
 }
 
+/// Whether an error tells that a folder takes no new file, however a file in it may be written.
+bool IsRefusal(int error) noexcept {
+    return error == EACCES || error == EPERM || error == EROFS;
+}
+
 /// A name that no other file of this process has; short, since the target's may be as long as a
 /// name can be.
 std::string TemporaryName(const std::string& folder) {
@@ -141,7 +146,8 @@ bool File::OpenToReplace(const char* name) {
             return Fail(errno);
         }
         target_ = std::move(target);
-        return OpenTemporary(DefaultPermissions);
+        const int error = OpenTemporary(DefaultPermissions);
+        return error == 0 || Fail(error);
     }
     struct stat status {};
     if (System::Get().GetStatus(descriptor_, &status) != 0) {
@@ -155,8 +161,12 @@ bool File::OpenToReplace(const char* name) {
     CloseDescriptor();
     target_ = std::move(target);
     const unsigned permissions = status.st_mode & PermissionBits;
-    if (!OpenTemporary(permissions)) {
-        return false;
+    if (status.st_nlink > 1) {
+        // Its other names are to lead to the new text, too.
+        return OpenTarget();
+    }
+    if (const int error = OpenTemporary(permissions); error != 0) {
+        return IsRefusal(error) ? OpenTarget() : Fail(error);
     }
     if (System::Get().ChangeMode(descriptor_, permissions) != 0) {
         Fail(errno);
@@ -166,17 +176,22 @@ bool File::OpenToReplace(const char* name) {
     return true;
 }
 
-bool File::OpenTemporary(unsigned mode) {
+/// \return the system's error number when the file cannot be made, else 0.
+int File::OpenTemporary(unsigned mode) {
     const std::string folder = FolderOf(target_);
     std::string name;
     do {
         name = TemporaryName(folder);
     } while (!OpenDescriptor(name.c_str(), O_WRONLY | O_CREAT | O_EXCL, mode) && errno == EEXIST);
     if (!IsOpen()) {
-        return Fail(errno);
+        return errno;
     }
     temporary_ = std::move(name);
-    return true;
+    return 0;
+}
+
+bool File::OpenTarget() {
+    return OpenDescriptor(target_.c_str(), O_WRONLY | O_TRUNC, 0) || Fail(errno);
 }
 
 bool File::close() {

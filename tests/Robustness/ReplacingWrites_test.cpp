@@ -1,5 +1,6 @@
 // A written netlist takes the place of a file as a whole, or not at all.
 #include "Orn_Hdl/Streams.h"
+#include "Port/System.h"
 #include "Support/EngineScript.h"
 #include "Support/TemporaryFolder.h"
 
@@ -215,13 +216,83 @@ TEST_F(Replacing, WhatMayNotBeWrittenIsNotReplaced) {
     WriteWholeFile(Path("file"), "former");
     fs::permissions(Path("file"), fs::perms(0444));
     EXPECT_EQ(Replace(Path("file")), EACCES);
-    fs::permissions(Path("file"), fs::perms(0644));
     fs::permissions(folder_.GetPath(), fs::perms(0555));
-    EXPECT_EQ(Replace(Path("file")), EACCES) << "the folder takes no temporary file";
+    EXPECT_EQ(Replace(Path("file")), EACCES);
     EXPECT_EQ(Replace(Path("fresh")), EACCES);
     fs::permissions(folder_.GetPath(), fs::perms(0755));
     EXPECT_EQ(ReadWholeFile(Path("file")), "former");
     EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, AFileIsWrittenDirectlyWhereNoOtherCanBeMade) {
+    const PlainUser user(folder_.GetPath());
+    WriteWholeFile(Path("file"), "former, and longer than the new text");
+    fs::permissions(Path("file"), fs::perms(0640));
+    fs::create_symlink("file", Path("link"));
+    fs::permissions(folder_.GetPath(), fs::perms(0555));
+    for (const char* name : {"file", "link"}) {
+        EXPECT_EQ(Replace(Path(name)), 0);
+        EXPECT_EQ(ReadWholeFile(Path("file")), "new\n");
+    }
+    Support::EngineScript script;
+    script.Run("WRITE VERILOG -NOHEADER " + Path("file"));
+    EXPECT_EQ(script.GetModel().GetWriteError(), 0);
+    EXPECT_NE(ReadWholeFile(Path("file")).find("endmodule"), std::string::npos);
+    fs::permissions(folder_.GetPath(), fs::perms(0755));
+    EXPECT_EQ(fs::status(Path("file")).permissions(), fs::perms(0640));
+    EXPECT_EQ(CountFiles(), 2);
+}
+
+/// A system in which no file can be made, and, if so wished, none written over.
+class ReadOnlySystem : public Port::System {
+public:
+    ReadOnlySystem(int error, bool refusesAll) : error_(error), refusesAll_(refusesAll) {
+        System::Replace(this);
+    }
+    ReadOnlySystem(const ReadOnlySystem&) = delete;
+    ReadOnlySystem& operator=(const ReadOnlySystem&) = delete;
+    ~ReadOnlySystem() override { System::Replace(nullptr); }
+
+    int Open(const char* name, int flags, unsigned mode) override {
+        if ((flags & O_CREAT) != 0 || (refusesAll_ && (flags & O_TRUNC) != 0)) {
+            errno = error_;
+            return -1;
+        }
+        return System::Open(name, flags, mode);
+    }
+
+private:
+    int error_;
+    bool refusesAll_;
+};
+
+TEST_F(Replacing, OnlyARefusalOfNewFilesIsGoneRound) {
+    for (const int error : {EACCES, EPERM, EROFS, ENOSPC, EIO, EMFILE}) {
+        const bool isRefusal = error == EACCES || error == EPERM || error == EROFS;
+        WriteWholeFile(Path("file"), "former");
+        for (const bool refusesAll : {true, false}) {
+            const ReadOnlySystem system(error, refusesAll);
+            const bool isWritten = isRefusal && !refusesAll;
+            EXPECT_EQ(Replace(Path("file")), isWritten ? 0 : error);
+            EXPECT_EQ(ReadWholeFile(Path("file")), isWritten ? "new\n" : "former");
+            EXPECT_EQ(Replace(Path("fresh")), error) << "there is nothing to write over";
+        }
+    }
+    EXPECT_EQ(CountFiles(), 1);
+}
+
+TEST_F(Replacing, AllNamesOfAFileLeadToTheNewText) {
+    WriteWholeFile(Path("file"), "former, and longer than the new text");
+    fs::permissions(Path("file"), fs::perms(0604));
+    fs::create_hard_link(Path("file"), Path("other"));
+    EXPECT_EQ(Replace(Path("other")), 0);
+    EXPECT_EQ(ReadWholeFile(Path("file")), "new\n");
+    EXPECT_EQ(fs::hard_link_count(Path("file")), 2u);
+    EXPECT_EQ(fs::status(Path("file")).permissions(), fs::perms(0604));
+    EXPECT_EQ(CountFiles(), 2);
+    fs::remove(Path("other"));
+    EXPECT_EQ(Replace(Path("file")), 0);
+    EXPECT_EQ(ReadWholeFile(Path("file")), "new\n");
 }
 
 TEST_F(Replacing, LeavesNoFileOpen) {
