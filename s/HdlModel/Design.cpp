@@ -94,7 +94,10 @@ OutputGuard::~OutputGuard() = default;
 Model::Model(CommandFactory* factory)
     : implementation_(std::make_unique<Implementation>(factory)) {}
 
-Model::~Model() = default;
+Model::~Model() {
+    // A command that ends may use its model: all of it is still there.
+    implementation_->commands.Clear();
+}
 
 void Model::Delete(std::unique_ptr<Model> model) noexcept {
     if (model != nullptr && model->uses_ > 0) {

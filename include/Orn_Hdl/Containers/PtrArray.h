@@ -97,17 +97,27 @@ template <class T> class PtrArray : public PtrArrayBase {
 public:
     static_assert(std::is_pointer<T>::value, "the array holds pointers");
 
-    /// \{
-    /// As the operations of the base, with `T` in place of the untyped pointer.
+    /// The element at `i`; null for an index out of range.
     T GetAt(int i) const noexcept { return static_cast<T>(PtrArrayBase::GetAt(i)); }
+    /// The last element; null when there is none.
     T GetTail() const noexcept { return static_cast<T>(PtrArrayBase::GetTail()); }
+    /// The index of the first element equal to `p`, or -1.
     int GetIndex(T p) const noexcept { return PtrArrayBase::GetIndex(p); }
+    /// Whether an element is equal to `p`.
     bool Contains(T p) const noexcept { return GetIndex(p) >= 0; }
+    /// Appends. \return the index of the new element.
     int Add(T p) { return PtrArrayBase::Add(p); }
+    /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
     void SetAt(int i, T p) { PtrArrayBase::SetAt(i, p); }
+    /// Puts an element before the one at `i`; an index out of range is ignored, but for that behind
+    /// the last element.
     void InsertAt(int i, T p) { PtrArrayBase::InsertAt(i, p); }
+    /// Removes the first element equal to `p`, keeping the others' order.
+    /// \return false when there is none.
     bool Remove(T p) noexcept { return PtrArrayBase::Remove(p); }
+    /// Removes the element at `i`, keeping the others' order; an index out of range is ignored.
     void RemoveAt(int i) noexcept { PtrArrayBase::RemoveAt(i); }
+    /// Sorts stably with the caller's less-than predicate, which receives `context`.
     void Sort(bool (*less)(T a, T b, void* context), void* context) {
         struct Caller {
             bool (*less)(T, T, void*);
@@ -120,7 +130,6 @@ public:
             },
             &caller);
     }
-    /// \}
 };
 
 /// A `PtrArray` with room for its first elements in itself.
