@@ -42,10 +42,13 @@ LIMITS = [
            simulation="is expected"),
     _limit("bare_generic", verilator="Too many digits", languages="nproven",
            simulation="is expected"),
+    _limit("comment_in_value", iverilog="syntax error", verilator="Unterminated string",
+           yosys="syntax error", languages="syntax error", simulation="syntax error"),
     _limit("constant_against", languages="nproven", simulation="is expected"),
     _limit("constant_width", **_vhdl("string length does not match")),
     _limit("driven_input", verilator="MULTIDRIVEN", yosys="multiple conflicting drivers",
            languages="multiple assignments"),
+    _limit("generic_and_attribute", **_vhdl("already used for a declaration")),
     _limit("missing_configuration", **_vhdl('unit "cfg_inv1" not found')),
     _limit("no_ports", **_vhdl("empty interface list")),
     _limit("open_bit", **_vhdl("cannot associate individually with open")),
@@ -66,6 +69,7 @@ LIMITS = [
     _limit("two_drivers", verilator="MULTIDRIVEN", yosys="multiple conflicting drivers"),
     _limit("undeclared_attribute", **_vhdl('no declaration for "loc"')),
     _limit("undeclared_generic", **_vhdl('no declaration for "init"')),
+    _limit("widened_after_write", ghdl_93="actual port of mode out"),
     _limit("underscores", **_vhdl("underscore|can't start with")),
 ]
 
