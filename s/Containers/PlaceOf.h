@@ -5,9 +5,9 @@
 
 namespace Orn_Hdl {
 
-/// The place of the element, of the last or the first that are equal; below zero when there is none.
-/// What is removed was mostly added last, or is removed in the order in which it was added: both
-/// ends are searched at once.
+/// The place of the element, of the last or the first that are equal; below zero when there is
+/// none. What is removed was mostly added last, or is removed in the order in which it was added:
+/// both ends are searched at once.
 template <class T> int PlaceOf(const PtrArray<T*>& list, const T* element) noexcept {
     int first = 0;
     int last = list.GetSize() - 1;
