@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <climits>
 #include <cstring>
+#include <ostream>
 #include <string>
 #include <vector>
 
@@ -390,6 +391,10 @@ struct Rule {
     bool skipEmpty;
     const char* quotes;
 };
+
+std::ostream& operator<<(std::ostream& out, const Rule& rule) {
+    return out << "separators <" << rule.separators << ">, quotes <" << rule.quotes << ">";
+}
 
 class TokeniserRule : public testing::TestWithParam<Rule> {};
 
