@@ -20,9 +20,10 @@ public:
     /// `Replace` is `Overwrite` that takes effect as a whole: what is written goes into a temporary
     /// file in the same folder, which `close` puts in the place of the named one when nothing has
     /// failed. Until then, and after any failure, the former file stands as it was; its permission
-    /// bits are kept, and a symbolic link stays one. Written directly, as by `Overwrite`, are
-    /// devices, pipes and other files that are not regular, a file that has more than one name, and
-    /// one that may be written in a folder that takes no new file.
+    /// bits are kept, and a symbolic link stays one; the file's other names, hard links, go on
+    /// leading to the former file. Written directly, as by `Overwrite`, are devices, pipes and
+    /// other files that are not regular, and a file that may be written in a folder that takes no
+    /// new file.
     enum Mode { Read = 1, Overwrite = 2, Append = 6, Replace = 10 };
 
     File() noexcept = default;

@@ -161,10 +161,6 @@ bool File::OpenToReplace(const char* name) {
     CloseDescriptor();
     target_ = std::move(target);
     const unsigned permissions = status.st_mode & PermissionBits;
-    if (status.st_nlink > 1) {
-        // Its other names are to lead to the new text, too.
-        return OpenTarget();
-    }
     if (const int error = OpenTemporary(permissions); error != 0) {
         return IsRefusal(error) ? OpenTarget() : Fail(error);
     }
