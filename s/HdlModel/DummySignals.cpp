@@ -33,8 +33,9 @@ bool DummySignals::IsKeptAsOriginal(const Signal& signal) const noexcept {
     return keeper != nullptr && (keeper != this || Find(&signal) != nullptr);
 }
 
-void DummySignals::Keep(Signal& signal) {
-    Signal::Links& links = signal.MakeLinks();
+/// \param signal has links already.
+void DummySignals::Keep(Signal& signal) noexcept {
+    Signal::Links& links = *signal.links_;
     links.keeper = this;
     ++links.timesKept;
 }
@@ -100,8 +101,8 @@ void DummySignals::Link(const Entry& entry) {
 }
 
 /// Puts the dummies in the place of their signals in all compounds that have one of these signals
-/// as a member; each compound is gone through once. \param firstEntry whose signals, and those of
-/// the entries behind it, tell the compounds.
+/// as a member; each compound is gone through once.
+/// \param firstEntry its signal and those of the entries behind it tell the compounds.
 void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
     std::unordered_set<const Signal*> met;
     for (std::size_t i = firstEntry; i < entries_.size(); ++i) {
