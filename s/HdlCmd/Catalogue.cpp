@@ -1,8 +1,8 @@
 #include "HdlCmd/Catalogue.h"
 
+#include "Exception/Failure.h"
 #include "HdlCmd/Executing.h"
 #include "HdlCmd/Parsing.h"
-#include "HdlModel/Failure.h"
 #include "Orn_Hdl/Model.h"
 
 namespace Orn_Hdl {

@@ -1,5 +1,5 @@
 #include "Orn_Hdl/Commands.h"
-#include "Orn_Hdl/Model/Design.h"
+#include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 
 #include <array>

@@ -1,11 +1,11 @@
 #include "Orn_Hdl/Commands.h"
 
+#include "Exception/Failure.h"
 #include "HdlCmd/Catalogue.h"
 #include "HdlCmd/PhraseTable.h"
-#include "HdlModel/Failure.h"
 #include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
-#include "Orn_Hdl/Model/Design.h"
+#include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
 

@@ -1,6 +1,6 @@
 #include "HdlCmd/Executing.h"
 
-#include "HdlModel/Failure.h"
+#include "Exception/Failure.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"

@@ -1,7 +1,7 @@
 #include "Orn_Hdl/Engine.h"
 
+#include "Exception/Failure.h"
 #include "HdlEngine/ModelRegistry.h"
-#include "HdlModel/Failure.h"
 #include "Options/Keywords.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Model.h"

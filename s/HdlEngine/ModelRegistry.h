@@ -1,8 +1,8 @@
 // The models of an engine, found by name without asking each of them.
 #pragma once
 
-#include "HdlModel/NameListener.h"
-#include "Orn_Hdl/Model/Design.h"
+#include "HdlModel/Objects/NameListener.h"
+#include "Orn_Hdl/Model.h"
 
 #include <cstdint>
 #include <map>

@@ -1,7 +1,7 @@
 // Keeps a model from ending in the middle of what it does.
 #pragma once
 
-#include "Orn_Hdl/Model/Design.h"
+#include "Orn_Hdl/Model.h"
 
 namespace Orn_Hdl {
 

@@ -1,4 +1,4 @@
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Orn_Hdl/Model/Component.h"
 #include "Orn_Hdl/Options.h"

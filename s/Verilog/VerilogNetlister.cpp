@@ -1,6 +1,6 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/Generics.h"
 #include "Writers/InstanceWalk.h"

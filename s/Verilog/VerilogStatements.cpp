@@ -1,6 +1,6 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Port/Ascii.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"

@@ -1,7 +1,7 @@
 // Writes a signal as a Verilog expression.
 #pragma once
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Model/Signals.h"
 #include "Orn_Hdl/Streams.h"
 

@@ -1,7 +1,7 @@
 #include "Orn_Hdl/Writers/Vhdl.h"
 
-#include "HdlModel/Names.h"
-#include "HdlModel/Primitives.h"
+#include "HdlModel/Names/Names.h"
+#include "HdlModel/Netlist/Primitives.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/Generics.h"

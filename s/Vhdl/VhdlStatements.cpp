@@ -1,6 +1,6 @@
 #include "Orn_Hdl/Writers/Vhdl.h"
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
 #include "Writers/OneLine.h"

@@ -1,6 +1,6 @@
 #include "Vhdl/WritePortAssignmentVisitor.h"
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Writers/Text.h"
 
 #include <climits>

@@ -1,7 +1,7 @@
 // What both writers do with names and plain text.
 #pragma once
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Model/Pins.h"
 #include "Orn_Hdl/Streams.h"

@@ -1,4 +1,4 @@
-#include "HdlModel/NameIndex.h"
+#include "HdlModel/Names/NameIndex.h"
 
 #include <gtest/gtest.h>
 

@@ -44,7 +44,7 @@ SOURCES = """\
 #include "HdlCmd/Executing.h"
 #include "HdlCmd/Catalogue.h"
 #include "HdlCmd/Parsing.h"
-#include "HdlModel/Failure.h"
+#include "Exception/Failure.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 namespace Orn_Hdl {{
 {code}

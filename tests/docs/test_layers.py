@@ -1,4 +1,5 @@
-"""Sources include only what stands in their own layer or below it, as docs/architecture.md says."""
+"""Sources include only what stands in their own layer or below it; the table in docs/architecture.md
+says which files and folders a layer is."""
 
 from __future__ import annotations
 
@@ -9,33 +10,36 @@ from pathlib import Path
 PROJECT = Path(__file__).resolve().parents[2]
 INCLUDE = re.compile(r'^#include "(.*?)"', re.M)
 
-# From the lowest to the highest; the first pattern that matches a file tells its layer. Headers are
-# named as they are included, public and private ones alike.
-LAYERS = {
-    "portability": r"Port/|Orn_Hdl/Exception\.h|HdlModel/Failure\.",
-    "containers": r"(Orn_Hdl/)?Containers(/|\.)",
-    "streams": r"(Orn_Hdl/)?Streams(/|\.)",
-    "design": r"Orn_Hdl/Attributes\.h|Orn_Hdl/Model/(?!Design\.)|HdlModel/(?!Design\.|ModelUse\.)",
-    "options": r"(Orn_Hdl/)?Options(/|\.)",
-    "writers": r"(Orn_Hdl/)?Writers(/|\.)|Header/|Verilog/|Vhdl/",
-    "model": r"Orn_Hdl/Model(/Design)?\.h|HdlModel/(Design|ModelUse)\.",
-    "commands": r"Orn_Hdl/Commands\.h|HdlCmd/",
-    "engine": r"Orn_Hdl/(Engine|Orn_Hdl)\.h|HdlEngine/",
-}
-ORDER = list(LAYERS)
+ROW = re.compile(r"^\| (\w+) \|[^|]*\|([^|]*)\|([^|]*)\|$", re.M)
+
+
+def layers() -> list[tuple[str, list[str]]]:
+    """The rows of the page's table, lowest first: the layer's name, then its files and folders as they
+    are included, public and private ones alike."""
+    page = (PROJECT / "docs" / "architecture.md").read_text()
+    rows = [(name, re.findall(r"`([^`]+)`", public) +
+             [folder.removeprefix("s/") for folder in re.findall(r"`([^`]+)`", private)])
+            for name, public, private in ROW.findall(page)]
+    return rows[[name for name, _ in rows].index("tool"):][::-1]
+
+
+LAYERS = layers()
 
 # What the page names as its exceptions.
 UPWARDS = {
-    ("HdlModel/Design.cpp", "Orn_Hdl/Commands.h"),
+    ("HdlModel/Model.cpp", "Orn_Hdl/Commands.h"),
     ("Options/HdlUtilities.cpp", "Orn_Hdl/Writers/NetlistHeader.h"),
 }
 
 
 def layer_of(file: str) -> int:
-    for order, pattern in enumerate(LAYERS.values()):
-        if re.match(pattern, file):
-            return order
-    raise AssertionError(f"{file} belongs to no layer")
+    """The layer whose row names the file or the innermost folder around it."""
+    inner = file.removeprefix("Orn_Hdl/")
+    found = [(len(place), order) for order, (_, places) in enumerate(LAYERS) for place in places
+             if inner == place or inner.startswith(place.rstrip("/") + "/")]
+    if not found:
+        raise AssertionError(f"{file} belongs to no layer")
+    return max(found)[1]
 
 
 def includes() -> list[tuple[str, str]]:
@@ -55,10 +59,13 @@ class Layers(unittest.TestCase):
                    if layer_of(header) > layer_of(file)}
         self.assertEqual(upwards, UPWARDS)
 
-    def test_the_page_names_the_layers_in_this_order(self) -> None:
-        page = (PROJECT / "docs" / "architecture.md").read_text()
-        rows = re.findall(r"^\| (\w+) \| .*\|$", page, re.M)
-        self.assertEqual(rows[rows.index("tool") + 1:], ORDER[::-1])
+    def test_every_place_of_the_table_exists(self) -> None:
+        self.assertEqual(len(LAYERS), 10)
+        for name, places in LAYERS:
+            for place in places:
+                self.assertTrue(any((PROJECT / root / place).exists()
+                                    for root in ("include", "include/Orn_Hdl", "s", "")),
+                                f"{name}: {place}")
 
 
 if __name__ == "__main__":

@@ -1,7 +1,7 @@
 // Sorting objects by a rank, then by name in natural order.
 #pragma once
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
 
 #include <algorithm>

@@ -1,6 +1,6 @@
-#include "HdlModel/DummySignals.h"
+#include "HdlModel/Netlist/DummySignals.h"
 
-#include "HdlModel/SignalLinks.h"
+#include "HdlModel/Signals/SignalLinks.h"
 
 #include <algorithm>
 #include <memory>

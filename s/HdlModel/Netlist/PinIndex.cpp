@@ -1,4 +1,4 @@
-#include "HdlModel/PinIndex.h"
+#include "HdlModel/Netlist/PinIndex.h"
 
 namespace Orn_Hdl {
 

@@ -1,7 +1,7 @@
 // Looks up ahead of time what coming command lines name.
 #pragma once
 
-#include "HdlModel/NameIndex.h"
+#include "HdlModel/Names/NameIndex.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/Prefetch.h"
 

@@ -1,7 +1,7 @@
 // Finds the pins of a long list by name.
 #pragma once
 
-#include "HdlModel/NameIndex.h"
+#include "HdlModel/Names/NameIndex.h"
 #include "Orn_Hdl/Model/Pins.h"
 
 #include <atomic>

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "Containers/HashByEights.h"
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
 #include "Port/Prefetch.h"

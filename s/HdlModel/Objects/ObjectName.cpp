@@ -1,6 +1,6 @@
 #include "Orn_Hdl/Model/ObjectName.h"
 
-#include "HdlModel/ObjectDetails.h"
+#include "HdlModel/Objects/ObjectDetails.h"
 
 #include <atomic>
 #include <cstring>

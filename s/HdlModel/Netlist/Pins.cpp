@@ -1,8 +1,8 @@
 #include "Orn_Hdl/Model/Pins.h"
 
-#include "HdlModel/Names.h"
-#include "HdlModel/ObjectDetails.h"
-#include "HdlModel/PinIndex.h"
+#include "HdlModel/Names/Names.h"
+#include "HdlModel/Netlist/PinIndex.h"
+#include "HdlModel/Objects/ObjectDetails.h"
 #include "Orn_Hdl/Model/Signals.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"

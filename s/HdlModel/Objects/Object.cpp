@@ -1,8 +1,8 @@
 #include "Orn_Hdl/Model/Object.h"
 
-#include "HdlModel/Names.h"
-#include "HdlModel/ObjectDetails.h"
-#include "HdlModel/ObjectKey.h"
+#include "HdlModel/Names/Names.h"
+#include "HdlModel/Objects/ObjectDetails.h"
+#include "HdlModel/Objects/ObjectKey.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
 

@@ -1,7 +1,7 @@
 #include "Orn_Hdl/Model/Component.h"
 
-#include "HdlModel/NaturalSort.h"
-#include "HdlModel/PinIndex.h"
+#include "HdlModel/Names/NaturalSort.h"
+#include "HdlModel/Netlist/PinIndex.h"
 #include "Orn_Hdl/Model/Signals.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"

@@ -1,7 +1,7 @@
 #include "Orn_Hdl/Attributes.h"
 
-#include "HdlModel/Names.h"
-#include "HdlModel/ObjectKey.h"
+#include "HdlModel/Names/Names.h"
+#include "HdlModel/Objects/ObjectKey.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"

@@ -1,7 +1,7 @@
 // Cells of the primitive library, which are marked by an attribute.
 #pragma once
 
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Model/Component.h"
 
 namespace Orn_Hdl {

@@ -1,14 +1,14 @@
 #include "Orn_Hdl/Model/Netlist.h"
 
 #include "Containers/PlaceOf.h"
-#include "HdlModel/DummySignals.h"
-#include "HdlModel/Foresight.h"
-#include "HdlModel/NameIndex.h"
-#include "HdlModel/NameListener.h"
-#include "HdlModel/Names.h"
-#include "HdlModel/NaturalSort.h"
-#include "HdlModel/ObjectKey.h"
-#include "HdlModel/Primitives.h"
+#include "HdlModel/Names/NameIndex.h"
+#include "HdlModel/Names/Names.h"
+#include "HdlModel/Names/NaturalSort.h"
+#include "HdlModel/Netlist/DummySignals.h"
+#include "HdlModel/Netlist/Foresight.h"
+#include "HdlModel/Netlist/Primitives.h"
+#include "HdlModel/Objects/NameListener.h"
+#include "HdlModel/Objects/ObjectKey.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>

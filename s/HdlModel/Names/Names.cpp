@@ -1,4 +1,4 @@
-#include "HdlModel/Names.h"
+#include "HdlModel/Names/Names.h"
 
 #include "Port/Text.h"
 

@@ -1,11 +1,11 @@
 #include "Orn_Hdl/Model/Signals.h"
 
 #include "Containers/PlaceOf.h"
-#include "HdlModel/DummySignals.h"
-#include "HdlModel/Names.h"
-#include "HdlModel/ObjectDetails.h"
-#include "HdlModel/ObjectKey.h"
-#include "HdlModel/SignalLinks.h"
+#include "HdlModel/Names/Names.h"
+#include "HdlModel/Netlist/DummySignals.h"
+#include "HdlModel/Objects/ObjectDetails.h"
+#include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Signals/SignalLinks.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
 

@@ -1,4 +1,4 @@
-#include "HdlModel/Failure.h"
+#include "Exception/Failure.h"
 
 #include "Orn_Hdl/Exception.h"
 
