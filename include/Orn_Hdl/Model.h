@@ -14,6 +14,7 @@
 #include "Port/String.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <string_view>
 
@@ -108,9 +109,12 @@ public:
     /// \}
     /// What became of the last netlist that a write command wrote: the file's name and the system's
     /// error number, 0 when every byte was written.
-    void RecordWrite(const char* fileName, int error);
+    /// \param leftover how many bytes stand at the end of a file although appending has failed.
+    void RecordWrite(const char* fileName, int error, std::uint64_t leftover = 0);
     /// The error number of the last write.
     int GetWriteError() const noexcept;
+    /// How many bytes of the last write stand at the end of the file although appending has failed.
+    std::uint64_t GetWriteLeftover() const noexcept;
     /// The file name of the last write.
     Port::StringBase<char> GetWrittenFileName() const;
 
