@@ -1,6 +1,7 @@
 // Sorting objects by a rank, then by name in natural order.
 #pragma once
 
+#include "Containers/Reordering.h"
 #include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
 
@@ -58,7 +59,7 @@ template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankO
         return order != 0 ? order < 0 : a.GetIndex() < b.GetIndex();
     });
     for (int i = 0; i < size; ++i) {
-        objects.SetAt(i, objectOf(keys[static_cast<std::size_t>(i)]));
+        Reordering::Place(objects, i, objectOf(keys[static_cast<std::size_t>(i)]));
     }
 }
 
