@@ -117,16 +117,10 @@ protected:
 
 private:
     friend class PinBlock;
-    friend class Signal;
-    friend class PinList;
+    friend class PinLinks;
 
     /// Makes a copy of this pin at `place`, which has room for any pin.
     virtual Pin* CloneInto(void* place) const = 0;
-
-    bool IsListedBy(const Signal* signal) const noexcept;
-    void NoteUnlisted(Signal* signal) noexcept;
-    void PrepareToLeave();
-    void PointAt(Signal* signal, bool isListed) noexcept;
 
     static constexpr unsigned ListedFlag = 0x10;
 

@@ -159,6 +159,20 @@ std::string WithRange(string_view base, int left, int right) {
     return WithRange(base, std::to_string(left), std::to_string(right));
 }
 
+bool IsDummy(string_view base) noexcept {
+    return base.size() >= DummySuffix.size() &&
+           IsNamed(base.substr(base.size() - DummySuffix.size()), DummySuffix);
+}
+
+std::string DummyOf(string_view base) {
+    return std::string(base).append(DummySuffix);
+}
+
+std::string DummyOfPart(string_view name) {
+    const string_view base = BeforeParenthesis(name);
+    return DummyOf(base).append(name.substr(base.size()));
+}
+
 namespace {
 
 std::size_t DigitRun(string_view text, std::size_t start) noexcept {

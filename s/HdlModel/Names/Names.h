@@ -12,7 +12,7 @@
 
 namespace Orn_Hdl::Names {
 
-/// What the name of a signal that stands in for another one ends in.
+/// What the names of dummy signals end in, before a range or index.
 constexpr std::string_view DummySuffix = "_DUMMY";
 
 /// One character of a name in its normalised form.
@@ -107,6 +107,13 @@ std::string WithIndex(std::string_view base, std::string_view index);
 std::string WithIndex(std::string_view base, int index);
 std::string WithRange(std::string_view base, std::string_view left, std::string_view right);
 std::string WithRange(std::string_view base, int left, int right);
+
+/// Whether a base name ends as those of dummy signals do, letter case ignored.
+bool IsDummy(std::string_view base) noexcept;
+/// The name of the dummy signal of a scalar signal.
+std::string DummyOf(std::string_view base);
+/// The name of the dummy signal of a bus or a part of one: the range or index stays behind.
+std::string DummyOfPart(std::string_view name);
 
 inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
     return Port::EqualIgnoringCase(name, other);

@@ -45,8 +45,6 @@ private:
     void MakeForCompound(Netlist& netlist, CompoundBus& compound, bool forOutputs);
     /// Adds a dummy to the netlist and to the memory, and lets it take over for the first time.
     void Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs);
-    void Keep(Signal& signal) noexcept;
-    static void Release(Signal& signal) noexcept;
     bool IsKeptAsOriginal(const Signal& signal) const noexcept;
     static void TakeOver(const Entry& entry);
     static void Link(const Entry& entry);

@@ -9,6 +9,10 @@
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Signals/BusParts.h"
+#include "HdlModel/Signals/PinLinks.h"
+#include "HdlModel/Signals/References.h"
+#include "HdlModel/Signals/SignalCast.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
@@ -66,14 +70,8 @@ struct Netlist::Implementation {
 
     ~Implementation() {
         dummies.Clear();
-        // Signals end first: an instance then has nothing to leave. They part all at once, while
-        // all of them are alive.
-        for (Signal* signal : Iterator<Signal*>(&signals)) {
-            signal->MarkDying();
-        }
-        for (Signal* signal : Iterator<Signal*>(&signals)) {
-            signal->LeaveAll();
-        }
+        // Signals are destroyed first: an instance then has nothing to leave.
+        References::LeaveTogether(signals);
         signals.DeleteAll();
         instances.DeleteAll();
         components.DeleteAll();
@@ -106,23 +104,23 @@ struct Netlist::Implementation {
     void MakeRoomFor(const Object* /*object*/) { byName.MakeRoom(); }
     void MakeRoomFor(const Signal* signal) {
         byName.MakeRoom();
-        if (signal->GetSignalType() == SignalTypeBus) {
+        if (As<Bus>(signal) != nullptr) {
             busesByBaseName.MakeRoom();
         }
     }
 
     void Enter(Object* /*object*/) {}
     void Enter(Signal* signal) {
-        if (signal->GetSignalType() == SignalTypeBus) {
-            busesByBaseName.Add(static_cast<Bus*>(signal));
+        if (Bus* const bus = As<Bus>(signal)) {
+            busesByBaseName.Add(bus);
         }
     }
 
     void Forget(Object* /*object*/) noexcept {}
     void Forget(Signal* signal) noexcept {
         dummies.Forget(signal);
-        if (signal->GetSignalType() == SignalTypeBus) {
-            busesByBaseName.Remove(static_cast<Bus*>(signal));
+        if (Bus* const bus = As<Bus>(signal)) {
+            busesByBaseName.Remove(bus);
         }
     }
 };
@@ -277,21 +275,33 @@ void Netlist::SetBoxTypeAttribute() {
     }
 }
 
+namespace {
+
+/// Whether a compound that no netlist holds has a signal as a member.
+bool IsInLooseCompound(const Signal& signal) {
+    const std::vector<Signal*>& referrers = References::GetReferrers(signal);
+    return std::any_of(referrers.begin(), referrers.end(), [](const Signal* referrer) {
+        return As<CompoundBus>(referrer) != nullptr && !OwnedFlag::Get(*referrer);
+    });
+}
+
+} // namespace
+
 bool Netlist::MayHaveFeedBack(bool outputPorts) const {
     const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
     const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;
     for (const Signal* signal : GetSignalIterator()) {
-        const int type = signal->GetSignalType();
         // A compound has a polarity of its own only when its members agree; any member counts here.
-        const bool isCandidate =
-            type == SignalTypeCompoundBus || signal->GetPortPolarity().GetValue() == portPolarity;
-        if ((isCandidate && signal->HasPinOf(pinPolarity)) || signal->HasLooseCompound()) {
+        const bool isCandidate = As<CompoundBus>(signal) != nullptr ||
+                                 signal->GetPortPolarity().GetValue() == portPolarity;
+        if ((isCandidate && PinLinks::HasPinOf(*signal, pinPolarity)) ||
+            IsInLooseCompound(*signal)) {
             return true;
         }
-        if (isCandidate && type == SignalTypeBus) {
+        if (const Bus* const bus = isCandidate ? As<Bus>(signal) : nullptr) {
             // The netlist need not hold the parts of its buses.
-            for (const Signal* part : static_cast<const Bus*>(signal)->GetBusSliceIterator()) {
-                if (part->HasPinOf(pinPolarity) || part->HasLooseCompound()) {
+            for (const Signal* part : bus->GetBusSliceIterator()) {
+                if (PinLinks::HasPinOf(*part, pinPolarity) || IsInLooseCompound(*part)) {
                     return true;
                 }
             }
@@ -349,17 +359,32 @@ void Netlist::CreateVhdlDummySignals() {
     dummies.Make(*this, names, true);
 }
 
+namespace {
+
+/// \param to has no comment yet.
+void CopyComment(const Object& from, Object& to) {
+    std::string_view comment = from.GetCommentView();
+    if (!comment.empty()) {
+        // AddComment puts the last line feed back.
+        comment.remove_suffix(1);
+        to.AddComment(std::string(comment).c_str());
+    }
+}
+
+} // namespace
+
 void Netlist::ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider,
                          std::unique_ptr<BusSlice> slice) {
     wider->SetPortPolarity(narrower->GetPortPolarity());
     static_cast<AttributeHolder&>(*wider) = *narrower;
-    wider->TakeCommentOf(*narrower);
+    CopyComment(*narrower, *wider);
     slice->CloneConnection(narrower);
     if (!narrower->GetConstantValue().GetValue().IsEmpty()) {
         slice->AssignConstantValue(narrower->GetConstantValue());
     }
-    narrower->ReplaceEverywhereBy(slice.get());
-    wider->TakeParts(*narrower);
+    PinLinks::MoveUnlisted(*narrower, *slice);
+    References::ReplaceEverywhere(*narrower, *slice);
+    BusParts::TakeOver(*wider, *narrower);
     Remove(narrower);
     Add(wider.release());
     Add(slice.release());

@@ -11,13 +11,14 @@ std::optional<std::int64_t> Count(const Signal& signal) {
     if (IsSingle(signal)) {
         return 1;
     }
-    if (signal.GetSignalType() != SignalTypeCompoundBus) {
+    const CompoundBus* const compound = As<CompoundBus>(&signal);
+    if (compound == nullptr) {
         Names::BusName bus;
         const bool isListable = Names::ParseBus(signal.GetNameView(), bus) && bus.IsExpandable();
         return isListable ? std::optional(bus.GetBits()) : std::nullopt;
     }
     std::int64_t count = 0;
-    for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
+    for (const Signal* member : compound->GetBusMemberIterator()) {
         const std::optional<std::int64_t> ofMember = Count(*member);
         if (!ofMember) {
             return std::nullopt;
@@ -25,6 +26,10 @@ std::optional<std::int64_t> Count(const Signal& signal) {
         count += *ofMember;
     }
     return count;
+}
+
+void AppendTo(StringArray& names, const Names::BusName& bus) {
+    ForEach(bus, bus.GetBits(), [&names](std::string_view bit) { names.Add(bit); });
 }
 
 } // namespace Orn_Hdl::SignalBits

@@ -10,6 +10,8 @@
 #pragma once
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Signals/SignalCast.h"
+#include "Orn_Hdl/Containers/StringArray.h"
 #include "Orn_Hdl/Model/Signals.h"
 
 #include <algorithm>
@@ -53,9 +55,8 @@ std::int64_t ForEach(const Signal& signal, std::int64_t most, const Visit& visit
     }
     std::int64_t done = 0;
     Names::BusName bus;
-    if (signal.GetSignalType() == SignalTypeCompoundBus) {
-        for (const Signal* member :
-             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
+    if (const CompoundBus* const compound = As<CompoundBus>(&signal)) {
+        for (const Signal* member : compound->GetBusMemberIterator()) {
             done += ForEach(*member, most - done, visit);
         }
     } else if (Names::ParseBus(signal.GetNameView(), bus)) {
@@ -63,5 +64,8 @@ std::int64_t ForEach(const Signal& signal, std::int64_t most, const Visit& visit
     }
     return done;
 }
+
+/// Appends the names of all bits of a range.
+void AppendTo(StringArray& names, const Names::BusName& bus);
 
 } // namespace Orn_Hdl::SignalBits
