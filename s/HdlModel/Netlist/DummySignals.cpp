@@ -27,8 +27,7 @@ Signal* DummySignals::Find(const Signal* original) const noexcept {
     return found == dummyOf_.end() ? nullptr : found->second;
 }
 
-/// Whether the signal has a dummy already, or is none of this memory's business: the memory of
-/// another netlist knows it.
+/// Whether the signal has a dummy already, here or in another netlist.
 bool DummySignals::IsKeptAsOriginal(const Signal& signal) const noexcept {
     const DummySignals* const keeper = References::GetKeeper(signal);
     return keeper != nullptr && (keeper != this || Find(&signal) != nullptr);
@@ -59,8 +58,8 @@ void DummySignals::Clear() noexcept {
     dummyOf_.clear();
 }
 
-/// The dummy takes the pins that still point at its signal. In the place of an output port it takes
-/// the aliases and the constant away too, so that the port has no driver but the dummy.
+/// The dummy takes over the pins that still point at its signal. The dummy of an output port takes
+/// the aliases and the constant away as well, so that it is the port's only driver.
 void DummySignals::TakeOver(const Entry& entry) {
     Signal& original = *entry.original;
     Signal& dummy = *entry.dummy;
@@ -80,14 +79,14 @@ void DummySignals::Link(const Entry& entry) {
     driven->Connect(driven == entry.original ? entry.dummy : entry.original);
 }
 
-/// Puts the dummies in the place of their signals in all compounds that have one of these signals
-/// as a member; each compound is gone through once.
-/// \param firstEntry its signal and those of the entries behind it tell the compounds.
+/// Replaces signals by their dummies in all compounds that have one of them as a member; each
+/// compound is gone through once.
+/// \param firstEntry the first of the entries whose signals are looked for.
 void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
     std::unordered_set<const Signal*> met;
     for (std::size_t i = firstEntry; i < entries_.size(); ++i) {
         const std::vector<Signal*> referrers = References::GetReferrers(*entries_[i].original);
-        // The last first: that is where the original, which forgets each of them, looks first.
+        // The last first: that is where the original, which drops each note, looks first.
         for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
             CompoundBus* const compound = As<CompoundBus>(*referrer);
             if (compound != nullptr && met.insert(compound).second) {
@@ -98,7 +97,7 @@ void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
 }
 
 void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
-    // From the end, for the same reason.
+    // From the end: that is where the notes of the members are looked for first.
     for (int i = compound.GetSize() - 1; i >= 0; --i) {
         const Signal* const member = compound.GetAt(i);
         if (which == Members::All || As<CompoundBus>(member) == nullptr) {
@@ -111,7 +110,7 @@ void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
 
 void DummySignals::Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs) {
     netlist.Add(dummy);
-    // What can fail for want of memory comes first: both are told of their end from here on.
+    // Room comes first: an entry whose signals are kept is dropped when either is destroyed.
     References::PrepareToKeep(original);
     References::PrepareToKeep(*dummy);
     entries_.push_back({&original, dummy, forOutputs});

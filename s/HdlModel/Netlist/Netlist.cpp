@@ -5,6 +5,7 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Names/NaturalSort.h"
 #include "HdlModel/Netlist/DummySignals.h"
+#include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/Foresight.h"
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Objects/NameListener.h"
@@ -82,7 +83,7 @@ struct Netlist::Implementation {
         if (object == nullptr || OwnedFlag::Get(*object)) {
             return;
         }
-        // What can fail for want of memory comes first: what is held is found.
+        // All allocation comes first, so that what the netlist holds can always be found.
         std::unique_ptr<T> taken(object);
         MakeRoomFor(object);
         objects.AddNew(object);
@@ -275,74 +276,11 @@ void Netlist::SetBoxTypeAttribute() {
     }
 }
 
-namespace {
-
-/// Whether a compound that no netlist holds has a signal as a member.
-bool IsInLooseCompound(const Signal& signal) {
-    const std::vector<Signal*>& referrers = References::GetReferrers(signal);
-    return std::any_of(referrers.begin(), referrers.end(), [](const Signal* referrer) {
-        return As<CompoundBus>(referrer) != nullptr && !OwnedFlag::Get(*referrer);
-    });
-}
-
-} // namespace
-
-bool Netlist::MayHaveFeedBack(bool outputPorts) const {
-    const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
-    const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;
-    for (const Signal* signal : GetSignalIterator()) {
-        // A compound has a polarity of its own only when its members agree; any member counts here.
-        const bool isCandidate = As<CompoundBus>(signal) != nullptr ||
-                                 signal->GetPortPolarity().GetValue() == portPolarity;
-        if ((isCandidate && PinLinks::HasPinOf(*signal, pinPolarity)) ||
-            IsInLooseCompound(*signal)) {
-            return true;
-        }
-        if (const Bus* const bus = isCandidate ? As<Bus>(signal) : nullptr) {
-            // The netlist need not hold the parts of its buses.
-            for (const Signal* part : bus->GetBusSliceIterator()) {
-                if (PinLinks::HasPinOf(*part, pinPolarity) || IsInLooseCompound(*part)) {
-                    return true;
-                }
-            }
-        }
-    }
-    return false;
-}
-
-void Netlist::GetFeedBackSignals(bool outputPorts, StringSet& names) const {
-    // Most designs use no port against its direction; the ports tell that faster than all pins do.
-    if (!MayHaveFeedBack(outputPorts)) {
-        return;
-    }
-    for (const Instance* instance : GetInstanceIterator()) {
-        PtrArray<Pin*> pins;
-        if (outputPorts) {
-            instance->GetOutPortConnectedToInPin(pins);
-        } else {
-            instance->GetInPortConnectedToOutPin(pins);
-        }
-        for (const Pin* pin : Iterator<Pin*>(&pins)) {
-            if (pin->GetSignal() != nullptr) {
-                pin->GetSignal()->GetBaseName(names);
-            }
-        }
-    }
-}
-
-void Netlist::GetWiredOrOutputSignals(StringSet& names) const {
-    for (const Signal* signal : GetSignalIterator()) {
-        if (signal->GetPortPolarity().GetValue() == Polarity::Output && signal->HasMultiDriver()) {
-            signal->GetBaseName(names);
-        }
-    }
-}
-
 void Netlist::CreateVerilogDummySignals() {
     DummySignals& dummies = implementation_->dummies;
     dummies.Refresh(*this);
     StringSet names;
-    GetFeedBackSignals(false, names);
+    FeedBack::AddSignals(*this, false, names);
     dummies.Make(*this, names, false);
 }
 
@@ -351,11 +289,11 @@ void Netlist::CreateVhdlDummySignals() {
     dummies.Refresh(*this);
     StringSet names;
     for (const bool outputPorts : {true, false}) {
-        GetFeedBackSignals(outputPorts, names);
+        FeedBack::AddSignals(*this, outputPorts, names);
         dummies.Make(*this, names, outputPorts);
         names.Empty();
     }
-    GetWiredOrOutputSignals(names);
+    FeedBack::AddWiredOrOutputs(*this, names);
     dummies.Make(*this, names, true);
 }
 
