@@ -4,6 +4,7 @@
 #pragma once
 
 #include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Language.h"
 #include "Port/Export.h"
 #include "Port/String.h"
 
@@ -108,7 +109,10 @@ public:
     /// The names of an instance's attributes, then those of its component's that it does not have.
     /// A null instance gives an empty list.
     static const StringArray GetAttrNames(const Instance* instance);
-    /// Writes the header banner.
+    /// Writes the header banner in comments of a language.
+    static void WriteHeader(const Port::StringBase<char>& designName, Language language,
+                            const HdlOptions& options, OutStream& out);
+    /// Writes the header banner in the comments that a flag chooses.
     /// \param vhdlComments true for VHDL comments, false for Verilog's.
     static void WriteHeader(const Port::StringBase<char>& designName, bool vhdlComments,
                             const HdlOptions& options, OutStream& out);

@@ -143,7 +143,7 @@ void VerilogNetlister::Writer::SetNameCase(Object& object,
 
 void VerilogNetlister::Writer::WriteHead() {
     if (options_.writeHeader) {
-        HdlUtilities::WriteHeader(netlist_.GetName(), false, options_, out_);
+        HdlUtilities::WriteHeader(netlist_.GetName(), Language::Verilog, options_, out_);
     }
     statements_.WriteComment(&netlist_);
     statements_.WriteIncludePath(options_.verilog.includePaths);

@@ -215,7 +215,7 @@ void VhdlNetlister::Writer::Prepare() {
 
 void VhdlNetlister::Writer::WriteHead() {
     if (options_.writeHeader) {
-        HdlUtilities::WriteHeader(netlist_.GetName(), true, options_, out_);
+        HdlUtilities::WriteHeader(netlist_.GetName(), Language::Vhdl, options_, out_);
     }
     statements_.WriteComment(&netlist_);
     out_.WriteEmptyLine();
