@@ -84,8 +84,9 @@ struct ORN_HDL_API HdlOptions {
     /// \}
     /// Whether each port and each pin connection stands on a line of its own.
     bool onePortPerLine = true;
-    /// Whether instances pass the module's own INIT parameter down. Each Verilog write sets it.
-    mutable bool hierarchicalInit = false;
+    /// Whether the last Verilog write gave instances the module's own INIT parameter in place of
+    /// values of their own. A write with options that it may change sets it; no write reads it.
+    bool hierarchicalInit = false;
 };
 
 /// Helpers that both writers share.

@@ -181,7 +181,7 @@ void VerilogStatements::WriteDefParamInitStatement(Attribute* attribute, const c
 
 void VerilogStatements::WriteComment(const Object* object) {
     if (object != nullptr) {
-        Writers::WriteCommentLines(out_, "// ", object->GetCommentView());
+        Writers::WriteComment(out_, Language::Verilog, *object);
     }
 }
 

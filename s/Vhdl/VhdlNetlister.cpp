@@ -4,10 +4,7 @@
 #include "HdlModel/Netlist/Primitives.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
-#include "Writers/Generics.h"
-#include "Writers/InstanceWalk.h"
-#include "Writers/SignalLists.h"
-#include "Writers/Text.h"
+#include "Writers/NetlistPass.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -23,8 +20,6 @@ using namespace std::literals::string_view_literals;
 
 namespace {
 
-constexpr const char* TranslateOff = "-- synopsys translate_off";
-constexpr const char* TranslateOn = "-- synopsys translate_on";
 constexpr string_view PortIndentation = "       ";      // 7 blanks
 constexpr string_view GenericIndentation = "         "; // 9 blanks
 constexpr string_view AssociationPerLine = ",\n          ";
@@ -39,7 +34,7 @@ constexpr GenericForm GenericClause = {"generic", ";", ";"};
 constexpr GenericForm GenericMap = {"generic map", ",", ""};
 
 bool IsWritable(string_view name) {
-    return !Writers::IsOpen(name);
+    return Writers::IsWritable(Language::Vhdl, name);
 }
 
 /// Whether only the signal's bits, not the signal, can stand in an assignment.
@@ -115,13 +110,12 @@ bool IsBinary(string_view digits) {
 
 } // namespace
 
-/// Writes one netlist: first the netlist is prepared, then it is only read.
-class VhdlNetlister::Writer {
+class VhdlNetlister::Writer : private Writers::NetlistPass {
 public:
     Writer(OutStream& out, VhdlStatements& statements, StringSet& declared, Netlist& netlist,
            const HdlOptions& options)
-        : out_(out), statements_(statements), declared_(declared), netlist_(netlist),
-          options_(options) {}
+        : NetlistPass(Language::Vhdl, out, netlist, options), statements_(statements),
+          declared_(declared) {}
 
     void Write();
 
@@ -152,19 +146,17 @@ private:
     template <class List, class WritePort>
     void WritePortClause(const List& ports, const WritePort& writePort);
     template <class WriteItem>
-    void WriteGenerics(const Writers::GenericAttrs& attributes, Attribute* init,
-                       const GenericForm& form, const WriteItem& writeItem);
+    void WriteGenerics(const Writers::GenericAttrs& attributes, const GenericForm& form,
+                       const WriteItem& writeItem);
+    template <class WriteItem>
+    void WriteGenericList(const Writers::GenericAttrs& attributes, const GenericForm& form,
+                          const WriteItem& writeItem);
     void WriteAttrDeclaration(const AttributeHolder* holder);
     void WriteAttrAssignment(const Signal& signal);
 
-    OutStream& out_;
     VhdlStatements& statements_;
     /// The names of the attributes that this file has declared.
     StringSet& declared_;
-    Netlist& netlist_;
-    const HdlOptions& options_;
-    /// Whether instances are given the entity's own generic INIT.
-    bool passesInit_ = false;
     /// The width of the column of names in the declarations of attributes.
     int attrWidth_ = 0;
     PtrArray<Attribute*> effectiveAttrs_;
@@ -189,35 +181,29 @@ void VhdlNetlister::WriteNetlist(Netlist* netlist, const HdlOptions* options) {
 
 void VhdlNetlister::Writer::Write() {
     Prepare();
-    const Writers::SignalLists signals(netlist_, IsWritable);
+    const Writers::SignalLists signals(netlist_, Language::Vhdl);
     const InstanceLists instances(netlist_);
     WriteHead();
     WriteEntity(signals.ports);
     WriteArchitecture(signals, instances);
     out_.WriteEmptyLine();
     if (!options_.vhdl.suppressConfiguration) {
-        WriteConfiguration(instances);
+        WriteHidden([this, &instances] { WriteConfiguration(instances); });
         out_.WriteEmptyLine();
     }
 }
 
 void VhdlNetlister::Writer::Prepare() {
-    netlist_.SortNetlist();
-    netlist_.CreateVhdlDummySignals();
+    NetlistPass::Prepare();
     netlist_.SetBoxTypeAttribute();
     if (!options_.vhdl.openPin) {
         netlist_.ConnectOpenPinToDummy();
     }
-    passesInit_ = netlist_.GetNameView().find("MHALVEX") != string_view::npos &&
-                  Writers::InitDefined(netlist_);
     attrWidth_ = Netlist::GetLongestAttrName(&netlist_);
 }
 
 void VhdlNetlister::Writer::WriteHead() {
-    if (options_.writeHeader) {
-        HdlUtilities::WriteHeader(netlist_.GetName(), Language::Vhdl, options_, out_);
-    }
-    statements_.WriteComment(&netlist_);
+    WriteOpening();
     out_.WriteEmptyLine();
     statements_.WriteUserLibrary(options_.vhdl.libraries);
     statements_.WriteUseUserLibrary(options_.vhdl.useClauses);
@@ -288,16 +274,9 @@ void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signal
     out_.Unindent();
     PutLine(out_, "begin");
     out_.Indent();
-    for (const Signal* signal : signals.constants) {
-        WriteConstant(*signal);
-    }
-    for (const Signal* signal : signals.aliased) {
-        for (const Signal* alias : signal->GetSignalIterator()) {
-            if (IsWritable(alias->GetNameView())) {
-                WriteAlias(*signal, *alias);
-            }
-        }
-    }
+    WriteAssignments(
+        signals, [this](const Signal& signal) { WriteConstant(signal); },
+        [this](const Signal& signal, const Signal& alias) { WriteAlias(signal, alias); });
     WriteInstances();
     out_.Unindent();
     PutLine(out_, "end", " BEHAVIORAL;");
@@ -354,57 +333,49 @@ void VhdlNetlister::Writer::WriteComponent(const Component& component) {
 
 void VhdlNetlister::Writer::WriteGenericMap(const AttributeHolder& holder) {
     genericAttrs_.Split(holder.GetAttrIterator());
-    WriteGenerics(genericAttrs_, nullptr, GenericClause,
+    WriteGenerics(genericAttrs_, GenericClause,
                   [this](Attribute* attribute) { statements_.WriteGenericMapAttrType(attribute); });
 }
 
-/// Writes a generic clause or map. The items that are kept from synthesis come last; a clause of
-/// such items alone is kept from it as a whole. The attribute `init`, which may be null, gets its
-/// value from the entity's generic of its name.
+/// Writes a generic clause or map; one of which every item is hidden from synthesis is hidden as a
+/// whole.
 template <class WriteItem>
-void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attributes, Attribute* init,
+void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attributes,
                                           const GenericForm& form, const WriteItem& writeItem) {
-    if (attributes.IsEmpty() && init == nullptr) {
-        return;
+    if (!attributes.syn.IsEmpty()) {
+        WriteGenericList(attributes, form, writeItem);
+    } else if (!attributes.nosyn.IsEmpty()) {
+        WriteHidden([&] { WriteGenericList(attributes, form, writeItem); });
     }
-    const bool hasHidden = !attributes.nosyn.IsEmpty();
-    const bool isHidden = attributes.syn.IsEmpty() && init == nullptr;
+}
+
+/// The items that are hidden from synthesis come last.
+template <class WriteItem>
+void VhdlNetlister::Writer::WriteGenericList(const Writers::GenericAttrs& attributes,
+                                             const GenericForm& form, const WriteItem& writeItem) {
     bool isFirst = true;
-    const auto beginItem = [this, &form, &isFirst] {
-        if (!isFirst) {
-            PutLine(out_, form.separator);
-            Put(out_, GenericIndentation);
+    const auto writeItems = [&](const PtrArray<Attribute*>& items) {
+        for (Attribute* attribute : Iterator<Attribute*>(&items)) {
+            if (!isFirst) {
+                PutLine(out_, form.separator);
+                Put(out_, GenericIndentation);
+            }
+            isFirst = false;
+            writeItem(attribute);
         }
-        isFirst = false;
     };
-    if (isHidden) {
-        PutLine(out_, TranslateOff);
-    }
     Put(out_, form.keyword, "( ");
-    if (init != nullptr) {
-        beginItem();
-        statements_.WriteGenericMapInitAttr(init);
-    }
-    for (Attribute* attribute : Iterator<Attribute*>(&attributes.syn)) {
-        beginItem();
-        writeItem(attribute);
-    }
-    if (hasHidden && !isHidden) {
+    writeItems(attributes.syn);
+    if (attributes.syn.IsEmpty() || attributes.nosyn.IsEmpty()) {
+        writeItems(attributes.nosyn);
+    } else {
         PutLine(out_);
-        PutLine(out_, TranslateOff);
-    }
-    for (Attribute* attribute : Iterator<Attribute*>(&attributes.nosyn)) {
-        beginItem();
-        writeItem(attribute);
-    }
-    if (hasHidden && !isHidden) {
-        PutLine(out_);
-        PutLine(out_, TranslateOn);
+        WriteHidden([&] {
+            writeItems(attributes.nosyn);
+            PutLine(out_);
+        });
     }
     PutLine(out_, ")", form.closing);
-    if (isHidden) {
-        PutLine(out_, TranslateOn);
-    }
 }
 
 void VhdlNetlister::Writer::WriteSynthesisAttrAssignment(
@@ -493,8 +464,8 @@ void VhdlNetlister::Writer::WriteAliasBits(const StringArray& bits, const String
 void VhdlNetlister::Writer::WriteInstances() {
     const string_view separator = options_.onePortPerLine ? AssociationPerLine : ", "sv;
     WritePortAssignmentVisitor portMap(separator, statements_, out_);
-    Writers::ForEachInstance(
-        netlist_, [this, &portMap](const Instance& instance) { WriteInstance(instance, portMap); });
+    ForEachInstance(
+        [this, &portMap](const Instance& instance) { WriteInstance(instance, portMap); });
 }
 
 void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
@@ -521,18 +492,25 @@ void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
 void VhdlNetlister::Writer::WriteInstanceGenericMap(const Instance& instance) {
     Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
     genericAttrs_.Split(Iterator<Attribute*>(&effectiveAttrs_));
-    Attribute* const init = passesInit_ ? genericAttrs_.FindInit() : nullptr;
-    genericAttrs_.syn.Remove(init);
-    genericAttrs_.nosyn.Remove(init);
+    Attribute* const init = FindPassedInit(genericAttrs_);
+    if (init != nullptr) {
+        genericAttrs_.syn.Remove(init);
+        genericAttrs_.nosyn.Remove(init);
+        genericAttrs_.syn.InsertAt(0, init);
+    }
     out_.Indent();
-    WriteGenerics(genericAttrs_, init, GenericMap,
-                  [this](Attribute* attribute) { statements_.WriteGenericMapAttr(attribute); });
+    WriteGenerics(genericAttrs_, GenericMap, [this, init](Attribute* attribute) {
+        if (attribute == init) {
+            statements_.WriteGenericMapInitAttr(attribute);
+        } else {
+            statements_.WriteGenericMapAttr(attribute);
+        }
+    });
     out_.Unindent();
 }
 
 void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
     const string_view name = netlist_.GetNameView();
-    PutLine(out_, TranslateOff);
     PutLine(out_, "configuration", " ", "CFG_", name, " ", "of", "  ", name, " ", "is");
     out_.Indent();
     PutLine(out_, "for", " ", "BEHAVIORAL");
@@ -548,7 +526,6 @@ void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
     PutLine(out_, "end", " ", "for", ";");
     out_.Unindent();
     PutLine(out_, "end", " ", "CFG_", name, ";");
-    PutLine(out_, TranslateOn);
 }
 
 void VhdlNetlister::Writer::WriteConfigurationItem(const Component& component,

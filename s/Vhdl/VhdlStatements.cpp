@@ -105,7 +105,7 @@ void VhdlStatements::WriteTimeStamp(const char* sourceFileName) {
 
 void VhdlStatements::WriteComment(const Object* object) {
     if (object != nullptr) {
-        Writers::WriteCommentLines(out_, "-- ", object->GetCommentView());
+        Writers::WriteComment(out_, Language::Vhdl, *object);
     }
 }
 

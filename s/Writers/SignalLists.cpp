@@ -1,10 +1,12 @@
 #include "Writers/SignalLists.h"
 
+#include "Writers/Text.h"
+
 namespace Orn_Hdl::Writers {
 
-SignalLists::SignalLists(const Netlist& netlist, NameTest isWritable) {
+SignalLists::SignalLists(const Netlist& netlist, Language language) {
     for (Signal* signal : netlist.GetSignalIterator()) {
-        if (!isWritable(signal->GetNameView())) {
+        if (!IsWritable(language, signal->GetNameView())) {
             continue;
         }
         if (signal->IsNeededToDeclared()) {
@@ -17,6 +19,10 @@ SignalLists::SignalLists(const Netlist& netlist, NameTest isWritable) {
             aliased.push_back(signal);
         }
     }
+}
+
+bool IsWritable(Language language, std::string_view name) {
+    return language == Language::Vhdl ? !IsOpen(name) : !name.empty();
 }
 
 bool IsSingleBit(const Signal& signal) {
