@@ -63,7 +63,7 @@ struct ORN_HDL_API HdlOptions {
         /// Selects the synthesis tool by name, letter case ignored; an unknown name selects QSN.
         void SetSynthesisType(const char* text);
         /// Whether a statement's semicolon stands before its synthesis attributes.
-        bool IsSemiColonWrittenBeforeAttr() const noexcept { return synthesisType != SYNPLICITY; }
+        bool IsSemiColonWrittenBeforeAttr() const noexcept;
         /// The case of a name, letter case ignored; an unknown name gives `DEFSULT`.
         static CaseType GetCaseType(const char* text);
     };

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
 #include "HdlModel/Names/Names.h"
+#include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/NetlistPass.h"
 
@@ -29,6 +30,7 @@ public:
     Writer(OutStream& out, VerilogStatements& statements, Netlist& netlist,
            const HdlOptions& options)
         : NetlistPass(Language::Verilog, out, netlist, options), statements_(statements),
+          dialect_(DialectOf(options.verilog.synthesisType)),
           connection_(out, WriteSignalVisitor::Connection),
           reference_(out, WriteSignalVisitor::Assignment) {}
 
@@ -56,12 +58,12 @@ private:
     void WriteNextItem(std::size_t column);
     void WriteSemicolon() { PutLine(out_, ";"); }
     void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
-    void WriteSynthesisAttr(const Iterator<Attribute*>& attributes, const char* objectName);
     template <class WriteStatement>
     void WriteGenericAttrs(const Writers::GenericAttrs& attributes,
                            const WriteStatement& writeStatement);
 
     VerilogStatements& statements_;
+    const Dialect& dialect_;
     WriteSignalVisitor connection_;
     WriteSignalVisitor reference_;
     PtrArray<Attribute*> effectiveAttrs_;
@@ -285,49 +287,22 @@ void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
     }
 }
 
-/// Ends a statement whose object has synthesis attributes: one tool wants them before the
-/// semicolon.
+/// Ends a statement whose object may have synthesis attributes.
 void VerilogNetlister::Writer::EndStatement(const Iterator<Attribute*>& attributes,
                                             string_view objectName) {
     if (attributes.IsAtEnd()) {
         WriteSemicolon();
         return;
     }
-    const bool semicolonFirst = options_.verilog.IsSemiColonWrittenBeforeAttr();
-    if (semicolonFirst) {
+    if (dialect_.isSemicolonFirst) {
         WriteSemicolon();
     }
-    WriteSynthesisAttr(attributes, Port::String(objectName).CStr());
-    if (!semicolonFirst) {
+    dialect_.write(statements_, attributes, Port::String(objectName).CStr());
+    if (!dialect_.isSemicolonFirst) {
         WriteSemicolon();
     }
 }
 
-void VerilogNetlister::Writer::WriteSynthesisAttr(const Iterator<Attribute*>& attributes,
-                                                  const char* objectName) {
-    switch (options_.verilog.synthesisType) {
-    case HdlOptions::VerilogOption::EXEMPLAR:
-        statements_.WriteExemplarAttr(attributes, objectName);
-        break;
-    case HdlOptions::VerilogOption::SYNPLICITY:
-        statements_.WriteSynplicityAttr(attributes);
-        break;
-    case HdlOptions::VerilogOption::SYNOPSYS:
-        statements_.WriteSynopsysAttr(attributes);
-        break;
-    case HdlOptions::VerilogOption::VERILOG2001:
-        break;
-    case HdlOptions::VerilogOption::PRECISION:
-        statements_.WritePrecisionAttr(attributes, objectName);
-        break;
-    default:
-        statements_.WriteQSNAttr(attributes, objectName);
-        break;
-    }
-}
-
-/// Writes a statement for each "SYN" attribute but one, then for each "NOSYN" attribute, hidden
-/// from synthesis.
 template <class WriteStatement>
 void VerilogNetlister::Writer::WriteGenericAttrs(const Writers::GenericAttrs& attributes,
                                                  const WriteStatement& writeStatement) {
