@@ -3,7 +3,6 @@
 #include "Port/Text.h"
 
 #include <algorithm>
-#include <climits>
 
 namespace Orn_Hdl::Names {
 
@@ -42,19 +41,6 @@ bool IsInteger(string_view text) noexcept {
     return !text.empty() && std::all_of(text.begin(), text.end(), Port::IsDigit);
 }
 
-std::int64_t BusName::GetBits() const noexcept {
-    const std::int64_t distance = std::int64_t(leftIndex) - rightIndex;
-    return (distance < 0 ? -distance : distance) + 1;
-}
-
-int BusName::GetWidth() const noexcept {
-    return static_cast<int>(std::min<std::int64_t>(GetBits(), INT_MAX));
-}
-
-int BusName::IndexAt(std::int64_t position) const noexcept {
-    return static_cast<int>(leftIndex >= rightIndex ? leftIndex - position : leftIndex + position);
-}
-
 bool ParseBus(string_view name, BusName& parsed) noexcept {
     if (name.empty() || name.back() != ')') {
         return false;
@@ -70,7 +56,7 @@ bool ParseBus(string_view name, BusName& parsed) noexcept {
     if (!IsBase(base) || !IsInteger(left) || !IsInteger(right)) {
         return false;
     }
-    parsed = {base, left, right, Port::ToIntSaturated(left), Port::ToIntSaturated(right)};
+    parsed = {{Port::ToIntSaturated(left), Port::ToIntSaturated(right)}, base, left, right};
     return true;
 }
 
@@ -88,6 +74,26 @@ bool ParseBit(string_view name, BitName& parsed) noexcept {
         return false;
     }
     parsed = {base, index, Port::ToIntSaturated(index)};
+    return true;
+}
+
+int GetWidth(string_view name) noexcept {
+    BusName parsed;
+    return ParseBus(name, parsed) ? parsed.GetWidth() : 0;
+}
+
+bool IsDownTo(string_view name) noexcept {
+    BusName parsed;
+    return ParseBus(name, parsed) && parsed.IsDownTo();
+}
+
+bool GetIndexTexts(string_view name, Port::StringBase<char>& left, Port::StringBase<char>& right) {
+    BusName parsed;
+    if (!ParseBus(name, parsed)) {
+        return false;
+    }
+    left = parsed.left;
+    right = parsed.right;
     return true;
 }
 

@@ -2,16 +2,15 @@
 // in one pass without recursion, and so hold up at names of any length.
 #pragma once
 
+#include "HdlModel/Names/Range.h"
 #include "Port/Ascii.h"
+#include "Port/String.h"
 
 #include <cstdint>
 #include <string>
 #include <string_view>
 
 namespace Orn_Hdl::Names {
-
-/// The most bits that one name is ever expanded into.
-constexpr std::int64_t MostExpandedBits = 1048576;
 
 /// What the name of a signal that stands in for another one ends in.
 constexpr std::string_view DummySuffix = "_DUMMY";
@@ -54,35 +53,34 @@ private:
 bool IsBase(std::string_view text) noexcept;
 bool IsInteger(std::string_view text) noexcept;
 
-/// The pieces of a bus name such as D(7:0); the views point into the name.
-struct BusName {
+/// The range of a bus name such as D(7:0), and its texts, which are views of the name.
+struct BusName : Range {
     std::string_view base;
     std::string_view left;
     std::string_view right;
-    /// The indices, saturated to 32 bits.
-    int leftIndex = 0;
-    int rightIndex = 0;
-
-    bool IsDownTo() const noexcept { return leftIndex > rightIndex; }
-    bool IsOneBit() const noexcept { return leftIndex == rightIndex; }
-    /// The number of bits, exact.
-    std::int64_t GetBits() const noexcept;
-    /// The number of bits, at most INT_MAX.
-    int GetWidth() const noexcept;
-    /// The index of the bit at `position`, counted from the left.
-    int IndexAt(std::int64_t position) const noexcept;
 };
 
-/// The pieces of a bit name such as D(3); the views point into the name.
+/// The index of a bit name such as D(3), saturated to 32 bits, and its texts, which are views of
+/// the name.
 struct BitName {
     std::string_view base;
     std::string_view index;
     int value = 0;
 };
 
-/// Both take a normalised name; false, `parsed` untouched, for a name of another form.
+/// Reads a normalised bus name. \return false, `parsed` untouched, for a name of another form.
 bool ParseBus(std::string_view name, BusName& parsed) noexcept;
+/// Reads a normalised bit name. \return false, `parsed` untouched, for a name of another form.
 bool ParseBit(std::string_view name, BitName& parsed) noexcept;
+
+/// The number of bits of a bus name, at most INT_MAX; 0 for a name of another form.
+int GetWidth(std::string_view name) noexcept;
+/// Whether a name is a bus name with a descending range.
+bool IsDownTo(std::string_view name) noexcept;
+/// Copies the texts of a bus name's indices. \return false, both untouched, for a name of another
+/// form.
+bool GetIndexTexts(std::string_view name, Port::StringBase<char>& left,
+                   Port::StringBase<char>& right);
 
 /// Whether a normalised name is two or more base, bus or bit names separated by "," or "\".
 bool IsCompound(std::string_view name) noexcept;

@@ -213,23 +213,15 @@ Port::StringBase<char> BusPin::GetBaseName() const {
 }
 
 bool BusPin::GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const {
-    Names::BusName parsed;
-    if (!Names::ParseBus(GetNameView(), parsed)) {
-        return false;
-    }
-    left = parsed.left;
-    right = parsed.right;
-    return true;
+    return Names::GetIndexTexts(GetNameView(), left, right);
 }
 
 bool BusPin::IsDownTo() const noexcept {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) && parsed.IsDownTo();
+    return Names::IsDownTo(GetNameView());
 }
 
 int BusPin::GetWidth() const noexcept {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) ? parsed.GetWidth() : 0;
+    return Names::GetWidth(GetNameView());
 }
 
 Pin* BusIndexPin::ClonePin() const {

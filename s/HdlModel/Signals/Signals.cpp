@@ -5,6 +5,7 @@
 #include "HdlModel/Netlist/DummySignals.h"
 #include "HdlModel/Objects/ObjectDetails.h"
 #include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "HdlModel/Signals/SignalLinks.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
@@ -394,8 +395,7 @@ void Bus::AcceptSignal(SignalVisitor& visitor) {
 }
 
 int Bus::GetWidth() const {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) ? parsed.GetWidth() : 0;
+    return Names::GetWidth(GetNameView());
 }
 
 Port::StringBase<char> Bus::GetDummySignalName() const {
@@ -415,23 +415,8 @@ Port::StringBase<char> Bus::GetBaseName() const {
     return Names::BeforeParenthesis(GetNameView());
 }
 
-namespace {
-
-bool GetIndexTexts(std::string_view name, Port::StringBase<char>& left,
-                   Port::StringBase<char>& right) {
-    Names::BusName parsed;
-    if (!Names::ParseBus(name, parsed)) {
-        return false;
-    }
-    left = parsed.left;
-    right = parsed.right;
-    return true;
-}
-
-} // namespace
-
 bool Bus::GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const {
-    return GetIndexTexts(GetNameView(), left, right);
+    return Names::GetIndexTexts(GetNameView(), left, right);
 }
 
 bool Bus::GetIndex(int& left, int& right) const noexcept {
@@ -445,8 +430,7 @@ bool Bus::GetIndex(int& left, int& right) const noexcept {
 }
 
 bool Bus::IsDownTo() const noexcept {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) && parsed.IsDownTo();
+    return Names::IsDownTo(GetNameView());
 }
 
 void Bus::AddBusSlice(Signal* slice) {
@@ -572,15 +556,20 @@ bool Bus::ParseBusName(const char* name, Port::StringBase<char>& base, int& left
     return true;
 }
 
+namespace {
+
+void AddBits(const Names::BusName& bus, StringArray& bits) {
+    SignalBits::ForEach(bus, bus.GetBits(), [&bits](std::string_view bit) { bits.Add(bit); });
+}
+
+} // namespace
+
 bool Bus::ParseBusName(const char* name, StringArray& bits) {
     Names::BusName parsed;
-    if (!Names::ParseBus(Port::ViewOf(name), parsed) ||
-        parsed.GetBits() > Names::MostExpandedBits) {
+    if (!Names::ParseBus(Port::ViewOf(name), parsed) || !parsed.IsExpandable()) {
         return false;
     }
-    for (std::int64_t i = 0; i < parsed.GetBits(); ++i) {
-        bits.Add(Names::WithIndex(parsed.base, parsed.IndexAt(i)));
-    }
+    AddBits(parsed, bits);
     return true;
 }
 
@@ -627,8 +616,7 @@ Polarity BusSlice::GetPortPolarity() const {
 }
 
 int BusSlice::GetWidth() const {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) ? parsed.GetWidth() : 0;
+    return Names::GetWidth(GetNameView());
 }
 
 Port::StringBase<char> BusSlice::GetDummySignalName() const {
@@ -648,12 +636,11 @@ Port::StringBase<char> BusSlice::GetBaseName() const {
 }
 
 bool BusSlice::GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const {
-    return GetIndexTexts(GetNameView(), left, right);
+    return Names::GetIndexTexts(GetNameView(), left, right);
 }
 
 bool BusSlice::IsDownTo() const noexcept {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) && parsed.IsDownTo();
+    return Names::IsDownTo(GetNameView());
 }
 
 bool BusSlice::IsSameDirectionAsParent() const noexcept {
@@ -968,13 +955,15 @@ bool CompoundBus::ParseCompoundBusName(const char* name, StringArray& names, boo
     std::string_view piece;
     Names::BusName bus;
     for (Names::CompoundPieces pieces(text); expand && pieces.Next(piece);) {
-        if (Names::ParseBus(piece, bus) && bus.GetBits() > Names::MostExpandedBits) {
+        if (Names::ParseBus(piece, bus) && !bus.IsExpandable()) {
             return false;
         }
     }
     for (Names::CompoundPieces pieces(text); pieces.Next(piece);) {
-        if (!expand || !Bus::ParseBusName(std::string(piece).c_str(), names)) {
-            names.Add(std::string(piece));
+        if (expand && Names::ParseBus(piece, bus)) {
+            AddBits(bus, names);
+        } else {
+            names.Add(piece);
         }
     }
     return true;
