@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/NetlistPass.h"
@@ -195,12 +196,12 @@ void VerilogNetlister::Writer::WriteConstantAssignment(Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     if (IsNamedPlainly(signal)) {
         statements_.WriteConstantSignalAssignment(signal.GetNameView(),
-                                                  Writers::IsSingleBit(signal), value);
+                                                  SignalBits::IsSingle(signal), value);
     } else {
         Put(out_, "assign", " ");
         WriteReference(signal);
         Put(out_, " = ");
-        statements_.WriteConstant(Writers::IsSingleBit(signal), value);
+        statements_.WriteConstant(SignalBits::IsSingle(signal), value);
     }
     WriteSemicolon();
 }

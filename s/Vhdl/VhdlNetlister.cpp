@@ -2,6 +2,7 @@
 
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/Primitives.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/NetlistPass.h"
@@ -45,7 +46,7 @@ bool IsCompoundOrAgainst(const Signal& signal) {
 /// Whether an alias of the signal must be written bit by bit: a bus of one bit, a vector, may be
 /// aliased with a bit.
 bool IsAliasedByBits(const Signal& signal) {
-    return (!Writers::IsSingleBit(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
+    return (!SignalBits::IsSingle(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
 }
 
 /// Whether the signal is a slice of one bit of a bus that counts upwards. Its range reads as one
@@ -58,50 +59,11 @@ bool IsBitOfUpwardBus(const Signal& signal) {
     return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
 }
 
-/// How many bits the signal has; nothing when they cannot be listed.
-std::optional<std::int64_t> CountBits(const Signal& signal) {
-    if (Writers::IsSingleBit(signal)) {
-        return 1;
-    }
-    if (signal.GetSignalType() != SignalTypeCompoundBus) {
-        Names::BusName parsed;
-        const bool isListable = Names::ParseBus(signal.GetNameView(), parsed) &&
-                                parsed.GetBits() <= Names::MostExpandedBits;
-        return isListable ? std::optional(parsed.GetBits()) : std::nullopt;
-    }
-    std::int64_t count = 0;
-    for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-        const std::optional<std::int64_t> ofMember = CountBits(*member);
-        if (!ofMember) {
-            return std::nullopt;
-        }
-        count += *ofMember;
-    }
-    return count;
-}
-
-/// Appends the names of the signal's bits, which can be listed, leftmost first, until there are
-/// `most` names.
-void AddBitNames(const Signal& signal, std::int64_t most, StringArray& bits) {
-    if (bits.GetSize() >= most) {
-        return;
-    }
-    if (Writers::IsSingleBit(signal)) {
-        bits.Add(signal.GetName());
-        return;
-    }
-    Names::BusName parsed;
-    if (signal.GetSignalType() == SignalTypeCompoundBus) {
-        for (const Signal* member :
-             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-            AddBitNames(*member, most, bits);
-        }
-    } else if (Names::ParseBus(signal.GetNameView(), parsed)) {
-        const std::int64_t count = std::min(parsed.GetBits(), most - bits.GetSize());
-        for (std::int64_t i = 0; i < count; ++i) {
-            bits.Add(Names::WithIndex(parsed.base, parsed.IndexAt(i)));
-        }
-    }
+/// The names of the leftmost `count` bits of a signal.
+StringArray GetBitNames(const Signal& signal, std::int64_t count) {
+    StringArray names;
+    SignalBits::ForEach(signal, count, [&names](string_view name) { names.Add(name); });
+    return names;
 }
 
 bool IsBinary(string_view digits) {
@@ -406,12 +368,12 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
     if (IsCompoundOrAgainst(signal)) {
         WriteConstantBits(signal);
     } else if (IsBitOfUpwardBus(signal)) {
-        StringArray bits;
-        AddBitNames(signal, 1, bits);
-        statements_.WriteConstantSignalAssignment(bits.GetView(0), true, signal.GetConstantValue());
+        SignalBits::ForEach(signal, 1, [this, &signal](string_view bit) {
+            statements_.WriteConstantSignalAssignment(bit, true, signal.GetConstantValue());
+        });
     } else {
         statements_.WriteConstantSignalAssignment(
-            signal.GetNameView(), Writers::IsSingleBit(signal), signal.GetConstantValue());
+            signal.GetNameView(), SignalBits::IsSingle(signal), signal.GetConstantValue());
     }
 }
 
@@ -419,34 +381,28 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
 void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     const string_view digits = value.GetValue();
-    const std::optional<std::int64_t> count = CountBits(signal);
+    const std::optional<std::int64_t> count = SignalBits::Count(signal);
     if (value.GetBase() != 2 || !IsBinary(digits) || !count ||
         digits.size() != static_cast<std::size_t>(*count)) {
         return;
     }
-    StringArray bits;
-    AddBitNames(signal, *count, bits);
-    for (int i = 0; i < bits.GetSize(); ++i) {
-        if (IsWritable(bits.GetView(i))) {
-            const Port::String digit(digits.substr(static_cast<std::size_t>(i), 1));
-            statements_.WriteConstantSignalAssignment(bits.GetView(i), true,
-                                                      BitVectorValue(digit.CStr()));
+    std::size_t position = 0;
+    SignalBits::ForEach(signal, *count, [this, digits, &position](string_view bit) {
+        const Port::String digit(digits.substr(position++, 1));
+        if (IsWritable(bit)) {
+            statements_.WriteConstantSignalAssignment(bit, true, BitVectorValue(digit.CStr()));
         }
-    }
+    });
 }
 
 void VhdlNetlister::Writer::WriteAlias(const Signal& signal, const Signal& alias) {
     if (IsAliasedByBits(signal) || IsAliasedByBits(alias)) {
-        const std::optional<std::int64_t> count = CountBits(signal);
-        const std::optional<std::int64_t> aliasCount = CountBits(alias);
+        const std::optional<std::int64_t> count = SignalBits::Count(signal);
+        const std::optional<std::int64_t> aliasCount = SignalBits::Count(alias);
         // What is listed stands in memory, so the narrower side may not be too wide either.
         const std::int64_t narrower = std::min(count.value_or(0), aliasCount.value_or(0));
         if (count && aliasCount && narrower <= Names::MostExpandedBits) {
-            StringArray bits;
-            StringArray aliasBits;
-            AddBitNames(signal, narrower, bits);
-            AddBitNames(alias, narrower, aliasBits);
-            WriteAliasBits(bits, aliasBits);
+            WriteAliasBits(GetBitNames(signal, narrower), GetBitNames(alias, narrower));
             return;
         }
     }

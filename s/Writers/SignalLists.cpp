@@ -25,11 +25,6 @@ bool IsWritable(Language language, std::string_view name) {
     return language == Language::Vhdl ? !IsOpen(name) : !name.empty();
 }
 
-bool IsSingleBit(const Signal& signal) {
-    const int type = signal.GetSignalType();
-    return type == SignalTypeScalar || type == SignalTypeBusIndex;
-}
-
 bool RunsAgainstParent(const Signal& signal) {
     return signal.GetSignalType() == SignalTypeBusSlice && signal.GetWidth() != 1 &&
            !static_cast<const BusSlice&>(signal).IsSameDirectionAsParent();

@@ -27,9 +27,6 @@ struct SignalLists {
 /// reserved word "open".
 bool IsWritable(Language language, std::string_view name);
 
-/// Whether the signal is a scalar signal or a bit of a bus; a bus of one bit is neither.
-bool IsSingleBit(const Signal& signal);
-
 /// Whether a slice of more than one bit counts the other way than the bus that it is a part of.
 bool RunsAgainstParent(const Signal& signal);
 
