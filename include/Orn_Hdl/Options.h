@@ -4,6 +4,7 @@
 #pragma once
 
 #include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Language.h"
 #include "Port/Export.h"
 #include "Port/String.h"
 
@@ -62,7 +63,7 @@ struct ORN_HDL_API HdlOptions {
         /// Selects the synthesis tool by name, letter case ignored; an unknown name selects QSN.
         void SetSynthesisType(const char* text);
         /// Whether a statement's semicolon stands before its synthesis attributes.
-        bool IsSemiColonWrittenBeforeAttr() const noexcept { return synthesisType != SYNPLICITY; }
+        bool IsSemiColonWrittenBeforeAttr() const noexcept;
         /// The case of a name, letter case ignored; an unknown name gives `DEFSULT`.
         static CaseType GetCaseType(const char* text);
     };
@@ -83,8 +84,9 @@ struct ORN_HDL_API HdlOptions {
     /// \}
     /// Whether each port and each pin connection stands on a line of its own.
     bool onePortPerLine = true;
-    /// Whether instances pass the module's own INIT parameter down. Each Verilog write sets it.
-    mutable bool hierarchicalInit = false;
+    /// Whether the last Verilog write gave instances the module's own INIT parameter in place of
+    /// values of their own. A write with options that it may change sets it; no write reads it.
+    bool hierarchicalInit = false;
 };
 
 /// Helpers that both writers share.
@@ -108,7 +110,10 @@ public:
     /// The names of an instance's attributes, then those of its component's that it does not have.
     /// A null instance gives an empty list.
     static const StringArray GetAttrNames(const Instance* instance);
-    /// Writes the header banner.
+    /// Writes the header banner in comments of a language.
+    static void WriteHeader(const Port::StringBase<char>& designName, Language language,
+                            const HdlOptions& options, OutStream& out);
+    /// Writes the header banner in the comments that a flag chooses.
     /// \param vhdlComments true for VHDL comments, false for Verilog's.
     static void WriteHeader(const Port::StringBase<char>& designName, bool vhdlComments,
                             const HdlOptions& options, OutStream& out);

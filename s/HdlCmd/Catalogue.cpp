@@ -4,10 +4,14 @@
 #include "HdlCmd/Executing.h"
 #include "HdlCmd/Parsing.h"
 #include "Orn_Hdl/Model.h"
+#include "Verilog/Dialects.h"
 
 namespace Orn_Hdl {
 
 namespace {
+
+constexpr DialectSentence SynthesisHelp("Chooses the syntax of synthesis attributes in Verilog: ",
+                                        ".");
 
 constexpr CommandEntry NoOperationEntry{
     {"NOOP", "", "Does nothing."}, ParseNothing, [](Model&, const Arguments&) {}};
@@ -85,11 +89,7 @@ constexpr CommandEntry AddIncludeEntry{
 using AddIncludeCommand = CatalogueCommand<AddIncludeEntry>;
 
 constexpr CommandEntry SetSynthesisEntry{
-    {"SET SYNTHESIS", "<tool>",
-     "Chooses the syntax of synthesis attributes in Verilog: QSN, EXEMPLAR, SYNPLICITY, "
-     "SYNOPSYS, VERILOG2001 or PRECISION."},
-    ParseText<2>,
-    ExecuteSetSynthesis};
+    {"SET SYNTHESIS", "<tool>", SynthesisHelp.GetText()}, ParseText<2>, ExecuteSetSynthesis};
 using SetSynthesisCommand = CatalogueCommand<SetSynthesisEntry>;
 
 constexpr CommandEntry UppercaseEntry{{"UPPERCASE", "<instance|siganl|component>",

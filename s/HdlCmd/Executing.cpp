@@ -69,7 +69,7 @@ template <class Write> void WriteFile(Model& model, const Arguments& arguments, 
 } // namespace
 
 void ExecuteWriteVerilog(Model& model, const Arguments& arguments) {
-    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, const HdlOptions& options) {
+    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, HdlOptions& options) {
         VerilogNetlister(out).WriteNetlist(&netlist, options);
     });
 }

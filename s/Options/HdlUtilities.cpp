@@ -1,4 +1,5 @@
 #include "HdlModel/Names/Names.h"
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Orn_Hdl/Model/Component.h"
 #include "Orn_Hdl/Options.h"
@@ -26,11 +27,11 @@ const Text HdlUtilities::GetVersion() {
 }
 
 const Text HdlUtilities::ConvertVhdlBase(int base) {
-    return base == 2 ? "b" : base == 8 ? "o" : "x";
+    return GetBaseLetter(Language::Vhdl, base);
 }
 
 const Text HdlUtilities::ConvertVerilogBase(int base) {
-    return base == 2 ? "b" : base == 8 ? "o" : "h";
+    return GetBaseLetter(Language::Verilog, base);
 }
 
 const Text HdlUtilities::AddDummySuffix(const char* name) {
@@ -84,10 +85,15 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
 
 void HdlUtilities::WriteHeader(const Text& designName, bool vhdlComments, const HdlOptions& options,
                                OutStream& out) {
+    WriteHeader(designName, WithComments(vhdlComments), options, out);
+}
+
+void HdlUtilities::WriteHeader(const Text& designName, Language language, const HdlOptions& options,
+                               OutStream& out) {
     const auto* const file = dynamic_cast<const TextFileOutStream*>(&out);
     NetlistHeader(options.application, file == nullptr ? Text() : file->GetFileName(),
                   options.command, designName, options.device, options.purpose, options.reference,
-                  vhdlComments, out)
+                  language, out)
         .Write();
 }
 

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
 #include "HdlModel/Names/Names.h"
+#include "Options/LanguageTraits.h"
 #include "Port/Ascii.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"
@@ -35,7 +36,7 @@ string_view DirectionKeyword(const Polarity& polarity) {
 
 void WriteBaseAndLength(const BitVectorValue& value, OutStream& out) {
     if (value.HasBaseAndLength()) {
-        Put(out, value.GetLength(), "'", HdlUtilities::ConvertVerilogBase(value.GetBase()));
+        Put(out, value.GetLength(), "'", GetBaseLetter(Language::Verilog, value.GetBase()));
     }
 }
 
@@ -180,7 +181,7 @@ void VerilogStatements::WriteDefParamInitStatement(Attribute* attribute, const c
 
 void VerilogStatements::WriteComment(const Object* object) {
     if (object != nullptr) {
-        Writers::WriteCommentLines(out_, "// ", object->GetCommentView());
+        Writers::WriteComment(out_, Language::Verilog, *object);
     }
 }
 

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Vhdl.h"
 
 #include "HdlModel/Names/Names.h"
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
 #include "Writers/OneLine.h"
@@ -36,7 +37,7 @@ void WriteLines(OutStream& out, string_view keyword, const StringArray& items) {
 
 void WriteBasePrefix(const BitVectorValue& value, OutStream& out) {
     if (value.HasBaseAndLength()) {
-        Put(out, HdlUtilities::ConvertVhdlBase(value.GetBase()));
+        Put(out, GetBaseLetter(Language::Vhdl, value.GetBase()));
     }
 }
 
@@ -104,7 +105,7 @@ void VhdlStatements::WriteTimeStamp(const char* sourceFileName) {
 
 void VhdlStatements::WriteComment(const Object* object) {
     if (object != nullptr) {
-        Writers::WriteCommentLines(out_, "-- ", object->GetCommentView());
+        Writers::WriteComment(out_, Language::Vhdl, *object);
     }
 }
 

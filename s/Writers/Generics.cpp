@@ -15,6 +15,21 @@ Attribute* FindInitIn(const PtrArray<Attribute*>& attributes) {
     return nullptr;
 }
 
+/// \{
+/// The marks, in any place of its name, of a netlist that stands for a cell of the HALVEX library
+/// and is made of such cells. INIT is the contents of such a cell, so whoever places the netlist
+/// says what the cells in it hold.
+constexpr std::string_view MacroMark = "MHALVEX";
+constexpr std::string_view VerilogMacroMark = "HHALVEX";
+/// \}
+
+/// The second mark counts in Verilog alone. Nothing in the languages asks for that: netlists have
+/// always been written so, and their bytes are kept.
+bool HasInitMark(Language language, std::string_view name) {
+    return name.find(MacroMark) != std::string_view::npos ||
+           (language == Language::Verilog && name.find(VerilogMacroMark) != std::string_view::npos);
+}
+
 } // namespace
 
 void GenericAttrs::Split(const Iterator<Attribute*>& attributes) {
@@ -58,8 +73,9 @@ void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attribute
     }
 }
 
-bool InitDefined(const Netlist& netlist) {
-    return GenericAttrs(netlist.GetAttrIterator()).FindInit() != nullptr;
+bool PassesInit(Language language, const Netlist& netlist) {
+    return HasInitMark(language, netlist.GetNameView()) &&
+           GenericAttrs(netlist.GetAttrIterator()).FindInit() != nullptr;
 }
 
 } // namespace Orn_Hdl::Writers

@@ -3,6 +3,7 @@
 
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Netlist.h"
 
 namespace Orn_Hdl::Writers {
@@ -27,7 +28,8 @@ struct GenericAttrs {
 /// by one of the same name.
 void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes);
 
-/// Whether the module itself has a parameter INIT that its instances can be given.
-bool InitDefined(const Netlist& netlist);
+/// Whether the instances in the netlist are given the module's own parameter or generic INIT in
+/// place of values of their own: the netlist has one, and its name has a mark of the language.
+bool PassesInit(Language language, const Netlist& netlist);
 
 } // namespace Orn_Hdl::Writers

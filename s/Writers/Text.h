@@ -3,6 +3,7 @@
 
 #include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Pins.h"
 #include "Orn_Hdl/Streams.h"
 
@@ -48,7 +49,11 @@ template <class... Pieces> void PutLine(OutStream& out, const Pieces&... pieces)
 /// Writes blanks as one piece of text, which no line break divides.
 void WriteBlanks(OutStream& out, std::size_t count);
 
-/// Writes each line of a comment behind a prefix; lines without any text are left out.
-void WriteCommentLines(OutStream& out, std::string_view prefix, std::string_view comment);
+/// A text as one line of comment.
+std::string InComment(Language language, std::string_view text);
+
+/// Writes each line of the object's comment as a line of comment; lines without any text are left
+/// out.
+void WriteComment(OutStream& out, Language language, const Object& object);
 
 } // namespace Orn_Hdl::Writers

@@ -118,6 +118,9 @@ public:
     /// Sorts the netlist, makes the stand-in signals that it needs, renames its objects when the
     /// options ask for upper or lower case, and writes it. A null netlist writes nothing.
     void WriteNetlist(Netlist* netlist, const HdlOptions& options);
+    /// Writes the netlist in the same way, and records in `options.hierarchicalInit` whether its
+    /// instances are given the module's INIT parameter. A null netlist leaves the options alone.
+    void WriteNetlist(Netlist* netlist, HdlOptions& options);
 
 private:
     class ORN_HDL_LOCAL Writer;
