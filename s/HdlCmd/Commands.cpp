@@ -26,7 +26,7 @@ void Command::operator delete(void* memory) noexcept {
 
 CommandFactory::CommandFactory() : phrases_(std::make_shared<PhraseTable>()) {
     for (const RegisteredCommand& command : GetRegisteredCommands()) {
-        AddCommandCreator(command.entry->info.phrase, command.create);
+        AddCommandCreator(command.info.phrase, command.create);
     }
 }
 
@@ -71,7 +71,7 @@ const std::vector<CommandInfo>& CommandFactory::GetCatalogue() {
     static const std::vector<CommandInfo> catalogue = [] {
         std::vector<CommandInfo> entries;
         for (const RegisteredCommand& command : GetRegisteredCommands()) {
-            entries.push_back(command.entry->info);
+            entries.push_back(command.info);
         }
         return entries;
     }();
