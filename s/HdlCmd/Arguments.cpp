@@ -86,7 +86,7 @@ char* Arguments::MakePlace(std::size_t size) {
     return block;
 }
 
-void Arguments::Set(std::initializer_list<std::string_view> texts, unsigned flags) {
+void Arguments::Set(std::initializer_list<std::string_view> texts) {
     std::size_t size = 0;
     for (const std::string_view text : texts) {
         size += text.size() + 1;
@@ -98,7 +98,7 @@ void Arguments::Set(std::initializer_list<std::string_view> texts, unsigned flag
         *place++ = '\0';
     }
     count_ = static_cast<std::uint8_t>(count_ | texts.size());
-    flags_ = static_cast<std::uint8_t>(flags);
+    flags_ = 0;
 }
 
 const char* Arguments::Get(int index) const noexcept {

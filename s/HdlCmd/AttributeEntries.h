@@ -39,12 +39,14 @@ template <FixedText Argument, FixedText Noun, AttributeOwner Owner> struct Attri
     static constexpr AttributeOwner owner = Owner;
 };
 
-using OfModule = AttributeOwnerTraits<"", "the module", OnModule>;
-using OfComponent = AttributeOwnerTraits<"<component> ", "a component", OnObject>;
-using OfInstance = AttributeOwnerTraits<"<instance> ", "an instance", OnObject>;
-using OfSignal = AttributeOwnerTraits<"<signal> ", "a signal", OnObject>;
-using OfComponentPin = AttributeOwnerTraits<"<component.pin> ", "a pin of a component", OnPin>;
-using OfInstancePin = AttributeOwnerTraits<"<instance.pin> ", "a pin of an instance", OnPin>;
+using OfModule = AttributeOwnerTraits<"", "the module", AttributeOwner::Module>;
+using OfComponent = AttributeOwnerTraits<"<component> ", "a component", AttributeOwner::Object>;
+using OfInstance = AttributeOwnerTraits<"<instance> ", "an instance", AttributeOwner::Object>;
+using OfSignal = AttributeOwnerTraits<"<signal> ", "a signal", AttributeOwner::Object>;
+using OfComponentPin =
+    AttributeOwnerTraits<"<component.pin> ", "a pin of a component", AttributeOwner::Pin>;
+using OfInstancePin =
+    AttributeOwnerTraits<"<instance.pin> ", "a pin of an instance", AttributeOwner::Pin>;
 
 template <class Owner, auto Operation> constexpr CommandEntry AddAttribute(const char* phrase) {
     return {{phrase,

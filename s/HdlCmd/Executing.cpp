@@ -20,7 +20,7 @@ void ExecuteAddPort(Model& model, const Arguments& arguments) {
 }
 
 void ExecuteConnection(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(OnAPin)) {
+    if (arguments.Has(TargetFlag::Pin)) {
         model.ConnectSignalToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
     } else {
         model.ConnectSignals(arguments.Get(0), arguments.Get(1));
@@ -28,7 +28,7 @@ void ExecuteConnection(Model& model, const Arguments& arguments) {
 }
 
 void ExecuteConstant(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(OnAPin)) {
+    if (arguments.Has(TargetFlag::Pin)) {
         model.AssignConstantToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
     } else {
         model.AssignConstantToSignal(arguments.Get(0), arguments.Get(1));
@@ -58,9 +58,9 @@ void RequirePermission(const Model& model, const char* fileName) {
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
     RequirePermission(model, fileName);
-    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
-                                                                    : TextFileOutStream::Replace);
-    model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);
+    TextFileOutStream out(fileName, arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
+                                                                     : TextFileOutStream::Replace);
+    model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();
     model.RecordWrite(fileName, out.GetError());
