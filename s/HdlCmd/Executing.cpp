@@ -1,6 +1,7 @@
 #include "HdlCmd/Executing.h"
 
 #include "Exception/Failure.h"
+#include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
@@ -57,7 +58,11 @@ void RequirePermission(const Model& model, const char* fileName) {
 /// that is there already is replaced when everything was written, and untouched otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
+    const Model::Use use(&model);
     RequirePermission(model, fileName);
+    if (!use.HasModel()) {
+        return;
+    }
     TextFileOutStream out(fileName, arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
                                                                      : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
