@@ -21,7 +21,7 @@ class PhraseTable;
 class ORN_HDL_API Command {
 public:
     /// \param model the model to act on; not owned, may be null.
-    explicit Command(Model* model) noexcept : model_(model) {}
+    explicit Command(Model* model) noexcept { SetModel(model); }
     Command(const Command&) = delete;
     Command& operator=(const Command&) = delete;
     virtual ~Command();
@@ -34,9 +34,13 @@ public:
     virtual const char* GetName() const = 0;
 
     /// The model to act on.
-    Model* GetModel() const noexcept { return model_; }
+    Model* GetModel() const noexcept {
+        return reinterpret_cast<Model*>(modelAndMark_ & ~OwnedMark);
+    }
     /// Sets the model to act on; not owned.
-    void SetModel(Model* model) noexcept { model_ = model; }
+    void SetModel(Model* model) noexcept {
+        modelAndMark_ = reinterpret_cast<std::uintptr_t>(model) | (modelAndMark_ & OwnedMark);
+    }
 
     /// Millions of done commands are kept: they come from pages of their own.
     static void* operator new(std::size_t size);
@@ -58,7 +62,17 @@ public:
     /// \}
 
 private:
-    Model* model_;
+    friend class CommandManager;
+
+    static constexpr std::uintptr_t OwnedMark = 1;
+
+    /// Whether a manager runs or keeps the command, and so owns it.
+    bool IsOwned() const noexcept { return (modelAndMark_ & OwnedMark) != 0; }
+    void MarkOwned() noexcept { modelAndMark_ |= OwnedMark; }
+
+    /// The model's address, whose lowest bit is free for the mark: a command is kept by the million
+    /// and has no byte to spare.
+    std::uintptr_t modelAndMark_ = 0;
 };
 
 /// Makes an unparsed command bound to a model; the caller owns it.
@@ -119,9 +133,8 @@ public:
     ///         "PHRASE: Invalid Arguments.\n" when the arguments do not parse, or whatever the
     ///         command throws; the command is then deleted.
     bool CreateAndExecute(const StringArray& tokens, Model* model, CommandFactory* factory);
-    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is a
-    /// command that is kept already or that this manager is carrying out: it is kept when it is
-    /// done.
+    /// Keeps a command and takes ownership of it, also if allocation fails. Null is ignored, and so
+    /// is a command that this or another manager keeps, or is carrying out and will keep.
     void AddDoneCommand(Command* command);
     /// How many done commands are kept.
     int GetDoneCommandCount() const noexcept;
@@ -129,7 +142,12 @@ public:
     void Clear();
 
 private:
+    friend class Model;
     struct Implementation;
+
+    /// Deletes every done command; what is done from now on is not kept.
+    void End() noexcept;
+
     std::unique_ptr<Implementation> implementation_;
 };
 

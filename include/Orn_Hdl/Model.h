@@ -49,11 +49,17 @@ public:
 /// bit of the bus D, A,D(3:0) a compound. Brackets "[]", "{}", "<>" and "()" are one and the same.
 class ORN_HDL_API Model {
 public:
+    /// A piece of work on a model; defined and used by the library alone.
+    class Use;
+
     /// \param factory makes the commands; not owned, must outlive the model. Null: no command is
     ///        ever found.
     explicit Model(CommandFactory* factory);
     Model(const Model&) = delete;
     Model& operator=(const Model&) = delete;
+    /// Deletes the done commands, the first one first, then the design. A command of the model may
+    /// destroy it: the command is then deleted when it is through, and no further line of a command
+    /// file is read.
     ~Model();
 
     /// Whether the design has changed since the flag was cleared.
@@ -245,10 +251,8 @@ public:
     /// \}
 
 private:
-    friend class CommandManager;
     friend class Engine;
     struct Implementation;
-    class Use;
 
     /// Deletes a model, or, while there is a `Use` of it, leaves that to the last one. Null is
     /// ignored.
@@ -284,8 +288,8 @@ private:
     bool AssignConstant(Pin* pin, const char* value, const char* instance);
 
     std::unique_ptr<Implementation> implementation_;
-    /// How many uses there are, and whether the last one deletes the model.
-    unsigned uses_ = 0;
+    /// The innermost use, and whether the last one deletes the model.
+    Use* innermostUse_ = nullptr;
     bool endsUnused_ = false;
 };
 

@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <initializer_list>
 #include <string_view>
+#include <type_traits>
 
 namespace Orn_Hdl {
 
@@ -26,13 +27,25 @@ public:
     Arguments& operator=(const Arguments&) = delete;
     ~Arguments() { Release(); }
 
-    void Set(std::initializer_list<std::string_view> texts, unsigned flags = 0);
-    /// The text at `index`, closed by a NUL; empty when there is none.
+    /// Sets the texts, each up to its first NUL, and lowers every flag.
+    void Set(std::initializer_list<std::string_view> texts);
+    /// The text at `index`, closed by a NUL; empty if there is none.
     const char* Get(int index) const noexcept;
-    bool HasFlag(unsigned flag) const noexcept { return (flags_ & flag) != 0; }
+
+    /// Raises a flag, an enumerator of the command's own flags.
+    template <class Flag> void Raise(Flag flag) noexcept {
+        flags_ = static_cast<std::uint8_t>(flags_ | BitOf(flag));
+    }
+    template <class Flag> bool Has(Flag flag) const noexcept { return (flags_ & BitOf(flag)) != 0; }
 
 private:
     static constexpr std::uint8_t OwnBlock = 0x80;
+
+    template <class Flag> static constexpr unsigned BitOf(Flag flag) noexcept {
+        static_assert(std::is_enum_v<Flag> && !std::is_convertible_v<Flag, int>,
+                      "each kind of command has an enum class of its own");
+        return 1U << static_cast<unsigned>(flag);
+    }
 
     char* GetRoom() noexcept { return reinterpret_cast<char*>(this) + sizeof(Arguments); }
     const char* GetRoom() const noexcept {

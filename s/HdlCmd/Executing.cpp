@@ -1,6 +1,7 @@
 #include "HdlCmd/Executing.h"
 
 #include "Exception/Failure.h"
+#include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
@@ -20,7 +21,7 @@ void ExecuteAddPort(Model& model, const Arguments& arguments) {
 }
 
 void ExecuteConnection(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(OnAPin)) {
+    if (arguments.Has(TargetFlag::Pin)) {
         model.ConnectSignalToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
     } else {
         model.ConnectSignals(arguments.Get(0), arguments.Get(1));
@@ -28,7 +29,7 @@ void ExecuteConnection(Model& model, const Arguments& arguments) {
 }
 
 void ExecuteConstant(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(OnAPin)) {
+    if (arguments.Has(TargetFlag::Pin)) {
         model.AssignConstantToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
     } else {
         model.AssignConstantToSignal(arguments.Get(0), arguments.Get(1));
@@ -57,10 +58,14 @@ void RequirePermission(const Model& model, const char* fileName) {
 /// that is there already is replaced when everything was written, and untouched otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
+    const Model::Use use(&model);
     RequirePermission(model, fileName);
-    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
-                                                                    : TextFileOutStream::Replace);
-    model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);
+    if (!use.HasModel()) {
+        return;
+    }
+    TextFileOutStream out(fileName, arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
+                                                                     : TextFileOutStream::Replace);
+    model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();
     model.RecordWrite(fileName, out.GetError());

@@ -49,10 +49,10 @@ template <auto Operation> void Apply(Model& model, const Arguments& arguments) {
 /// and the attribute stand the generic value, then the synthesis-attribute value.
 template <auto SetGeneric, auto SetSynAttr>
 void ApplyOptions(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(GenericGiven)) {
+    if (arguments.Has(AttributeOptionFlag::Generic)) {
         CommandDetail::CallWithLast(model, SetGeneric, arguments, 0);
     }
-    if (arguments.HasFlag(SynAttrGiven)) {
+    if (arguments.Has(AttributeOptionFlag::SynAttr)) {
         CommandDetail::CallWithLast(model, SetSynAttr, arguments, 1);
     }
 }
@@ -73,7 +73,7 @@ template <class Part, auto Field> void AppendOption(Model& model, const Argument
 }
 
 template <class Part, auto Field> void SetFlag(Model& model, const Arguments& arguments) {
-    Part::Of(model).*Field = arguments.HasFlag(FlagOn);
+    Part::Of(model).*Field = arguments.Has(OptionFlag::On);
 }
 
 template <class Part, auto Field> void RaiseFlag(Model& model, const Arguments& /*arguments*/) {
@@ -87,9 +87,9 @@ template <auto Field> void SetText(Model& model, const Arguments& arguments) {
 template <HdlOptions::VerilogOption::CaseType Case>
 void ExecuteCase(Model& model, const Arguments& arguments) {
     HdlOptions::VerilogOption& options = VerilogPart::Of(model);
-    if (arguments.HasFlag(InstanceNames)) {
+    if (arguments.Has(NameKind::Instance)) {
         options.instanceCase = Case;
-    } else if (arguments.HasFlag(SignalNames)) {
+    } else if (arguments.Has(NameKind::Signal)) {
         options.signalCase = Case;
     } else {
         options.componentCase = Case;

@@ -10,25 +10,24 @@
 
 namespace Orn_Hdl {
 
-/// Bits of `Arguments::HasFlag`.
-enum ArgumentFlag : unsigned {
-    /// A flag command was not given "false".
-    FlagOn = 1,
-    /// The connection or constant is that of a pin.
-    OnAPin = 1,
-    /// A write command was given "-APPEND", "-NOHEADER".
-    AppendToFile = 1,
-    WithoutHeader = 2,
-    /// An option of that kind was given.
-    GenericGiven = 1,
-    SynAttrGiven = 2
-};
+/// The flag of the commands that set an option to true or false.
+enum class OptionFlag { On };
 
-/// The kinds of names that UPPERCASE and LOWERCASE know, as flags.
-enum NameKind : unsigned { InstanceNames = 1, SignalNames = 2, ComponentNames = 4 };
+/// The flag of CONNECT SIGNAL and ASSIGN CONSTANT: the line names a pin, not a signal.
+enum class TargetFlag { Pin };
 
-/// On what an attribute command acts; the value is the number of name texts that this takes.
-enum AttributeOwner { OnModule = 0, OnObject = 1, OnPin = 2 };
+/// The flags of the write commands.
+enum class WriteFlag { Append, WithoutHeader };
+
+/// Which options a SET ... ATTRIBUTE OPTION command was given.
+enum class AttributeOptionFlag { Generic, SynAttr };
+
+/// The kinds of names whose letter case UPPERCASE and LOWERCASE choose.
+enum class NameKind { Instance, Signal, Component };
+
+/// What has the attributes that a command is about: the module, which takes no name, an object with
+/// a name of its own, or a pin, which its line names as "owner.pin".
+enum class AttributeOwner { Module, Object, Pin };
 
 bool ParseNothing(const StringArray& tokens, Arguments& arguments);
 bool ParsePin(const StringArray& tokens, Arguments& arguments);

@@ -4,8 +4,6 @@
 #include "Orn_Hdl/Commands.h"
 
 #include <cstddef>
-#include <cstdint>
-#include <deque>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -24,19 +22,8 @@ public:
     CommandCreator Find(const StringArray& words) const noexcept;
 
 private:
-    /// A word in upper case that is compared sixteen characters at once.
-    class Word {
-    public:
-        explicit Word(std::string_view text) noexcept;
-        bool operator==(const Word& other) const noexcept;
-
-    private:
-        std::uint64_t start_ = 0;
-        std::uint64_t end_ = 0;
-        std::string_view text_;
-    };
     struct Child {
-        Word word;
+        std::string word;
         std::size_t node;
     };
     struct Node {
@@ -48,14 +35,12 @@ private:
     static constexpr std::size_t None = 0;
 
     /// The node behind another one that a word leads to.
-    std::size_t GetChild(std::size_t node, const Word& word) const noexcept;
+    std::size_t GetChild(std::size_t node, std::string_view word) const noexcept;
     /// The same for a word that was in quotes, and may hold blanks and so several words of a
     /// phrase.
     std::size_t GetDescendant(std::size_t node, std::string_view words) const noexcept;
 
     std::vector<Node> nodes_{1};
-    /// The words' characters, which stay where they are.
-    std::deque<std::string> texts_;
 };
 
 } // namespace Orn_Hdl

@@ -95,12 +95,13 @@ Model::Model(CommandFactory* factory)
     : implementation_(std::make_unique<Implementation>(factory)) {}
 
 Model::~Model() {
-    // A command that ends may use its model: all of it is still there.
-    implementation_->commands.Clear();
+    // A command that is destroyed may use its model: all of it is still there.
+    implementation_->commands.End();
+    Use::TakeAway(*this);
 }
 
 void Model::Delete(std::unique_ptr<Model> model) noexcept {
-    if (model != nullptr && model->uses_ > 0) {
+    if (model != nullptr && model->innermostUse_ != nullptr) {
         model->endsUnused_ = true;
         static_cast<void>(model.release());
     }
@@ -162,7 +163,9 @@ bool Model::ExecuteLine(std::string_view line) {
     words.Empty();
     words.ParseCommandLine(line);
     const bool result = Execute(words);
-    implementation_->words = std::move(words);
+    if (use.HasModel()) {
+        implementation_->words = std::move(words);
+    }
     return result;
 }
 
@@ -187,6 +190,9 @@ bool Model::Read(const char* fileName) {
     bool result = true;
     while (const StringArray* words = reader.Next()) {
         result = Execute(*words);
+        if (!use.HasModel()) {
+            return result;
+        }
     }
     SetModifiedFlag(false);
     return result && reader.GetError() == 0;

@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <memory>
 #include <string>
 #include <type_traits>
 #include <vector>
@@ -221,6 +222,30 @@ TEST_F(RemovalFromWithin, OfACommandFile) {
     const std::string file = folder / "lines.cmd";
     WriteWholeFile(file, "ADD SIGNAL M\nREMOVE\nCONNECT SIGNAL N M\n");
     EXPECT_TRUE(engine_.ReadCommandFile("top", file.c_str())) << "its other lines are done, too";
+}
+
+TEST(EngineModels, AnEngineMayBeDestroyedWithinItsCommand) {
+    const TemporaryFolder folder;
+    const std::string file = folder / "lines.cmd";
+    WriteWholeFile(file, "NOOP\nREMOVE\nUNKNOWN\n");
+    std::unique_ptr<Engine> engine;
+    removal = [&engine](Model& /*model*/) { engine.reset(); };
+    farewell = nullptr;
+    const std::function<void()> runs[] = {
+        [&] { engine->Execute("REMOVE"); },
+        [&] { engine->Execute("top", "REMOVE"); },
+        [&] { EXPECT_TRUE(engine->ReadCommandFile("top", file.c_str())); },
+    };
+    for (const auto& run : runs) {
+        endedRemovers = 0;
+        engine = std::make_unique<Engine>();
+        engine->CreateAndAddModel("top", "");
+        engine->UseModel("top");
+        engine->GetModel("top")->GetCommandFactory()->AddCommandCreator("REMOVE", &Remover::Create);
+        run();
+        EXPECT_EQ(engine, nullptr);
+        EXPECT_EQ(endedRemovers, 1);
+    }
 }
 
 TEST(EngineModels, ARenamedModelIsFoundByItsNewName) {
