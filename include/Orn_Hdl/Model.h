@@ -13,7 +13,6 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
-#include <cstddef>
 #include <memory>
 #include <string_view>
 
@@ -89,11 +88,6 @@ public:
     bool ExecuteLine(std::string_view line);
     /// As above, for a line that has been split.
     bool Execute(const StringArray& tokens);
-    /// Hints that a line, split, will be executed `ForeseenLines` lines later, so that in a large
-    /// design what it names is fetched in the meantime. Changes nothing.
-    void Foresee(const StringArray& words) noexcept;
-    /// How many lines `Foresee` looks ahead.
-    static constexpr std::size_t ForeseenLines = 16;
     /// Replays a command file and clears the modified flag. An exception of a line ends the replay.
     /// \return false when the file cannot be opened or read.
     bool Read(const char* fileName);

@@ -3,7 +3,6 @@
 #include "Exception/Failure.h"
 #include "HdlModel/ModelUse.h"
 #include "HdlModel/Names/Names.h"
-#include "HdlModel/Netlist/Foresight.h"
 #include "HdlModel/Objects/MakePacked.h"
 #include "HdlModel/Objects/ObjectKey.h"
 #include "Orn_Hdl/Commands.h"
@@ -169,12 +168,6 @@ bool Model::ExecuteLine(std::string_view line) {
 bool Model::Execute(const StringArray& tokens) {
     return tokens.IsEmpty() ||
            implementation_->commands.CreateAndExecute(tokens, this, GetCommandFactory());
-}
-
-static_assert(Model::ForeseenLines == Foresight::Distance);
-
-void Model::Foresee(const StringArray& words) noexcept {
-    implementation_->netlist.Foresee(words);
 }
 
 bool Model::Read(const char* fileName) {
