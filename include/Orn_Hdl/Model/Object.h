@@ -92,9 +92,9 @@ protected:
     void CopyNameFrom(const Object& other);
 
     /// The parts that few objects have, made when first asked for.
-    ObjectDetails& MakeDetails();
+    ORN_HDL_LOCAL ObjectDetails& MakeDetails();
     /// The parts that few objects have; null when this object has none of them.
-    ObjectDetails* GetDetails() const noexcept;
+    ORN_HDL_LOCAL ObjectDetails* GetDetails() const noexcept;
 
     /// A direction, as pins and signals have one: -1 to 2 stand in spare bits, where they cost
     /// nothing, any other number in the details.
