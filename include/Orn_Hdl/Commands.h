@@ -5,11 +5,10 @@
 
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/Export.h"
+#include "Port/Pooled.h"
 
-#include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <new>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -18,7 +17,7 @@ class Model;
 class PhraseTable;
 
 /// One command on one model: parsed from the words of a line, then executed.
-class ORN_HDL_API Command {
+class ORN_HDL_API Command : public Port::Pooled<Port::Pool::Commands> {
 public:
     /// \param model the model to act on; not owned, may be null.
     explicit Command(Model* model) noexcept { SetModel(model); }
@@ -41,25 +40,6 @@ public:
     void SetModel(Model* model) noexcept {
         modelAndMark_ = reinterpret_cast<std::uintptr_t>(model) | (modelAndMark_ & OwnedMark);
     }
-
-    /// Millions of done commands are kept: they come from pages of their own.
-    static void* operator new(std::size_t size);
-    /// Gives the memory back.
-    static void operator delete(void* memory) noexcept;
-    /// \{
-    /// For classes of larger alignment: as without these pages.
-    static void* operator new(std::size_t size, std::align_val_t alignment) {
-        return ::operator new(size, alignment);
-    }
-    static void operator delete(void* memory, std::align_val_t alignment) noexcept {
-        ::operator delete(memory, alignment);
-    }
-    /// \}
-    /// \{
-    /// In place: takes and gives back nothing.
-    static void* operator new(std::size_t, void* place) noexcept { return place; }
-    static void operator delete(void*, void*) noexcept {}
-    /// \}
 
 private:
     friend class CommandManager;

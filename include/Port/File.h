@@ -51,8 +51,6 @@ public:
     /// Reads the next line. \param line receives it without its line end, valid until the next
     /// call. \return false at the end of the file or on a failure.
     bool NextLine(std::string_view& line);
-    /// As `NextLine`, without reading: false also when the rest of the line has yet to be read.
-    bool NextLineAtHand(std::string_view& line);
     /// How many bytes the last line given takes in the file, its line end included.
     std::size_t GetLineSize() const noexcept { return lineSize_; }
 
@@ -60,6 +58,8 @@ public:
     int GetError() const noexcept { return error_; }
 
 private:
+    friend class LinesAtHand;
+
     bool Fail(int error) noexcept;
     bool OpenDescriptor(const char* name, int flags, unsigned mode);
     void CloseDescriptor() noexcept;

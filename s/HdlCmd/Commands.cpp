@@ -7,7 +7,6 @@
 #include "Orn_Hdl/Containers/PtrArray.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
-#include "Port/Pool.h"
 
 #include <memory>
 #include <utility>
@@ -17,14 +16,6 @@ namespace Orn_Hdl {
 static_assert(alignof(Model) > 1, "the lowest bit of its address is free");
 
 Command::~Command() = default;
-
-void* Command::operator new(std::size_t size) {
-    return Port::Pool::Allocate(size, Port::Pool::Commands);
-}
-
-void Command::operator delete(void* memory) noexcept {
-    Port::Pool::Free(memory);
-}
 
 CommandFactory::CommandFactory() : phrases_(std::make_shared<PhraseTable>()) {
     for (const RegisteredCommand& command : GetRegisteredCommands()) {

@@ -291,15 +291,6 @@ bool File::NextLine(std::string_view& line) {
     return true;
 }
 
-bool File::NextLineAtHand(std::string_view& line) {
-    const std::size_t length = GetUnread().find('\n');
-    if (length == std::string_view::npos) {
-        return false;
-    }
-    line = TakeLine(length);
-    return true;
-}
-
 std::string_view File::TakeLine(std::size_t length) noexcept {
     std::string_view line = GetUnread().substr(0, length);
     lineSize_ = std::min(length + 1, GetUnread().size());

@@ -8,7 +8,6 @@ namespace {
 
 using namespace Orn_Hdl;
 
-static_assert(sizeof(ObjectName) == 16);
 static_assert(sizeof(Object) == 24);
 static_assert(sizeof(AttributeHolder) == 16);
 

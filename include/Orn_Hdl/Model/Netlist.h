@@ -105,10 +105,9 @@ public:
 private:
     friend class Model;
     friend class ModelRegistry;
+    friend class ReadAhead;
     struct Implementation;
 
-    /// Hints that a command line will be executed some lines later.
-    void Foresee(const StringArray& words) noexcept;
     /// Who is told of a new name; not owned, null for nobody.
     void SetNameListener(NameListener* listener) noexcept;
 

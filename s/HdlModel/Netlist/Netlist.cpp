@@ -8,6 +8,7 @@
 #include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/Foresight.h"
 #include "HdlModel/Netlist/Primitives.h"
+#include "HdlModel/Netlist/ReadAhead.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "HdlModel/Objects/ObjectKey.h"
 #include "HdlModel/Signals/BusParts.h"
@@ -196,8 +197,8 @@ bool Netlist::IsNameUsed(std::string_view name) const noexcept {
     return implementation_->byName.Contains(NameKey(name));
 }
 
-void Netlist::Foresee(const StringArray& words) noexcept {
-    implementation_->foresight.Note(implementation_->byName, words);
+void ReadAhead::Note(Netlist& netlist, const StringArray& words) noexcept {
+    netlist.implementation_->foresight.Note(netlist.implementation_->byName, words);
 }
 
 Bus* Netlist::GetParentBus(const char* name) const {

@@ -1,8 +1,5 @@
-/// \file
-/// `ObjectName`, the compact name that every object of a design holds.
+// The compact name that every object of a design holds.
 #pragma once
-
-#include "Port/Export.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -13,25 +10,26 @@ namespace Orn_Hdl {
 
 struct ObjectDetails;
 
-/// A name in 16 bytes. Up to 14 characters stand in the object itself; a longer name stands in a
-/// block that copies share, so that the pins of a thousand instances hold a long pin name once.
-/// The sixteenth byte is left to the owner, whose flags would otherwise cost eight.
+/// A name in 15 bytes of any alignment. Up to 14 characters stand in the object itself; a longer
+/// name stands in a block that copies share, so that the pins of a thousand instances hold a long
+/// pin name once.
 ///
 /// It also leads to the parts of the owner that few objects have, so that the millions without them
 /// pay nothing: an object that has details keeps its name there.
-class ORN_HDL_API ObjectName {
+class ObjectName {
 public:
     ObjectName() noexcept : bytes_(), length_(0) {}
-    /// As `Assign`.
-    explicit ObjectName(std::string_view text) : ObjectName() { Assign(text); }
-    /// \{
-    /// Copies the name; the details and the owner's byte stay with their owner.
+    /// Copies the name; the details stay with their owner.
     ObjectName(const ObjectName& other) noexcept;
+    /// Copies the name; the details stay with their owner.
     ObjectName& operator=(const ObjectName& other) noexcept;
-    /// \}
-    ~ObjectName() { Release(); }
+    ~ObjectName() {
+        if (length_ > InlineCapacity) {
+            Release();
+        }
+    }
 
-    /// Stores a text.
+    /// Stores a text. When allocation fails the name stays as it was.
     void Assign(std::string_view text);
 
     /// The name, valid until it changes or the details are made.
@@ -43,19 +41,15 @@ public:
     ObjectDetails* GetDetails() const noexcept {
         return length_ == DetailedLength ? static_cast<ObjectDetails*>(GetPointer()) : nullptr;
     }
-    /// The same, made when there are none.
+    /// The owner's details, made when there are none.
     ObjectDetails& MakeDetails();
-
-    /// The owner's byte; copying a name does not copy it.
-    std::uint8_t GetOwnerByte() const noexcept { return ownerByte_; }
-    /// Sets the owner's byte.
-    void SetOwnerByte(std::uint8_t value) noexcept { ownerByte_ = value; }
 
 private:
     struct Shared;
     static constexpr std::size_t InlineCapacity = 14;
-    /// What `length_` says of a name that stands elsewhere.
+    /// Stands in `length_` when `bytes_` hold a pointer to a shared name.
     static constexpr std::uint8_t SharedLength = 255;
+    /// Stands in `length_` when `bytes_` hold a pointer to the details.
     static constexpr std::uint8_t DetailedLength = 254;
 
     std::string_view LongView() const noexcept;
@@ -73,11 +67,8 @@ private:
     ObjectName& GetPlain() noexcept;
     void Release() noexcept;
 
-    alignas(8) char bytes_[InlineCapacity];
+    char bytes_[InlineCapacity];
     std::uint8_t length_;
-    std::uint8_t ownerByte_ = 0;
 };
-
-static_assert(sizeof(ObjectName) == 16, "every object of a design holds one");
 
 } // namespace Orn_Hdl
