@@ -19,7 +19,7 @@ struct ORN_HDL_API HdlOptions {
     struct ORN_HDL_API VhdlOption {
         /// Leaves the configuration out.
         bool suppressConfiguration = false;
-        /// Has no effect on what is written.
+        /// What the command FLATTEN BUS sets; it has no effect on what is written.
         bool flattenBus = false;
         /// Writes the IEEE and KESTRA clauses.
         bool useDefaultLibrary = true;
@@ -51,12 +51,12 @@ struct ORN_HDL_API HdlOptions {
 
         /// The chosen tool, a `SynthesisType`.
         int synthesisType = QSN;
-        /// \{
-        /// How names of each kind are written.
+        /// How the names of signals are written.
         CaseType signalCase = DEFSULT;
+        /// How the names of instances are written.
         CaseType instanceCase = DEFSULT;
+        /// How the names of components are written.
         CaseType componentCase = DEFSULT;
-        /// \}
         /// Files to be included.
         StringArray includePaths;
 
@@ -68,20 +68,22 @@ struct ORN_HDL_API HdlOptions {
         static CaseType GetCaseType(const char* text);
     };
 
-    /// Of the VHDL writer.
+    /// What the VHDL writer reads.
     VhdlOption vhdl;
-    /// Of the Verilog writer.
+    /// What the Verilog writer reads.
     VerilogOption verilog;
     /// Whether files begin with the header.
     bool writeHeader = true;
-    /// \{
-    /// The texts that the header shows.
+    /// The program that the header names.
     Port::StringBase<char> application;
+    /// The command line that the header shows.
     Port::StringBase<char> command;
+    /// The device that the header names.
     Port::StringBase<char> device;
+    /// The purpose that the header gives, in lines of words.
     Port::StringBase<char> purpose;
+    /// The reference that the header gives, in lines of words.
     Port::StringBase<char> reference;
-    /// \}
     /// Whether each port and each pin connection stands on a line of its own.
     bool onePortPerLine = true;
     /// Whether the last Verilog write gave instances the module's own INIT parameter in place of

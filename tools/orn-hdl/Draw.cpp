@@ -129,8 +129,9 @@ Status Draw(const DrawOptions& options) {
     Orn_Hdl::Engine engine;
     engine.CreateAndAddModel("", options.file.c_str());
     Orn_Hdl::Model& model = *engine.GetModel("");
-    for (const char* phrase : {"WRITE VERILOG", "WRITE VHDL"}) {
-        model.GetCommandFactory()->AddCommandCreator(phrase, &NoWriteCommand::Create);
+    for (const Orn_Hdl::Language language : Orn_Hdl::Languages) {
+        const std::string phrase = std::string("WRITE ") + Orn_Hdl::GetLanguageName(language);
+        model.GetCommandFactory()->AddCommandCreator(phrase.c_str(), &NoWriteCommand::Create);
     }
     Progress progress(true, options.file);
     const Replayed replayed = Replay(model, options.file, false, progress);

@@ -53,7 +53,7 @@ std::optional<Bit> GetUnknownAs(const ImportOptions& options) {
 }
 
 Status WriteNetlists(const Netlist& netlist, const ImportOptions& options) {
-    if (options.outputs.verilog.empty() && options.outputs.vhdl.empty()) {
+    if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
     Orn_Hdl::Engine engine;
