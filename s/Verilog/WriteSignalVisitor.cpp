@@ -1,10 +1,10 @@
 #include "Verilog/WriteSignalVisitor.h"
 
+#include "HdlModel/Signals/SignalBits.h"
 #include "Writers/SignalLists.h"
 #include "Writers/Text.h"
 
 #include <algorithm>
-#include <cstdint>
 
 namespace Orn_Hdl {
 
@@ -22,14 +22,16 @@ void WriteSignalVisitor::WriteInBrackets(string_view name) {
     Put(out_, string_view(text_));
 }
 
-void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
+void WriteSignalVisitor::WriteBits(const BusSlice& slice) {
     Put(out_, "{");
-    for (std::int64_t i = 0; i < slice.GetBits(); ++i) {
-        if (i > 0) {
+    bool isFirst = true;
+    SignalBits::ForEach(slice, Names::MostExpandedBits, [&](string_view bit) {
+        if (!isFirst) {
             Put(out_, ", ");
         }
-        WriteInBrackets(Names::WithIndex(slice.base, slice.IndexAt(i)));
-    }
+        isFirst = false;
+        WriteInBrackets(bit);
+    });
     Put(out_, "}");
 }
 
@@ -56,13 +58,10 @@ void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
     if (!IsWritten(*slice)) {
         return;
     }
-    const string_view name = slice->GetNameView();
-    Names::BusName parsed;
-    if (Writers::RunsAgainstParent(*slice) && Names::ParseBus(name, parsed) &&
-        parsed.GetBits() <= Names::MostExpandedBits) {
-        WriteBits(parsed);
+    if (Writers::RunsAgainstParent(*slice) && SignalBits::Count(*slice)) {
+        WriteBits(*slice);
     } else {
-        WriteInBrackets(name);
+        WriteInBrackets(slice->GetNameView());
     }
 }
 

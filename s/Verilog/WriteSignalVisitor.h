@@ -32,7 +32,7 @@ public:
 private:
     bool IsWritten(const Signal& signal) const noexcept;
     void WriteInBrackets(std::string_view name);
-    void WriteBits(const Names::BusName& slice);
+    void WriteBits(const BusSlice& slice);
 
     OutStream& out_;
     Place place_;

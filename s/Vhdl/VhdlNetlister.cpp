@@ -2,6 +2,7 @@
 
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/Primitives.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/Generics.h"
@@ -63,50 +64,11 @@ bool IsBitOfUpwardBus(const Signal& signal) {
     return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
 }
 
-/// How many bits the signal has; nothing when they cannot be listed.
-std::optional<std::int64_t> CountBits(const Signal& signal) {
-    if (Writers::IsSingleBit(signal)) {
-        return 1;
-    }
-    if (signal.GetSignalType() != SignalTypeCompoundBus) {
-        Names::BusName parsed;
-        const bool isListable = Names::ParseBus(signal.GetNameView(), parsed) &&
-                                parsed.GetBits() <= Names::MostExpandedBits;
-        return isListable ? std::optional(parsed.GetBits()) : std::nullopt;
-    }
-    std::int64_t count = 0;
-    for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-        const std::optional<std::int64_t> ofMember = CountBits(*member);
-        if (!ofMember) {
-            return std::nullopt;
-        }
-        count += *ofMember;
-    }
-    return count;
-}
-
-/// Appends the names of the signal's bits, which can be listed, leftmost first, until there are
-/// `most` names.
-void AddBitNames(const Signal& signal, std::int64_t most, StringArray& bits) {
-    if (bits.GetSize() >= most) {
-        return;
-    }
-    if (Writers::IsSingleBit(signal)) {
-        bits.Add(signal.GetName());
-        return;
-    }
-    Names::BusName parsed;
-    if (signal.GetSignalType() == SignalTypeCompoundBus) {
-        for (const Signal* member :
-             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-            AddBitNames(*member, most, bits);
-        }
-    } else if (Names::ParseBus(signal.GetNameView(), parsed)) {
-        const std::int64_t count = std::min(parsed.GetBits(), most - bits.GetSize());
-        for (std::int64_t i = 0; i < count; ++i) {
-            bits.Add(Names::WithIndex(parsed.base, parsed.IndexAt(i)));
-        }
-    }
+/// The names of the signal's leftmost bits, `most` at most.
+StringArray BitNames(const Signal& signal, std::int64_t most) {
+    StringArray names;
+    SignalBits::ForEach(signal, most, [&names](string_view bit) { names.Add(bit); });
+    return names;
 }
 
 bool IsBinary(string_view digits) {
@@ -435,8 +397,7 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
     if (IsCompoundOrAgainst(signal)) {
         WriteConstantBits(signal);
     } else if (IsBitOfUpwardBus(signal)) {
-        StringArray bits;
-        AddBitNames(signal, 1, bits);
+        const StringArray bits = BitNames(signal, 1);
         statements_.WriteConstantSignalAssignment(bits.GetView(0), true, signal.GetConstantValue());
     } else {
         statements_.WriteConstantSignalAssignment(
@@ -448,13 +409,12 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
 void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     const string_view digits = value.GetValue();
-    const std::optional<std::int64_t> count = CountBits(signal);
+    const std::optional<std::int64_t> count = SignalBits::Count(signal);
     if (value.GetBase() != 2 || !IsBinary(digits) || !count ||
         digits.size() != static_cast<std::size_t>(*count)) {
         return;
     }
-    StringArray bits;
-    AddBitNames(signal, *count, bits);
+    const StringArray bits = BitNames(signal, *count);
     for (int i = 0; i < bits.GetSize(); ++i) {
         if (IsWritable(bits.GetView(i))) {
             const Port::String digit(digits.substr(static_cast<std::size_t>(i), 1));
@@ -466,16 +426,12 @@ void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
 
 void VhdlNetlister::Writer::WriteAlias(const Signal& signal, const Signal& alias) {
     if (IsAliasedByBits(signal) || IsAliasedByBits(alias)) {
-        const std::optional<std::int64_t> count = CountBits(signal);
-        const std::optional<std::int64_t> aliasCount = CountBits(alias);
+        const std::optional<std::int64_t> count = SignalBits::Count(signal);
+        const std::optional<std::int64_t> aliasCount = SignalBits::Count(alias);
         // What is listed stands in memory, so the narrower side may not be too wide either.
         const std::int64_t narrower = std::min(count.value_or(0), aliasCount.value_or(0));
         if (count && aliasCount && narrower <= Names::MostExpandedBits) {
-            StringArray bits;
-            StringArray aliasBits;
-            AddBitNames(signal, narrower, bits);
-            AddBitNames(alias, narrower, aliasBits);
-            WriteAliasBits(bits, aliasBits);
+            WriteAliasBits(BitNames(signal, narrower), BitNames(alias, narrower));
             return;
         }
     }

@@ -1,6 +1,7 @@
 #include "Vhdl/WritePortAssignmentVisitor.h"
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "Writers/Text.h"
 
 #include <climits>
@@ -88,7 +89,7 @@ void WritePortAssignmentVisitor::VisitBus(Bus* bus) {
 
 void WritePortAssignmentVisitor::VisitBusSlice(BusSlice* slice) {
     const string_view name = slice->GetNameView();
-    if (!slice->IsSameDirectionAsParent() && WriteBitByBit(name)) {
+    if (!slice->IsSameDirectionAsParent() && WriteBitByBit(*slice)) {
         return;
     }
     WriteFormal();
@@ -113,16 +114,16 @@ void WritePortAssignmentVisitor::VisitCompoundBus(CompoundBus* compound) {
 }
 
 /// \return false, nothing written, when the slice cannot be expanded.
-bool WritePortAssignmentVisitor::WriteBitByBit(string_view slice) {
-    Names::BusName range;
-    if (!Names::ParseBus(slice, range) || range.GetBits() > Names::MostExpandedBits) {
+bool WritePortAssignmentVisitor::WriteBitByBit(const BusSlice& slice) {
+    if (!SignalBits::Count(slice)) {
         return false;
     }
     const std::string formal = formal_;
-    for (int i = 0; i < range.GetWidth(); ++i) {
-        SetFormalPiece(formal, i, 1);
-        WriteScalar(Names::WithIndex(range.base, range.IndexAt(i)));
-    }
+    int offset = 0;
+    SignalBits::ForEach(slice, Names::MostExpandedBits, [&](string_view bit) {
+        SetFormalPiece(formal, offset++, 1);
+        WriteScalar(bit);
+    });
     return true;
 }
 

@@ -39,7 +39,7 @@ private:
     void WriteScalar(std::string_view actual);
     void WriteBus(std::string_view actual);
     void WriteFormal();
-    bool WriteBitByBit(std::string_view slice);
+    bool WriteBitByBit(const BusSlice& slice);
 
     std::string_view separator_;
     std::string_view pending_;
