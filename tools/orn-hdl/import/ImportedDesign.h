@@ -1,38 +1,16 @@
-// A design as a JSON netlist tells it: modules with ports, nets and cells, whose connections are
-// lists of numbered bits. Large tables are flat: a million cells are a few arrays.
+// The contents of a JSON netlist: modules with ports, nets and cells, whose connections are lists
+// of numbered bits. Large tables are flat: a million cells are a few arrays.
 #pragma once
 
+#include "import/JsonPath.h"
+
 #include <cstdint>
-#include <cstring>
 #include <memory_resource>
-#include <optional>
-#include <stdexcept>
-#include <string>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
 
 namespace Tool::Import {
-
-/// The file cannot be imported: `what()` tells where in it, and why.
-class Error : public std::runtime_error {
-public:
-    using std::runtime_error::runtime_error;
-};
-
-/// A place in a JSON file, such as modules.top.cells["u.1"].connections.A[3].
-class Path {
-public:
-    Path() = default;
-    explicit Path(std::string_view key) { AddKey(key); }
-
-    Path& AddKey(std::string_view key);
-    Path& AddIndex(std::size_t index);
-    const std::string& GetText() const noexcept { return text_; }
-
-private:
-    std::string text_;
-};
 
 /// One bit of a port, net or connection: the index of a net bit, or one of four constants.
 using Bit = std::uint32_t;
@@ -45,17 +23,20 @@ constexpr bool IsNet(Bit bit) noexcept {
     return bit < Zero;
 }
 
-/// A stretch of one of a module's tables.
+/// A run of consecutive entries in one of a module's tables.
 struct Span {
     std::uint32_t start = 0;
     std::uint32_t count = 0;
 };
 
-enum class Direction : std::uint8_t { Input, Output, InOut, Untold };
+/// `Unspecified` is the direction of a pin whose cell type has no module and whose cells give no
+/// "port_directions".
+enum class Direction : std::uint8_t { Input, Output, InOut, Unspecified };
 
-/// How the bits of a port or net are numbered. The first bit in the file is the rightmost one.
-struct Range {
+/// The indices of the bits of a port or net. The first bit in the file is the rightmost one.
+struct BitRange {
     std::int64_t offset = 0;
+    /// Whether the range ascends: the leftmost bit has the lowest index.
     bool upto = false;
 };
 
@@ -76,15 +57,16 @@ struct NamedValue {
 
 struct ModulePort {
     std::string_view name;
-    Direction direction = Direction::Untold;
-    Range range;
+    Direction direction = Direction::Unspecified;
+    BitRange range;
     Span bits;
 };
 
 struct Net {
     std::string_view name;
+    /// Whether a program made the name up.
     bool hidden = false;
-    Range range;
+    BitRange range;
     Span bits;
     Span attributes;
 };
@@ -97,6 +79,7 @@ struct Connection {
 
 struct Cell {
     std::string_view name;
+    /// Whether a program made the name up.
     bool hidden = false;
     std::uint32_t type = 0;
     Span connections;
@@ -108,9 +91,11 @@ struct Module {
     std::string_view name;
     /// Marked as one whose contents do not matter.
     bool blackBox = false;
+    /// Marked as the top of the design.
     bool top = false;
     bool hasMemories = false;
     std::vector<ModulePort> ports;
+    /// The default values of parameters.
     std::vector<NamedValue> defaults;
     std::vector<Net> nets;
     std::vector<Cell> cells;
@@ -118,14 +103,22 @@ struct Module {
     std::vector<Bit> bits;
     std::vector<Connection> connections;
     std::vector<NamedValue> values;
-    /// How many net bits there are.
+    /// The number of net bits.
     std::uint32_t netBits = 0;
+
+    Bit GetBit(const Span& run, std::uint32_t i) const { return bits[run.start + i]; }
+    /// The place of an object of one of the module's tables, such as "cells".
+    JsonPath GetPath(std::string_view table, std::string_view object) const;
+    JsonPath GetPinPath(const Cell& cell, std::string_view pin) const;
+    Place GetPlace(const Cell& cell, std::string_view part, std::string_view partName) const {
+        return Place{name, "cells", cell.name, part, partName};
+    }
 };
 
-/// A pin of a cell type, as the cells tell it.
+/// A pin of a cell type, collected from the cells.
 struct TypePin {
     std::string_view name;
-    Direction direction = Direction::Untold;
+    Direction direction = Direction::Unspecified;
 };
 
 /// What the cells of one type have in common.
@@ -137,7 +130,8 @@ struct CellType {
     std::uint32_t GetOrAddPin(std::string_view pin);
 };
 
-struct Design {
+/// A whole file.
+struct ImportedDesign {
     std::vector<Module> modules;
     std::vector<CellType> types;
 

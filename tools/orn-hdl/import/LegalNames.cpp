@@ -1,10 +1,9 @@
-#include "ImportNames.h"
+#include "import/LegalNames.h"
 
 #include "Orn_Hdl/Engine.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
-#include <cstdint>
 #include <iterator>
 
 namespace Tool::Import {
@@ -36,7 +35,8 @@ constexpr std::string_view VerilogWords =
     " within ";
 
 /// Words that VHDL gained after IEEE 1076-1993, the names of types, literals and libraries that
-/// written VHDL mentions, and of the architecture. Likewise; in any letter case.
+/// written VHDL mentions, and of the architecture, in lower case. A blank stands before and behind
+/// each.
 constexpr std::string_view VhdlWords =
     " assume assume_guarantee behavioral bit bit_vector boolean context cover default"
     " fairness false force ieee integer kestra numeric_std parameter private property"
@@ -47,7 +47,7 @@ constexpr std::string_view VhdlWords =
 /// A signal of this name could not be declared: ADD SIGNAL COMMENT is another command.
 constexpr std::string_view CommandWord("comment");
 
-/// Ends of names that the library makes for signals of its own.
+/// Suffixes of names that the library gives to signals of its own.
 constexpr std::string_view ReservedEnds[] = {"_dummy", "_const_signal", "_opensignal"};
 
 std::string ToLower(std::string_view text) {
@@ -98,8 +98,8 @@ bool IsNumber(std::string_view text) noexcept {
     return !text.empty() && std::all_of(text.begin(), text.end(), IsDigit);
 }
 
-/// Of one part of a made-up name, without the place in a source file that it may begin with:
-/// "opt_dff.cc:744:run" gives "run", "top.v:12" nothing.
+/// A part of a made-up name without the place in a source file at its start: "opt_dff.cc:744:run"
+/// gives "run", "top.v:12" the empty text.
 std::string_view WithoutPlace(std::string_view part) {
     const std::size_t line = part.find(':');
     if (line == std::string_view::npos) {
@@ -112,9 +112,9 @@ std::string_view WithoutPlace(std::string_view part) {
     return end == part.size() ? std::string_view() : part.substr(end + 1);
 }
 
-/// Of a name that a program made up, such as "$abc$97$auto$opt_dff.cc:744:run$12", the parts that
-/// tell something: "run$12". Other names stay as they are.
-std::string GetTellingPart(std::string_view name) {
+/// The parts of a name that mean something to a reader: of "$abc$97$auto$opt_dff.cc:744:run$12",
+/// which a program made up, "run$12". A name that no program made up stays whole.
+std::string GetMeaningfulParts(std::string_view name) {
     std::string result;
     if (name.empty() || name.front() != '$') {
         return result.assign(name);
@@ -124,10 +124,10 @@ std::string GetTellingPart(std::string_view name) {
         const std::size_t end = std::min(name.find('$', start), name.size());
         const std::string_view part = name.substr(start, end - start);
         const bool isRun = previous == "abc" && IsNumber(part);
-        const std::string_view telling =
+        const std::string_view kept =
             isRun || part == "abc" || part == "auto" ? std::string_view() : WithoutPlace(part);
-        if (!telling.empty()) {
-            result.append(result.empty() ? "" : "$").append(telling);
+        if (!kept.empty()) {
+            result.append(result.empty() ? "" : "$").append(kept);
         }
         previous = part;
         start = end + 1;
@@ -143,7 +143,7 @@ bool IsLegalName(std::string_view name) {
 
 std::string MakeLegalName(std::string_view name, char initial) {
     std::string result;
-    for (const char c : GetTellingPart(name)) {
+    for (const char c : GetMeaningfulParts(name)) {
         if (IsLetter(c) || IsDigit(c)) {
             result += c;
         } else if (!result.empty() && result.back() != '_') {
@@ -157,45 +157,6 @@ std::string MakeLegalName(std::string_view name, char initial) {
         result.insert(result.begin(), initial);
     }
     return result;
-}
-
-std::size_t NameTable::Hash::operator()(std::string_view name) const noexcept {
-    // FNV-1a over the letters in one case.
-    std::uint64_t hash = 14695981039346656037u;
-    for (const char c : name) {
-        hash = (hash ^ static_cast<unsigned char>(Port::ToUpper(c))) * 1099511628211u;
-    }
-    return hash;
-}
-
-bool NameTable::Equal::operator()(std::string_view a, std::string_view b) const noexcept {
-    return Port::EqualIgnoringCase(a, b);
-}
-
-std::string_view NameTable::Keep(std::string_view name) {
-    char* copy = static_cast<char*>(memory_.allocate(name.size(), 1));
-    std::copy(name.begin(), name.end(), copy);
-    return std::string_view(copy, name.size());
-}
-
-bool NameTable::Claim(std::string_view name) {
-    return !IsTaken(name) && taken_.insert(Keep(name)).second;
-}
-
-std::string NameTable::ClaimSimilar(std::string_view name, char initial) {
-    std::string wanted = MakeLegalName(name, initial);
-    if (IsLegalName(wanted) && Claim(wanted)) {
-        return wanted;
-    }
-    auto number = numbers_.find(wanted);
-    if (number == numbers_.end()) {
-        number = numbers_.emplace(Keep(wanted), 0).first;
-    }
-    std::string numbered;
-    do {
-        numbered = wanted + "_" + std::to_string(++number->second);
-    } while (!Claim(numbered));
-    return numbered;
 }
 
 } // namespace Tool::Import

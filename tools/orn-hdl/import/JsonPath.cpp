@@ -1,4 +1,4 @@
-#include "ImportDesign.h"
+#include "import/JsonPath.h"
 
 #include "Port/Ascii.h"
 
@@ -15,7 +15,7 @@ bool IsPlainKey(std::string_view key) noexcept {
 
 } // namespace
 
-Path& Path::AddKey(std::string_view key) {
+JsonPath& JsonPath::AddKey(std::string_view key) {
     if (IsPlainKey(key)) {
         text_.append(text_.empty() ? "" : ".").append(key);
         return *this;
@@ -32,26 +32,23 @@ Path& Path::AddKey(std::string_view key) {
     return *this;
 }
 
-Path& Path::AddIndex(std::size_t index) {
+JsonPath& JsonPath::AddIndex(std::size_t index) {
     text_.append("[").append(std::to_string(index)).append("]");
     return *this;
 }
 
-std::uint32_t CellType::GetOrAddPin(std::string_view pin) {
-    const auto [place, isNew] = pinIndex.try_emplace(pin, static_cast<std::uint32_t>(pins.size()));
-    if (isNew) {
-        pins.push_back(TypePin{pin, Direction::Untold});
+JsonPath Place::ToPath() const {
+    JsonPath path("modules");
+    for (const std::string_view key : {module, table, object, part, name}) {
+        if (!key.empty()) {
+            path.AddKey(key);
+        }
     }
-    return place->second;
+    return path;
 }
 
-std::string_view Design::Keep(std::string_view text) {
-    if (text.empty()) {
-        return std::string_view();
-    }
-    char* copy = static_cast<char*>(texts_.allocate(text.size(), 1));
-    std::memcpy(copy, text.data(), text.size());
-    return std::string_view(copy, text.size());
+void Fail(const JsonPath& path, std::string_view text) {
+    throw Error(path.GetText() + ": " + std::string(text));
 }
 
 } // namespace Tool::Import

@@ -1,4 +1,4 @@
-// Names that both netlist languages can hold.
+// The names of one scope.
 #pragma once
 
 #include <cstddef>
@@ -10,30 +10,20 @@
 
 namespace Tool::Import {
 
-/// Whether a name can stand in both languages as it is: a VHDL basic identifier that is no word of
-/// either language, no type that written VHDL mentions, and not of the form of the names that the
-/// writers make themselves.
-bool IsLegalName(std::string_view name);
-
-/// A legal name that resembles `name`: what is not allowed becomes "_", never two in a row nor one
-/// at either end. Of a name that a program made up, only the telling part is kept.
-/// \param initial the letter put before a name that would begin with a digit or be empty.
-std::string MakeLegalName(std::string_view name, char initial);
-
-/// The names of one scope, unique but for letter case. Millions of them take one block of memory
-/// after the other.
-class NameTable {
+/// The names of one scope. Names that differ in letter case only count as one. Millions of names
+/// are kept in a few blocks of memory.
+class UniqueNames {
 public:
-    NameTable() = default;
-    NameTable(const NameTable&) = delete;
-    NameTable& operator=(const NameTable&) = delete;
+    UniqueNames() = default;
+    UniqueNames(const UniqueNames&) = delete;
+    UniqueNames& operator=(const UniqueNames&) = delete;
 
     /// Makes room for a number of names.
     void Reserve(std::size_t count) { taken_.reserve(count); }
     /// Takes a name. \return false when it is taken already.
     bool Claim(std::string_view name);
     bool IsTaken(std::string_view name) const { return taken_.count(name) != 0; }
-    /// Takes a name that resembles `name`, numbered when that is not legal or not free.
+    /// Takes a legal name that resembles `name`, with a number when another one has it already.
     std::string ClaimSimilar(std::string_view name, char initial);
 
 private:

@@ -1,0 +1,63 @@
+#include "import/NetlistConnections.h"
+
+#include "import/SignalReferences.h"
+
+#include <algorithm>
+#include <cstddef>
+#include <string>
+
+namespace Tool::Import {
+
+namespace {
+
+bool HasOpenInput(const ImportedNetlist& netlist, std::size_t cell, const BitUses& uses) {
+    const std::vector<ImportedPin>& pins = netlist.components.GetOf(cell).pins;
+    const auto isInput = [](const ImportedPin& pin) { return pin.direction == Direction::Input; };
+    auto open = std::count_if(pins.begin(), pins.end(), isInput);
+    const Span& connections = netlist.top.cells[cell].connections;
+    for (std::uint32_t k = 0; k < connections.count; ++k) {
+        const Connection& connection = netlist.top.connections[connections.start + k];
+        open -= isInput(pins[connection.pin]) && !uses.IsOpen(connections.start + k) ? 1 : 0;
+    }
+    return open > 0;
+}
+
+/// Adds the signals for the constants among the bits of a connection.
+void NeedConstants(ImportedNetlist& netlist, const Span& bits, UniqueNames& names) {
+    for (std::uint32_t i = 0; i < bits.count; ++i) {
+        const Bit bit = netlist.unknown.Replace(netlist.top.GetBit(bits, i));
+        if (!IsNet(bit)) {
+            netlist.owners.NeedConstant(bit, names);
+        }
+    }
+}
+
+} // namespace
+
+void DecideConnections(ImportedNetlist& netlist, const BitUses& uses, UniqueNames& names) {
+    const Module& top = netlist.top;
+    netlist.connections.assign(top.connections.size(), ConnectionKind::Open);
+    for (std::size_t c = 0; c < top.cells.size(); ++c) {
+        const Cell& cell = top.cells[c];
+        netlist.hasOpenInputs = netlist.hasOpenInputs || HasOpenInput(netlist, c, uses);
+        for (std::uint32_t k = 0; k < cell.connections.count; ++k) {
+            const std::uint32_t index = cell.connections.start + k;
+            const Connection& connection = top.connections[index];
+            if (uses.IsOpen(index)) {
+                continue;
+            }
+            const ImportedPin& pin = netlist.components.GetOf(c).pins[connection.pin];
+            const SignalReferences references(top, netlist.owners, netlist.unknown);
+            // Two pins whose constant signals would share a name get a signal of the import's.
+            if (references.IsConstant(connection.bits) &&
+                names.Claim(netlist.cellNames[c] + "_" + pin.baseName + "_CONST_SIGNAL")) {
+                netlist.connections[index] = ConnectionKind::Constant;
+                continue;
+            }
+            netlist.connections[index] = ConnectionKind::Signal;
+            NeedConstants(netlist, connection.bits, names);
+        }
+    }
+}
+
+} // namespace Tool::Import

@@ -1,0 +1,59 @@
+// How the cells of the top module use their types: widths of pins, and parameters.
+#pragma once
+
+#include "import/ImportedDesign.h"
+#include "import/Warnings.h"
+
+#include <cstdint>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace Tool::Import {
+
+/// The use of one cell type.
+struct TypeUse {
+    struct Pin {
+        /// The port of the leaf module; null without a leaf module.
+        const ModulePort* port = nullptr;
+        std::uint32_t width = 0;
+        /// Whether cells of the type disagree on the width.
+        bool varies = false;
+    };
+    struct Parameter {
+        std::string_view name;
+        /// The value of the first cell that has it.
+        const Value* first = nullptr;
+        /// The value that the leaf module gives; null without one.
+        const Value* defaultValue = nullptr;
+        /// The number of cells that have it.
+        std::uint32_t cells = 0;
+        /// Whether the values of the cells are of different kinds.
+        bool kindVaries = false;
+    };
+
+    /// The module that describes the type; null when the file has none.
+    const Module* leaf = nullptr;
+    const Cell* firstCell = nullptr;
+    std::uint32_t cells = 0;
+    /// By the pin index of the type.
+    std::vector<Pin> pins;
+    std::vector<Parameter> parameters;
+    std::unordered_map<std::string_view, std::uint32_t> parameterIndex;
+    /// Whether the cells need more than one component.
+    bool varies = false;
+
+    /// Whether some cells take the default of a parameter.
+    bool NeedsDefault(const Parameter& parameter) const noexcept { return parameter.cells < cells; }
+    /// Whether some cells take a default that the file does not contain.
+    bool IsPartial(const Parameter& parameter) const noexcept {
+        return NeedsDefault(parameter) && parameter.defaultValue == nullptr;
+    }
+};
+
+/// The uses of the types of a design, by the index of the type. Adds the ports of leaf modules to
+/// the pins of their types. Warns of values whose type the file does not contain. \throws Error
+/// when a cell has contents, or does not fit its leaf module.
+std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top, Warnings& warnings);
+
+} // namespace Tool::Import
