@@ -2,6 +2,7 @@
 // in one pass without recursion, and so hold up at names of any length.
 #pragma once
 
+#include "HdlModel/Names/GeneratedNames.h"
 #include "Port/Ascii.h"
 
 #include <cstdint>
@@ -12,9 +13,6 @@ namespace Orn_Hdl::Names {
 
 /// The most bits that one name is ever expanded into.
 constexpr std::int64_t MostExpandedBits = 1048576;
-
-/// What the name of a signal that stands in for another one ends in.
-constexpr std::string_view DummySuffix = "_DUMMY";
 
 /// One character of a name in its normalised form.
 constexpr char Normalized(char c) noexcept {

@@ -1,10 +1,10 @@
 #include "import/LegalNames.h"
 
 #include "Orn_Hdl/Engine.h"
+#include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
-#include <iterator>
 
 namespace Tool::Import {
 
@@ -47,9 +47,6 @@ constexpr std::string_view VhdlWords =
 /// A signal of this name could not be declared: ADD SIGNAL COMMENT is another command.
 constexpr std::string_view CommandWord("comment");
 
-/// Suffixes of names that the library gives to signals of its own.
-constexpr std::string_view ReservedEnds[] = {"_dummy", "_const_signal", "_opensignal"};
-
 std::string ToLower(std::string_view text) {
     std::string result(text);
     std::transform(result.begin(), result.end(), result.begin(), Port::ToLower);
@@ -70,13 +67,6 @@ bool IsReserved(std::string_view name) {
     return lower == CommandWord || Orn_Hdl::Engine::IsVhdlKeyword(text.c_str()) ||
            Orn_Hdl::Engine::IsVerilogKeyword(text.c_str()) || IsListed(VerilogWords, name) ||
            IsListed(VhdlWords, lower);
-}
-
-bool HasReservedEnd(std::string_view name) {
-    return std::any_of(std::begin(ReservedEnds), std::end(ReservedEnds), [&](std::string_view end) {
-        return name.size() >= end.size() &&
-               Port::EqualIgnoringCase(name.substr(name.size() - end.size()), end);
-    });
 }
 
 /// A letter, then letters and digits with single "_" between them.
@@ -138,7 +128,8 @@ std::string GetMeaningfulParts(std::string_view name) {
 } // namespace
 
 bool IsLegalName(std::string_view name) {
-    return IsBasicIdentifier(name) && !IsReserved(name) && !HasReservedEnd(name);
+    return IsBasicIdentifier(name) && !IsReserved(name) &&
+           !Orn_Hdl::HdlUtilities::IsGeneratedName(std::string(name).c_str());
 }
 
 std::string MakeLegalName(std::string_view name, char initial) {

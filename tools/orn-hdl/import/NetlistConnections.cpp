@@ -2,6 +2,8 @@
 
 #include "import/SignalReferences.h"
 
+#include "Orn_Hdl/Model/Pins.h"
+
 #include <algorithm>
 #include <cstddef>
 #include <string>
@@ -20,6 +22,14 @@ bool HasOpenInput(const ImportedNetlist& netlist, std::size_t cell, const BitUse
         open -= isInput(pins[connection.pin]) && !uses.IsOpen(connections.start + k) ? 1 : 0;
     }
     return open > 0;
+}
+
+/// The name, without its range, that the library gives to the signal of a constant at a pin.
+std::string GetConstantSignalName(const std::string& cell, const ImportedPin& pin) {
+    Orn_Hdl::ScalarPin scalar(pin.baseName.c_str(), Orn_Hdl::Polarity());
+    Orn_Hdl::PinConstantSignalVisitor visitor(cell.c_str());
+    visitor.VisitScalarPin(&scalar);
+    return std::string(visitor.GetName().GetView());
 }
 
 /// Adds the signals for the constants among the bits of a connection.
@@ -50,7 +60,7 @@ void DecideConnections(ImportedNetlist& netlist, const BitUses& uses, UniqueName
             const SignalReferences references(top, netlist.owners, netlist.unknown);
             // Two pins whose constant signals would share a name get a signal of the import's.
             if (references.IsConstant(connection.bits) &&
-                names.Claim(netlist.cellNames[c] + "_" + pin.baseName + "_CONST_SIGNAL")) {
+                names.Claim(GetConstantSignalName(netlist.cellNames[c], pin))) {
                 netlist.connections[index] = ConnectionKind::Constant;
                 continue;
             }
