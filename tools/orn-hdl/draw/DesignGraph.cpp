@@ -131,12 +131,13 @@ void DesignGraph::AddSources(Signal& signal) {
 
 /// Connects the pieces of two signals that share bits when both are counted from the left.
 void DesignGraph::AddSource(const std::vector<Piece>& to, const std::vector<Piece>& from) {
+    auto first = from.begin();
     for (const Piece& target : to) {
-        for (const Piece& source : from) {
-            if (source.start < target.end && target.start < source.end) {
-                nets_[target.net].sources.push_back(Source{source.net, target.signal});
-                nets_[source.net].aliases.push_back(target.net);
-            }
+        first = std::find_if(first, from.end(),
+                             [&](const Piece& source) { return target.start < source.end; });
+        for (auto source = first; source != from.end() && source->start < target.end; ++source) {
+            nets_[target.net].sources.push_back(Source{source->net, target.signal});
+            nets_[source->net].aliases.push_back(target.net);
         }
     }
 }

@@ -2,6 +2,8 @@
 
 #include "Orn_Hdl/Model.h"
 
+#include <algorithm>
+
 namespace Tool {
 
 using namespace Orn_Hdl;
@@ -57,9 +59,6 @@ std::string DotWriter::GetEndNode(const Net& net, const End& end) const {
 }
 
 std::string DotWriter::GetStart(const Net& net, const SortedEnds& ends) const {
-    if (DesignGraph::HasManyEnds(net)) {
-        return GetNode(StubNode, net);
-    }
     if (DesignGraph::NeedsPoint(net, ends) || !net.sources.empty()) {
         return GetNode(PointNode, net);
     }
@@ -84,9 +83,12 @@ void DotWriter::WriteLine(std::string_view from, std::string_view to, const Sign
 std::string DotWriter::GetPinText(const Box& box, const Pin& pin, std::size_t number) const {
     std::string text = Quote(pin.GetNameView(), true);
     const char* separator = "\\ =\\ ";
-    for (const DesignGraph::Wire& wire : box.wires) {
-        if (wire.pin == number && DesignGraph::HasManyEnds(graph_.GetNets()[wire.net])) {
-            text.append(separator).append(Quote(wire.part->GetNameView(), true));
+    auto wire = std::lower_bound(
+        box.wires.begin(), box.wires.end(), number,
+        [](const DesignGraph::Wire& w, std::size_t wanted) { return w.pin < wanted; });
+    for (; wire != box.wires.end() && wire->pin == number; ++wire) {
+        if (DesignGraph::HasManyEnds(graph_.GetNets()[wire->net])) {
+            text.append(separator).append(Quote(wire->part->GetNameView(), true));
             separator = ",\\ ";
         }
     }
@@ -139,7 +141,11 @@ void DotWriter::WriteSources(const Net& net, const std::string& to) {
     for (const DesignGraph::Source& source : net.sources) {
         const Net& from = graph_.GetNets()[source.net];
         if (from.drawn) {
-            WriteLine(GetStart(from, graph_.SortEnds(from)), to, *source.part, "");
+            // Sorting the ends of a net with very many would be done again for each alias.
+            const std::string start = DesignGraph::HasManyEnds(from)
+                                          ? GetNode(StubNode, from)
+                                          : GetStart(from, graph_.SortEnds(from));
+            WriteLine(start, to, *source.part, "");
         }
     }
 }

@@ -42,7 +42,7 @@ private:
     void WriteLine(std::string_view from, std::string_view to, const Orn_Hdl::Signal& part,
                    std::string_view more);
 
-    /// The node, and the side of it, where the lines of a net begin.
+    /// The node, and the side of it, where the lines of a net begin that has not very many ends.
     std::string GetStart(const Net& net, const SortedEnds& ends) const;
     std::string GetEndNode(const Net& net, const End& end) const;
     std::string GetNode(std::string_view kind, const Net& net) const;

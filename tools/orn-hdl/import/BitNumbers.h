@@ -5,30 +5,39 @@
 
 #include <cstddef>
 #include <cstdint>
-#include <unordered_map>
+#include <map>
 #include <vector>
 
 namespace Tool::Import {
 
-/// Gives the bit numbers of a module consecutive indices, in the order of their first use. Numbers
-/// up to `limit` have a table. Programs number bits without large gaps; a file with larger numbers
-/// must not make the table huge.
+/// Gives the bit numbers of each module consecutive indices, in the order of their first use.
+/// Programs number bits without large gaps, so numbers up to a limit have a table; larger ones must
+/// not make the table huge. All modules share the table: a file may have many modules, each with
+/// few bits of large numbers.
 class BitNumbers {
 public:
+    /// \param limit the greatest number that gets a place in the table.
     explicit BitNumbers(std::size_t limit) : limit_(limit) {}
 
+    /// Begins a module, whose first index is 0.
+    void StartModule();
     Bit GetIndex(std::int64_t number);
-    std::uint32_t GetCount() const noexcept { return count_; }
+    /// The number of indices that the present module has.
+    std::uint32_t GetCount() const noexcept { return next_ - first_; }
 
 private:
-    static constexpr Bit NoIndex = 0xFFFFFFFF;
+    /// A bit's index counted over all modules, plus 1. Entries of earlier modules are lower than
+    /// those of the present one, and so need not be removed.
+    using Entry = std::uint32_t;
 
-    Bit Claim(Bit& index);
+    Bit Claim(Entry& entry);
 
     std::size_t limit_;
-    std::uint32_t count_ = 0;
-    std::vector<Bit> table_;
-    std::unordered_map<std::int64_t, Bit> others_;
+    Entry first_ = 1;
+    Entry next_ = 1;
+    std::vector<Entry> table_;
+    /// Sorted, since numbers can be chosen to collide in a hash table.
+    std::map<std::int64_t, Entry> others_;
 };
 
 } // namespace Tool::Import

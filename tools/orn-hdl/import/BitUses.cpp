@@ -97,7 +97,7 @@ void BitUses::CountConnections(const ImportedComponents& components) {
         const Cell& cell = top_.cells[c];
         for (std::uint32_t k = 0; k < cell.connections.count; ++k) {
             const std::uint32_t index = cell.connections.start + k;
-            CountConnection(cell, index, components.GetOf(c).pins[top_.connections[index].pin]);
+            CountConnection(cell, index, components.GetOf(c).GetPin(top_.connections[index].pin));
         }
     }
 }

@@ -1,6 +1,5 @@
 #include "import/DesignReader.h"
 
-#include "import/BitNumbers.h"
 #include "import/CellReader.h"
 #include "import/JsonWalker.h"
 #include "import/PartReader.h"
@@ -15,8 +14,8 @@ namespace {
 
 class DesignReader {
 public:
-    DesignReader(ImportedDesign& design, bool keepAttributes)
-        : design_(design), keepAttributes_(keepAttributes), parts_(design, walker_),
+    DesignReader(ImportedDesign& design, bool keepAttributes, std::size_t fileSize)
+        : design_(design), keepAttributes_(keepAttributes), parts_(design, walker_, fileSize),
           cells_(design, walker_, parts_, keepAttributes) {}
 
     void Read(std::string text);
@@ -33,14 +32,12 @@ private:
 
     ImportedDesign& design_;
     const bool keepAttributes_;
-    std::size_t fileSize_ = 0;
     JsonWalker walker_;
     PartReader parts_;
     CellReader cells_;
 };
 
 void DesignReader::Read(std::string text) {
-    fileSize_ = text.size();
     walker_.Walk(std::move(text), [this](JsonValue& root) { ReadFile(root); });
 }
 
@@ -64,12 +61,10 @@ void DesignReader::ReadFile(JsonValue& root) {
 void DesignReader::ReadModule(std::string_view name, JsonValue& value) {
     Module& module = design_.modules.emplace_back();
     module.name = name;
-    BitNumbers bitNumbers(fileSize_);
-    parts_.SetBitNumbers(&bitNumbers);
+    parts_.StartModule();
     walker_.ForEachField(
         value, [&](std::string_view key, JsonValue& part) { ReadModulePart(module, key, part); });
-    parts_.SetBitNumbers(nullptr);
-    module.netBits = bitNumbers.GetCount();
+    module.netBits = parts_.CountNetBits();
 }
 
 void DesignReader::ReadModulePart(Module& module, std::string_view key, JsonValue& part) {
@@ -160,7 +155,7 @@ void DesignReader::ReadNet(Module& module, std::string_view name, JsonValue& val
 
 std::unique_ptr<ImportedDesign> ReadDesign(std::string text, bool keepAttributes) {
     auto design = std::make_unique<ImportedDesign>();
-    DesignReader(*design, keepAttributes).Read(std::move(text));
+    DesignReader(*design, keepAttributes, text.size()).Read(std::move(text));
     return design;
 }
 

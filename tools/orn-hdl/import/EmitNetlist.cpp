@@ -153,11 +153,11 @@ void NetlistEmitter::EmitCell(std::size_t index) {
     sink_.AddInstance(name, component.name);
     for (std::uint32_t k = 0; k < cell.connections.count; ++k) {
         const std::uint32_t connection = cell.connections.start + k;
-        EmitConnection(name, component.pins[top_.connections[connection].pin], connection);
+        EmitConnection(name, component.GetPin(top_.connections[connection].pin), connection);
     }
     for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
         const NamedValue& value = top_.values[cell.parameters.start + i];
-        const std::string& generic = netlist_.components.GetGeneric(index, value.name).value.name;
+        const std::string& generic = component.GetGeneric(value.name).value.name;
         sink_.AddInstanceGeneric(name, MakeGeneric(generic, value.value, netlist_.unknown));
     }
 }

@@ -5,6 +5,8 @@
 #include "import/Values.h"
 
 #include <algorithm>
+#include <cstddef>
+#include <iterator>
 #include <map>
 #include <utility>
 
@@ -12,9 +14,31 @@ namespace Tool::Import {
 
 namespace {
 
-/// What tells the component of a cell from others of its type: the width of each pin, then for each
-/// parameter whether the cell has it. Empty when the type has one component only.
-using Variant = std::vector<std::uint32_t>;
+/// What tells the component of a cell from others of its type, as sorted numbers: `PinKey` for pins
+/// whose width is not the type's (for all pins of a type that is split by pins), then
+/// `ParameterKey` for parameters that other cells lack and that have no default. Only what the cell
+/// itself has takes part, so that many different cells of one type cost no more than their own
+/// sizes.
+using Variant = std::vector<std::uint64_t>;
+
+constexpr std::uint64_t PinKey(std::uint32_t pin, std::uint32_t width) noexcept {
+    return std::uint64_t(pin) << 32 | width;
+}
+
+constexpr std::uint64_t ParameterBit = std::uint64_t(1) << 63;
+
+constexpr std::uint64_t ParameterKey(std::uint32_t parameter) noexcept {
+    return ParameterBit | parameter;
+}
+
+constexpr std::uint32_t GetPinOf(std::uint64_t key) noexcept {
+    return static_cast<std::uint32_t>(key >> 32);
+}
+
+/// The lower half of a key: a pin's width or a parameter's index.
+constexpr std::uint32_t GetNumberOf(std::uint64_t key) noexcept {
+    return static_cast<std::uint32_t>(key);
+}
 
 class ComponentFinder {
 public:
@@ -30,8 +54,12 @@ public:
 private:
     Variant GetVariant(const TypeUse& type, const Cell& cell) const;
     void Add(std::uint32_t index, const Variant& variant, const Cell& cell);
-    void AddPin(ImportedComponent& component, const TypePin& typePin, std::uint32_t width);
+    void AddPins(ImportedComponent& component, std::uint32_t type, const Variant& variant);
+    void AddPin(ImportedComponent& component, const std::vector<TypePin>& pins,
+                std::uint32_t typePin, std::uint32_t width);
     void AddGenerics(ImportedComponent& component, const TypeUse& type, const Variant& variant);
+    void AddGeneric(ImportedComponent& component, const TypeUse& type,
+                    const TypeUse::Parameter& parameter);
     void NameParts(ImportedComponent& component, const TypeUse& type);
     void ClaimSimilar(UniqueNames& scope, const ImportedComponent& component, std::string_view part,
                       std::string_view oldName, std::string& name);
@@ -58,45 +86,60 @@ std::uint32_t ComponentFinder::GetOrAdd(const Cell& cell) {
 
 Variant ComponentFinder::GetVariant(const TypeUse& type, const Cell& cell) const {
     Variant variant;
-    if (!type.varies) {
-        return variant;
-    }
-    for (const TypeUse::Pin& pin : type.pins) {
-        variant.push_back(pin.width);
-    }
     for (std::uint32_t i = 0; i < cell.connections.count; ++i) {
         const Connection& connection = top_.connections[cell.connections.start + i];
-        if (connection.bits.count > 0) {
-            variant[connection.pin] = connection.bits.count;
+        const std::uint32_t usual = type.pins[connection.pin].width;
+        const std::uint32_t width = connection.bits.count > 0 ? connection.bits.count : usual;
+        if (type.splitsByPins || width != usual) {
+            variant.push_back(PinKey(connection.pin, width));
         }
     }
-    variant.resize(type.pins.size() + type.parameters.size());
     for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
         const std::string_view name = top_.values[cell.parameters.start + i].name;
         const std::uint32_t index = type.parameterIndex.find(name)->second;
-        variant[type.pins.size() + index] = type.IsPartial(type.parameters[index]) ? 1 : 0;
+        if (type.IsPartial(type.parameters[index])) {
+            variant.push_back(ParameterKey(index));
+        }
     }
+    std::sort(variant.begin(), variant.end());
+    variant.erase(std::unique(variant.begin(), variant.end()), variant.end());
     return variant;
 }
 
 void ComponentFinder::Add(std::uint32_t index, const Variant& variant, const Cell& cell) {
     const TypeUse& type = types_[index];
-    const CellType& cellType = design_.types[index];
     ImportedComponent& component = components_.emplace_back();
-    component.oldName = cellType.name;
+    component.oldName = design_.types[index].name;
     component.firstCell = &cell;
-    for (std::size_t i = 0; i < cellType.pins.size(); ++i) {
-        AddPin(component, cellType.pins[i], variant.empty() ? type.pins[i].width : variant[i]);
-    }
+    component.splitByPins = type.splitsByPins;
+    AddPins(component, index, variant);
     AddGenerics(component, type, variant);
     NameParts(component, type);
 }
 
-void ComponentFinder::AddPin(ImportedComponent& component, const TypePin& typePin,
-                             std::uint32_t width) {
+void ComponentFinder::AddPins(ImportedComponent& component, std::uint32_t type,
+                              const Variant& variant) {
+    const std::vector<TypePin>& pins = design_.types[type].pins;
+    auto key = variant.begin();
+    const auto isPin = [&] { return key != variant.end() && *key < ParameterBit; };
+    if (component.splitByPins) {
+        for (; isPin(); ++key) {
+            AddPin(component, pins, GetPinOf(*key), GetNumberOf(*key));
+        }
+        return;
+    }
+    for (std::uint32_t pin = 0; pin < pins.size(); ++pin) {
+        const bool differs = isPin() && GetPinOf(*key) == pin;
+        AddPin(component, pins, pin, differs ? GetNumberOf(*key++) : types_[type].pins[pin].width);
+    }
+}
+
+void ComponentFinder::AddPin(ImportedComponent& component, const std::vector<TypePin>& pins,
+                             std::uint32_t typePin, std::uint32_t width) {
     ImportedPin& pin = component.pins.emplace_back();
-    pin.oldName = typePin.name;
-    pin.direction = typePin.direction;
+    pin.oldName = pins[typePin].name;
+    pin.typePin = typePin;
+    pin.direction = pins[typePin].direction;
     pin.width = width;
     if (pin.direction == Direction::Unspecified) {
         warnings_.Add(top_.GetPath("cells", component.firstCell->name).AddKey("port_directions"),
@@ -108,24 +151,30 @@ void ComponentFinder::AddPin(ImportedComponent& component, const TypePin& typePi
 
 void ComponentFinder::AddGenerics(ImportedComponent& component, const TypeUse& type,
                                   const Variant& variant) {
-    for (std::size_t i = 0; i < type.parameters.size(); ++i) {
-        const TypeUse::Parameter& parameter = type.parameters[i];
-        const bool has = parameter.cells > 0 &&
-                         (!type.IsPartial(parameter) || variant[type.pins.size() + i] != 0);
-        if (!has) {
-            continue;
-        }
-        ImportedGeneric& generic = component.generics.emplace_back();
-        generic.oldName = parameter.name;
-        Place place = top_.GetPlace(*component.firstCell, "parameters", parameter.name);
-        const Value* value = parameter.first;
-        if (type.NeedsDefault(parameter) && parameter.defaultValue != nullptr) {
-            value = parameter.defaultValue;
-            place = Place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
-        }
-        CheckParameter(*value, place, unknown_, warnings_);
-        generic.value = MakeGeneric("", *value, unknown_);
+    std::vector<std::uint32_t> parameters = type.commonParameters;
+    const auto common = static_cast<std::ptrdiff_t>(parameters.size());
+    const auto own = std::lower_bound(variant.begin(), variant.end(), ParameterBit);
+    std::transform(own, variant.end(), std::back_inserter(parameters), GetNumberOf);
+    std::inplace_merge(parameters.begin(), parameters.begin() + common, parameters.end());
+    for (const std::uint32_t index : parameters) {
+        AddGeneric(component, type, type.parameters[index]);
     }
+}
+
+void ComponentFinder::AddGeneric(ImportedComponent& component, const TypeUse& type,
+                                 const TypeUse::Parameter& parameter) {
+    component.genericIndex.emplace(parameter.name,
+                                   static_cast<std::uint32_t>(component.generics.size()));
+    ImportedGeneric& generic = component.generics.emplace_back();
+    generic.oldName = parameter.name;
+    Place place = top_.GetPlace(*component.firstCell, "parameters", parameter.name);
+    const Value* value = parameter.first;
+    if (type.NeedsDefault(parameter) && parameter.defaultValue != nullptr) {
+        value = parameter.defaultValue;
+        place = Place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
+    }
+    CheckParameter(*value, place, unknown_, warnings_);
+    generic.value = MakeGeneric("", *value, unknown_);
 }
 
 void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& type) {
@@ -148,9 +197,8 @@ void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& typ
     for (ImportedGeneric& generic : component.generics) {
         ClaimSimilar(scope, component, "parameters", generic.oldName, generic.value.name);
     }
-    for (std::size_t i = 0; i < component.pins.size(); ++i) {
-        ImportedPin& pin = component.pins[i];
-        const ModulePort* port = type.pins[i].port;
+    for (ImportedPin& pin : component.pins) {
+        const ModulePort* port = type.pins[pin.typePin].port;
         const BitRange range = Normalize(port == nullptr ? BitRange() : port->range, pin.width);
         pin.scalar = pin.width == 1 && range.offset == 0;
         pin.name = pin.scalar ? pin.baseName
@@ -171,6 +219,17 @@ void ComponentFinder::ClaimSimilar(UniqueNames& scope, const ImportedComponent& 
     }
 }
 
+/// Why a component could not keep the name of its type.
+const char* GetReason(const ImportedComponent& component) {
+    if (!IsLegalName(component.oldName)) {
+        return "no name in both languages";
+    }
+    return component.splitByPins
+               ? "the cells of the type have few pins in common"
+               : "other cells of the type have pins of other widths, or parameters whose default "
+                 "is not told";
+}
+
 void NameComponents(std::vector<ImportedComponent>& components, const Module& top,
                     UniqueNames& names, Warnings& warnings) {
     for (ImportedComponent& component : components) {
@@ -179,27 +238,24 @@ void NameComponents(std::vector<ImportedComponent>& components, const Module& to
         }
     }
     for (ImportedComponent& component : components) {
-        if (!component.name.empty()) {
-            continue;
+        if (component.name.empty()) {
+            component.name = names.ClaimSimilar(component.oldName, 'c');
+            warnings.Add(top.GetPath("cells", component.firstCell->name).AddKey("type"),
+                         std::string(GetReason(component)) + "; this component is called " +
+                             component.name);
         }
-        component.name = names.ClaimSimilar(component.oldName, 'c');
-        warnings.Add(top.GetPath("cells", component.firstCell->name).AddKey("type"),
-                     (IsLegalName(component.oldName)
-                          ? "other cells of the type have pins of other widths, or parameters "
-                            "whose default is not told; this component is called "
-                          : "no name in both languages; this component is called ") +
-                         component.name);
     }
 }
 
 } // namespace
 
-const ImportedGeneric& ImportedComponents::GetGeneric(std::size_t cell,
-                                                      std::string_view parameter) const {
-    const std::vector<ImportedGeneric>& generics = GetOf(cell).generics;
-    return *std::find_if(generics.begin(), generics.end(), [&](const ImportedGeneric& generic) {
-        return generic.oldName == parameter;
-    });
+const ImportedPin& ImportedComponent::GetPin(std::uint32_t typePin) const {
+    if (!splitByPins) {
+        return pins[typePin];
+    }
+    return *std::lower_bound(
+        pins.begin(), pins.end(), typePin,
+        [](const ImportedPin& pin, std::uint32_t wanted) { return pin.typePin < wanted; });
 }
 
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,

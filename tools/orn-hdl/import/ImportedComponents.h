@@ -12,12 +12,16 @@
 #include <cstdint>
 #include <string>
 #include <string_view>
+#include <unordered_map>
+#include <utility>
 #include <vector>
 
 namespace Tool::Import {
 
 struct ImportedPin {
     std::string_view oldName;
+    /// Its index in the pins of the type.
+    std::uint32_t typePin = 0;
     /// Without the range.
     std::string baseName;
     /// With the range, if the pin has one.
@@ -38,13 +42,24 @@ struct ImportedComponent {
     /// The first cell that needs it.
     const Cell* firstCell = nullptr;
     std::string name;
-    /// By the pin index of the type.
+    /// Whether it only has the pins of the cells that need it.
+    bool splitByPins = false;
+    /// In the order of the type's pins.
     std::vector<ImportedPin> pins;
     std::vector<ImportedGeneric> generics;
+    std::unordered_map<std::string_view, std::uint32_t> genericIndex;
+
+    /// A pin, by its index in the pins of the type.
+    const ImportedPin& GetPin(std::uint32_t typePin) const;
+    /// A generic, by the name of the parameter.
+    const ImportedGeneric& GetGeneric(std::string_view parameter) const {
+        return generics[genericIndex.find(parameter)->second];
+    }
 };
 
 /// One component for each type of cell, and further ones where cells of one type differ in the
-/// widths of their pins, or in parameters whose default is not in the file.
+/// widths of their pins, or in parameters whose default is not in the file, or have few pins in
+/// common.
 class ImportedComponents {
 public:
     /// \param components those that the cells need, in the order of the first cell that needs them.
@@ -57,7 +72,6 @@ public:
     const ImportedComponent& GetOf(std::size_t cell) const {
         return components_[componentOf_[cell]];
     }
-    const ImportedGeneric& GetGeneric(std::size_t cell, std::string_view parameter) const;
 
 private:
     std::vector<ImportedComponent> components_;

@@ -41,7 +41,7 @@ void OpenConstantOutputs(Module& top, const ImportedComponents& components, Warn
         const Cell& cell = top.cells[c];
         for (std::uint32_t k = 0; k < cell.connections.count; ++k) {
             const Connection& connection = top.connections[cell.connections.start + k];
-            OpenConstants(top, cell, components.GetOf(c).pins[connection.pin], connection.bits,
+            OpenConstants(top, cell, components.GetOf(c).GetPin(connection.pin), connection.bits,
                           warnings);
         }
     }

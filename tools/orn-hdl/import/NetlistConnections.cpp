@@ -13,13 +13,15 @@ namespace Tool::Import {
 namespace {
 
 bool HasOpenInput(const ImportedNetlist& netlist, std::size_t cell, const BitUses& uses) {
-    const std::vector<ImportedPin>& pins = netlist.components.GetOf(cell).pins;
+    const ImportedComponent& component = netlist.components.GetOf(cell);
     const auto isInput = [](const ImportedPin& pin) { return pin.direction == Direction::Input; };
-    auto open = std::count_if(pins.begin(), pins.end(), isInput);
+    auto open = std::count_if(component.pins.begin(), component.pins.end(), isInput);
     const Span& connections = netlist.top.cells[cell].connections;
     for (std::uint32_t k = 0; k < connections.count; ++k) {
         const Connection& connection = netlist.top.connections[connections.start + k];
-        open -= isInput(pins[connection.pin]) && !uses.IsOpen(connections.start + k) ? 1 : 0;
+        open -= isInput(component.GetPin(connection.pin)) && !uses.IsOpen(connections.start + k)
+                    ? 1
+                    : 0;
     }
     return open > 0;
 }
@@ -56,7 +58,7 @@ void DecideConnections(ImportedNetlist& netlist, const BitUses& uses, UniqueName
             if (uses.IsOpen(index)) {
                 continue;
             }
-            const ImportedPin& pin = netlist.components.GetOf(c).pins[connection.pin];
+            const ImportedPin& pin = netlist.components.GetOf(c).GetPin(connection.pin);
             const SignalReferences references(top, netlist.owners, netlist.unknown);
             // Two pins whose constant signals would share a name get a signal of the import's.
             if (references.IsConstant(connection.bits) &&

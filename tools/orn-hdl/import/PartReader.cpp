@@ -35,7 +35,7 @@ Bit PartReader::ReadBit(JsonValue& value) {
         if (number < 0) {
             walker_.Fail("the number of a net is negative");
         }
-        return bitNumbers_->GetIndex(number);
+        return bitNumbers_.GetIndex(number);
     }
     const std::string_view text = walker_.ReadText(value);
     const std::size_t constant = std::string_view("01xz").find(text);

@@ -5,6 +5,8 @@
 #include "import/ImportedDesign.h"
 #include "import/JsonWalker.h"
 
+#include <cstddef>
+#include <cstdint>
 #include <memory_resource>
 #include <string_view>
 #include <unordered_set>
@@ -14,10 +16,14 @@ namespace Tool::Import {
 /// All functions fail with the place of a part that is not of the expected form.
 class PartReader {
 public:
-    PartReader(ImportedDesign& design, JsonWalker& walker) : design_(design), walker_(walker) {}
+    /// \param fileSize bounds the bit numbers that a program writes into such a file.
+    PartReader(ImportedDesign& design, JsonWalker& walker, std::size_t fileSize)
+        : design_(design), walker_(walker), bitNumbers_(fileSize) {}
 
-    /// The numbers of the bits that are read from now on; not owned.
-    void SetBitNumbers(BitNumbers* numbers) noexcept { bitNumbers_ = numbers; }
+    /// Begins a module, whose bits have indices of their own.
+    void StartModule() { bitNumbers_.StartModule(); }
+    /// The number of net bits that the present module has.
+    std::uint32_t CountNetBits() const noexcept { return bitNumbers_.GetCount(); }
 
     Direction ReadDirection(JsonValue& value);
     /// \return false, with nothing read, when `key` is no part of a range.
@@ -47,7 +53,7 @@ private:
 
     ImportedDesign& design_;
     JsonWalker& walker_;
-    BitNumbers* bitNumbers_ = nullptr;
+    BitNumbers bitNumbers_;
 };
 
 } // namespace Tool::Import

@@ -18,6 +18,11 @@ bool MayBeInteger(const Value& value) noexcept {
     return value.kind == Value::Bits && value.text.size() == 32;
 }
 
+/// Types with more open pins for each connection are split by the pins that cells have.
+constexpr std::uint64_t MostPinsPerConnection = 8;
+/// So many pins of instances are no burden, open or not.
+constexpr std::uint64_t FewPins = 65536;
+
 void AppendName(std::string& list, std::string_view name) {
     list.append(list.empty() ? "" : ", ").append(name);
 }
@@ -91,6 +96,7 @@ void TypeUseCounter::AddLeaf(TypeUse& type, CellType& cellType, const Module& le
 }
 
 void TypeUseCounter::CountPins(TypeUse& type, const Cell& cell) {
+    type.connections += cell.connections.count;
     for (std::uint32_t i = 0; i < cell.connections.count; ++i) {
         const Connection& connection = top_.connections[cell.connections.start + i];
         TypeUse::Pin& pin = type.pins[connection.pin];
@@ -103,7 +109,6 @@ void TypeUseCounter::CountPins(TypeUse& type, const Cell& cell) {
         if (pin.width == 0) {
             pin.width = width;
         }
-        pin.varies |= width != 0 && width != pin.width;
     }
 }
 
@@ -124,15 +129,20 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
     }
 }
 
-/// Decides whether one component can stand for all cells of a type.
+/// Decides what the components of a type have in common.
 void CompareCells(TypeUse& type) {
     for (TypeUse::Pin& pin : type.pins) {
         pin.width = std::max<std::uint32_t>(pin.width, 1);
-        type.varies |= pin.varies;
     }
-    for (const TypeUse::Parameter& parameter : type.parameters) {
-        type.varies |= parameter.cells > 0 && type.IsPartial(parameter);
+    for (std::uint32_t i = 0; i < type.parameters.size(); ++i) {
+        const TypeUse::Parameter& parameter = type.parameters[i];
+        if (parameter.cells > 0 && !type.IsPartial(parameter)) {
+            type.commonParameters.push_back(i);
+        }
     }
+    const std::uint64_t pins = std::uint64_t(type.cells) * type.pins.size();
+    type.splitsByPins =
+        type.leaf == nullptr && pins > FewPins && pins > type.connections * MostPinsPerConnection;
 }
 
 void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& warnings) {

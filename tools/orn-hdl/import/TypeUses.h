@@ -16,9 +16,8 @@ struct TypeUse {
     struct Pin {
         /// The port of the leaf module; null without a leaf module.
         const ModulePort* port = nullptr;
+        /// The leaf module's width, else that of the first cell that connects the pin.
         std::uint32_t width = 0;
-        /// Whether cells of the type disagree on the width.
-        bool varies = false;
     };
     struct Parameter {
         std::string_view name;
@@ -40,8 +39,13 @@ struct TypeUse {
     std::vector<Pin> pins;
     std::vector<Parameter> parameters;
     std::unordered_map<std::string_view, std::uint32_t> parameterIndex;
-    /// Whether the cells need more than one component.
-    bool varies = false;
+    /// The number of connections of all cells together.
+    std::uint64_t connections = 0;
+    /// The indices of the parameters that every component of the type has.
+    std::vector<std::uint32_t> commonParameters;
+    /// Whether each set of pins needs a component of its own: with a component that has the pins of
+    /// all cells, instances would consist of open pins almost entirely.
+    bool splitsByPins = false;
 
     /// Whether some cells take the default of a parameter.
     bool NeedsDefault(const Parameter& parameter) const noexcept { return parameter.cells < cells; }
