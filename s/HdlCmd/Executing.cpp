@@ -53,13 +53,26 @@ void RequirePermission(const Model& model, const char* fileName) {
     }
 }
 
+/// Opens a file that may be written, where the model's guard wants it.
+TextFileOutStream Open(const Model& model, const char* fileName, TextFileOutStream::Mode mode) {
+    OutputGuard* const guard = model.GetOutputGuard();
+    Port::StringBase<char> path;
+    const Port::Folder* const folder =
+        guard == nullptr ? nullptr : guard->GetFolder(fileName, path);
+    if (folder == nullptr) {
+        return TextFileOutStream(fileName, mode);
+    }
+    return TextFileOutStream(*folder, path.CStr(), fileName, mode);
+}
+
 /// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
 /// that is there already is replaced when everything was written, and untouched otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
     RequirePermission(model, fileName);
-    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
-                                                                    : TextFileOutStream::Replace);
+    TextFileOutStream out = Open(model, fileName,
+                                 arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
+                                                                 : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();
