@@ -10,9 +10,9 @@ using namespace Orn_Hdl;
 
 namespace {
 
-/// With more boxes than this, Graphviz takes minutes unless it is told to take less care.
+/// With more boxes than this, Graphviz takes minutes unless its limits are lowered.
 constexpr std::size_t MostBoxesDrawnWell = 150;
-/// With more boxes than this, Graphviz has to take still less care.
+/// With more boxes than this, the limits have to be lower still.
 constexpr std::size_t MostBoxesDrawnFairly = 1500;
 
 // Kinds of nodes; the number of the net makes a node's name of them.

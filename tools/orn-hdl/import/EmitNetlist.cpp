@@ -40,7 +40,7 @@ private:
 
 void NetlistEmitter::Emit() {
     sink_.SetName(netlist_.name);
-    // Nobody knows whether the leaf cells have configurations.
+    // The leaf cells need not have configurations.
     sink_.SuppressConfiguration();
     if (netlist_.hasOpenInputs) {
         sink_.WireOpenPins();

@@ -14,7 +14,7 @@ namespace Tool::Import {
 
 namespace {
 
-/// What tells the component of a cell from others of its type, as sorted numbers: `PinKey` for pins
+/// The differences of a component from others of its type, as sorted numbers: `PinKey` for pins
 /// whose width is not the type's (for all pins of a type that is split by pins), then
 /// `ParameterKey` for parameters that other cells lack and that have no default. Only what the cell
 /// itself has takes part, so that many different cells of one type cost no more than their own

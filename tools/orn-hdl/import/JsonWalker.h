@@ -41,8 +41,8 @@ public:
     [[noreturn]] void FailAt(std::string_view field, std::string_view member,
                              const std::string& text);
 
-    /// Calls `visit` with the name and value of each field. The present place includes the field
-    /// meanwhile, and still does when an error ends the walk.
+    /// Calls `visit` with the name and value of each field. During the call, and when an error ends
+    /// the walk, the present place includes the field.
     template <class Visit> void ForEachField(JsonValue& value, Visit visit) {
         if (value.type() != simdjson::ondemand::json_type::object) {
             Fail("an object is expected");

@@ -14,7 +14,7 @@ using Port::IsDigit;
 using Port::IsLetter;
 
 /// Words that Verilog gained after IEEE 1364-1995, SystemVerilog's included (IEEE 1800-2017, annex
-/// B), and "force". A blank stands before and behind each.
+/// B), and "force". Each has a blank before and after it.
 constexpr std::string_view VerilogWords =
     " accept_on alias always_comb always_ff always_latch assert assume automatic"
     " before bind bins binsof bit break byte cell chandle checker class clocking"
@@ -35,8 +35,8 @@ constexpr std::string_view VerilogWords =
     " within ";
 
 /// Words that VHDL gained after IEEE 1076-1993, the names of types, literals and libraries that
-/// written VHDL mentions, and of the architecture, in lower case. A blank stands before and behind
-/// each.
+/// written VHDL mentions, and of the architecture, in lower case. Each has a blank before and
+/// after it.
 constexpr std::string_view VhdlWords =
     " assume assume_guarantee behavioral bit bit_vector boolean context cover default"
     " fairness false force ieee integer kestra numeric_std parameter private property"

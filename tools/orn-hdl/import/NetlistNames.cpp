@@ -17,7 +17,7 @@ namespace {
 std::string GetWantedCellName(const ImportedNetlist& netlist, std::size_t cell) {
     const std::string_view name = netlist.top.cells[cell].name;
     const std::size_t number = name.find_last_not_of("0123456789") + 1;
-    // A name that a program made up tells which of its steps made the cell; the component says
+    // A name that a program made up names the step that made the cell; the component's name says
     // more.
     return netlist.top.cells[cell].hidden && number < name.size()
                ? netlist.components.GetOf(cell).name + "_" + std::string(name.substr(number))
