@@ -16,6 +16,10 @@
 #include <memory>
 #include <string_view>
 
+namespace Port {
+class Folder;
+}
+
 namespace Orn_Hdl {
 
 class CommandFactory;
@@ -34,6 +38,12 @@ public:
     /// \param fileName the file, as the command names it; never null.
     /// \return an empty text when the file may be written, otherwise why it may not.
     virtual Port::StringBase<char> WhyNot(const char* fileName) = 0;
+    /// Asked after `WhyNot` has allowed a file: below which folder the file is opened. Unless this
+    /// is overridden, that is wherever the file's name leads at that moment.
+    /// \param path receives the file's path below the folder, free of links and "..": no link is
+    ///        followed (`Port::File::OpenBelow`).
+    /// \return the folder, not owned, which must stay open during the call; or null.
+    virtual const Port::Folder* GetFolder(const char* fileName, Port::StringBase<char>& path);
 };
 
 /// One design: its netlist, its output options and its done commands.

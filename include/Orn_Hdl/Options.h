@@ -106,6 +106,10 @@ public:
     static const Port::StringBase<char> ConvertVerilogBase(int base);
     /// Puts "_DUMMY" behind a name, or before its range: D(7:0) gives D_DUMMY(7:0).
     static const Port::StringBase<char> AddDummySuffix(const char* name);
+    /// Whether a name, range aside, has the form of the names that the library gives to dummy
+    /// signals, to the signals of constants at pins, and to the signals at open pins. A design with
+    /// such names of its own may get two signals of one name. Null is read as "".
+    static bool IsGeneratedName(const char* name);
     /// Takes the quotes off a text that is wholly enclosed in double or in single quotes; null is
     /// read as "".
     static const Port::StringBase<char> RemoveQuotes(const char* text);

@@ -12,6 +12,10 @@
 #include <string>
 #include <string_view>
 
+namespace Port {
+class Folder;
+}
+
 namespace Orn_Hdl {
 
 /// Where an `OutStream` sends its text.
@@ -116,6 +120,11 @@ public:
     TextFileOutStream(const char* fileName, bool append);
     /// \param mode what becomes of a file that is there.
     TextFileOutStream(const char* fileName, Mode mode);
+    /// Opens a file below a folder without following a link (`Port::File::OpenBelow`).
+    /// \param path the file's path below the folder.
+    /// \param fileName the name to remember.
+    TextFileOutStream(const Port::Folder& folder, const char* path, const char* fileName,
+                      Mode mode);
     ~TextFileOutStream() override;
 
     /// Closes the file that is open and opens another. The remembered name does not change.

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "Port/Export.h"
+#include "Port/Folder.h"
 #include "Port/String.h"
 
 #include <cstddef>
@@ -36,6 +37,12 @@ public:
     ///        over from its first byte on. Of no meaning for the other modes.
     /// \return false when the file cannot be opened; a directory never can.
     bool open(const char* name, Mode mode, bool fromStart);
+    /// Opens a file below a folder, closing the one that was open. No link is followed, neither on
+    /// the way to the file nor by its own name, and nothing but a regular file is opened: no other
+    /// process can make this write outside of the folder.
+    /// \param folder only needed during the call.
+    /// \param path the file's path below the folder, without "..".
+    bool OpenBelow(const Folder& folder, const char* path, Mode mode, bool fromStart);
     /// \return false when anything has failed since `open`: what was written may be lost.
     bool close();
     /// Closes the file. What was written to replace a file is dropped; anything else stays.
@@ -62,6 +69,10 @@ private:
 
     bool Fail(int error) noexcept;
     bool OpenDescriptor(const char* name, int flags, unsigned mode);
+    bool OpenNamed(const char* name, Mode mode, bool fromStart);
+    int OpenInFolder(const char* name, int flags, unsigned mode) const;
+    int RenameTemporary() const;
+    void UnlinkTemporary() const;
     void CloseDescriptor() noexcept;
     bool OpenToReplace(const char* name);
     int OpenTemporary(unsigned mode);
@@ -74,6 +85,8 @@ private:
     std::string_view TakeLine(std::size_t length) noexcept;
 
     int descriptor_ = -1;
+    /// Where names begin; closed for the current folder.
+    Folder folder_;
     int error_ = 0;
     /// The file that is being written to replace another; empty when there is none.
     std::string temporary_;

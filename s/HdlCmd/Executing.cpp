@@ -54,6 +54,18 @@ void RequirePermission(const Model& model, const char* fileName) {
     }
 }
 
+/// Opens a file that may be written, where the model's guard wants it.
+TextFileOutStream Open(const Model& model, const char* fileName, TextFileOutStream::Mode mode) {
+    OutputGuard* const guard = model.GetOutputGuard();
+    Port::StringBase<char> path;
+    const Port::Folder* const folder =
+        guard == nullptr ? nullptr : guard->GetFolder(fileName, path);
+    if (folder == nullptr) {
+        return TextFileOutStream(fileName, mode);
+    }
+    return TextFileOutStream(*folder, path.CStr(), fileName, mode);
+}
+
 /// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
 /// that is there already is replaced when everything was written, and untouched otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
@@ -63,8 +75,9 @@ template <class Write> void WriteFile(Model& model, const Arguments& arguments, 
     if (!use.HasModel()) {
         return;
     }
-    TextFileOutStream out(fileName, arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
-                                                                     : TextFileOutStream::Replace);
+    TextFileOutStream out = Open(model, fileName,
+                                 arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
+                                                                  : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();

@@ -30,6 +30,11 @@ struct Model::Implementation {
 
 OutputGuard::~OutputGuard() = default;
 
+const Port::Folder* OutputGuard::GetFolder(const char* /*fileName*/,
+                                           Port::StringBase<char>& /*path*/) {
+    return nullptr;
+}
+
 Model::Model(CommandFactory* factory)
     : implementation_(std::make_unique<Implementation>(factory)) {}
 

@@ -49,6 +49,10 @@ const Text HdlUtilities::AddDummySuffix(const char* name) {
     return result;
 }
 
+bool HdlUtilities::IsGeneratedName(const char* name) {
+    return Names::IsGenerated(Names::BeforeParenthesis(Port::ViewOf(name)));
+}
+
 const Text HdlUtilities::RemoveQuotes(const char* text) {
     const std::string_view whole = Port::ViewOf(text);
     Text result = text;

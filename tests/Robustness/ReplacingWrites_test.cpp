@@ -1,11 +1,14 @@
 // A written netlist takes the place of a file as a whole, or not at all.
 #include "Orn_Hdl/Streams.h"
+#include "Port/Folder.h"
 #include "Port/System.h"
+#include "Robustness/FailingSystem.h"
 #include "Support/EngineScript.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstdlib>
 #include <fcntl.h>
@@ -290,6 +293,30 @@ TEST_F(Replacing, OtherNamesOfAFileLeadToTheFormerText) {
     EXPECT_EQ(fs::status(Path("other")).permissions(), fs::perms(0604));
     EXPECT_EQ(ReadWholeFile(Path("file")), "former");
     EXPECT_EQ(CountFiles(), 2);
+}
+
+TEST_F(Replacing, AFailureBelowAFolderLeavesTheFormerText) {
+    Port::Folder folder;
+    ASSERT_EQ(folder.Open(folder_.GetPath().c_str()), 0);
+    const int before = Support::CountOpenFiles();
+    int calls = 0;
+    // The first run fails nowhere and counts the calls.
+    for (int failing = 0; failing <= calls; ++failing) {
+        WriteWholeFile(Path("file"), "former");
+        int error = 0;
+        {
+            const Robustness::FailingSystem system(failing, EIO);
+            TextFileOutStream out(folder, "file", "file", TextFileOutStream::Replace);
+            out << "new" << OutStream::NewLine;
+            out.Close();
+            error = out.GetError();
+            calls = std::max(calls, system.GetCallCount());
+        }
+        EXPECT_EQ(ReadWholeFile(Path("file")), error == 0 ? "new\n" : "former") << failing;
+        EXPECT_EQ(CountFiles(), 1) << failing;
+        EXPECT_EQ(Support::CountOpenFiles(), before) << failing;
+    }
+    EXPECT_GT(calls, 8);
 }
 
 TEST_F(Replacing, LeavesNoFileOpen) {

@@ -5,8 +5,10 @@ from __future__ import annotations
 import os
 import pty
 import subprocess
+import threading
 import time
 import unittest
+from collections.abc import Callable
 
 from support import EXAMPLES, FAILED, FILE, INVERTER, SUCCESS, TOOL, USAGE, ToolTest
 
@@ -190,6 +192,11 @@ class Outputs(ToolTest):
         self.assertIn("module d(A", outcome.out)
 
 
+# Runs of a test in which another thread changes the folder. A check of the name alone lets about one run
+# in ten write outside.
+RACES = 16
+
+
 class WriteRules(ToolTest):
     """A command file that is not trusted writes below one folder, or nothing."""
 
@@ -286,6 +293,53 @@ class WriteRules(ToolTest):
                 self.assertEqual(outcome.status, FAILED if rule == ["--no-write"] else SUCCESS)
                 self.assertIn("entity w is", self.read("b.vhd"))
                 (self.folder / "b.vhd").unlink()
+
+    def race(self, swap: Callable[[], None], *lines: str) -> None:
+        """Replays the lines while another thread swaps what their files lie in, and checks that
+        nothing is ever written outside of the folder."""
+        outside = {path.name for path in (self.folder / "outer").iterdir()}
+        done = threading.Event()
+
+        def keep_swapping() -> None:
+            while not done.is_set():
+                swap()
+
+        swapper = threading.Thread(target=keep_swapping)
+        swapper.start()
+        try:
+            for _ in range(RACES):
+                self.write("w.cmd", INVERTER + "".join(f"{line}\n" for line in lines))
+                self.run_tool("run", "w.cmd", "--output-dir", "out", "--keep-going")
+                if {path.name for path in (self.folder / "outer").iterdir()} != outside:
+                    break
+        finally:
+            done.set()
+            swapper.join()
+        self.assertEqual({path.name for path in (self.folder / "outer").iterdir()}, outside)
+        self.assertEqual(self.read("outer/kept"), "kept\n")
+
+    def test_a_folder_that_becomes_a_link_in_the_meantime(self) -> None:
+        way, real = self.folder / "out" / "sub", self.folder / "out" / "real"
+
+        def swap() -> None:
+            way.rename(real)
+            way.symlink_to("../outer")
+            way.unlink()
+            real.rename(way)
+
+        self.race(swap, *(f"WRITE VERILOG -APPEND sub/a{i}.v" for i in range(100)),
+                  *(f"WRITE VHDL sub/b{i}.vhd" for i in range(100)))
+
+    def test_a_file_that_becomes_a_link_in_the_meantime(self) -> None:
+        file, link = self.folder / "out" / "a.v", self.folder / "out" / "link"
+
+        def swap() -> None:
+            link.symlink_to("../outer/kept")
+            link.replace(file)
+            file.unlink()
+            file.touch()
+
+        self.race(swap, *["WRITE VERILOG -APPEND a.v", "WRITE VHDL a.v"] * 100)
 
     def test_no_write(self) -> None:
         self.write("w.cmd", INVERTER + "WRITE VERILOG a.v\nWRITE VHDL -APPEND /dev/null\nNOOP\n")

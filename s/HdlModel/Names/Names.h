@@ -2,6 +2,7 @@
 // in one pass without recursion, and so hold up at names of any length.
 #pragma once
 
+#include "HdlModel/Names/GeneratedNames.h"
 #include "HdlModel/Names/Range.h"
 #include "Port/Ascii.h"
 #include "Port/String.h"
@@ -12,8 +13,6 @@
 
 namespace Orn_Hdl::Names {
 
-/// What the names of dummy signals end in, before a range or index.
-constexpr std::string_view DummySuffix = "_DUMMY";
 
 /// One character of a name in its normalised form.
 constexpr char Normalized(char c) noexcept {

@@ -254,7 +254,10 @@ void Netlist::ConnectOpenPinToDummy() {
             const bool isBus = pin->GetPinType() == PinTypeBus;
             const std::string_view base = isBus ? Names::BeforeParenthesis(pinName) : pinName;
             std::string name(instance->GetNameView());
-            name.append("_").append(base).append("_openSignal").append(pinName.substr(base.size()));
+            name.append("_")
+                .append(base)
+                .append(Names::OpenSuffix)
+                .append(pinName.substr(base.size()));
             Signal* signal = GetSignal(std::string_view(name));
             if (signal == nullptr) {
                 signal = isBus ? static_cast<Signal*>(new Bus(name.c_str()))

@@ -175,7 +175,7 @@ void PinConstantSignalVisitor::SetResult(std::string_view baseName, std::string_
     name_ = instanceName_;
     name_ += '_';
     name_ += baseName;
-    name_ += "_CONST_SIGNAL";
+    name_ += Names::ConstantSuffix;
     name_ += index;
 }
 
