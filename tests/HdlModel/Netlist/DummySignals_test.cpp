@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model.h"
 
 #include "Support/Names.h"
+#include "Support/Parts.h"
 #include "Support/SlowStringSet.h"
 
 #include <gtest/gtest.h>
@@ -12,20 +13,16 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::In;
 using Support::Names;
 using Support::NamesOf;
+using Support::Out;
 
-const Polarity In("in");
-const Polarity Out("out");
-
-/// A netlist of buffers, each with an input I, an output O and a bidirectional pin B.
+/// A netlist of buffers.
 class DummySignals : public testing::Test {
 protected:
     DummySignals() {
-        component_ = new Component("BUF");
-        component_->AddPin("I", In, "");
-        component_->AddPin("O", Out, "");
-        component_->AddPin("B", Polarity("bi"), "");
+        component_ = Support::MakeBuffer().release();
         netlist_.Add(component_);
     }
 
@@ -144,10 +141,14 @@ TEST_F(DummySignals, OnlyPortsOfTheWrongUseGetOne) {
 }
 
 TEST_F(DummySignals, ABidirectionalPinReadsAndDrives) {
-    AddScalar("Y", Out)->Connect(AddBuffer("U1")->GetPin("B"));
-    AddScalar("A", In)->Connect(AddBuffer("U2")->GetPin("B"));
+    Pin* const driver = AddBuffer("U1")->GetPin("B");
+    Pin* const reader = AddBuffer("U2")->GetPin("B");
+    AddScalar("Y", Out)->Connect(driver);
+    AddScalar("A", In)->Connect(reader);
     netlist_.CreateVhdlDummySignals();
     EXPECT_EQ(Signals(), (Names{"Y", "A", "Y_DUMMY", "A_DUMMY"}));
+    EXPECT_EQ(driver->GetSignal(), Get("Y_DUMMY"));
+    EXPECT_EQ(reader->GetSignal(), Get("A_DUMMY"));
 }
 
 TEST_F(DummySignals, AnOutputPortWithSeveralDriversGetsOneForVhdl) {
