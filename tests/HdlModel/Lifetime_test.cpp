@@ -49,6 +49,37 @@ TEST(Lifetime, APinThatOnlyPointsAtASignalMayEndBeforeOrAfterIt) {
     EXPECT_EQ(late.GetSignal(), nullptr);
 }
 
+TEST(Lifetime, APinThatMovedOnIsNotOpenedByAnyFormerSignal) {
+    const auto pointedAt = [](Signal& signal, Pin& pin) { pin.Connect(&signal); };
+    const auto listed = [](Signal& signal, Pin& pin) { signal.Connect(&pin); };
+    const auto pointedAtThenListed = [](Signal& signal, Pin& pin) {
+        pin.Connect(&signal);
+        signal.Connect(&pin);
+    };
+    const auto listedThenPointedAt = [](Signal& signal, Pin& pin) {
+        signal.Connect(&pin);
+        signal.Disconnect(&pin);
+        pin.Connect(&signal);
+    };
+    const std::function<void(Signal&, Pin&)> ways[] = {pointedAt, listed, pointedAtThenListed,
+                                                       listedThenPointedAt};
+    for (const auto& before : ways) {
+        for (const auto& after : ways) {
+            ScalarPin pin("A", In);
+            ScalarSignal last("M");
+            auto former = std::make_unique<ScalarSignal>("N");
+            before(*former, pin);
+            after(last, pin);
+            former->DisconnectAll();
+            EXPECT_EQ(pin.GetSignal(), &last);
+            before(*former, pin);
+            after(last, pin);
+            former.reset();
+            EXPECT_EQ(pin.GetSignal(), &last);
+        }
+    }
+}
+
 TEST(Lifetime, ASignalThatEndsOpensItsPins) {
     ScalarPin listed("A", In);
     ScalarPin unlisted("B", In);

@@ -179,6 +179,26 @@ TEST_F(DummySignals, TakeAliasesAndConstantOfAnOutputPortAway) {
     EXPECT_EQ(port->GetConstantValue().GetValue(), "");
 }
 
+TEST_F(DummySignals, TakePinsAndAliasesOverInTheirOrder) {
+    ScalarSignal* const port = AddScalar("Y", Out);
+    const Names names{"c", "a", "d", "b"};
+    std::vector<Pin*> pins;
+    for (const std::string& name : names) {
+        pins.push_back(AddBuffer(name.c_str())->GetPin("I"));
+        port->Connect(pins.back());
+        port->Connect(AddScalar(name.c_str()));
+    }
+    netlist_.CreateVhdlDummySignals();
+    const Signal* const dummy = Get("Y_DUMMY");
+    ASSERT_NE(dummy, nullptr);
+    std::vector<Pin*> taken;
+    for (Pin* pin : dummy->GetPinIterator()) {
+        taken.push_back(pin);
+    }
+    EXPECT_EQ(taken, pins);
+    EXPECT_EQ(NamesOf(dummy->GetSignalIterator()), names);
+}
+
 TEST_F(DummySignals, LeaveAliasesAndConstantOfAnInputPort) {
     ScalarSignal* port = AddFeedback("A", In);
     port->Connect(AddScalar("X"));
