@@ -150,7 +150,7 @@ TEST_F(CommandLine, TabsAreNoSeparators) {
     EXPECT_NE(model_.GetComponent("X\tY"), nullptr);
 }
 
-TEST_F(CommandLine, ALineEndsAtItsFirstNul) {
+TEST_F(CommandLine, EndsAtItsFirstNul) {
     EXPECT_TRUE(model_.ExecuteLine(std::string_view("ADD SIGNAL N\0M", 14)));
     EXPECT_NE(model_.GetSignal("N"), nullptr);
     EXPECT_TRUE(model_.ExecuteLine(std::string_view("\0MAKE COFFEE", 12)));
@@ -757,16 +757,21 @@ TEST_F(CommandFile, OneCarriageReturnBelongsToTheLineEnd) {
 }
 
 TEST_F(CommandFile, EmptyFilesAreFine) {
+    model_.SetModifiedFlag(true);
     EXPECT_TRUE(Read(""));
+    EXPECT_FALSE(model_.IsModified());
     EXPECT_TRUE(Read("\n"));
     EXPECT_TRUE(Read("\r\n"));
     EXPECT_EQ(GetDoneCount(), 0);
 }
 
-TEST_F(CommandFile, ALineEndsAtItsFirstNul) {
-    EXPECT_TRUE(Read(std::string("ADD SIGNAL A\0B C\nADD SIGNAL D\n", 30)));
-    EXPECT_NE(model_.GetSignal("A"), nullptr);
-    EXPECT_NE(model_.GetSignal("D"), nullptr);
+TEST_F(CommandFile, IsClosedOnEveryPath) {
+    const int before = Support::CountOpenFiles();
+    EXPECT_TRUE(Read("ADD COMPONENT A\n"));
+    EXPECT_THROW(Read("ADD COMPONENT B\nADD COMPONENT B\nADD COMPONENT C\n"), Exception);
+    EXPECT_EQ(Support::CountOpenFiles(), before);
+    EXPECT_NE(model_.GetComponent("B"), nullptr) << "the lines before the failure stay done";
+    EXPECT_EQ(model_.GetComponent("C"), nullptr);
 }
 
 TEST_F(CommandFile, AnExceptionStopsTheReplayAndKeepsTheFlag) {

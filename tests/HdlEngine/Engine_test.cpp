@@ -171,7 +171,8 @@ protected:
 } // namespace
 
 TEST_F(RemovalFromWithin, OfALine) {
-    engine_.Execute("REMOVE");
+    EXPECT_EQ(FailureOfLine(engine_, "REMOVE"), "");
+    EXPECT_EQ(endedRemovers, 1);
 }
 
 TEST_F(RemovalFromWithin, OfALineOfTheModel) {
@@ -319,15 +320,26 @@ TEST(EngineModels, EnginesAreIndependent) {
 }
 
 TEST(EngineModels, DestructionDeletesManyModelsWithDesigns) {
-    Engine engine;
-    for (int i = 0; i < 50; ++i) {
-        const std::string name = "m" + std::to_string(i);
-        engine.CreateAndAddModel(name.c_str(), "");
-        engine.Execute(name.c_str(), "ADD COMPONENT INV");
-        engine.Execute(name.c_str(), "ADD PIN INV I Input");
-        engine.Execute(name.c_str(), "ADD INSTANCE INV U1");
-        engine.Execute(name.c_str(), "CONNECT SIGNAL N U1.I");
+    constexpr int Models = 50;
+    endedRemovers = 0;
+    farewell = nullptr;
+    removal = [](Model&) {};
+    {
+        Engine engine;
+        for (int i = 0; i < Models; ++i) {
+            const std::string name = "m" + std::to_string(i);
+            engine.CreateAndAddModel(name.c_str(), "");
+            engine.GetModel(name.c_str())
+                ->GetCommandFactory()
+                ->AddCommandCreator("REMOVE", &Remover::Create);
+            for (const char* line : {"ADD COMPONENT INV", "ADD PIN INV I Input",
+                                     "ADD INSTANCE INV U1", "CONNECT SIGNAL N U1.I", "REMOVE"}) {
+                engine.Execute(name.c_str(), line);
+            }
+        }
+        EXPECT_EQ(endedRemovers, 0);
     }
+    EXPECT_EQ(endedRemovers, Models) << "each model has ended, with the commands that it keeps";
 }
 
 TEST(EngineModels, AnEngineIsNotCopied) {

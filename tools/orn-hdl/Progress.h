@@ -3,6 +3,8 @@
 
 #include <chrono>
 #include <cstdint>
+#include <cstdio>
+#include <functional>
 #include <string>
 #include <string_view>
 
@@ -12,9 +14,15 @@ namespace Tool {
 /// second. The destructor erases the line.
 class Progress {
 public:
+    using Clock = std::chrono::steady_clock;
+
     /// \param quiet shows nothing at all.
     /// \param file the file that is read; its size is needed for the percentage.
     Progress(bool quiet, const std::string& file);
+    /// Shows the line on `terminal`, by the time that `now` returns.
+    ///
+    /// \param terminal null shows nothing at all.
+    Progress(std::FILE* terminal, const std::string& file, std::function<Clock::time_point()> now);
     ~Progress() { Erase(); }
     Progress(const Progress&) = delete;
     Progress& operator=(const Progress&) = delete;
@@ -27,13 +35,13 @@ public:
     void Erase();
 
 private:
-    using Clock = std::chrono::steady_clock;
-
     bool IsDue();
     void Show(const std::string& text);
 
-    const bool enabled_;
+    /// Null when nothing is shown.
+    std::FILE* const terminal_;
     const std::uint64_t totalBytes_;
+    const std::function<Clock::time_point()> now_;
     bool shown_ = false;
     Clock::time_point next_;
 };

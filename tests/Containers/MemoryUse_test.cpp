@@ -16,7 +16,7 @@ template <class Action> std::size_t Count(Action action) {
     return Support::CountAllocations(action).blocks;
 }
 
-TEST(Allocation, IsCounted) {
+TEST(ContainerMemory, IsCounted) {
     EXPECT_GE(Count([] {
                   StringArray array;
                   array.Add("a text that is too long for its object");
@@ -24,7 +24,7 @@ TEST(Allocation, IsCounted) {
               1u);
 }
 
-TEST(Allocation, AnEmptyMapTakesNoMemory) {
+TEST(ContainerMemory, AnEmptyMapTakesNoMemory) {
     EXPECT_EQ(Count([] {
                   IStringPtrMap<int*> map;
                   EXPECT_EQ(map.Get("a"), nullptr);
@@ -36,7 +36,7 @@ TEST(Allocation, AnEmptyMapTakesNoMemory) {
               0u);
 }
 
-TEST(Allocation, AnEmptyArrayTakesNoMemory) {
+TEST(ContainerMemory, AnEmptyArrayTakesNoMemory) {
     EXPECT_EQ(Count([] {
                   PtrArray<int*> array;
                   EXPECT_EQ(array.GetIndex(nullptr), -1);
@@ -51,7 +51,7 @@ TEST(Allocation, AnEmptyArrayTakesNoMemory) {
               0u);
 }
 
-TEST(Allocation, AHolderWithoutAttributesTakesNoMemory) {
+TEST(ContainerMemory, AHolderWithoutAttributesTakesNoMemory) {
     EXPECT_EQ(Count([] {
                   const AttributeHolder holder;
                   EXPECT_EQ(holder.GetAttr("a"), nullptr);
@@ -62,7 +62,7 @@ TEST(Allocation, AHolderWithoutAttributesTakesNoMemory) {
               0u);
 }
 
-TEST(Allocation, AnEmptySetTakesLittleMemory) {
+TEST(ContainerMemory, AnEmptySetTakesLittleMemory) {
     // At most one allocation a table, so that the buckets come with the first name.
     EXPECT_LE(Count([] {
                   StringSet set;
@@ -72,7 +72,7 @@ TEST(Allocation, AnEmptySetTakesLittleMemory) {
               2u);
 }
 
-TEST(Allocation, SplittingALineTakesAHandfulHoweverManyWordsItHas) {
+TEST(ContainerMemory, SplittingALineTakesAHandfulHoweverManyWordsItHas) {
     const char* line = "ADD INSTANCE AND2 U1 and some more words to make it \"as long\" as it gets";
     StringArray array;
     EXPECT_LE(Count([&] { array.ParseCommandLine(line); }), 12u);
@@ -81,7 +81,7 @@ TEST(Allocation, SplittingALineTakesAHandfulHoweverManyWordsItHas) {
     EXPECT_EQ(array.GetSize(), 15);
 }
 
-TEST(Allocation, ATextThatIsSetAgainAndAgainTakesTheRoomOfOne) {
+TEST(ContainerMemory, ATextThatIsSetAgainAndAgainTakesTheRoomOfOne) {
     const Port::String longer(std::string(1000, 'x'));
     const Port::String other(std::string(900, 'y'));
     StringArray array;

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model.h"
 
 #include "Support/Names.h"
+#include "Support/Parts.h"
 
 #include <gtest/gtest.h>
 
@@ -11,12 +12,11 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::Bi;
+using Support::In;
 using Support::Names;
 using Support::NamesOf;
-
-const Polarity In("in");
-const Polarity Out("out");
-const Polarity Bi("bi");
+using Support::Out;
 
 template <class T> T* Added(Netlist& netlist, T* object) {
     netlist.Add(object);

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model.h"
 
 #include "Support/Names.h"
+#include "Support/Parts.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
@@ -13,12 +14,11 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::Bi;
+using Support::In;
 using Support::Names;
 using Support::NamesOf;
-
-const Polarity In("in");
-const Polarity Out("out");
-const Polarity Bi("bi");
+using Support::Out;
 
 TEST(Component, StoresItsNameNormalised) {
     EXPECT_EQ(Component("C[1-0]").GetName(), "C(1:0)");

@@ -31,7 +31,7 @@ template <class T> int Length(const Orn_Hdl::Iterator<T*>& list) {
     return count;
 }
 
-TEST(Sizes, ALineOfAHundredMegabytes) {
+TEST(LargeInput, ALineOfAHundredMegabytes) {
     constexpr std::size_t Size = 100'000'000;
     EngineScript script;
     std::string line = "ADD NOTES ";
@@ -44,7 +44,7 @@ TEST(Sizes, ALineOfAHundredMegabytes) {
     EXPECT_EQ(script.GetFailure(line), "");
 }
 
-TEST(Sizes, ALineOfTenMillionWords) {
+TEST(LargeInput, ALineOfTenMillionWords) {
     EngineScript script;
     std::string line = "ADD NOTES";
     for (int i = 0; i < 10'000'000; ++i) {
@@ -54,7 +54,7 @@ TEST(Sizes, ALineOfTenMillionWords) {
     EXPECT_EQ(script.GetNetlist().GetCommentView().size(), 20'000'000u);
 }
 
-TEST(Sizes, ANameOfAMegabyte) {
+TEST(LargeInput, ANameOfAMegabyte) {
     const std::string name(1'000'000, 'n');
     EngineScript script;
     script.Run("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U\nADD SIGNAL " + name +
@@ -68,7 +68,7 @@ TEST(Sizes, ANameOfAMegabyte) {
               2147483647);
 }
 
-TEST(Sizes, ACompoundOfAHundredThousandMembers) {
+TEST(LargeInput, ACompoundOfAHundredThousandMembers) {
     constexpr int Members = 100'000;
     std::string name = "m0";
     for (int i = 1; i < Members; ++i) {
@@ -83,7 +83,7 @@ TEST(Sizes, ACompoundOfAHundredThousandMembers) {
     EXPECT_EQ(CountOf(script.Vhdl(), "signal m"), std::size_t(Members));
 }
 
-TEST(Sizes, ABusOfTwoToTheThirtyFirstBits) {
+TEST(LargeInput, ABusOfTwoToTheThirtyFirstBits) {
     EngineScript script;
     script.Run(
         "ADD COMPONENT C\nADD PIN C I(2147483647:0) input\nADD PIN C O(0:2147483647) output\n"
@@ -97,7 +97,7 @@ TEST(Sizes, ABusOfTwoToTheThirtyFirstBits) {
     EXPECT_LT(script.Vhdl().size(), 100'000u);
 }
 
-TEST(Sizes, TenThousandModelsInOneEngine) {
+TEST(LargeInput, TenThousandModelsInOneEngine) {
     constexpr int Models = 10'000;
     const auto name = [](const char* stem, int i) { return stem + std::to_string(i); };
     Orn_Hdl::Engine engine;
@@ -121,7 +121,7 @@ int CountOfInstances() {
     return wanted == nullptr ? 330'000 : std::stoi(wanted);
 }
 
-TEST(Sizes, AMillionCommandsInOneFile) {
+TEST(LargeInput, AMillionCommandsInOneFile) {
     const int instances = CountOfInstances();
     const Support::TemporaryFolder folder;
     const std::string name = folder / "design.cmd";
@@ -143,7 +143,7 @@ TEST(Sizes, AMillionCommandsInOneFile) {
               std::size_t(instances) + 1);
 }
 
-TEST(Sizes, SignalsOnManyListsAreRemovedInAnyOrder) {
+TEST(LargeInput, SignalsOnManyListsAreRemovedInAnyOrder) {
     constexpr int Count = 100'000;
     EngineScript script;
     Orn_Hdl::Netlist& netlist = script.GetNetlist();
@@ -168,7 +168,7 @@ template <class Name> std::string Row(int count, Name name) {
     return row;
 }
 
-TEST(Sizes, NamesThatDifferInPunctuationAlone) {
+TEST(LargeInput, NamesThatDifferInPunctuationAlone) {
     EngineScript script;
     std::string lines;
     for (unsigned i = 0; i < 1U << 16U; ++i) {
@@ -183,7 +183,7 @@ TEST(Sizes, NamesThatDifferInPunctuationAlone) {
     EXPECT_EQ(Length(script.GetNetlist().GetSignalIterator()), 1 << 16);
 }
 
-TEST(Sizes, ManyBusesAreWidened) {
+TEST(LargeInput, ManyBusesAreWidened) {
     constexpr int Count = 30'000;
     EngineScript script;
     std::string lines;
@@ -196,7 +196,7 @@ TEST(Sizes, ManyBusesAreWidened) {
     EXPECT_EQ(Length(script.GetNetlist().GetSignalIterator()), 2 * Count + 1);
 }
 
-TEST(Sizes, APinIsWiredToManyNets) {
+TEST(LargeInput, APinIsWiredToManyNets) {
     constexpr int Count = 60'000;
     EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U");
     std::string lines;
@@ -209,7 +209,7 @@ TEST(Sizes, APinIsWiredToManyNets) {
     EXPECT_EQ(Length(script.GetModel().GetSignal("n0")->GetPinIterator()), 1);
 }
 
-TEST(Sizes, ACompoundOfOutputPortsThatIsReadInside) {
+TEST(LargeInput, ACompoundOfOutputPortsThatIsReadInside) {
     constexpr int Count = 100'000;
     EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD PIN C J input\nADD PIN C K input\n"
                         "ADD INSTANCE C U\nADD PORT y output\nADD PORT d(100000:0) output");
@@ -226,7 +226,7 @@ TEST(Sizes, ACompoundOfOutputPortsThatIsReadInside) {
     EXPECT_EQ(CountOf(script.Vhdl(), "  signal p"), std::size_t(Count));
 }
 
-TEST(Sizes, AnOutputPortThatIsReadInsideHasManyAliases) {
+TEST(LargeInput, AnOutputPortThatIsReadInsideHasManyAliases) {
     constexpr int Count = 200'000;
     EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U\n"
                         "ADD PORT y output\nCONNECT SIGNAL y U.I");
@@ -238,7 +238,7 @@ TEST(Sizes, AnOutputPortThatIsReadInsideHasManyAliases) {
     EXPECT_EQ(CountOf(script.Vhdl(), "y_DUMMY <= a"), std::size_t(Count));
 }
 
-TEST(Sizes, AWideCompoundIsAliasedWithABit) {
+TEST(LargeInput, AWideCompoundIsAliasedWithABit) {
     const std::string wide = Row(200, [](int) { return std::string("d(1048575:0)"); });
     EngineScript script;
     script.Run("ADD SIGNAL d(1048575:0)\nCONNECT SIGNAL x " + wide + "\nCONNECT SIGNAL " + wide +
@@ -249,7 +249,7 @@ TEST(Sizes, AWideCompoundIsAliasedWithABit) {
     EXPECT_EQ(CountOf(text, "d(1048575) <= y;"), 1U);
 }
 
-TEST(Sizes, SignalsAreRemovedInTheOrderInWhichTheyWereAdded) {
+TEST(LargeInput, SignalsAreRemovedInTheOrderInWhichTheyWereAdded) {
     constexpr int Count = 30'000;
     EngineScript script("ADD COMPONENT C\nADD PIN C I input\nADD INSTANCE C U");
     std::string lines;

@@ -333,12 +333,15 @@ TEST(AttributeVisitor, MeetsAnyOtherAttributeThroughTheGeneralOperation) {
     EXPECT_EQ(recorder.calls, std::vector<std::string>{"any"});
 }
 
-TEST(AttributeVisitor, OfTheBaseDoesNothing) {
+TEST(AttributeVisitor, OfTheBaseChangesNothing) {
     AttributeVisitor visitor;
     const AttributeVisitor copy(visitor);
     visitor = copy;
-    AttributeString("a", "b").AcceptAttribute(visitor);
+    AttributeString attribute("a", "b");
+    attribute.AcceptAttribute(visitor);
     Foreign().AcceptAttribute(visitor);
+    EXPECT_EQ(attribute.GetName(), "a");
+    EXPECT_EQ(attribute.GetValueString(), "b");
 }
 
 TEST(AttributeHolder, StartsEmpty) {

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model.h"
 
 #include "Support/Names.h"
+#include "Support/Parts.h"
 #include "Support/SlowStringSet.h"
 
 #include <gtest/gtest.h>
@@ -12,20 +13,16 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::In;
 using Support::Names;
 using Support::NamesOf;
+using Support::Out;
 
-const Polarity In("in");
-const Polarity Out("out");
-
-/// A netlist of buffers, each with an input I, an output O and a bidirectional pin B.
+/// A netlist of buffers.
 class DummySignals : public testing::Test {
 protected:
     DummySignals() {
-        component_ = new Component("BUF");
-        component_->AddPin("I", In, "");
-        component_->AddPin("O", Out, "");
-        component_->AddPin("B", Polarity("bi"), "");
+        component_ = Support::MakeBuffer().release();
         netlist_.Add(component_);
     }
 
@@ -144,10 +141,14 @@ TEST_F(DummySignals, OnlyPortsOfTheWrongUseGetOne) {
 }
 
 TEST_F(DummySignals, ABidirectionalPinReadsAndDrives) {
-    AddScalar("Y", Out)->Connect(AddBuffer("U1")->GetPin("B"));
-    AddScalar("A", In)->Connect(AddBuffer("U2")->GetPin("B"));
+    Pin* const driver = AddBuffer("U1")->GetPin("B");
+    Pin* const reader = AddBuffer("U2")->GetPin("B");
+    AddScalar("Y", Out)->Connect(driver);
+    AddScalar("A", In)->Connect(reader);
     netlist_.CreateVhdlDummySignals();
     EXPECT_EQ(Signals(), (Names{"Y", "A", "Y_DUMMY", "A_DUMMY"}));
+    EXPECT_EQ(driver->GetSignal(), Get("Y_DUMMY"));
+    EXPECT_EQ(reader->GetSignal(), Get("A_DUMMY"));
 }
 
 TEST_F(DummySignals, AnOutputPortWithSeveralDriversGetsOneForVhdl) {
@@ -176,6 +177,26 @@ TEST_F(DummySignals, TakeAliasesAndConstantOfAnOutputPortAway) {
     EXPECT_EQ(dummy->GetConstantValue().GetValue(), "1");
     EXPECT_EQ(NamesOf(port->GetSignalIterator()), Names{"Y_DUMMY"}) << "one driver only";
     EXPECT_EQ(port->GetConstantValue().GetValue(), "");
+}
+
+TEST_F(DummySignals, TakePinsAndAliasesOverInTheirOrder) {
+    ScalarSignal* const port = AddScalar("Y", Out);
+    const Names names{"c", "a", "d", "b"};
+    std::vector<Pin*> pins;
+    for (const std::string& name : names) {
+        pins.push_back(AddBuffer(name.c_str())->GetPin("I"));
+        port->Connect(pins.back());
+        port->Connect(AddScalar(name.c_str()));
+    }
+    netlist_.CreateVhdlDummySignals();
+    const Signal* const dummy = Get("Y_DUMMY");
+    ASSERT_NE(dummy, nullptr);
+    std::vector<Pin*> taken;
+    for (Pin* pin : dummy->GetPinIterator()) {
+        taken.push_back(pin);
+    }
+    EXPECT_EQ(taken, pins);
+    EXPECT_EQ(NamesOf(dummy->GetSignalIterator()), names);
 }
 
 TEST_F(DummySignals, LeaveAliasesAndConstantOfAnInputPort) {

@@ -3,6 +3,7 @@
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Support/Names.h"
+#include "Support/Parts.h"
 
 #include <gtest/gtest.h>
 
@@ -15,12 +16,11 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::Bi;
+using Support::In;
 using Support::Names;
 using Support::NamesOf;
-
-const Polarity In("in");
-const Polarity Out("out");
-const Polarity Bi("bi");
+using Support::Out;
 
 Names BaseNamesOf(const Signal& signal) {
     StringSet names;

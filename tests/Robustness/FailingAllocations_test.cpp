@@ -178,11 +178,11 @@ template <class Action> void FailInTurn(const Action& action) {
 
 constexpr const char* LongName = "a name that is too long for the object that bears it";
 
-TEST(Allocation, AComponentThatIsNotMadeLeavesNothingBehind) {
+TEST(FailingAllocation, AComponentThatIsNotMadeLeavesNothingBehind) {
     FailInTurn([] { const Orn_Hdl::Component component(LongName); });
 }
 
-TEST(Allocation, ACompoundThatIsNotMadeIsForgottenByItsMembers) {
+TEST(FailingAllocation, ACompoundThatIsNotMadeIsForgottenByItsMembers) {
     Orn_Hdl::PtrArray<Orn_Hdl::Signal*> members;
     FailInTurn([&] {
         // These end after the compound that could not be made.
@@ -196,7 +196,7 @@ TEST(Allocation, ACompoundThatIsNotMadeIsForgottenByItsMembers) {
     members.Empty();
 }
 
-TEST(Allocation, ASetThatIsNotCopiedLeavesNothingBehind) {
+TEST(FailingAllocation, ASetThatIsNotCopiedLeavesNothingBehind) {
     Orn_Hdl::StringSet set;
     for (const char* name : {"A", "b", LongName}) {
         set.Add(name);
@@ -204,7 +204,7 @@ TEST(Allocation, ASetThatIsNotCopiedLeavesNothingBehind) {
     FailInTurn([&] { const Orn_Hdl::StringSet copy(set); });
 }
 
-TEST(Allocation, ATextThatFindsNoRoomLeavesTheListAsItWas) {
+TEST(FailingAllocation, ATextThatFindsNoRoomLeavesTheListAsItWas) {
     Orn_Hdl::StringArray texts;
     texts.Add("first");
     texts.Add("second");
@@ -221,7 +221,7 @@ TEST(Allocation, ATextThatFindsNoRoomLeavesTheListAsItWas) {
     });
 }
 
-TEST(Allocation, ANameThatFindsNoPlaceIsNotInTheMap) {
+TEST(FailingAllocation, ANameThatFindsNoPlaceIsNotInTheMap) {
     int object = 0;
     Orn_Hdl::IStringPtrMap<int*> names;
     // As many as have places before there must be more of them.
@@ -241,7 +241,7 @@ TEST(Allocation, ANameThatFindsNoPlaceIsNotInTheMap) {
     });
 }
 
-TEST(Allocation, WhatANetlistHoldsIsFound) {
+TEST(FailingAllocation, WhatANetlistHoldsIsFound) {
     FailInTurn([] {
         Orn_Hdl::Netlist netlist;
         try {
@@ -263,7 +263,7 @@ TEST(Allocation, WhatANetlistHoldsIsFound) {
     });
 }
 
-TEST(Allocation, ADoneCommandThatIsNotKeptEnds) {
+TEST(FailingAllocation, ADoneCommandThatIsNotKeptEnds) {
     int ended = 0;
     struct Done final : Orn_Hdl::Command {
         explicit Done(int& count) noexcept : Command(nullptr), ended(count) {}
@@ -283,7 +283,7 @@ TEST(Allocation, ADoneCommandThatIsNotKeptEnds) {
     EXPECT_EQ(ended, made);
 }
 
-TEST(Allocation, AnyOneMayFail) {
+TEST(FailingAllocation, AnyOneMayFail) {
     const Support::TemporaryFolder folder;
     const std::string file = folder / "netlist";
     // The tables that the process keeps are filled first.
