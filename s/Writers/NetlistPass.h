@@ -51,9 +51,7 @@ private:
 };
 
 template <class Write> void NetlistPass::WriteHidden(const Write& write) {
-    PutLine(out_, InComment(language_, "synopsys translate_off"));
-    write();
-    PutLine(out_, InComment(language_, "synopsys translate_on"));
+    Writers::WriteHidden(out_, language_, write);
 }
 
 template <class WriteConstant, class WriteAlias>

@@ -19,6 +19,10 @@ Port::String GetUnquotedValue(const Attribute& attribute) {
     return OneLine(value).GetView();
 }
 
+void WriteQuotedValue(OutStream& out, const Attribute& attribute) {
+    Put(out, "\"", GetUnquotedValue(attribute), "\"");
+}
+
 std::string_view GetSingleBit(const BitVectorValue& value) {
     const std::string_view digits = value.GetValue();
     return !digits.empty() && digits.back() == '0' ? "0" : "1";

@@ -24,6 +24,10 @@ std::string_view GetBaseName(const Pin& pin);
 /// The text of an attribute's value without the quotes around it, on one line.
 Port::String GetUnquotedValue(const Attribute& attribute);
 
+/// Writes the text of an attribute's value, on one line, between double quotes in place of those
+/// that it may have.
+void WriteQuotedValue(OutStream& out, const Attribute& attribute);
+
 /// The bit that a constant gives to a signal of one bit: only a last digit 0 gives "0".
 std::string_view GetSingleBit(const BitVectorValue& value);
 
@@ -51,6 +55,13 @@ void WriteBlanks(OutStream& out, std::size_t count);
 
 /// A text as one line of comment.
 std::string InComment(Language language, std::string_view text);
+
+/// Writes what `write` writes between two comments that hide it from synthesis.
+template <class Write> void WriteHidden(OutStream& out, Language language, const Write& write) {
+    PutLine(out, InComment(language, "synopsys translate_off"));
+    write();
+    PutLine(out, InComment(language, "synopsys translate_on"));
+}
 
 /// Writes each line of the object's comment as a line of comment; lines without any text are left
 /// out.
