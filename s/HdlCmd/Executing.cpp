@@ -54,8 +54,8 @@ void RequirePermission(const Model& model, const char* fileName) {
     }
 }
 
-/// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
-/// that is there already is replaced when everything was written, and untouched otherwise.
+/// Opens the file, lets `write` write into it, closes it, and records the outcome in the model. An
+/// existing file is replaced once everything has been written, and stays as it is otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
     const Model::Use use(&model);
