@@ -34,7 +34,7 @@ public:
     OutputGuard(const OutputGuard&) = delete;
     OutputGuard& operator=(const OutputGuard&) = delete;
     virtual ~OutputGuard();
-    /// Asked before a file is opened.
+    /// Asked before a file is opened. It may destroy the model that asks; nothing is written then.
     /// \param fileName the file, as the command names it; never null.
     /// \return an empty text when the file may be written, otherwise why it may not.
     virtual Port::StringBase<char> WhyNot(const char* fileName) = 0;

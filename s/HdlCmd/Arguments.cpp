@@ -9,7 +9,8 @@ namespace Orn_Hdl {
 
 namespace {
 
-/// Where in the room the pointer to a block stands: aligned, so that leak checkers see it.
+/// Where the pointer to a block stands in the room. It is aligned there, so that leak checkers find
+/// it.
 constexpr std::size_t BlockOffset = 4;
 constexpr std::size_t LeastRoom = BlockOffset + sizeof(char*);
 constexpr std::size_t MostRoom = 4096;
@@ -61,7 +62,7 @@ void Arguments::Set(std::initializer_list<std::string_view> texts) {
     }
     char* place = MakePlace(size);
     for (const std::string_view text : texts) {
-        // The texts are told apart by the NUL behind each.
+        // `Get` counts NULs, so a text must not contain one.
         place += text.copy(place, text.find('\0'));
         *place++ = '\0';
     }

@@ -74,7 +74,7 @@ const std::vector<CommandInfo>& CommandFactory::GetCatalogue() {
 struct CommandManager::Implementation {
     struct Call;
 
-    /// Owns a command, whose last manager this is.
+    /// Takes a command into the done ones, or deletes it if the manager is being destroyed.
     void Keep(std::unique_ptr<Command> command) {
         if (isEnding) {
             return;
@@ -93,7 +93,7 @@ struct CommandManager::Implementation {
     bool isEnding = false;
 };
 
-/// A call of `CreateAndExecute`, which its command may outlive its manager in.
+/// A call of `CreateAndExecute` that is under way. Its command may destroy the manager.
 struct CommandManager::Implementation::Call {
     explicit Call(Implementation& own) noexcept : manager(&own), outer(own.innermost) {
         own.innermost = this;

@@ -54,7 +54,7 @@ void RequirePermission(const Model& model, const char* fileName) {
     }
 }
 
-/// Opens a file that may be written, where the model's guard wants it.
+/// Opens a file in the folder that the model's guard keeps open, or by its name if there is none.
 TextFileOutStream Open(const Model& model, const char* fileName, TextFileOutStream::Mode mode) {
     OutputGuard* const guard = model.GetOutputGuard();
     Port::StringBase<char> path;
@@ -66,8 +66,8 @@ TextFileOutStream Open(const Model& model, const char* fileName, TextFileOutStre
     return TextFileOutStream(*folder, path.CStr(), fileName, mode);
 }
 
-/// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
-/// that is there already is replaced when everything was written, and untouched otherwise.
+/// Opens the file, lets `write` write into it, closes it, and records the outcome in the model. An
+/// existing file is replaced once everything has been written, and stays as it is otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
     const Model::Use use(&model);

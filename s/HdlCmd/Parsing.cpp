@@ -53,7 +53,7 @@ bool ParseNameKind(string_view text, string_view signalWord, Arguments& argument
     return true;
 }
 
-/// The names at the front of an attribute command's arguments: none, an object's, or owner and pin.
+/// The names of what has an attribute: none for a module, an object's name, or owner and pin.
 struct OwnerNames {
     string_view first;
     string_view second;
@@ -71,7 +71,7 @@ struct OwnerNames {
         }
     }
 
-    /// Sets the arguments of a command: the names that there are, then the other texts.
+    /// Sets the arguments of a command: the names of the owner, then the other texts.
     template <class... Texts>
     void SetBefore(Arguments& arguments, AttributeOwner owner, Texts... texts) const {
         switch (owner) {
@@ -88,13 +88,14 @@ struct OwnerNames {
     }
 };
 
-/// Where the owner's name stands when the words MODULE, COMPONENT PIN and so on stand at `kindWord`
-/// and `wordsAfter` words of the phrase follow them.
+/// Where the owner's name stands. The second word of the phrase is the kind of owner, one word or,
+/// for a pin, two; `wordsAfter` words of the phrase follow.
 constexpr int OwnerPosition(AttributeOwner owner, int wordsAfter) {
     constexpr int kindWord = 1;
     return kindWord + (owner == AttributeOwner::Pin ? 2 : 1) + wordsAfter;
 }
 
+/// Where the attribute's name stands: behind the owner's, which a module has not.
 constexpr int AttributePosition(AttributeOwner owner, int wordsAfter) {
     return OwnerPosition(owner, wordsAfter) + (owner == AttributeOwner::Module ? 0 : 1);
 }
@@ -155,7 +156,7 @@ bool ParseWrite(const StringArray& tokens, Arguments& arguments) {
 }
 
 bool ParseUppercase(const StringArray& tokens, Arguments& arguments) {
-    // The spelling is the language's own.
+    // The misspelling is part of the command language.
     return ParseNameKind(tokens.GetView(1), "siganl", arguments);
 }
 

@@ -10,15 +10,15 @@
 
 namespace Orn_Hdl {
 
-/// The phrases of a factory, letter case ignored, as a tree with one word a node. A line is looked
-/// up word by word and given up at the first word that no phrase goes on with, so the words behind
-/// the phrase cost nothing.
+/// The phrases of a factory as a tree with one word a node; letter case is ignored. A line is
+/// looked up word by word until no phrase continues with the next word, so its arguments cost
+/// nothing.
 class PhraseTable {
 public:
-    /// Enters a phrase, or gives one that is present another creator.
+    /// Enters a phrase, or gives a present one another creator.
     void Add(std::string_view phrase, CommandCreator creator);
-    /// The creator of the longest phrase that the words, joined by one blank, begin with as whole
-    /// words; null when there is none.
+    /// The creator of the longest phrase that the words, joined by one blank, begin with; null if
+    /// there is none. A phrase ends where a word ends.
     CommandCreator Find(const StringArray& words) const noexcept;
 
 private:
@@ -31,13 +31,13 @@ private:
         std::vector<Child> children;
     };
 
-    /// The root is nobody's child.
+    /// No node: index 0 is the root, which is no node's child.
     static constexpr std::size_t None = 0;
 
-    /// The node behind another one that a word leads to.
+    /// The child of a node for one word; `None` if there is none.
     std::size_t GetChild(std::size_t node, std::string_view word) const noexcept;
-    /// The same for a word that was in quotes, and may hold blanks and so several words of a
-    /// phrase.
+    /// The descendant of a node for a quoted word, which may contain blanks and so several words of
+    /// a phrase; `None` if there is none.
     std::size_t GetDescendant(std::size_t node, std::string_view words) const noexcept;
 
     std::vector<Node> nodes_{1};
