@@ -1,4 +1,5 @@
 #include "HdlModel/Names/Names.h"
+#include "Options/EffectiveAttrs.h"
 #include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Orn_Hdl/Model/Component.h"
@@ -69,19 +70,15 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
     if (instance == nullptr) {
         return names;
     }
+    PtrArray<Attribute*> attributes;
+    const int own = GetEffectiveAttrs(*instance, attributes);
+    // Of several attributes of one name that the component has, the first counts.
     IStringPtrMap<const Attribute*> known;
-    const auto add = [&names, &known](const Attribute* attribute) {
-        names.Add(attribute->GetName());
-        known.Add(attribute->GetNameView(), attribute);
-    };
-    for (const Attribute* attribute : instance->GetAttrIterator()) {
-        add(attribute);
-    }
-    if (const Component* component = instance->GetComponent()) {
-        for (const Attribute* attribute : component->GetAttrIterator()) {
-            if (!known.Contains(attribute->GetName().CStr())) {
-                add(attribute);
-            }
+    for (int i = 0; i < attributes.GetSize(); ++i) {
+        const Attribute* const attribute = attributes.GetAt(i);
+        if (i < own || !known.Contains(attribute->GetNameView())) {
+            names.Add(attribute->GetName());
+            known.Add(attribute->GetNameView(), attribute);
         }
     }
     return names;

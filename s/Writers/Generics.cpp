@@ -1,7 +1,5 @@
 #include "Writers/Generics.h"
 
-#include "Orn_Hdl/Containers/StringPtrMap.h"
-
 namespace Orn_Hdl::Writers {
 
 namespace {
@@ -50,27 +48,6 @@ void GenericAttrs::Split(const Iterator<Attribute*>& attributes) {
 Attribute* GenericAttrs::FindInit() const {
     Attribute* const init = FindInitIn(syn);
     return init != nullptr ? init : FindInitIn(nosyn);
-}
-
-void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes) {
-    attributes.Empty();
-    const Component* const component = instance.GetComponent();
-    const bool canHide = component != nullptr && component->HasAttrs();
-    // By their present names: the instance goes on finding a renamed attribute by its former one.
-    IStringPtrMap<const Attribute*> hiding;
-    for (Attribute* attribute : instance.GetAttrIterator()) {
-        attributes.Add(attribute);
-        if (canHide) {
-            hiding.Add(attribute->GetNameView(), attribute);
-        }
-    }
-    if (canHide) {
-        for (Attribute* attribute : component->GetAttrIterator()) {
-            if (!hiding.Contains(attribute->GetName().CStr())) {
-                attributes.Add(attribute);
-            }
-        }
-    }
 }
 
 bool PassesInit(Language language, const Netlist& netlist) {

@@ -1,6 +1,7 @@
-// The attributes that take effect on an instance, and those that become parameters or generics.
+// The attributes that become parameters or generics.
 #pragma once
 
+#include "Options/EffectiveAttrs.h"
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
 #include "Orn_Hdl/Language.h"
@@ -24,9 +25,7 @@ struct GenericAttrs {
     Attribute* FindInit() const;
 };
 
-/// Replaces the list by the instance's attributes and those of its component that it does not hide
-/// by one of the same name.
-void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes);
+using Orn_Hdl::GetEffectiveAttrs;
 
 /// Whether the instances in the netlist are given the module's own parameter or generic INIT in
 /// place of values of their own: the netlist has one, and its name has a mark of the language.

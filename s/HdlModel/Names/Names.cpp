@@ -189,6 +189,19 @@ unsigned char Rank(char c) noexcept {
 
 } // namespace
 
+std::size_t SharedLength(string_view a, string_view b, std::size_t known) noexcept {
+    const std::size_t common = std::min(a.size(), b.size());
+    std::size_t length = known;
+    while (length < common && Rank(a[length]) == Rank(b[length])) {
+        ++length;
+    }
+    // A run of digits counts as a whole.
+    while (length > known && Port::IsDigit(a[length - 1])) {
+        --length;
+    }
+    return length;
+}
+
 int CompareNatural(string_view a, string_view b) noexcept {
     const std::size_t common = std::min(a.size(), b.size());
     std::size_t i = 0;

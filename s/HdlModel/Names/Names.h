@@ -7,6 +7,7 @@
 #include "Port/Ascii.h"
 #include "Port/String.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 #include <string_view>
@@ -121,6 +122,11 @@ inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
 /// Below, at or above zero in natural order: letter case ignored, runs of digits by their value, a
 /// digit after every other character, the end of a name before any character.
 int CompareNatural(std::string_view a, std::string_view b) noexcept;
+
+/// How many characters both names begin with, letter case ignored, that tell nothing of their
+/// natural order: what follows them in each name sorts as the whole names do.
+/// \param known so many are known to be shared; a former result, or 0.
+std::size_t SharedLength(std::string_view a, std::string_view b, std::size_t known) noexcept;
 
 /// An object to sort, in sixteen bytes: its index, and a key made of its rank and the start of its
 /// name. A smaller key sorts first, by rank, then in natural order; equal keys say nothing.

@@ -155,6 +155,23 @@ TEST(NaturalOrder, AgreesWithASlowOrderOnLongNames) {
     }
 }
 
+TEST(NaturalOrder, AgreesWithASlowOrderOnGroupsOfLongNames) {
+    const std::string unfoldable(3, '\xFF');
+    Names names;
+    for (const std::string& beginning :
+         {std::string("top_of_the_design_"), std::string("Top_Of_The_Design_alu_of_core_"),
+          std::string("top_of_the_design_alu_of_core_12"), "top_of_the_design_" + unfoldable,
+          "top_of_the_design_" + unfoldable + "_behind_these", std::string(300, '7') + "_and_",
+          std::string()}) {
+        Support::ForEachText("10aB_", 3,
+                             [&](const std::string& name) { names.push_back(beginning + name); });
+    }
+    std::reverse(names.begin(), names.end());
+    const Names expected = SortedSlowly(names);
+    EXPECT_TRUE(SortedAsInstances(names) == expected);
+    EXPECT_TRUE(SortedAsSignals(names) == expected);
+}
+
 RC_GTEST_PROP(NaturalOrder, AgreesWithASlowOrderOnAnyNames, ()) {
     const auto names = *rc::gen::container<Names>(rc::gen::container<std::string>(
         rc::gen::elementOf(std::string("0123456789abcABC_ \xC4\x7F"))));
