@@ -87,11 +87,11 @@ struct OwnerNames {
     }
 };
 
-/// Where the owner's name stands when the words MODULE, COMPONENT PIN and so on stand at `kindWord`
+/// Where the owner's name stands when the words MODULE, COMPONENT PIN and so on stand at `KindWord`
 /// and `wordsAfter` words of the phrase follow them.
 constexpr int OwnerPosition(AttributeOwner owner, int wordsAfter) {
-    constexpr int kindWord = 1;
-    return kindWord + (owner == OnPin ? 2 : 1) + wordsAfter;
+    constexpr int KindWord = 1;
+    return KindWord + (owner == OnPin ? 2 : 1) + wordsAfter;
 }
 
 constexpr int AttributePosition(AttributeOwner owner, int wordsAfter) {

@@ -15,9 +15,9 @@ PhraseTable::Word::Word(std::string_view text) noexcept : text_(text) {
 }
 
 bool PhraseTable::Word::operator==(const Word& other) const noexcept {
-    constexpr std::size_t compared = sizeof start_ + sizeof end_;
+    constexpr std::size_t Compared = sizeof start_ + sizeof end_;
     return start_ == other.start_ && end_ == other.end_ && text_.size() == other.text_.size() &&
-           (text_.size() <= compared || Port::EqualIgnoringCase(text_, other.text_));
+           (text_.size() <= Compared || Port::EqualIgnoringCase(text_, other.text_));
 }
 
 std::size_t PhraseTable::GetChild(std::size_t node, const Word& word) const noexcept {

@@ -7,11 +7,11 @@
 namespace Orn_Hdl {
 
 void HdlOptions::VerilogOption::SetSynthesisType(const char* text) {
-    constexpr const char* names[] = {"QSN",      "EXEMPLAR",    "SYNPLICITY",
+    constexpr const char* Names[] = {"QSN",      "EXEMPLAR",    "SYNPLICITY",
                                      "SYNOPSYS", "VERILOG2001", "PRECISION"};
     synthesisType = QSN;
-    for (int i = 0; i < static_cast<int>(std::size(names)); ++i) {
-        if (Port::EqualIgnoringCase(names[i], Port::ViewOf(text))) {
+    for (int i = 0; i < static_cast<int>(std::size(Names)); ++i) {
+        if (Port::EqualIgnoringCase(Names[i], Port::ViewOf(text))) {
             synthesisType = i;
         }
     }

@@ -96,13 +96,13 @@ void Context::CheckAttribute(const Value& value, const Place& place) {
 }
 
 TypedValue Context::MakeAttribute(const std::string& name, const Value& value) {
-    constexpr std::size_t integerWidth = 32;
+    constexpr std::size_t IntegerWidth = 32;
     if (value.kind == Value::Integer) {
         return TypedValue{name, "Integer", std::to_string(value.integer)};
     }
     std::string text(value.text);
     if (value.kind == Value::Bits && text.find_first_of("xz") == std::string::npos) {
-        return text.size() == integerWidth
+        return text.size() == IntegerWidth
                    ? TypedValue{name, "Integer", std::to_string(ToInteger(text))}
                    : TypedValue{name, "BitVector", MakeConstant(text, false)};
     }
@@ -139,8 +139,8 @@ void Fail(const Path& path, std::string_view text) {
 }
 
 Range Normalize(Range range, std::uint32_t width) noexcept {
-    constexpr std::int64_t greatest = std::numeric_limits<std::int32_t>::max();
-    if (range.offset < 0 || range.offset > greatest - width + 1) {
+    constexpr std::int64_t Greatest = std::numeric_limits<std::int32_t>::max();
+    if (range.offset < 0 || range.offset > Greatest - width + 1) {
         range.offset = 0;
     }
     return range;
