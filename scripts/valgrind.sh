@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Runs unit tests under valgrind, which also sees what no sanitizer was compiled in for: the use of
-# values that were never set. By hand, since it takes minutes; without arguments all programs but
-# Robustness, whose designs are too large for it.
+# values that were never set. By hand, since it takes minutes; without arguments all programs of
+# the library but Robustness, whose designs are too large for it, and Threads.
 #
 #   scripts/valgrind.sh [PROGRAM...]
 #

@@ -29,8 +29,8 @@ void Call(Model& model, Result (Model::*operation)(Texts...), const Arguments& a
 template <class Result, class... Texts, std::size_t... Indices>
 void CallWithLast(Model& model, Result (Model::*operation)(Texts...), const Arguments& arguments,
                   int last, std::index_sequence<Indices...>) {
-    constexpr std::size_t end = sizeof...(Texts) - 1;
-    (model.*operation)(arguments.Get(Indices == end ? last : static_cast<int>(Indices))...);
+    constexpr std::size_t End = sizeof...(Texts) - 1;
+    (model.*operation)(arguments.Get(Indices == End ? last : static_cast<int>(Indices))...);
 }
 
 /// Calls an operation with the arguments in order, but skips `behind` arguments before the last

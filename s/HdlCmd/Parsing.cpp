@@ -91,8 +91,8 @@ struct OwnerNames {
 /// Where the owner's name stands. The second word of the phrase is the kind of owner, one word or,
 /// for a pin, two; `wordsAfter` words of the phrase follow.
 constexpr int OwnerPosition(AttributeOwner owner, int wordsAfter) {
-    constexpr int kindWord = 1;
-    return kindWord + (owner == AttributeOwner::Pin ? 2 : 1) + wordsAfter;
+    constexpr int KindWord = 1;
+    return KindWord + (owner == AttributeOwner::Pin ? 2 : 1) + wordsAfter;
 }
 
 /// Where the attribute's name stands: behind the owner's, which a module has not.

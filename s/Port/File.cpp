@@ -47,10 +47,10 @@ std::string FolderOf(const std::string& name) {
 /// Whether the system serves the name itself. Such names lead to open files and devices by ways
 /// that are no folders, so nothing can be put in their place.
 bool IsServedBySystem(std::string_view name) noexcept {
-    constexpr std::string_view devices = "/dev/";
-    constexpr std::string_view processes = "/proc/";
-    return name.substr(0, devices.size()) == devices ||
-           name.substr(0, processes.size()) == processes;
+    constexpr std::string_view Devices = "/dev/";
+    constexpr std::string_view Processes = "/proc/";
+    return name.substr(0, Devices.size()) == Devices ||
+           name.substr(0, Processes.size()) == Processes;
 }
 
 /// Replaces a name by the file that its chain of symbolic links leads to, whether it exists or not.

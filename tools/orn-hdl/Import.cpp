@@ -34,15 +34,15 @@ Status ReadFile(const std::string& name, std::string& text) {
     if (!file.open(SystemFileName(name.c_str()), Port::File::Read, true)) {
         return ComplainUnreadable(name, file.GetError());
     }
-    constexpr std::size_t piece = std::size_t(1) << 20;
+    constexpr std::size_t Piece = std::size_t(1) << 20;
     std::error_code unknown;
     const std::uintmax_t expected = std::filesystem::file_size(name, unknown);
-    text.reserve((unknown ? 0 : expected) + piece + Margin);
+    text.reserve((unknown ? 0 : expected) + Piece + Margin);
     std::size_t size = 0;
     std::size_t count = 0;
     do {
-        text.resize(size + piece);
-        count = file.read(text.data() + size, piece);
+        text.resize(size + Piece);
+        count = file.read(text.data() + size, Piece);
         size += count;
     } while (count > 0);
     text.resize(size);

@@ -58,8 +58,8 @@ bool IsListed(std::string_view words, std::string_view word) {
 }
 
 bool IsReserved(std::string_view name) {
-    constexpr std::size_t longestWord = 20;
-    if (name.size() > longestWord) {
+    constexpr std::size_t LongestWord = 20;
+    if (name.size() > LongestWord) {
         return false;
     }
     const std::string text(name);
