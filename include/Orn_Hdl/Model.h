@@ -13,6 +13,7 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstdint>
 #include <memory>
 #include <string_view>
 
@@ -121,9 +122,12 @@ public:
     OutputGuard* GetOutputGuard() const noexcept;
     /// Remembers what became of the last netlist that a write command wrote.
     /// \param error the system's error number; 0 when every byte was written.
-    void RecordWrite(const char* fileName, int error);
+    /// \param leftover how many bytes stand at the end of a file although appending has failed.
+    void RecordWrite(const char* fileName, int error, std::uint64_t leftover = 0);
     /// The error number of the last write; 0 when it succeeded, and before the first.
     int GetWriteError() const noexcept;
+    /// How many bytes of the last write stand at the end of the file although appending has failed.
+    std::uint64_t GetWriteLeftover() const noexcept;
     /// The file name of the last write; empty before the first.
     Port::StringBase<char> GetWrittenFileName() const;
 

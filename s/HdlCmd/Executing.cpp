@@ -81,7 +81,7 @@ template <class Write> void WriteFile(Model& model, const Arguments& arguments, 
     model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();
-    model.RecordWrite(fileName, out.GetError());
+    model.RecordWrite(fileName, out.GetError(), out.GetLeftoverSize());
 }
 
 } // namespace

@@ -23,6 +23,7 @@ struct Model::Implementation {
     StringArray words;
     OutputGuard* outputGuard = nullptr;
     int writeError = 0;
+    std::uint64_t writeLeftover = 0;
     Port::StringBase<char> writtenFileName;
 
     explicit Implementation(CommandFactory* commandFactory) : factory(commandFactory) {}
@@ -149,13 +150,18 @@ OutputGuard* Model::GetOutputGuard() const noexcept {
     return implementation_->outputGuard;
 }
 
-void Model::RecordWrite(const char* fileName, int error) {
+void Model::RecordWrite(const char* fileName, int error, std::uint64_t leftover) {
     implementation_->writtenFileName = fileName;
     implementation_->writeError = error;
+    implementation_->writeLeftover = leftover;
 }
 
 int Model::GetWriteError() const noexcept {
     return implementation_->writeError;
+}
+
+std::uint64_t Model::GetWriteLeftover() const noexcept {
+    return implementation_->writeLeftover;
 }
 
 Port::StringBase<char> Model::GetWrittenFileName() const {

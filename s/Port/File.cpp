@@ -34,11 +34,6 @@ int OpenFlags(File::Mode mode, bool fromStart) noexcept {
     return O_WRONLY | O_CREAT | O_APPEND;
 }
 
-bool IsDirectory(int descriptor) {
-    struct stat status {};
-    return System::Get().GetStatus(descriptor, &status) == 0 && S_ISDIR(status.st_mode);
-}
-
 /// The folder of a file, with its closing "/"; empty for the current folder.
 std::string FolderOf(const std::string& name) {
     return name.substr(0, name.rfind('/') + 1);
@@ -173,19 +168,77 @@ bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
     lineEnd_ = 0;
     lineSize_ = 0;
     atEnd_ = false;
+    appends_ = false;
+    written_ = 0;
+    leftover_ = 0;
     name = name == nullptr ? "" : name;
     if (mode == Replace) {
         return OpenToReplace(name);
     }
+    if (mode == Append) {
+        target_ = name;
+    }
     if (!OpenDescriptor(name, OpenFlags(mode, fromStart), DefaultPermissions)) {
         return Fail(errno);
     }
-    if (IsDirectory(descriptor_)) {
+    struct stat status {};
+    const bool isKnown = System::Get().GetStatus(descriptor_, &status) == 0;
+    if (isKnown && S_ISDIR(status.st_mode)) {
         Fail(EISDIR);
         Discard();
         return false;
     }
+    if (mode == Append && (!isKnown || S_ISREG(status.st_mode))) {
+        // What is not known stays zero, which is no file's inode.
+        appends_ = true;
+        device_ = static_cast<std::uint64_t>(status.st_dev);
+        inode_ = static_cast<std::uint64_t>(status.st_ino);
+        formerSize_ = static_cast<std::uint64_t>(status.st_size);
+    }
     return true;
+}
+
+/// Gives the file its former length back, unless somebody else has appended to it as well.
+bool File::CutAppended() noexcept {
+    struct stat status {};
+    if (System::Get().GetStatus(descriptor_, &status) != 0 || device_ != status.st_dev ||
+        inode_ != status.st_ino) {
+        return false;
+    }
+    const auto size = static_cast<std::uint64_t>(status.st_size);
+    return size <= formerSize_ ||
+           (size - formerSize_ <= written_ &&
+            System::Get().Truncate(descriptor_, static_cast<off_t>(formerSize_)) == 0);
+}
+
+void File::CloseAppended() noexcept {
+    const bool hasFailed = error_ != 0;
+    bool endsAsItBegan = !hasFailed || written_ == 0 || CutAppended();
+    CloseDescriptor();
+    if (!hasFailed && error_ != 0 && written_ > 0) {
+        // Only the closing told of the failure. Another file that bears the name by now must not
+        // make the opening wait.
+        endsAsItBegan = OpenDescriptor(target_.c_str(), O_WRONLY | O_NONBLOCK, 0) && CutAppended();
+        if (IsOpen()) {
+            CloseDescriptor();
+        }
+    }
+    leftover_ = endsAsItBegan ? 0 : written_;
+    appends_ = false;
+}
+
+bool File::open(const char* name, int mode, bool fromStart) {
+    switch (mode) {
+    case Read:
+    case Overwrite:
+    case Append:
+    case Replace:
+        return open(name, static_cast<Mode>(mode), fromStart);
+    default:
+        close();
+        error_ = EINVAL;
+        return false;
+    }
 }
 
 bool File::OpenToReplace(const char* name) {
@@ -250,6 +303,10 @@ bool File::close() {
     if (!IsOpen()) {
         return true;
     }
+    if (appends_) {
+        CloseAppended();
+        return error_ == 0;
+    }
     CloseDescriptor();
     if (!temporary_.empty() && error_ == 0) {
         if (RenameTemporary() == 0) {
@@ -263,7 +320,9 @@ bool File::close() {
 }
 
 void File::Discard() noexcept {
-    if (IsOpen()) {
+    if (IsOpen() && appends_) {
+        CloseAppended();
+    } else if (IsOpen()) {
         CloseDescriptor();
     }
     if (!temporary_.empty()) {
@@ -302,6 +361,7 @@ bool File::write(const char* data, std::size_t size) {
         }
         data += count;
         size -= static_cast<std::size_t>(count);
+        written_ += static_cast<std::uint64_t>(count);
     }
     return true;
 }
@@ -362,7 +422,8 @@ Stream::Stream(File& file) : file_(file), buffer_(new char[BufferSize]) {}
 
 Stream::~Stream() = default;
 
-Stream& Stream::operator<<(std::string_view text) {
+Stream& Stream::operator<<(TextView added) {
+    std::string_view text = added;
     while (!text.empty()) {
         if (used_ == BufferSize) {
             flush();

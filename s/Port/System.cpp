@@ -35,6 +35,10 @@ int System::GetStatus(int descriptor, struct stat* status) {
     return ::fstat(descriptor, status);
 }
 
+int System::Truncate(int descriptor, off_t size) {
+    return ::ftruncate(descriptor, size);
+}
+
 int System::ChangeMode(int descriptor, unsigned mode) {
     return ::fchmod(descriptor, mode);
 }

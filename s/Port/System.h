@@ -19,6 +19,7 @@ public:
     virtual ssize_t Write(int descriptor, const void* data, std::size_t size);
     virtual int Close(int descriptor);
     virtual int GetStatus(int descriptor, struct stat* status);
+    virtual int Truncate(int descriptor, off_t size);
     virtual int ChangeMode(int descriptor, unsigned mode);
     virtual ssize_t ReadLink(const char* name, char* target, std::size_t size);
     virtual int Rename(const char* from, const char* to);

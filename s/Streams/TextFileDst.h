@@ -5,6 +5,7 @@
 #include "Port/File.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <cstring>
 #include <memory>
 #include <string_view>
@@ -29,6 +30,7 @@ public:
     void Close();
     const Port::StringBase<char>& GetFileName() const noexcept { return fileName_; }
     int GetError() const noexcept { return file_.GetError(); }
+    std::uint64_t GetLeftoverSize() const noexcept { return file_.GetLeftoverSize(); }
 
     void Flush() override;
     void Write(const char* text) override;

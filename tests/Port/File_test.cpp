@@ -58,6 +58,34 @@ TEST(File, AppendingMakesAFileThatIsMissing) {
     EXPECT_EQ(Support::ReadWholeFile(folder / "new"), "x");
 }
 
+template <class Mode>
+concept IsFileMode = requires(File file, Mode mode) {
+    file.open("name", mode, false);
+};
+
+TEST(File, TakesItsModeAsANumber) {
+    const Support::TemporaryFolder folder;
+    const std::string name = folder / "text";
+    const auto write = [&name](int mode, bool fromStart, const char* text) {
+        File file;
+        return file.open(name.c_str(), mode, fromStart) && file.write(text, 1) && file.close();
+    };
+    EXPECT_TRUE(write(2, true, "a"));
+    EXPECT_TRUE(write(6, false, "b"));
+    EXPECT_EQ(Support::ReadWholeFile(name), "ab");
+    EXPECT_TRUE(write(10, true, "c"));
+    EXPECT_EQ(Support::ReadWholeFile(name), "c");
+    for (const int unknown : {-1, 0, 3, 7, 11}) {
+        File file;
+        EXPECT_FALSE(file.open(name.c_str(), unknown, true));
+        EXPECT_FALSE(file.IsOpen());
+        EXPECT_EQ(file.GetError(), EINVAL);
+    }
+    EXPECT_EQ(Support::ReadWholeFile(name), "c");
+    enum OtherMode { Overwriting };
+    static_assert(IsFileMode<File::Mode> && IsFileMode<int> && !IsFileMode<OtherMode>);
+}
+
 TEST(File, ReadsTheBytesOfAFile) {
     const Support::TemporaryFolder folder;
     const std::string bytes("a\0\r\n\xFF", 5);
@@ -222,6 +250,17 @@ TEST(Stream, KeepsEveryCharacterWhereverItsBufferEnds) {
             ASSERT_TRUE(Support::ReadWholeFile(folder / "text") == text) << first << ", " << size;
         }
     }
+}
+
+TEST(Stream, ANullTextWritesNothing) {
+    const Support::TemporaryFolder folder;
+    File file;
+    ASSERT_TRUE(file.open((folder / "text").c_str(), File::Overwrite, true));
+    Port::Stream stream(file);
+    stream << static_cast<const char*>(nullptr) << "a" << nullptr << std::string("b")
+           << Port::String("c");
+    EXPECT_TRUE(stream.flush());
+    EXPECT_EQ(Support::ReadWholeFile(folder / "text"), "abc");
 }
 
 TEST(Stream, AFailedWriteShowsAtEveryFlush) {

@@ -40,6 +40,9 @@ public:
     int GetStatus(int descriptor, struct stat* status) override {
         return Fails() ? -1 : System::GetStatus(descriptor, status);
     }
+    int Truncate(int descriptor, off_t size) override {
+        return Fails() ? -1 : System::Truncate(descriptor, size);
+    }
     int ChangeMode(int descriptor, unsigned mode) override {
         return Fails() ? -1 : System::ChangeMode(descriptor, mode);
     }

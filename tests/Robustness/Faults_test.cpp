@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstdint>
 #include <map>
 #include <string>
 
@@ -25,6 +26,7 @@ const std::string Former = "what stood here before\n";
 struct Outcome {
     bool isRead = false;
     std::map<std::string, int> errors;
+    std::map<std::string, std::uint64_t> leftovers;
     std::map<std::string, std::string> texts;
 };
 
@@ -58,6 +60,7 @@ protected:
             engine.Execute(model.c_str(),
                            ("WRITE " + line.substr(0, blank) + " -NOHEADER " + path).c_str());
             outcome.errors[name] = engine.GetModel(model.c_str())->GetWriteError();
+            outcome.leftovers[name] = engine.GetModel(model.c_str())->GetWriteLeftover();
             outcome.texts[name] = ReadWholeFile(path);
         }
         EXPECT_EQ(Support::CountOpenFiles(), openFiles);
@@ -77,6 +80,7 @@ protected:
                 EXPECT_FALSE(std::filesystem::exists(folder_ / "fresh"));
             } else if (told != 0) {
                 EXPECT_EQ(text.substr(0, Former.size()), Former);
+                EXPECT_EQ(text.size(), Former.size() + outcome.leftovers.at(name));
             }
         }
         for (const auto& entry : std::filesystem::directory_iterator(folder_.GetPath())) {
@@ -111,6 +115,7 @@ TEST_F(Faults, AnyOneCallMayFail) {
                 told += writeError != 0 ? 1 : 0;
             }
             EXPECT_LE(told, 1) << "one failure fails one write";
+            EXPECT_EQ(outcome.leftovers.at("longer"), 0u) << "one failure leaves nothing behind";
             CheckFiles(outcome, error, outcome.isRead);
         }
     }

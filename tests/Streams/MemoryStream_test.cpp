@@ -173,4 +173,17 @@ TEST(StreamDst, ACopyHasTheSameIndentLevel) {
     EXPECT_EQ(destination.GetIndentLevel(), 2);
 }
 
+TEST(MemoryStream, TakesTextsInEveryForm) {
+    TextMemOutStream out(std::string("a") + std::string(1, '\0'));
+    EXPECT_EQ(out.GetValue(), std::string_view("a\0", 2));
+    out.SetValue(std::string_view("bcd").substr(0, 1));
+    EXPECT_EQ(out.GetValue(), "b");
+    out.SetValue(out.GetValue() + 'c');
+    EXPECT_EQ(out.GetValue(), "bc");
+    out.SetValue(nullptr);
+    EXPECT_EQ(out.GetValue(), "");
+    EXPECT_EQ(TextMemOutStream(nullptr).GetValue(), "");
+    EXPECT_EQ(TextMemOutStream(Port::String("d")).GetValue(), "d");
+}
+
 } // namespace

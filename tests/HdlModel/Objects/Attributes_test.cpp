@@ -7,6 +7,7 @@
 #include <rapidcheck/gtest.h>
 
 #include <climits>
+#include <cmath>
 #include <cstdio>
 #include <locale>
 #include <memory>
@@ -344,6 +345,13 @@ TEST(AttributeVisitor, OfTheBaseChangesNothing) {
     EXPECT_EQ(attribute.GetValueString(), "b");
 }
 
+TEST(AttributeFloat, KeepsTheSignOfWhatIsTooSmall) {
+    EXPECT_EQ(AttributeFloat("a", "-1e-400").GetValueString(), "     -0.0");
+    EXPECT_TRUE(std::signbit(AttributeFloat("a", "-1e-400").GetValue()));
+    EXPECT_EQ(AttributeFloat("a", "1e-400").GetValueString(), "      0.0");
+    EXPECT_EQ(AttributeFloat("a", "-1e400").GetValueString(), "     0.0");
+}
+
 TEST(AttributeHolder, StartsEmpty) {
     const AttributeHolder holder;
     EXPECT_FALSE(holder.HasAttrs());
@@ -418,6 +426,32 @@ TEST(AttributeHolder, CopiesCloneEveryAttribute) {
     EXPECT_EQ(assigned.GetAttr("LOC"), nullptr);
     assigned.AddAttr(new AttributeString("new", ""));
     EXPECT_NE(assigned.GetAttr("NEW"), nullptr);
+}
+
+TEST(AttributeHolder, AnIteratorSeesWhatIsAddedOrAssignedLater) {
+    AttributeHolder holder;
+    auto at = holder.GetAttrIterator();
+    const auto start = at;
+    EXPECT_TRUE(at.IsAtEnd());
+    EXPECT_EQ(at.GetCurrent(), nullptr);
+    holder.AddAttr(new AttributeString("a", ""));
+    EXPECT_FALSE(at.IsAtEnd());
+    EXPECT_EQ(at.GetCurrent(), holder.GetAttr("a"));
+    EXPECT_EQ(NamesOf(start), Names{"a"});
+    AttributeHolder other;
+    other.AddAttr(new AttributeString("b", ""));
+    other.AddAttr(new AttributeString("c", ""));
+    holder = other;
+    EXPECT_EQ(at.GetCurrent(), holder.GetAttr("b"));
+    at.Next();
+    EXPECT_EQ(at.GetCurrent(), holder.GetAttr("c"));
+    auto cursor = start.begin();
+    holder = AttributeHolder();
+    EXPECT_TRUE(at.IsAtEnd());
+    EXPECT_EQ(cursor, start.end());
+    EXPECT_EQ(*cursor, nullptr);
+    holder.AddAttr(new AttributeString("d", ""));
+    EXPECT_EQ(*cursor, holder.GetAttr("d"));
 }
 
 TEST(AttributeHolder, HoldsManyAttributes) {
