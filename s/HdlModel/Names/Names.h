@@ -133,6 +133,8 @@ std::size_t SharedLength(std::string_view a, std::string_view b, std::size_t kno
 class NaturalKey {
 public:
     NaturalKey(int rank, std::string_view name, std::uint32_t index) noexcept;
+    /// The key of no name, which is yet to be replaced.
+    explicit NaturalKey(std::uint32_t index) noexcept : first_(0), second_(0), index_(index) {}
 
     std::uint32_t GetIndex() const noexcept { return index_; }
 

@@ -21,7 +21,7 @@ public:
         : objects_(objects), rankOf_(rankOf), compare_(compare) {
         keys_.reserve(static_cast<std::size_t>(objects.GetSize()));
         for (int i = 0; i < objects.GetSize(); ++i) {
-            keys_.emplace_back(0, std::string_view(), static_cast<std::uint32_t>(i));
+            keys_.emplace_back(static_cast<std::uint32_t>(i));
         }
         SortByKeys(keys_.begin(), keys_.end(), SharedOf(keys_.begin(), keys_.end(), 0));
     }
