@@ -14,6 +14,10 @@
 #include <string_view>
 #include <type_traits>
 
+namespace Port {
+class Folder;
+}
+
 namespace Orn_Hdl {
 
 /// Where an `OutStream` sends its text.
@@ -152,6 +156,11 @@ public:
     /// \param fileName the file to open; null opens none.
     /// \param mode what becomes of a file that is there.
     TextFileOutStream(const char* fileName, Mode mode);
+    /// Opens a file below a folder without following a link (`Port::File::OpenBelow`).
+    /// \param path the file's path below the folder.
+    /// \param fileName the name to remember.
+    TextFileOutStream(const Port::Folder& folder, const char* path, const char* fileName,
+                      Mode mode);
     /// Opens a file; `IsOpen` tells whether it is open, `GetError` why it is not.
     /// \param mode what becomes of a file that is there.
     TextFileOutStream(const Port::StringBase<char>& fileName, Mode mode);

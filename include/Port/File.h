@@ -5,6 +5,7 @@
 #pragma once
 
 #include "Port/Export.h"
+#include "Port/Folder.h"
 #include "Port/String.h"
 
 #include <cstddef>
@@ -44,6 +45,12 @@ public:
     ///        over from its first byte on. Of no meaning for the other modes.
     /// \return false when the file cannot be opened; a directory never can.
     bool open(const char* name, Mode mode, bool fromStart);
+    /// Opens a file below a folder, closing the one that was open. No link is followed, neither on
+    /// the way to the file nor by its own name, and nothing but a regular file is opened: no other
+    /// process can make this write outside of the folder.
+    /// \param folder only needed during the call.
+    /// \param path the file's path below the folder, without "..".
+    bool OpenBelow(const Folder& folder, const char* path, Mode mode, bool fromStart);
     /// Opens a file, as the overload with a `Mode` does.
     /// \param mode the value of a `Mode`: 1, 2, 6 or 10. With any other number no file is opened,
     ///        and the error is EINVAL.
@@ -70,10 +77,6 @@ public:
     /// \param line receives it without its line end, valid until the next call.
     /// \return false at the end of the file or on a failure.
     bool NextLine(std::string_view& line);
-    /// Gives the next line where it has been read already, without reading from the file.
-    /// \param line receives it without its line end, valid until the next call.
-    /// \return false when the line, or the rest of it, has yet to be read.
-    bool NextLineAtHand(std::string_view& line);
     /// How many bytes the last line given takes in the file, its line end included.
     std::size_t GetLineSize() const noexcept { return lineSize_; }
 
@@ -84,8 +87,14 @@ public:
     std::uint64_t GetLeftoverSize() const noexcept { return leftover_; }
 
 private:
+    friend class LinesAtHand;
+
     bool Fail(int error) noexcept;
     bool OpenDescriptor(const char* name, int flags, unsigned mode);
+    bool OpenNamed(const char* name, Mode mode, bool fromStart);
+    int OpenInFolder(const char* name, int flags, unsigned mode) const;
+    int RenameTemporary() const;
+    void UnlinkTemporary() const;
     void CloseDescriptor() noexcept;
     bool OpenToReplace(const char* name);
     int OpenTemporary(unsigned mode);
@@ -100,6 +109,8 @@ private:
     std::string_view TakeLine(std::size_t length) noexcept;
 
     int descriptor_ = -1;
+    /// Where names begin; closed for the current folder.
+    Folder folder_;
     int error_ = 0;
     /// The file that is being written to replace another; empty when there is none.
     std::string temporary_;

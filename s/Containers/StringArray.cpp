@@ -223,10 +223,10 @@ int StringArray::ParseCommandLine(Port::TextView commandLine) {
     // through eight characters at a time. A blank behind it ends its last word; what follows fills
     // the last eight.
     constexpr std::size_t Step = sizeof(std::uint64_t);
-    constexpr string_view filling(" \0\0\0\0\0\0\0", Step);
+    constexpr string_view Filling(" \0\0\0\0\0\0\0", Step);
     const int before = GetSize();
     const std::size_t offset = text_.size();
-    text_.append(line).append(filling);
+    text_.append(line).append(Filling);
     std::size_t start = offset;
     for (std::size_t i = offset; i <= offset + line.size(); i += Step) {
         // Blanks and quotes, and some characters between them that mean nothing.

@@ -42,10 +42,10 @@ std::string FolderOf(const std::string& name) {
 /// Whether the system serves the name itself. Such names lead to open files and devices by ways
 /// that are no folders, so nothing can be put in their place.
 bool IsServedBySystem(std::string_view name) noexcept {
-    constexpr std::string_view devices = "/dev/";
-    constexpr std::string_view processes = "/proc/";
-    return name.substr(0, devices.size()) == devices ||
-           name.substr(0, processes.size()) == processes;
+    constexpr std::string_view Devices = "/dev/";
+    constexpr std::string_view Processes = "/proc/";
+    return name.substr(0, Devices.size()) == Devices ||
+           name.substr(0, Processes.size()) == Processes;
 }
 
 /// Replaces a name by the file that its chain of symbolic links leads to, whether it exists or not.
@@ -91,7 +91,8 @@ bool File::Fail(int error) noexcept {
 
 bool File::OpenDescriptor(const char* name, int flags, unsigned mode) {
     do {
-        descriptor_ = System::Get().Open(name, flags | O_CLOEXEC, mode);
+        descriptor_ = folder_.IsOpen() ? OpenInFolder(name, flags | O_CLOEXEC, mode)
+                                       : System::Get().Open(name, flags | O_CLOEXEC, mode);
     } while (descriptor_ < 0 && errno == EINTR);
     return descriptor_ >= 0;
 }
@@ -107,6 +108,61 @@ void File::CloseDescriptor() noexcept {
 
 bool File::open(const char* name, Mode mode, bool fromStart) {
     close();
+    folder_.Close();
+    return OpenNamed(name, mode, fromStart);
+}
+
+bool File::OpenBelow(const Folder& folder, const char* path, Mode mode, bool fromStart) {
+    close();
+    error_ = 0;
+    const char* name = nullptr;
+    if (const int error = folder.OpenParent(path, folder_, name); error != 0) {
+        folder_.Close();
+        return Fail(error);
+    }
+    if (!OpenNamed(name, mode, fromStart)) {
+        folder_.Close();
+        return false;
+    }
+    return true;
+}
+
+/// Opens a name in the folder that is open. \return the descriptor, or -1, errno set.
+int File::OpenInFolder(const char* name, int flags, unsigned mode) const {
+    // Without O_NONBLOCK, opening a pipe would wait for its other end.
+    const int opened =
+        System::Get().OpenAt(folder_.GetDescriptor(), name, flags | O_NOFOLLOW | O_NONBLOCK, mode);
+    // A file that the call has made is a regular one.
+    if (opened < 0 || (flags & O_EXCL) != 0) {
+        return opened;
+    }
+    struct stat status {};
+    const int error = System::Get().GetStatus(opened, &status) != 0 ? errno
+                      : S_ISREG(status.st_mode)                     ? 0
+                                                                    : EINVAL;
+    if (error == 0) {
+        return opened;
+    }
+    System::Get().Close(opened);
+    errno = error;
+    return -1;
+}
+
+int File::RenameTemporary() const {
+    return folder_.IsOpen() ? System::Get().RenameAt(folder_.GetDescriptor(), temporary_.c_str(),
+                                                     target_.c_str())
+                            : System::Get().Rename(temporary_.c_str(), target_.c_str());
+}
+
+void File::UnlinkTemporary() const {
+    if (folder_.IsOpen()) {
+        System::Get().UnlinkAt(folder_.GetDescriptor(), temporary_.c_str());
+    } else {
+        System::Get().Unlink(temporary_.c_str());
+    }
+}
+
+bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
     error_ = 0;
     lineStart_ = 0;
     lineEnd_ = 0;
@@ -187,7 +243,7 @@ bool File::open(const char* name, int mode, bool fromStart) {
 
 bool File::OpenToReplace(const char* name) {
     std::string target(name);
-    if (!FollowLinks(target)) {
+    if (!folder_.IsOpen() && !FollowLinks(target)) {
         return Fail(errno);
     }
     if (IsServedBySystem(target)) {
@@ -253,7 +309,7 @@ bool File::close() {
     }
     CloseDescriptor();
     if (!temporary_.empty() && error_ == 0) {
-        if (System::Get().Rename(temporary_.c_str(), target_.c_str()) == 0) {
+        if (RenameTemporary() == 0) {
             temporary_.clear();
         } else {
             Fail(errno);
@@ -270,9 +326,10 @@ void File::Discard() noexcept {
         CloseDescriptor();
     }
     if (!temporary_.empty()) {
-        System::Get().Unlink(temporary_.c_str());
+        UnlinkTemporary();
         temporary_.clear();
     }
+    folder_.Close();
 }
 
 std::size_t File::read(char* buffer, std::size_t size) {
@@ -346,15 +403,6 @@ bool File::NextLine(std::string_view& line) {
             return false;
         }
         length = GetUnread().size();
-    }
-    line = TakeLine(length);
-    return true;
-}
-
-bool File::NextLineAtHand(std::string_view& line) {
-    const std::size_t length = GetUnread().find('\n');
-    if (length == std::string_view::npos) {
-        return false;
     }
     line = TakeLine(length);
     return true;

@@ -55,6 +55,18 @@ int System::Unlink(const char* name) {
     return ::unlink(name);
 }
 
+int System::OpenAt(int folder, const char* name, int flags, unsigned mode) {
+    return ::openat(folder, name, flags, mode);
+}
+
+int System::RenameAt(int folder, const char* from, const char* to) {
+    return ::renameat(folder, from, folder, to);
+}
+
+int System::UnlinkAt(int folder, const char* name) {
+    return ::unlinkat(folder, name, 0);
+}
+
 System& System::Get() noexcept {
     return *inUse;
 }

@@ -25,6 +25,13 @@ public:
     virtual int Rename(const char* from, const char* to);
     virtual int Unlink(const char* name);
 
+    /// \{
+    /// The calls for names below an open folder.
+    virtual int OpenAt(int folder, const char* name, int flags, unsigned mode);
+    virtual int RenameAt(int folder, const char* from, const char* to);
+    virtual int UnlinkAt(int folder, const char* name);
+    /// \}
+
     /// The calls in use.
     static System& Get() noexcept;
     /// Puts other calls in use, null for the system's own; not owned. For tests, before any file is

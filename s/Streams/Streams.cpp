@@ -102,6 +102,11 @@ TextFileOutStream::TextFileOutStream(const char* fileName, Mode mode)
     : OutStream(new TextFileDst(fileName, mode)),
       file_(static_cast<TextFileDst&>(*GetDestination())) {}
 
+TextFileOutStream::TextFileOutStream(const Port::Folder& folder, const char* path,
+                                     const char* fileName, Mode mode)
+    : OutStream(new TextFileDst(folder, path, fileName, mode)),
+      file_(static_cast<TextFileDst&>(*GetDestination())) {}
+
 TextFileOutStream::~TextFileOutStream() = default;
 
 bool TextFileOutStream::Open(const char* fileName, bool append) {

@@ -18,6 +18,9 @@ public:
 
     TextFileDst() = default;
     TextFileDst(const char* fileName, TextFileOutStream::Mode mode);
+    /// Opens the file at `path` below a folder.
+    TextFileDst(const Port::Folder& folder, const char* path, const char* fileName,
+                TextFileOutStream::Mode mode);
     TextFileDst(const TextFileDst&) = delete;
     TextFileDst& operator=(const TextFileDst&) = delete;
     ~TextFileDst() override;

@@ -5,10 +5,12 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -222,6 +224,32 @@ TEST(Stream, HandsOverTextsOfAnySize) {
         EXPECT_TRUE(stream.flush());
     }
     EXPECT_TRUE(Support::ReadWholeFile(folder / "text") == expected);
+}
+
+TEST(Stream, KeepsEveryCharacterWhereverItsBufferEnds) {
+    constexpr std::size_t BufferSize = 262144;
+    const Support::TemporaryFolder folder;
+    std::string text;
+    for (std::size_t i = 0; i < 2 * BufferSize + 100; ++i) {
+        // 89 divides no buffer, so that no part looks like another.
+        text += static_cast<char>(' ' + i % 89);
+    }
+    for (std::size_t first = BufferSize - 4; first <= BufferSize + 4; ++first) {
+        for (const std::size_t size : {1u, 2u, 3u}) {
+            File file;
+            ASSERT_TRUE(file.open((folder / "text").c_str(), File::Overwrite, true));
+            Port::Stream stream(file);
+            std::string_view rest(text);
+            stream << rest.substr(0, first);
+            for (rest.remove_prefix(first); !rest.empty();
+                 rest.remove_prefix(std::min(size, rest.size()))) {
+                stream << rest.substr(0, size);
+            }
+            EXPECT_TRUE(stream.flush());
+            EXPECT_TRUE(file.close());
+            ASSERT_TRUE(Support::ReadWholeFile(folder / "text") == text) << first << ", " << size;
+        }
+    }
 }
 
 TEST(Stream, ANullTextWritesNothing) {

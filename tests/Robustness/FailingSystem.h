@@ -52,6 +52,12 @@ public:
     int Rename(const char* from, const char* to) override {
         return Fails() ? -1 : System::Rename(from, to);
     }
+    int OpenAt(int folder, const char* name, int flags, unsigned mode) override {
+        return Fails() ? -1 : System::OpenAt(folder, name, flags, mode);
+    }
+    int RenameAt(int folder, const char* from, const char* to) override {
+        return Fails() ? -1 : System::RenameAt(folder, from, to);
+    }
 
 private:
     bool Fails() noexcept {

@@ -1,5 +1,6 @@
 // Whichever file call of a whole run fails: nothing is thrown, the failure is told, files are
 // whole.
+#include "Port/File.h"
 #include "Robustness/FailingSystem.h"
 #include "Robustness/MidSizedDesign.h"
 #include "Support/EngineScript.h"
@@ -163,6 +164,33 @@ private:
 
     int calls_ = 0;
 };
+
+/// Writes that take nothing and tell no error, a hundred times; then they fail.
+class IdleSystem : public Port::System {
+public:
+    IdleSystem() { System::Replace(this); }
+    IdleSystem(const IdleSystem&) = delete;
+    IdleSystem& operator=(const IdleSystem&) = delete;
+    ~IdleSystem() override { System::Replace(nullptr); }
+
+    ssize_t Write(int /*descriptor*/, const void* /*data*/, std::size_t /*size*/) override {
+        errno = ENOSPC;
+        return ++writes > 100 ? -1 : 0;
+    }
+
+    int writes = 0;
+};
+
+TEST_F(Faults, AWriteThatTakesNothingIsAFailureAndNotTriedAgain) {
+    const std::string name = folder_ / "file";
+    IdleSystem system;
+    Port::File file;
+    ASSERT_TRUE(file.open(name.c_str(), Port::File::Overwrite, true));
+    EXPECT_FALSE(file.write("text", 4));
+    EXPECT_EQ(system.writes, 1);
+    EXPECT_EQ(file.GetError(), EIO);
+    EXPECT_FALSE(file.close());
+}
 
 TEST_F(Faults, InterruptedAndPartialCallsAreNoFailures) {
     InterruptedSystem system;

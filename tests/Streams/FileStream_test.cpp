@@ -505,13 +505,14 @@ TEST(FileStream, TellsThatADeviceIsFull) {
     EXPECT_EQ(out.GetError(), ENOSPC);
 }
 
-TEST(FileStream, LeavesNoFileOpen) {
+TEST(FileStream, HasOneFileOpenUntilItEnds) {
     const TemporaryFolder folder;
     const int before = Support::CountOpenFiles();
     {
         TextFileOutStream out((folder / "a").c_str(), false);
         out.Open((folder / "b").c_str(), false);
         out.Open((folder / "c").c_str(), true);
+        EXPECT_EQ(Support::CountOpenFiles(), before + 1);
     }
     EXPECT_EQ(Support::CountOpenFiles(), before);
 }
@@ -525,6 +526,26 @@ TEST(FileStream, WritesMegabytes) {
     });
     ASSERT_EQ(text.size(), 10000000u);
     EXPECT_EQ(text.find_first_not_of("x\n"), std::string::npos);
+}
+
+TEST(FileStream, KeepsEveryCharacterWhereverTheBufferEnds) {
+    // Numbered lines, moved on by one character at a time, and lines that outgrow the buffer.
+    for (std::size_t shift = 0; shift < 12; ++shift) {
+        std::string expected(shift, ' ');
+        const std::string text = Written([&](TextFileOutStream& out) {
+            out << expected.c_str();
+            for (int i = 0; i < 40000; ++i) {
+                expected += "line " + std::to_string(i) + "\n";
+                out << "line " << i << "\n";
+            }
+            for (int i = 0; i < 40000; ++i) {
+                expected += "//" + std::to_string(i);
+                out << "//" << i;
+            }
+            expected += "\n";
+        });
+        ASSERT_TRUE(text == expected) << "shifted by " << shift;
+    }
 }
 
 TEST(FileStream, WritesTextsOfMegabytesInTheirPlace) {

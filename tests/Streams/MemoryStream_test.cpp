@@ -129,10 +129,12 @@ TEST(OutStream, ANullTextReachesNoDestination) {
 
 TEST(OutStream, WithoutADestinationDropsEverything) {
     OutStream out(nullptr);
-    out << "a" << 1 << OutStream::NewLine << OutStream::Flush << Port::String("b");
-    out.Indent();
-    out.Unindent();
-    out.WriteEmptyLine();
+    OutStream* const same = &(out << "a" << 1 << OutStream::NewLine << OutStream::Flush);
+    EXPECT_EQ(same, &out) << "operators can be chained";
+    EXPECT_EQ(&(out << Port::String("b")), &out);
+    EXPECT_NO_THROW(out.Indent());
+    EXPECT_NO_THROW(out.Unindent());
+    EXPECT_NO_THROW(out.WriteEmptyLine());
 }
 
 TEST(OutStream, CannotBeCopied) {

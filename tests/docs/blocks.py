@@ -7,6 +7,7 @@ What follows the three back-quotes decides:
                       without main, statements that see `engine` and `model`: compiled
     cpp sources       a piece of the library's own sources: compiled
     orn               commands: replayed
+    orn more          commands: replayed behind those of the blocks before
     verilog, vhdl     a passage of the netlist that the last commands give
     sh                run by bash; a text block behind it is what it prints
     LANGUAGE FILE     written to that file, for the blocks behind it
@@ -91,6 +92,7 @@ class Page:
         self.folder = folder
         self.installed = installed
         self.printed: str | None = None
+        self.commands = ""
 
     def run(self, *command: str | Path) -> str:
         done = subprocess.run([str(word) for word in command], cwd=self.folder,
@@ -113,14 +115,14 @@ class Page:
             self.compile(SOURCES.format(code=block.code), "-std=c++20", "-fsyntax-only",
                          "-Wno-unused-const-variable", f"-I{PROJECT / 'include'}",
                          f"-I{PROJECT / 's'}")
+        elif block.language == "orn" and block.word == "more":
+            self.replay(self.commands + block.code)
         elif block.word:
             (self.folder / block.word).write_text(block.code)
         elif block.language == "cpp":
             self.check_cpp(block.code)
         elif block.language == "orn":
-            (self.folder / "block.cmd").write_text(block.code)
-            self.run("orn-hdl", "run", "--no-header", "--verilog", "block.verilog", "--vhdl",
-                     "block.vhdl", "block.cmd")
+            self.replay(block.code)
         elif block.language in ("verilog", "vhdl"):
             netlist = (self.folder / f"block.{block.language}").read_text()
             if _without_ends(block.code) not in _without_ends(netlist):
@@ -129,6 +131,12 @@ class Page:
             self.printed = self.run("bash", "-euo", "pipefail", "-c", block.code)
         else:
             raise Failed("is of a language that no test knows")
+
+    def replay(self, commands: str) -> None:
+        self.commands = commands
+        (self.folder / "block.cmd").write_text(commands)
+        self.run("orn-hdl", "run", "--no-header", "--verilog", "block.verilog", "--vhdl",
+                 "block.vhdl", "block.cmd")
 
     def check_cpp(self, code: str) -> None:
         include = f"-I{self.installed.prefix / 'include'}"
