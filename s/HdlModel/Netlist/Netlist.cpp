@@ -349,6 +349,10 @@ void Netlist::CreateVhdlDummySignals() {
     dummies.Make(*this, names, true);
 }
 
+const Signal* Netlist::GetStandIn(const Signal* signal) const noexcept {
+    return implementation_->dummies.Find(signal);
+}
+
 void Netlist::ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider,
                          std::unique_ptr<BusSlice> slice) {
     wider->SetPortPolarity(narrower->GetPortPolarity());
