@@ -211,7 +211,7 @@ constexpr Check::Rule Rules[] = {
     {"directive-comment", Verdicts("......rr."), "a comment that a tool obeys",
      "Comments that begin with synopsys, synthesis or verilator are commands to some tools.",
      "ADD NOTES synopsys translate_off", "other words at the comment's beginning"},
-    {"missing-configuration", Verdicts("...rr...r"),
+    {"missing-configuration", Verdicts("...ww...w"),
      "a configuration that names one of a component which WORK may not have",
      "The configuration of the design uses WORK.CFG_ with the component's name "
      "(IEEE 1076-2008, 7.3.2.2).",

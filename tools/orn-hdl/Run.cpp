@@ -77,17 +77,17 @@ private:
     Status status_ = Status::Success;
 };
 
-std::string GetModelName(const RunOptions& options) {
-    if (options.model) {
-        return *options.model;
+} // namespace
+
+std::string GetModelName(const std::string& file, const std::optional<std::string>& asked) {
+    if (asked) {
+        return *asked;
     }
-    if (options.file == "-") {
+    if (file == "-") {
         return NamelessModel;
     }
-    return std::string(Port::FileName(options.file.c_str()).GetStem().GetView());
+    return std::string(Port::FileName(file.c_str()).GetStem().GetView());
 }
-
-} // namespace
 
 Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
                 const WriteRules& rules) {
@@ -121,7 +121,7 @@ Status Run(const RunOptions& options) {
     static Orn_Hdl::Engine* engine = nullptr;
     delete std::exchange(engine, nullptr); // An earlier run's.
     engine = new Orn_Hdl::Engine;
-    const std::string name = GetModelName(options);
+    const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
     Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
     const Replayed replayed =

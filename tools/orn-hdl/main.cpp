@@ -5,6 +5,7 @@
 #include "Import.h"
 #include "Run.h"
 #include "Tool.h"
+#include "check/Check.h"
 
 #include "Port/Version.h"
 
@@ -12,6 +13,7 @@
 
 #include <exception>
 #include <functional>
+#include <map>
 #include <new>
 #include <sstream>
 #include <string>
@@ -64,6 +66,7 @@ public:
             "Print the version and leave");
         AddRun();
         AddImport();
+        AddCheck();
         AddDraw();
         AddCommands();
     }
@@ -127,6 +130,29 @@ private:
         command.footer("Without an output the file is only checked.");
     }
 
+    void AddCheck() {
+        CLI::App& command =
+            AddCommand("check", "Tell what tools make of the netlists of a command file",
+                       [this] { return Tool::CheckFiles(check_); });
+        command.add_option("FILE", check_.files, "The command files; - is standard input")
+            ->type_name("")
+            ->check(CheckFileName);
+        command.add_option("--model", check_.model, "The name of the design")->type_name("NAME");
+        command.add_option("--target", check_.targets, "Whose rules count; without it, all")
+            ->type_name("TARGET,...")
+            ->delimiter(',');
+        command.add_option("--fail-on", check_.failOn, "What makes the exit status 1")
+            ->check(CLI::IsMember({"error", "warning", "never"}));
+        command.add_option("--format", check_.format, "How the findings are printed")
+            ->transform(CLI::CheckedTransformer(
+                std::map<std::string, Tool::CheckFormat>{{"text", Tool::CheckFormat::Text},
+                                                         {"json", Tool::CheckFormat::Json},
+                                                         {"sarif", Tool::CheckFormat::Sarif}}))
+            ->type_name("text|json|sarif");
+        command.add_flag("--list", check_.list, "List the rules");
+        command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
+    }
+
     void AddDraw() {
         CLI::App& command = AddCommand("draw", "Draw the design of a command file",
                                        [this] { return Tool::Draw(draw_); });
@@ -158,6 +184,7 @@ private:
     Tool::RunOptions run_;
     Tool::ImportOptions import_;
     Tool::DrawOptions draw_;
+    Tool::CheckOptions check_;
     std::vector<std::string> words_;
     bool markdown_ = false;
 };
