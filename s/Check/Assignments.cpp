@@ -39,6 +39,21 @@ bool IsBitOfUpwardBus(const Signal& signal) {
     return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
 }
 
+/// Whether VHDL gets the constant of what is written bit by bit.
+bool IsWrittenByBits(const Signal& signal, const Digits& digits) {
+    const auto width = static_cast<std::size_t>(std::max(signal.GetWidth(), 0));
+    return digits.base == 2 && digits.digits.size() == width &&
+           digits.digits.find_first_not_of("01") == std::string::npos;
+}
+
+/// The verdicts on something that Verilog gets, and perhaps VHDL.
+Verdicts OnlyWritten(Verdicts verdicts, bool isInVhdl) {
+    if (!isInVhdl) {
+        verdicts.Restrict(Check::Targets::Verilog());
+    }
+    return verdicts;
+}
+
 /// The aliases and constants of all signals.
 class Assignments {
 public:
@@ -56,8 +71,8 @@ private:
     void CheckLength(const Signal& signal, const Digits& digits);
     void CheckVhdlConstant(const Signal& signal, const Digits& digits);
     void CheckMeaning(const Signal& signal, const Digits& digits);
-    void CheckTarget(const Signal& signal, const Cause& cause, std::string_view what);
-    void CheckRange(const Run& run, bool isWritten, const Cause& cause);
+    void CheckTarget(const Signal& signal, const Cause& cause, std::string_view what, bool isInVhdl);
+    void CheckRange(const Run& run, bool isWritten, bool isInVhdl, const Cause& cause);
     void CheckOpen(const Signal& signal);
     void CheckLoop(const Signal& signal);
     Finding* AddForConstant(RuleId rule, const Verdicts& verdicts, const Signal& signal);
@@ -91,27 +106,33 @@ void Assignments::CheckSignal(const Signal& signal) {
         CheckOpen(signal);
     }
     if (hasConstant) {
-        CheckTarget(signal, ConstantCause(signal), "a constant");
+        const Digits digits(signal.GetConstantValue());
+        CheckTarget(signal, ConstantCause(signal), "a constant",
+                    !IsCompoundOrAgainst(signal) || IsWrittenByBits(signal, digits));
         CheckConstant(signal);
     }
     for (const Signal* alias : aliases) {
-        CheckTarget(signal, AliasCause(signal, *alias), "an alias");
+        CheckTarget(signal, AliasCause(signal, *alias), "an alias", true);
         CheckAlias(signal, *alias);
     }
     CheckLoop(signal);
 }
 
 /// What an assignment writes to.
-void Assignments::CheckTarget(const Signal& signal, const Cause& cause, std::string_view what) {
+void Assignments::CheckTarget(const Signal& signal, const Cause& cause, std::string_view what,
+                              bool isInVhdl) {
     ForEachRun(signal, [&](const Run& run) {
         if (run.isOutside) {
-            CheckRange(run, true, cause);
+            CheckRange(run, true, isInVhdl, cause);
         }
         context_.uses.ForEach(run, [](Use& use) { use.AddDriver(); });
         if (!HasDirection(*run.declared, Polarity::Input)) {
             return;
         }
-        if (Finding* finding = context_.Add(RuleId::AssignedInput, cause)) {
+        if (Finding* finding = context_.Add(RuleId::AssignedInput,
+                                            OnlyWritten(GetRule(RuleId::AssignedInput).verdicts,
+                                                        isInVhdl),
+                                            cause)) {
             finding->objects = {run.declared};
             finding->message = std::string(what) + " assigns the input port " +
                                Quoted(run.declared->GetNameView());
@@ -120,10 +141,11 @@ void Assignments::CheckTarget(const Signal& signal, const Cause& cause, std::str
     });
 }
 
-void Assignments::CheckRange(const Run& run, bool isWritten, const Cause& cause) {
+void Assignments::CheckRange(const Run& run, bool isWritten, bool isInVhdl, const Cause& cause) {
     const bool isBit = run.reference->GetSignalType() == SignalTypeBusIndex;
-    const bool isRejected = isWritten && (isBit || run.isFarOutside);
-    const Verdicts verdicts(isRejected ? "rrrrrrwwr" : "wwwrrwwwr");
+    const bool isRejected = isWritten && isBit;
+    const Verdicts verdicts =
+        OnlyWritten(Verdicts(isRejected ? "rrrrrrwwr" : "wwwrrwwwr"), isInVhdl);
     if (Finding* finding = context_.Add(RuleId::SliceOutside, verdicts, cause)) {
         finding->objects = {run.reference, run.declared};
         finding->message = Quoted(run.reference->GetNameView()) + " lies outside the bus " +
@@ -135,7 +157,7 @@ void Assignments::CheckRange(const Run& run, bool isWritten, const Cause& cause)
 void Assignments::CheckAlias(const Signal& signal, const Signal& alias) {
     ForEachRun(alias, [&](const Run& run) {
         if (run.isOutside) {
-            CheckRange(run, false, AliasCause(signal, alias));
+            CheckRange(run, false, true, AliasCause(signal, alias));
         }
         context_.uses.ForEach(run, [](Use& use) { use.AddRead(); });
     });
@@ -266,9 +288,7 @@ void Assignments::CheckVhdlConstant(const Signal& signal, const Digits& digits) 
         return;
     }
     if (IsCompoundOrAgainst(signal)) {
-        const bool isWritten = digits.base == 2 && digits.digits.size() == width &&
-                               digits.digits.find_first_not_of("01") == std::string::npos;
-        if (!isWritten) {
+        if (!IsWrittenByBits(signal, digits)) {
             if (Finding* finding = AddForConstant(
                     RuleId::ConstantLeftOut, GetRule(RuleId::ConstantLeftOut).verdicts, signal)) {
                 finding->message = "VHDL gets no constant for " + Quoted(signal.GetNameView()) +

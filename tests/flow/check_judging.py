@@ -9,6 +9,7 @@ from __future__ import annotations
 import re
 import shutil
 import subprocess
+from collections.abc import Iterable, Sequence
 from dataclasses import dataclass, field
 from pathlib import Path
 
@@ -56,6 +57,7 @@ class Commands:
     case: str = ""
     libraries: list[str] = field(default_factory=list)
     includes: list[str] = field(default_factory=list)
+    suppressed: bool = False
 
 
 def words_of(line: str) -> list[str]:
@@ -105,6 +107,8 @@ def read_commands(text: str, name: str) -> Commands:
                                        words[2].translate(_NORMAL).lower())
         elif phrase in ("UPPERCASE COMPONENT", "LOWERCASE COMPONENT"):
             found.case = phrase[:5]
+        elif phrase.startswith("SUPPRESS COMPONENT"):
+            found.suppressed = not (len(words) > 2 and words[2].lower() == "false")
         elif phrase.startswith("ADD LIBRARY ") and len(words) == 3:
             found.libraries.append(words[2])
         elif phrase.startswith("ADD INCLUDE ") and len(words) == 3:
@@ -176,7 +180,8 @@ _VHDL_TYPES = {"string": ("string", '""'), "integer": ("integer", "0"), "float":
                "bitvector": ("bit_vector", '""')}
 
 
-def _vhdl_cell(cell: Cell) -> str:
+def _vhdl_parts(cell: Cell) -> str | None:
+    """The generic and port clauses; None when the cell has a name that VHDL has not."""
     ports: list[str] = []
     generics = [(name, *_VHDL_TYPES.get(kind.lower(), ("string", '""')))
                 for name, (kind, owner) in cell.generics.items() if owner == "component"]
@@ -189,17 +194,32 @@ def _vhdl_cell(cell: Cell) -> str:
             way = "downto" if int(bus[2]) >= int(bus[3]) else "to"
             kind = f"std_logic_vector({int(bus[2])} {way} {int(bus[3])})"
         if not _PLAIN_VHDL.match(base):
-            return ""
+            return None
         ports.append(f"{base} : {mode} {kind}")
     if not all(_PLAIN_VHDL.match(name) for name in [cell.name, *(g[0] for g in generics)]):
-        return ""
-    lines = ["library ieee;", "use ieee.std_logic_1164.all;", f"entity {cell.name} is"]
+        return None
+    text = ""
     if generics:
-        lines.append(f"  generic ({'; '.join(f'{n} : {t} := {v}' for n, t, v in generics)});")
+        text += f"  generic ({'; '.join(f'{n} : {t} := {v}' for n, t, v in generics)});\n"
     if ports:
-        lines.append(f"  port ({'; '.join(ports)});")
-    lines += [f"end {cell.name};", f"architecture stub of {cell.name} is", "begin", "end stub;"]
-    return "\n".join(lines) + "\n"
+        text += f"  port ({'; '.join(ports)});\n"
+    return text
+
+
+def _vhdl_component(cell: Cell) -> str:
+    parts = _vhdl_parts(cell)
+    return "" if parts is None else f"component {cell.name}\n{parts}end component;\n"
+
+
+def _vhdl_cell(cell: Cell) -> str:
+    """The entity, an empty architecture, and the configuration that a design can name."""
+    parts = _vhdl_parts(cell)
+    if parts is None:
+        return ""
+    name = cell.name
+    return (f"library ieee;\nuse ieee.std_logic_1164.all;\nentity {name} is\n{parts}end {name};\n"
+            f"architecture stub of {name} is\nbegin\nend stub;\n"
+            f"configuration CFG_{name} of {name} is\nfor stub\nend for;\nend CFG_{name};\n")
 
 
 def _limit() -> None:
@@ -238,6 +258,9 @@ class Judges:
         (work / "cells_bb.v").write_text("".join(_verilog_cell(c, False) for c in cells),
                                          "latin-1")
         self.vhdl_cells = [text for text in map(_vhdl_cell, cells) if text]
+        components = "".join(text for text in map(_vhdl_component, cells)) if commands.suppressed else ""
+        self.package = ("library ieee;\nuse ieee.std_logic_1164.all;\npackage Vcomponents is\n"
+                        f"{components}end Vcomponents;\n")
         for name in commands.includes:
             if re.match(r"[\w.]+$", name):
                 (work / name).write_text("")
@@ -265,9 +288,9 @@ class Judges:
             for library in {"KESTRA", *self.commands.libraries}:
                 if re.match(r"[A-Za-z]\w*$", library) and library.lower() not in ("ieee", "std",
                                                                                   "work"):
-                    package = "Vcomponents" if library == "KESTRA" else "parts"
                     source = folder / f"{library}.vhd"
-                    source.write_text(f"package {package} is\nend {package};\n")
+                    source.write_text(self.package if library == "KESTRA" else
+                                      "package parts is\nend parts;\n", "latin-1")
                     _run(["ghdl", "-a", f"--std={standard}", f"--workdir={folder}",
                           f"--work={library}", str(source)], folder)
         flags = [f"--std={standard}", "--syn-binding", f"--workdir={folder}", f"-P{folder}"]
@@ -283,10 +306,17 @@ class Judges:
         # What fails when the design is run is no mere warning.
         return _verdict(status or "-Wruntime-error" in text, text)
 
-    def all(self, verilog: str = "X.v", vhdl: str = "X.vhd") -> dict[str, Verdict]:
-        return {"icarus": self.icarus(verilog), "verilator": self.verilator(verilog),
-                "yosys": self.yosys(verilog), "ghdl_93": self.ghdl(vhdl, "93"),
-                "ghdl_08": self.ghdl(vhdl, "08")}
+    def all(self, verilog: Sequence[str] = ("X.v",),
+            vhdl: Sequence[str] = ("X.vhd",)) -> dict[str, Verdict]:
+        """What each tool says of the worst of the netlists of its language."""
+        def worst(verdicts: Iterable[Verdict]) -> Verdict:
+            return max(verdicts, key=lambda verdict: verdict.level)
+
+        return {"icarus": worst(map(self.icarus, verilog)),
+                "verilator": worst(map(self.verilator, verilog)),
+                "yosys": worst(map(self.yosys, verilog)),
+                "ghdl_93": worst(self.ghdl(name, "93") for name in vhdl),
+                "ghdl_08": worst(self.ghdl(name, "08") for name in vhdl)}
 
 
 def clear(folder: Path) -> Path:
