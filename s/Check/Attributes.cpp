@@ -164,6 +164,7 @@ private:
     void CheckNamesOf(const Holder& holder, const Attribute& attribute);
     void Declare(const Holder& holder, const Attribute& attribute);
     void CheckDeclared(const Holder& holder, const Attribute& attribute);
+    bool IsDeclaredBy(const Holder& holder, const Attribute& attribute) const;
     void CheckValue(const Holder& holder, const Attribute& attribute, const Places& places);
     void CheckText(const Holder& holder, const Attribute& attribute, string_view text,
                    const Places& places);
@@ -413,6 +414,16 @@ void AttributeWalk::Declare(const Holder& holder, const Attribute& attribute) {
     }
 }
 
+/// Whether the attribute's value can be one of the declared type: a value of a user type is written
+/// as it is.
+bool FitsType(const Attribute& attribute, const std::string& type) {
+    if (attribute.GetValueType() != Attribute::User) {
+        return TypeOf(attribute) == type;
+    }
+    return TypeOf(attribute) == type || !IsOneOf(VisibleTypes, type) ||
+           CanBeValueOf(type, attribute.GetValueString().GetView());
+}
+
 void AttributeWalk::CheckDeclared(const Holder& holder, const Attribute& attribute) {
     const auto found = declarations_.find(Lower(attribute.GetNameView()));
     if (found == declarations_.end() || !found->second.isDeclared) {
@@ -422,7 +433,7 @@ void AttributeWalk::CheckDeclared(const Holder& holder, const Attribute& attribu
                                    attribute)) {
             finding->message = holder.Describe(attribute) + " is not declared before its use";
         }
-    } else if (isTyped_ && found->second.type != TypeOf(attribute)) {
+    } else if (isTyped_ && !FitsType(attribute, found->second.type)) {
         if (Finding* finding =
                 Add(RuleId::AttributeTypes, GetRule(RuleId::AttributeTypes).verdicts, holder,
                     attribute)) {
@@ -431,6 +442,14 @@ void AttributeWalk::CheckDeclared(const Holder& holder, const Attribute& attribu
             finding->other = found->second.cause;
         }
     }
+}
+
+/// Whether the attribute is the one that declares its name, with its type.
+bool AttributeWalk::IsDeclaredBy(const Holder& holder, const Attribute& attribute) const {
+    const auto found = declarations_.find(Lower(attribute.GetNameView()));
+    return found != declarations_.end() && found->second.isDeclared &&
+           found->second.cause.kind == holder.kind &&
+           found->second.cause.first == holder.CauseOf(attribute).first;
 }
 
 void AttributeWalk::CheckValue(const Holder& holder, const Attribute& attribute,
@@ -453,7 +472,8 @@ void AttributeWalk::CheckValue(const Holder& holder, const Attribute& attribute,
                   places.verilogNumber ? text.GetView()
                                        : Writers::GetUnquotedValue(attribute).GetView(),
                   asText);
-        if (places.vhdl && places.typed) {
+        if (places.vhdl && places.typed &&
+            (IsGeneric(attribute) || IsDeclaredBy(holder, attribute))) {
             CheckUser(holder, attribute);
         }
         break;

@@ -3,6 +3,7 @@
 #include "Port/Ascii.h"
 
 #include <algorithm>
+#include <iterator>
 
 namespace Orn_Hdl::Checking {
 
@@ -148,13 +149,15 @@ std::string Digits::ExpandDigits() const {
     return bits;
 }
 
+std::string Digits::GetDecimalDigits() const {
+    std::string decimal;
+    std::copy_if(digits.begin(), digits.end(), std::back_inserter(decimal), Port::IsDigit);
+    return decimal.erase(0, std::min(decimal.find_first_not_of('0'), decimal.size()));
+}
+
 std::size_t Digits::GetNeededBits() const {
-    std::string bits;
-    if (hasLength) {
-        bits = ExpandDigits();
-    } else {
-        bits = ReadVerilog(MostDecimalDigits * 4).value_or("");
-    }
+    const std::string bits =
+        hasLength ? ExpandDigits() : ToBinary(GetDecimalDigits().substr(0, MostDecimalDigits));
     const std::size_t first = bits.find_first_not_of('0');
     return first == std::string::npos ? 0 : bits.size() - first;
 }
@@ -174,20 +177,12 @@ BitText Digits::ReadVerilog(std::size_t width) const {
         }
         return bits;
     }
-    std::string decimal;
-    bool isNegative = false;
-    for (const char c : digits) {
-        isNegative = isNegative != (c == '-');
-        if (Port::IsDigit(c)) {
-            decimal.push_back(c);
-        }
-    }
-    decimal.erase(0, std::min(decimal.find_first_not_of('0'), decimal.size()));
+    const std::string decimal = GetDecimalDigits();
     if (decimal.size() > MostDecimalDigits) {
         return std::nullopt;
     }
     std::string bits = Resize(ToBinary(decimal), width);
-    if (isNegative) {
+    if (std::count(digits.begin(), digits.end(), '-') % 2 != 0) {
         Negate(bits);
     }
     return bits;

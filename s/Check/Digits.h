@@ -43,6 +43,8 @@ struct Digits {
 private:
     /// The digits of a number with a base, as bits.
     std::string ExpandDigits() const;
+    /// The digits of a decimal number, without leading zeros.
+    std::string GetDecimalDigits() const;
 };
 
 } // namespace Orn_Hdl::Checking

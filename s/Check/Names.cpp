@@ -16,6 +16,8 @@ namespace {
 using VerilogOption = HdlOptions::VerilogOption;
 
 constexpr std::size_t LongestInGhdl = 1023;
+/// A longer module cannot be named as the top of the design.
+constexpr std::size_t LongestTopInVerilator = 127;
 constexpr std::size_t LongestInIcarus = 16000;
 constexpr std::size_t LongestInStandard = 1024;
 
@@ -45,10 +47,13 @@ Verdicts Both(const NameUse& use, std::string_view letters) {
 
 void CheckLength(Context& context, const NameUse& use) {
     const std::size_t length = use.name.size();
-    if (length <= LongestInGhdl) {
+    if (length <= LongestTopInVerilator) {
         return;
     }
-    Verdicts verdicts("........r");
+    Verdicts verdicts(length > LongestInGhdl ? "........r" : "");
+    if (use.kind == Kind::DesignName) {
+        verdicts.Worsen(Verdicts("......r"));
+    }
     if (length > LongestInStandard) {
         verdicts.Worsen(Verdicts("www"));
     }

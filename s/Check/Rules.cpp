@@ -107,7 +107,7 @@ constexpr Check::Rule Rules[] = {
      "a constant that VHDL cannot have, and which is left out there",
      "What is written bit by bit in VHDL (a compound, a slice against its bus) needs one binary "
      "digit a bit. Other constants are not written.",
-     "ASSIGN CONSTANT Y(0:3) 4:H:5", "one binary digit a bit"},
+     "ADD PORT Y(7:0) Output\nASSIGN CONSTANT Y(4:7) 4:H:5", "one binary digit a bit"},
     {"no-ports", Verdicts("...rr...r"), "a design without ports",
      "VHDL has no empty list of ports (IEEE 1076-2008, 6.5.6.1).", "SET NETLIST NAME bare",
      "a port that nothing is wired to"},

@@ -142,11 +142,8 @@ void Scopes::CheckBuses() {
         }
         const Declared bus = DescribeSignal(*signal);
         ForEachInScope(base, bus, [&](const Declared& other) {
-            // Verilator takes a net for the port of its name.
-            const bool isPort = signal->IsPort() || (other.object->GetObjectType() ==
-                                                         ObjectTypeSignal &&
-                                                     static_cast<const Signal*>(other.object)->IsPort());
-            ReportClash(bus, other, other.isInstance ? "rrr..rrr" : isPort ? "rrr..rwr" : "rrr..rrr");
+            // Verilator takes two nets of one name for one.
+            ReportClash(bus, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
         });
     }
 }

@@ -211,15 +211,16 @@ def _vhdl_component(cell: Cell) -> str:
     return "" if parts is None else f"component {cell.name}\n{parts}end component;\n"
 
 
-def _vhdl_cell(cell: Cell) -> str:
-    """The entity, an empty architecture, and the configuration that a design can name."""
+def _vhdl_cell(cell: Cell, configuration: bool) -> str:
+    """The entity, an empty architecture, and perhaps the configuration that a design can name."""
     parts = _vhdl_parts(cell)
     if parts is None:
         return ""
     name = cell.name
     return (f"library ieee;\nuse ieee.std_logic_1164.all;\nentity {name} is\n{parts}end {name};\n"
-            f"architecture stub of {name} is\nbegin\nend stub;\n"
-            f"configuration CFG_{name} of {name} is\nfor stub\nend for;\nend CFG_{name};\n")
+            f"architecture stub of {name} is\nbegin\nend stub;\n" +
+            (f"configuration CFG_{name} of {name} is\nfor stub\nend for;\nend CFG_{name};\n"
+             if configuration else ""))
 
 
 def _limit() -> None:
@@ -247,17 +248,17 @@ def _verdict(status: int, text: str, warning: str = r"\bwarning\b") -> Verdict:
 class Judges:
     """All tools over the netlists of one command file, in a folder of its own."""
 
-    def __init__(self, work: Path, commands: Commands, kestra: Path | None = None) -> None:
+    def __init__(self, work: Path, commands: Commands, configurations: bool = True) -> None:
         self.work = work
         self.commands = commands
-        self.kestra = kestra
         cells = [cell for cell in commands.cells.values()
                  if cell.name.lower() != commands.top.lower()]
         (work / "cells.v").write_text(
             "`timescale 1ns / 1ps\n" + "".join(_verilog_cell(c, True) for c in cells), "latin-1")
         (work / "cells_bb.v").write_text("".join(_verilog_cell(c, False) for c in cells),
                                          "latin-1")
-        self.vhdl_cells = [text for text in map(_vhdl_cell, cells) if text]
+        self.vhdl_cells = [text for text in (_vhdl_cell(cell, configurations) for cell in cells)
+                           if text]
         components = "".join(text for text in map(_vhdl_component, cells)) if commands.suppressed else ""
         self.package = ("library ieee;\nuse ieee.std_logic_1164.all;\npackage Vcomponents is\n"
                         f"{components}end Vcomponents;\n")
