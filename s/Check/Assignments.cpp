@@ -3,6 +3,7 @@
 #include "Check/Bits.h"
 #include "Check/Context.h"
 #include "Check/Digits.h"
+#include "Check/Identifier.h"
 #include "Writers/SignalLists.h"
 #include "Writers/Text.h"
 
@@ -143,7 +144,7 @@ void Assignments::CheckTarget(const Signal& signal, const Cause& cause, std::str
 
 void Assignments::CheckRange(const Run& run, bool isWritten, bool isInVhdl, const Cause& cause) {
     const bool isBit = run.reference->GetSignalType() == SignalTypeBusIndex;
-    const bool isRejected = isWritten && isBit;
+    const bool isRejected = isWritten && (isBit || run.isBeyondRight);
     const Verdicts verdicts =
         OnlyWritten(Verdicts(isRejected ? "rrrrrrwwr" : "wwwrrwwwr"), isInVhdl);
     if (Finding* finding = context_.Add(RuleId::SliceOutside, verdicts, cause)) {
@@ -234,7 +235,8 @@ void Assignments::CheckDigits(const Signal& signal, const Digits& digits) {
     Verdicts verdicts;
     if (!digits.IsVerilogNumber()) {
         // Yosys takes a name for a net that it declares.
-        verdicts.Worsen(Verdicts(digits.hasLength ? "rrr..rrr" : "rrr..rrw"));
+        const bool isName = !digits.hasLength && Identifier(digits.digits).isVerilog;
+        verdicts.Worsen(Verdicts(isName ? "rrr..rrw" : "rrr..rrr"));
     }
     if (!IsCompoundOrAgainst(signal) && !IsBitOfUpwardBus(signal)) {
         if (!digits.IsVhdlString(false)) {

@@ -160,6 +160,8 @@ private:
     void CheckComponents();
     void CheckInstances();
     void CheckHolder(const Holder& holder);
+    bool IsHidden(const Holder& component, const Attribute& attribute) const;
+    void NoteGeneric(const Holder& holder, const Attribute& attribute);
     void CheckGenericMap(const Instance& instance);
     void CheckNamesOf(const Holder& holder, const Attribute& attribute);
     void Declare(const Holder& holder, const Attribute& attribute);
@@ -179,6 +181,7 @@ private:
     const bool isInBlockComment_;
     std::unordered_map<std::string, Declaration> declarations_;
     std::unordered_set<std::string> checkedNames_;
+    bool hasHidden_ = false;
 };
 
 AttributeWalk::AttributeWalk(Context& context)
@@ -213,20 +216,13 @@ void AttributeWalk::CheckAll() {
 /// The module's attributes are written when they are generics, and only then.
 void AttributeWalk::CheckModule() {
     const Holder holder = {&context_.netlist, &context_.netlist, Kind::ModuleAttribute};
-    bool isHidden = false;
     for (const Attribute* attribute : context_.netlist.GetAttrIterator()) {
         if (!IsGeneric(*attribute)) {
             continue;
         }
         CheckNamesOf(holder, *attribute);
         CheckValue(holder, *attribute, {true, false, true, true});
-        if (attribute->GetGenericOption() == Attribute::GenericNoSyn && !isHidden) {
-            isHidden = true;
-            if (Finding* finding = Add(RuleId::HiddenGeneric,
-                                       GetRule(RuleId::HiddenGeneric).verdicts, holder, *attribute)) {
-                finding->message = holder.Describe(*attribute) + " is kept from synthesis";
-            }
-        }
+        NoteGeneric(holder, *attribute);
     }
 }
 
@@ -330,12 +326,50 @@ void AttributeWalk::CheckHolder(const Holder& holder) {
             CheckDeclared(holder, *attribute);
         }
         Places places = PlacesOf(*attribute);
+        if (holder.kind == Kind::ComponentAttribute && IsHidden(holder, *attribute)) {
+            places.verilogNumber = places.verilogComment = false;
+        }
+        NoteGeneric(holder, *attribute);
         CheckValue(holder, *attribute, places);
         if (places.verilogNumber && IsSynthesis(*attribute) && !isTyped_ &&
             attribute->GetValueType() != Attribute::String) {
             // The same value is a string elsewhere.
             places = {false, isInBlockComment_, true, false};
             CheckValue(holder, *attribute, places);
+        }
+    }
+}
+
+/// Whether each instance of the component has an attribute of that name in its place. Verilog has
+/// parameters of instances only.
+bool AttributeWalk::IsHidden(const Holder& component, const Attribute& attribute) const {
+    const auto* const used = static_cast<const Component*>(component.object);
+    if (context_.used.at(used).hasPlainInstance) {
+        return false;
+    }
+    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+        if (instance->GetComponent() == used &&
+            instance->GetAttr(attribute.GetName().CStr()) == nullptr) {
+            return false;
+        }
+    }
+    return true;
+}
+
+/// Tells of the first generic that is kept from synthesis, and of numbers that Yosys cannot hold.
+void AttributeWalk::NoteGeneric(const Holder& holder, const Attribute& attribute) {
+    if (attribute.GetGenericOption() == Attribute::GenericNoSyn && !hasHidden_) {
+        hasHidden_ = true;
+        if (Finding* finding = Add(RuleId::HiddenGeneric, GetRule(RuleId::HiddenGeneric).verdicts,
+                                   holder, attribute)) {
+            finding->message = holder.Describe(attribute) + " is kept from synthesis";
+        }
+    }
+    const bool isOfModule = holder.kind == Kind::ModuleAttribute;
+    if (IsGeneric(attribute) && attribute.GetValueType() == Attribute::Float && !isOfModule) {
+        if (Finding* finding = Add(RuleId::FloatGeneric, GetRule(RuleId::FloatGeneric).verdicts,
+                                   holder, attribute)) {
+            finding->message = holder.Describe(attribute) + " is a number that Yosys takes for a text";
         }
     }
 }

@@ -20,6 +20,7 @@ void SetRun(const Names::BusName& bus, int oneEnd, int otherEnd, Run& run) {
     const std::int64_t width = bus.GetBits();
     run.isOutside = first < 0 || end > width;
     run.isFarOutside = end <= 0 || first >= width;
+    run.isBeyondRight = end > width && !run.isFarOutside;
     run.first = std::clamp<std::int64_t>(first, 0, width);
     run.count = std::clamp<std::int64_t>(end, 0, width) - run.first;
 }

@@ -20,6 +20,8 @@ struct Run {
     bool isOutside = false;
     /// Whether all of them do.
     bool isFarOutside = false;
+    /// Whether only some do, beyond the right end.
+    bool isBeyondRight = false;
     /// The reference itself: the declared signal, or a part of it.
     const Signal* reference = nullptr;
 };

@@ -169,7 +169,8 @@ void Clauses::CheckIncludes() {
         const Port::String unquoted = HdlUtilities::RemoveQuotes(std::string(text).c_str());
         const Writers::OneLine file(unquoted);
         const bool isBroken = file.GetView().find('"') != string_view::npos;
-        const Verdicts verdicts(isBroken ? "rrr..rrr." : "www..www.");
+        const bool isNone = file.GetView().empty();
+        const Verdicts verdicts(isBroken ? "rrr..rrr." : isNone ? "rrr..wrr." : "www..www.");
         if (Finding* finding =
                 context_.Add(RuleId::IncludeFile, verdicts, Named(Kind::Include, text))) {
             finding->message = "the file " + Quoted(file.GetView()) +

@@ -103,6 +103,7 @@ void Walk::CheckInstance(const Instance& instance) {
             ++used.pinCount;
         }
     }
+    used.hasPlainInstance = used.hasPlainInstance || !instance.HasAttrs();
     if (pinCount != used.pinCount) {
         CheckLatePins(instance, *component);
     }
@@ -231,7 +232,8 @@ void Walk::CheckParts(const Instance& instance, const Pin& pin, const Signal& si
 void Walk::CheckRange(const Instance& instance, const Pin& pin, const Run& run) {
     const bool drives = !IsInput(pin.GetPolarity().GetValue());
     const bool isBit = run.reference->GetSignalType() == SignalTypeBusIndex;
-    const Verdicts verdicts(!drives ? "wwwrrwwwr" : isBit ? "rrrrrrwrr" : "wwwrrwwrr");
+    const bool isRejected = isBit || run.isFarOutside || run.isBeyondRight;
+    const Verdicts verdicts(!drives ? "wwwrrwwwr" : isRejected ? "rrrrrrwrr" : "wwwrrwwrr");
     if (Finding* finding = Add(RuleId::SliceOutside, verdicts, instance, pin)) {
         finding->objects.push_back(run.reference);
         finding->message = Quoted(run.reference->GetNameView()) + " lies outside the bus " +

@@ -23,10 +23,10 @@ using CaseType = HdlOptions::VerilogOption::CaseType;
 
 /// A component that has instances; only these are written.
 struct UsedComponent {
-    /// The width of each pin, in the component's order; 0 for a range that is none.
     int pinCount = 0;
-    /// The name of its first instance, for findings about what every instance shares.
     const Instance* firstInstance = nullptr;
+    /// Whether an instance has no attributes, and so those of the component.
+    bool hasPlainInstance = false;
 };
 
 /// A port that pins use against its direction, and the first pin that does.

@@ -51,6 +51,7 @@ enum class RuleId {
     GenericType,
     GenericDigits,
     HiddenGeneric,
+    FloatGeneric,
     QuoteInValue,
     CommentInValue,
     BackslashInValue,

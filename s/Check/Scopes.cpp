@@ -26,6 +26,11 @@ struct Declared {
     Cause cause;
 };
 
+bool IsPort(const Declared& declared) {
+    return declared.object != nullptr && declared.object->GetObjectType() == ObjectTypeSignal &&
+           static_cast<const Signal*>(declared.object)->IsPort();
+}
+
 /// Words that begin a comment which a tool obeys, and what the tools make of it.
 struct Directive {
     string_view words;
@@ -143,7 +148,8 @@ void Scopes::CheckBuses() {
         const Declared bus = DescribeSignal(*signal);
         ForEachInScope(base, bus, [&](const Declared& other) {
             // Verilator takes two nets of one name for one.
-            ReportClash(bus, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
+            const bool isPort = IsPort(bus) && IsPort(other);
+            ReportClash(bus, other, other.isInstance || isPort ? "rrr..rrr" : "rrr..rwr");
         });
     }
 }
@@ -158,7 +164,7 @@ void Scopes::CheckStandIns() {
             Spell(Names::BaseName(whole.GetView()), options_.verilog.signalCase);
         standIn.cause = SignalCause(Names::BaseName(port->GetNameView()));
         ForEachInScope(name, standIn, [&](const Declared& other) {
-            ReportClash(standIn, other, "rrr..rrr");
+            ReportClash(standIn, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
         });
     }
 }
@@ -212,9 +218,7 @@ void Scopes::CheckGenerics() {
         generic.verilogName = std::string(name);
         generic.cause = Named(Kind::ModuleAttribute, "", name);
         ForEachInScope(name, generic, [&](const Declared& other) {
-            const bool isPort = other.object->GetObjectType() == ObjectTypeSignal &&
-                                static_cast<const Signal*>(other.object)->IsPort();
-            ReportClash(generic, other, other.isInstance || isPort ? "rrr..rr" : "rrr..rw");
+            ReportClash(generic, other, other.isInstance || IsPort(other) ? "rrr..rr" : "rrr..rw");
         });
         const auto attributeOfName = context_.declaredAttributes.find(Lower(name));
         if (attributeOfName != context_.declaredAttributes.end()) {
@@ -266,7 +270,7 @@ void Scopes::CheckComponents() {
         if (Port::EqualIgnoringCase(component->GetNameView(), netlist_.GetNameView())) {
             const bool isSame = Spell(component->GetNameView(), options_.verilog.componentCase) ==
                                 netlist_.GetNameView();
-            const Verdicts verdicts(isSame ? "rrrrrr.rr" : "...rr...r");
+            const Verdicts verdicts(isSame ? "rrrrrrwrr" : "...rr...r");
             if (Finding* finding =
                     context_.Add(RuleId::OwnComponent, verdicts, CauseOf(*component))) {
                 finding->objects = {component, &netlist_};
@@ -350,9 +354,7 @@ void Scopes::CheckHiddenBy(const Declared& declared) {
                                  ? Names::BaseName(declared.object->GetNameView())
                                  : string_view(declared.cause.second);
     if (Port::EqualIgnoringCase(name, netlist_.GetNameView())) {
-        const bool isPort = declared.object != nullptr &&
-                            declared.object->GetObjectType() == ObjectTypeSignal &&
-                            static_cast<const Signal*>(declared.object)->IsPort();
+        const bool isPort = IsPort(declared);
         const bool isSame = declared.verilogName == netlist_.GetNameView();
         const bool isComponent = declared.object != nullptr &&
                                  declared.object->GetObjectType() == ObjectTypeComponent;

@@ -251,19 +251,20 @@ class Judges:
     def __init__(self, work: Path, commands: Commands, configurations: bool = True) -> None:
         self.work = work
         self.commands = commands
-        cells = [cell for cell in commands.cells.values()
-                 if cell.name.lower() != commands.top.lower()]
+        placed = [commands.cells[name] for name in dict.fromkeys(commands.instances.values())
+                  if name in commands.cells]
+        cells = [cell for cell in placed if cell.name != commands.top]
         (work / "cells.v").write_text(
             "`timescale 1ns / 1ps\n" + "".join(_verilog_cell(c, True) for c in cells), "latin-1")
         (work / "cells_bb.v").write_text("".join(_verilog_cell(c, False) for c in cells),
                                          "latin-1")
-        self.vhdl_cells = [text for text in (_vhdl_cell(cell, configurations) for cell in cells)
-                           if text]
+        self.vhdl_cells = [text for text in (_vhdl_cell(cell, configurations) for cell in cells
+                                             if cell.name.lower() != commands.top.lower()) if text]
         components = "".join(text for text in map(_vhdl_component, cells)) if commands.suppressed else ""
         self.package = ("library ieee;\nuse ieee.std_logic_1164.all;\npackage Vcomponents is\n"
                         f"{components}end Vcomponents;\n")
         for name in commands.includes:
-            if re.match(r"[\w.]+$", name):
+            if re.match(r"[\w. ]+$", name):
                 (work / name).write_text("")
 
     def icarus(self, netlist: str, generation: str = "2005") -> Verdict:
@@ -305,6 +306,8 @@ class Judges:
             status, more = _run(["ghdl", "-e", *flags, self.commands.top], folder)
             text += more
         # What fails when the design is run is no mere warning.
+        # Several netlists of one design replace each other in the library; that is no fault of theirs.
+        text = "\n".join(line for line in text.splitlines() if "-Wlibrary" not in line)
         return _verdict(status or "-Wruntime-error" in text, text)
 
     def all(self, verilog: Sequence[str] = ("X.v",),

@@ -150,6 +150,7 @@ private:
                                                          {"sarif", Tool::CheckFormat::Sarif}}))
             ->type_name("text|json|sarif");
         command.add_flag("--list", check_.list, "List the rules");
+        command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
     }
 

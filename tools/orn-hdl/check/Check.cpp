@@ -181,6 +181,9 @@ bool Fails(const Located& located, const std::string& failOn) {
 } // namespace
 
 Status CheckFiles(const CheckOptions& options) {
+    if (options.markdown) {
+        return Print(Checking::ListRulesAsMarkdown());
+    }
     if (options.list) {
         return Print(Checking::ListRules());
     }

@@ -24,6 +24,8 @@ struct CheckOptions {
     CheckFormat format = CheckFormat::Text;
     /// Prints the rules in place of a check.
     bool list = false;
+    /// The same as a table of the documentation.
+    bool markdown = false;
     /// Prints one rule in place of a check.
     std::string explain;
 };

@@ -31,15 +31,23 @@ constexpr std::pair<Check::Verdict, string_view> Sayings[] = {
     {Check::Verdict::Misreads, "read otherwise than meant by "},
     {Check::Verdict::Warns, "warned of by "}};
 
-/// Who minds, what was noted, the other half of a clash, and what helps.
-std::vector<std::string> GetNotes(const Located& located) {
-    std::vector<std::string> notes;
+/// Who minds, and how.
+std::vector<std::string> GetSayings(const Check::Verdicts& verdicts) {
+    Check::Finding finding;
+    finding.verdicts = verdicts;
+    std::vector<std::string> sayings;
     for (const auto& [verdict, saying] : Sayings) {
-        const std::vector<Check::Target> targets = located.finding.GetTargets(verdict);
+        const std::vector<Check::Target> targets = finding.GetTargets(verdict);
         if (!targets.empty()) {
-            notes.push_back(std::string(saying) + Join(targets));
+            sayings.push_back(std::string(saying) + Join(targets));
         }
     }
+    return sayings;
+}
+
+/// Who minds, what was noted, the other half of a clash, and what helps.
+std::vector<std::string> GetNotes(const Located& located) {
+    std::vector<std::string> notes = GetSayings(located.finding.verdicts);
     notes.insert(notes.end(), located.finding.notes.begin(), located.finding.notes.end());
     if (located.otherLine != 0) {
         notes.push_back(located.file + ":" + std::to_string(located.otherLine) +
@@ -225,16 +233,26 @@ std::string ListRules() {
     return text;
 }
 
+std::string ListRulesAsMarkdown() {
+    std::string text = "| rule | what is written | what comes of it | what helps |\n"
+                       "| --- | --- | --- | --- |\n";
+    for (const Check::Rule& rule : Check::GetRules()) {
+        text.append("| `").append(rule.name).append("` | ").append(rule.what).append(" | ");
+        string_view separator = "";
+        for (const std::string& saying : GetSayings(rule.verdicts)) {
+            text.append(separator).append(saying);
+            separator = "; ";
+        }
+        text.append(" | ").append(rule.help).append(" |\n");
+    }
+    return text;
+}
+
 std::string Explain(const Check::Rule& rule) {
     std::string text(rule.name);
     text.append(": ").append(rule.what).append("\n\n").append(rule.why).append("\n");
-    for (const auto& [verdict, saying] : Sayings) {
-        Check::Finding finding;
-        finding.verdicts = rule.verdicts;
-        const std::vector<Check::Target> targets = finding.GetTargets(verdict);
-        if (!targets.empty()) {
-            text.append("\n").append(saying).append(Join(targets));
-        }
+    for (const std::string& saying : GetSayings(rule.verdicts)) {
+        text.append("\n").append(saying);
     }
     text.append("\n\nExample:\n");
     for (string_view rest = rule.example; !rest.empty();) {

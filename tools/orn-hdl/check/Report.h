@@ -13,6 +13,8 @@ namespace Tool::Checking {
 std::string Format(const std::vector<Located>& findings, CheckFormat format);
 /// A line a rule.
 std::string ListRules();
+/// The table of the documentation.
+std::string ListRulesAsMarkdown();
 /// All that the table says of one rule.
 std::string Explain(const Orn_Hdl::Check::Rule& rule);
 
