@@ -102,8 +102,11 @@ void ConnectPin(benchmark::State& state) {
 BENCHMARK(ConnectPin)->Unit(benchmark::kMillisecond);
 
 /// Instances without pins whose names were added in no order.
-void SortNaturally(benchmark::State& state) {
+void SortInstances(benchmark::State& state, const std::string& beginning) {
     Names names(static_cast<int>(state.range(0)));
+    for (std::string& name : names.instances) {
+        name.insert(0, beginning);
+    }
     std::shuffle(names.instances.begin(), names.instances.end(), std::mt19937(1));
     TimeOnFreshModels(
         state,
@@ -115,7 +118,17 @@ void SortNaturally(benchmark::State& state) {
         [](Model& model) { model.GetNetlist()->SortNetlist(); });
     state.SetItemsProcessed(state.iterations() * state.range(0));
 }
+
+void SortNaturally(benchmark::State& state) {
+    SortInstances(state, "");
+}
 BENCHMARK(SortNaturally)->Arg(1'000)->Arg(100'000)->Unit(benchmark::kMicrosecond);
+
+/// A key holds fewer characters than all names begin with.
+void SortLongNames(benchmark::State& state) {
+    SortInstances(state, "top_core_0_alu_stage_");
+}
+BENCHMARK(SortLongNames)->Arg(1'000)->Arg(100'000)->Unit(benchmark::kMicrosecond);
 
 } // namespace
 

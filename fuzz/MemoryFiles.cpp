@@ -48,6 +48,11 @@ int MemoryFiles::GetStatus(int /*descriptor*/, struct stat* status) {
     return 0;
 }
 
+int MemoryFiles::Truncate(int descriptor, off_t size) {
+    files_[open_.at(descriptor)].resize(static_cast<std::size_t>(size));
+    return 0;
+}
+
 int MemoryFiles::ChangeMode(int /*descriptor*/, unsigned /*mode*/) {
     return 0;
 }

@@ -25,6 +25,7 @@ public:
     ssize_t Write(int descriptor, const void* data, std::size_t size) override;
     int Close(int descriptor) override;
     int GetStatus(int descriptor, struct stat* status) override;
+    int Truncate(int descriptor, off_t size) override;
     int ChangeMode(int descriptor, unsigned mode) override;
     ssize_t ReadLink(const char* name, char* target, std::size_t size) override;
     int Rename(const char* from, const char* to) override;

@@ -4,14 +4,16 @@
 #include "Bytes.h"
 #include "Check.h"
 #include "Consistency.h"
-#include "ImportContext.h"
-#include "ImportNetlist.h"
-#include "ImportReader.h"
-#include "ImportSink.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Writes.h"
+#include "import/CommandSink.h"
+#include "import/DesignReader.h"
+#include "import/EmitNetlist.h"
+#include "import/ImportedNetlist.h"
+#include "import/ModelSink.h"
+#include "import/TopModule.h"
 
 #include <algorithm>
 #include <optional>
@@ -22,24 +24,24 @@ using Fuzz::Check;
 using namespace Orn_Hdl;
 namespace Import = Tool::Import;
 
-std::optional<Import::Bit> PickUnknownAs(Fuzz::Bytes& bytes) {
+Import::UnknownValues PickUnknownValues(Fuzz::Bytes& bytes) {
     switch (bytes.Choose(4)) {
     case 0:
-        return Import::Zero;
+        return Import::UnknownValues(Import::Zero);
     case 1:
-        return Import::One;
+        return Import::UnknownValues(Import::One);
     default:
-        return std::nullopt;
+        return Import::UnknownValues(std::nullopt);
     }
 }
 
-std::string WriteCommands(const Import::Netlist& netlist) {
+std::string WriteCommands(const Import::ImportedNetlist& netlist) {
     Fuzz::MemoryFiles files;
     Port::File file;
     Check(file.open("commands", Port::File::Overwrite, true), "the command file is open");
     Port::Stream stream(file);
     Import::CommandSink sink(stream);
-    netlist.Emit(sink);
+    Import::EmitNetlist(netlist, sink);
     Check(stream.flush() && file.close(), "the command file is written");
     return files.GetFiles().at("commands");
 }
@@ -52,11 +54,11 @@ void Replay(Model& model, std::string_view commands) {
     }
 }
 
-void CheckImport(const Import::Netlist& netlist) {
+void CheckImport(const Import::ImportedNetlist& netlist) {
     CommandFactory factory;
     Model direct(&factory);
     Import::ModelSink sink(direct);
-    netlist.Emit(sink);
+    Import::EmitNetlist(netlist, sink);
     Fuzz::CheckNetlist(*direct.GetNetlist());
     Fuzz::CheckNames(*direct.GetNetlist());
     Model replayed(&factory);
@@ -70,14 +72,14 @@ void CheckImport(const Import::Netlist& netlist) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     Fuzz::Bytes bytes(data, size);
-    const std::optional<Import::Bit> unknownAs = PickUnknownAs(bytes);
+    const Import::UnknownValues unknown = PickUnknownValues(bytes);
     const bool keepAttributes = bytes.Choose(2) == 0;
     try {
-        const std::unique_ptr<Import::Design> design =
+        const std::unique_ptr<Import::ImportedDesign> design =
             Import::ReadDesign(std::string(bytes.Rest()), keepAttributes);
         Import::Module& top = Import::FindTop(*design, "");
-        Import::Context context(top, unknownAs);
-        CheckImport(Import::Netlist(*design, top, context));
+        Import::Warnings warnings;
+        CheckImport(Import::MakeNetlist(*design, top, unknown, warnings));
     } catch (const Import::Error&) {
         // What is no netlist, or cannot be imported, is told.
     }

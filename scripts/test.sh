@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Sets everything up and passes the tests: the optimised build with every test, the real tools
-# included, then the unit tests and the random scripts again under the sanitizers.
+# Sets everything up and passes the tests: static checks, the optimised build with every test, the real
+# tools included, the unit tests and the random scripts again under the sanitizers, and the fuzzer.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
@@ -27,6 +27,11 @@ cmake --build --preset asan -j "$jobs"
 
 step "tests under AddressSanitizer and UndefinedBehaviorSanitizer"
 ctest --preset asan -j "$jobs" --exclude-regex '^(flow|install|docs|judges)\.'
+
+step "threads under ThreadSanitizer"
+cmake --preset tsan
+cmake --build --preset tsan -j "$jobs" --target orn_hdl_Threads_tests
+ctest --preset tsan --tests-regex '^unit\.Threads$'
 
 step "tests"
 ctest --preset release -j "$jobs"

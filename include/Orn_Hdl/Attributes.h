@@ -147,7 +147,8 @@ private:
     int value_ = 0;
 };
 
-/// A floating-point number that is written with as many decimals as its text had.
+/// A floating-point number that is written with as many decimals as its text had. A number that is
+/// too small for a double is a zero of its sign; one that is not finite is 0.0.
 class ORN_HDL_API AttributeFloat : public Attribute {
 public:
     /// Null texts are read as "".
@@ -289,7 +290,8 @@ public:
     /// The attribute of that name, normalised and letter case ignored; null when there is none.
     virtual Attribute* GetAttr(const char* name) const;
 
-    /// The attributes, in the order in which they were added.
+    /// The attributes, in the order in which they were added, those included that are added or
+    /// assigned while it walks. The holder must outlive it.
     Iterator<Attribute*> GetAttrIterator() const noexcept;
     /// Whether there are any.
     bool HasAttrs() const noexcept { return table_ != nullptr; }

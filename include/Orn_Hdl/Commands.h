@@ -5,11 +5,10 @@
 
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/Export.h"
+#include "Port/Pooled.h"
 
-#include <cstddef>
 #include <cstdint>
 #include <memory>
-#include <new>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -17,51 +16,54 @@ namespace Orn_Hdl {
 class Model;
 class PhraseTable;
 
-/// One command on one model: parsed from the words of a line, then executed.
-class ORN_HDL_API Command {
+/// One command on one model: it is created, parses the words of its line, and is executed. Programs
+/// derive from it to add commands of their own, see `CommandFactory::AddCommandCreator`.
+class ORN_HDL_API Command : public Port::Pooled<Port::Pool::Commands> {
 public:
-    /// \param model the model to act on; not owned, may be null.
-    explicit Command(Model* model) noexcept : model_(model) {}
+    /// Creates a command that has not been parsed.
+    /// \param model the model to act on; not owned, may be null. It must outlive the command, or be
+    ///        replaced by `SetModel`, where the command uses its model in its destructor.
+    explicit Command(Model* model) noexcept { SetModel(model); }
     Command(const Command&) = delete;
     Command& operator=(const Command&) = delete;
     virtual ~Command();
-    /// Reads the arguments from the words of the whole line, phrase included, by position.
-    /// \return false when they are missing or invalid.
+    /// Reads the arguments of the command.
+    /// \param tokens the words of the whole line, those of the phrase included; not kept.
+    /// \return false if arguments are missing or invalid.
     virtual bool Parse(const StringArray& tokens) = 0;
-    /// Applies the command to its model; throws `Exception` "Missing Model.\n" without one.
+    /// Applies the parsed command to its model.
+    /// \throws Exception "Missing Model.\n" if the model is null, and what the model's operation
+    ///         throws.
     virtual void Execute() = 0;
-    /// The phrase that selects the command, in its registered spelling.
+    /// The phrase that selects the command, in its registered spelling; valid as long as the
+    /// command.
     virtual const char* GetName() const = 0;
 
-    /// The model to act on.
-    Model* GetModel() const noexcept { return model_; }
-    /// Sets the model to act on; not owned.
-    void SetModel(Model* model) noexcept { model_ = model; }
-
-    /// Millions of done commands are kept: they come from pages of their own.
-    static void* operator new(std::size_t size);
-    /// Gives the memory back.
-    static void operator delete(void* memory) noexcept;
-    /// \{
-    /// For classes of larger alignment: as without these pages.
-    static void* operator new(std::size_t size, std::align_val_t alignment) {
-        return ::operator new(size, alignment);
+    /// The model to act on, null if there is none.
+    Model* GetModel() const noexcept {
+        return reinterpret_cast<Model*>(modelAndMark_ & ~OwnedMark);
     }
-    static void operator delete(void* memory, std::align_val_t alignment) noexcept {
-        ::operator delete(memory, alignment);
+    /// Sets the model to act on; not owned, may be null.
+    void SetModel(Model* model) noexcept {
+        modelAndMark_ = reinterpret_cast<std::uintptr_t>(model) | (modelAndMark_ & OwnedMark);
     }
-    /// \}
-    /// \{
-    /// In place: takes and gives back nothing.
-    static void* operator new(std::size_t, void* place) noexcept { return place; }
-    static void operator delete(void*, void*) noexcept {}
-    /// \}
 
 private:
-    Model* model_;
+    friend class CommandManager;
+
+    static constexpr std::uintptr_t OwnedMark = 1;
+
+    /// Whether a manager runs or keeps the command, and so owns it.
+    bool IsOwned() const noexcept { return (modelAndMark_ & OwnedMark) != 0; }
+    void MarkOwned() noexcept { modelAndMark_ |= OwnedMark; }
+
+    /// The model's address, whose lowest bit is free for the mark: a command is kept by the million
+    /// and has no byte to spare.
+    std::uintptr_t modelAndMark_ = 0;
 };
 
-/// Makes an unparsed command bound to a model; the caller owns it.
+/// Creates a command for a model, which may be null. The words of its line are given for a creator
+/// that chooses by them; parsing is a step of its own. The caller owns the command.
 using CommandCreator = Command* (*)(Model* model, const StringArray& tokens);
 
 /// What a user needs to know of one phrase of the command language.
@@ -74,54 +76,76 @@ struct CommandInfo {
     const char* help;
 };
 
-/// Finds commands by their phrase. An engine has one factory; a program can register phrases of its
-/// own in it. Copies share one table.
+/// Finds commands by their phrase, in any letter case. An engine has one factory, in which a
+/// program can register phrases of its own. Copies of a factory share one table of phrases.
 class ORN_HDL_API CommandFactory {
 public:
     /// Registers every phrase of the command language.
     CommandFactory();
+    /// Shares the other factory's table: what is registered in either is found in both.
     CommandFactory(const CommandFactory& other);
+    /// Gives up the own table and shares the other factory's.
     CommandFactory& operator=(const CommandFactory& other);
     ~CommandFactory();
 
-    /// Registers a phrase; its words are separated by blanks. A phrase that is present gets the new
-    /// creator.
+    /// Registers a phrase, or gives a registered phrase another creator.
+    /// \param phrase words separated by blanks; quotes are characters like others.
+    /// \param creator makes the commands of the phrase.
     void AddCommandCreator(const char* phrase, CommandCreator creator);
+    /// Registers the phrase that the words make when they are joined by one blank, or gives it
+    /// another creator if it is registered.
     void AddCommandCreator(const StringArray& words, CommandCreator creator);
-    /// The creator of the longest registered phrase that the line begins with, letter case ignored;
-    /// null when there is none.
+    /// Looks up the longest registered phrase that the words of a line begin with.
+    /// \return its creator; null if there is none.
     CommandCreator GetCommandCreator(const StringArray& tokens) const;
+    /// Splits a line and looks up the longest registered phrase that it begins with.
+    /// \return its creator; null if there is none, or if the text is null.
     CommandCreator GetCommandCreator(const char* text) const;
-    /// A new command of that phrase, not parsed yet; the caller owns it. Null when there is none.
+    /// Creates the command of a line that has been split, without parsing it.
+    /// \param model the command's model; may be null.
+    /// \return the command, which the caller owns; null if no phrase matches.
     Command* CreateCommand(Model* model, const StringArray& tokens) const;
+    /// Splits a line and creates its command, without parsing it.
+    /// \param model the command's model; may be null.
+    /// \return the command, which the caller owns; null if no phrase matches, or if the text is
+    ///         null.
     Command* CreateCommand(Model* model, const char* text) const;
-    /// A new model bound to this factory, which must outlive it; the caller owns it.
+    /// Creates a model whose commands this factory makes; the factory must outlive it.
+    /// \return the model, which the caller owns.
     Model* CreateModel();
 
-    /// The command language, in the order of registration.
+    /// The phrases of the command language, in the order of registration; without those that
+    /// programs register. Valid until the program ends.
     static const std::vector<CommandInfo>& GetCatalogue();
 
 private:
     std::shared_ptr<PhraseTable> phrases_;
 };
 
-/// Runs commands and keeps the done ones, which it owns.
+/// Runs commands and keeps those that succeeded, which it owns. A command may run further commands
+/// with its manager, and may destroy its manager or its model: the command is then deleted when it
+/// has been executed, and what the manager kept before with the manager.
 class ORN_HDL_API CommandManager {
 public:
     CommandManager();
     CommandManager(const CommandManager&) = delete;
     CommandManager& operator=(const CommandManager&) = delete;
+    /// Deletes every done command, the first one first. A command that runs others in its
+    /// destructor may do so, but they are not kept.
     ~CommandManager();
 
     /// Creates, parses, executes and keeps the command of a line.
+    /// \param tokens the words of the line.
+    /// \param model the model to act on; not owned, may be null. A command that destroys it has a
+    ///        null model afterwards.
+    /// \param factory makes the command; not owned, may be null.
     /// \return true.
-    /// \throws Exception "Command not find.\n" when no phrase matches or `factory` is null,
-    ///         "PHRASE: Invalid Arguments.\n" when the arguments do not parse, or whatever the
+    /// \throws Exception "Command not find.\n" if no phrase matches or `factory` is null,
+    ///         "PHRASE: Invalid Arguments.\n" if the arguments do not parse, or whatever the
     ///         command throws; the command is then deleted.
     bool CreateAndExecute(const StringArray& tokens, Model* model, CommandFactory* factory);
-    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is a
-    /// command that is kept already or that this manager is carrying out: it is kept when it is
-    /// done.
+    /// Keeps a command and takes ownership of it, also if allocation fails. Null is ignored, and so
+    /// is a command that this or another manager keeps, or is carrying out and will keep.
     void AddDoneCommand(Command* command);
     /// How many done commands are kept.
     int GetDoneCommandCount() const noexcept;
@@ -129,7 +153,12 @@ public:
     void Clear();
 
 private:
+    friend class Model;
     struct Implementation;
+
+    /// Deletes every done command; what is done from now on is not kept.
+    void End() noexcept;
+
     std::unique_ptr<Implementation> implementation_;
 };
 

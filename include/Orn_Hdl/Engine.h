@@ -41,7 +41,8 @@ public:
     Engine();
     Engine(const Engine&) = delete;
     Engine& operator=(const Engine&) = delete;
-    /// Deletes every model, the last one first. None of them may be carrying out a command.
+    /// Deletes every model, the last one first. A command of a model may destroy the engine; see
+    /// `Model::~Model`.
     ~Engine();
 
     /// Makes a model; it does not become the current one.

@@ -13,9 +13,13 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
-#include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <string_view>
+
+namespace Port {
+class Folder;
+}
 
 namespace Orn_Hdl {
 
@@ -31,10 +35,16 @@ public:
     OutputGuard(const OutputGuard&) = delete;
     OutputGuard& operator=(const OutputGuard&) = delete;
     virtual ~OutputGuard();
-    /// Asked before a file is opened.
+    /// Asked before a file is opened. It may destroy the model that asks; nothing is written then.
     /// \param fileName the file, as the command names it; never null.
     /// \return an empty text when the file may be written, otherwise why it may not.
     virtual Port::StringBase<char> WhyNot(const char* fileName) = 0;
+    /// Asked after `WhyNot` has allowed a file: below which folder the file is opened. Unless this
+    /// is overridden, that is wherever the file's name leads at that moment.
+    /// \param path receives the file's path below the folder, free of links and "..": no link is
+    ///        followed (`Port::File::OpenBelow`).
+    /// \return the folder, not owned, which must stay open during the call; or null.
+    virtual const Port::Folder* GetFolder(const char* fileName, Port::StringBase<char>& path);
 };
 
 /// One design: its netlist, its output options and its done commands.
@@ -49,80 +59,90 @@ public:
 /// bit of the bus D, A,D(3:0) a compound. Brackets "[]", "{}", "<>" and "()" are one and the same.
 class ORN_HDL_API Model {
 public:
+    /// A piece of work on a model; defined and used by the library alone.
+    class Use;
+
     /// \param factory makes the commands; not owned, must outlive the model. Null: no command is
     ///        ever found.
     explicit Model(CommandFactory* factory);
     Model(const Model&) = delete;
     Model& operator=(const Model&) = delete;
+    /// Deletes the done commands, the first one first, then the design. A command of the model may
+    /// destroy it: the command is then deleted when it is through, and no further line of a command
+    /// file is read.
     ~Model();
 
     /// Whether the design has changed since the flag was cleared.
     bool IsModified() const noexcept;
-    /// Sets or clears the flag.
+    /// Sets or clears the modified flag.
     void SetModifiedFlag(bool modified) noexcept;
 
-    /// \{
-    /// What the model owns; never null.
+    /// The netlist, owned by the model; never null.
     Netlist* GetNetlist() noexcept;
+    /// The netlist of a model that is not to be changed, owned by the model; never null.
     const Netlist* GetNetlist() const noexcept;
+    /// The output options, owned by the model; never null.
     HdlOptions* GetOptions() noexcept;
-    /// \}
-    /// The factory that was given, which the model does not own.
+    /// The factory that the constructor was given, which the model does not own; null without one.
     CommandFactory* GetCommandFactory() const noexcept;
-    /// The done commands, owned by the model.
+    /// The done commands, owned by the model; never null.
     CommandManager* GetCommandManager() noexcept;
 
-    /// The netlist's name.
+    /// The netlist's name, which is the model's.
     Port::StringBase<char> GetName() const;
-    /// Null gives "HDL_NETLIST".
+    /// Renames the netlist; null gives "HDL_NETLIST".
     void SetName(const char* name);
-    /// \{
-    /// The file from which the design comes.
+    /// The file from which the design comes; empty when it is not known.
     Port::StringBase<char> GetSourceFileName() const;
+    /// Remembers from which file the design comes; null is read as "".
     void SetSourceFileName(const char* name);
-    /// \}
 
-    /// Splits a command line and runs it. An empty line does nothing.
+    /// Splits a command line and executes it. An empty line, and null, do nothing.
     /// \return true whenever no exception is thrown.
     bool Execute(const char* text);
-    /// As above, for a text of known length that ends at its first NUL.
+    /// Splits a line of known length, which ends at its first NUL, and executes it.
+    /// \return true whenever no exception is thrown.
     bool ExecuteLine(std::string_view line);
-    /// As above, for a line that has been split.
+    /// Executes a line that has been split into words.
+    /// \return true whenever no exception is thrown.
     bool Execute(const StringArray& tokens);
-    /// Hints that a line, split, will be executed `ForeseenLines` lines later, so that in a large
-    /// design what it names is fetched in the meantime. Changes nothing.
-    void Foresee(const StringArray& words) noexcept;
-    /// How many lines `Foresee` looks ahead.
-    static constexpr std::size_t ForeseenLines = 16;
-    /// Replays a command file and clears the modified flag. An exception of a line ends the replay.
-    /// \return false when the file cannot be opened or read.
+    /// Executes the lines of a command file and clears the modified flag. When a line throws, the
+    /// lines before it stay done.
+    /// \return false when the file cannot be opened or read; otherwise true, since no line fails
+    ///         without an exception.
     bool Read(const char* fileName);
     /// Clears the modified flag and returns true; done commands are kept in memory only.
     bool Write(const char* fileName);
 
-    /// \{
-    /// Who is asked before a write command opens its file. What it refuses fails the command, which
-    /// then changes nothing. Not owned; null, as at first, when every file may be written.
+    /// Sets who is asked before a write command opens its file. What it refuses fails the command,
+    /// which then changes nothing.
+    /// \param guard not owned; null, as at first, when every file may be written.
     void SetOutputGuard(OutputGuard* guard) noexcept;
+    /// Who is asked before a write command opens its file; null for nobody.
     OutputGuard* GetOutputGuard() const noexcept;
-    /// \}
-    /// What became of the last netlist that a write command wrote: the file's name and the system's
-    /// error number, 0 when every byte was written.
-    void RecordWrite(const char* fileName, int error);
-    /// The error number of the last write.
+    /// Remembers what became of the last netlist that a write command wrote.
+    /// \param error the system's error number; 0 when every byte was written.
+    /// \param leftover how many bytes stand at the end of a file although appending has failed.
+    void RecordWrite(const char* fileName, int error, std::uint64_t leftover = 0);
+    /// The error number of the last write; 0 when it succeeded, and before the first.
     int GetWriteError() const noexcept;
-    /// The file name of the last write.
+    /// How many bytes of the last write stand at the end of the file although appending has failed.
+    std::uint64_t GetWriteLeftover() const noexcept;
+    /// The file name of the last write; empty before the first.
     Port::StringBase<char> GetWrittenFileName() const;
 
-    /// \{
-    /// The object of that name, which the design owns; null when there is none, or no owner.
+    /// The component of that name, owned by the netlist; null when there is none.
     Component* GetComponent(const char* name) const;
+    /// The instance of that name, owned by the netlist; null when there is none.
     Instance* GetInstance(const char* name) const;
+    /// The signal of that name, owned by the netlist; null when there is none.
     Signal* GetSignal(const char* name) const;
+    /// The pin of that name, owned by the component; null when there is none, or no component.
     Pin* GetPin(const char* name, const Component* component) const;
+    /// The pin of that name, owned by the instance; null when there is none, or no instance.
     Pin* GetPin(const char* name, const Instance* instance) const;
+    /// The attribute of that name, owned by the holder; null when there is none, or no holder.
     Attribute* GetAttr(const char* name, const AttributeHolder* holder) const;
-    /// \}
 
     /// Declares a component without pins. Components, instances and signals share one name space.
     /// \throws Exception "Identifier ... already defined.\n" when the name is taken.
@@ -140,135 +160,210 @@ public:
     /// \throws Exception "Identifier ... already defined.\n", or, for a bus whose base name another
     ///         bus has, "Signal ... already declared.\n".
     bool AddSignal(const char* name);
-    /// Wires a pin to a signal, which is declared as by `AddSignal` when it is not there.
+    /// Connects a pin to a signal, which is declared on its first use.
     /// \throws Exception "Signal ... not found.\n" for an instance that is not there, and for a bit
     ///         of a bus that is not there; "Pin ... not found.\n".
     bool ConnectSignalToPin(const char* signal, const char* instance, const char* pin);
-    /// Makes the second signal an alias of the first; both are declared likewise.
+    /// Makes the second signal an alias of the first; both are declared on their first use.
     /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
     bool ConnectSignals(const char* first, const char* second);
-    /// Ties a signal to a constant; it is declared likewise.
+    /// Ties a signal to a constant; the signal is declared on its first use.
     /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
     /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
     bool AssignConstantToSignal(const char* signal, const char* value);
-    /// Wires a pin to a signal of its own that carries the constant.
+    /// Connects a pin to a signal of its own that carries the constant.
+    /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
     /// \throws Exception "Signal ... not found.\n" for an instance that is not there, "Pin ... not
     ///         found.\n".
     bool AssignConstantToPin(const char* instance, const char* pin, const char* value);
 
-    /// Adds an attribute, or gives one that is present another value, its type kept.
+    /// Adds an attribute to a holder, which owns it, or gives one that is present another value,
+    /// its type kept.
     /// \param type one of the seven type names; null means "String".
     /// \return false for a null holder, else true.
     /// \throws Exception "Invalid attribute type.\n".
     bool AddAttr(AttributeHolder* holder, const char* name, const char* value, const char* type);
-    /// \{
-    /// The same on an object by its name. What is not there throws "... not found.\n", a null
-    /// attribute name "Invalid Name.\n".
+    /// Adds an attribute to the module, as `AddAttr` does.
+    /// \throws Exception "Invalid Name.\n" for a null name, "Invalid attribute type.\n".
     bool AddModuleAttr(const char* name, const char* value, const char* type);
+    /// Adds an attribute to a component, as `AddAttr` does.
+    /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
+    ///         type.\n".
     bool AddComponentAttr(const char* component, const char* name, const char* value,
                           const char* type);
+    /// Adds an attribute to an instance, as `AddAttr` does.
+    /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
+    ///         type.\n".
     bool AddInstanceAttr(const char* instance, const char* name, const char* value,
                          const char* type);
+    /// Adds an attribute to a signal, as `AddAttr` does.
+    /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
+    ///         type.\n".
     bool AddSignalAttr(const char* signal, const char* name, const char* value, const char* type);
+    /// Adds an attribute to a pin of a component, as `AddAttr` does.
+    /// \throws Exception "Pin ... not found.\n", "Invalid Name.\n" for a null name, "Invalid
+    ///         attribute type.\n".
     bool AddComponentPinAttr(const char* component, const char* pin, const char* name,
                              const char* value, const char* type);
+    /// Adds an attribute to a pin of an instance, as `AddAttr` does.
+    /// \throws Exception "Pin ... not found.\n", "Invalid Name.\n" for a null name, "Invalid
+    ///         attribute type.\n".
     bool AddInstancePinAttr(const char* instance, const char* pin, const char* name,
                             const char* value, const char* type);
-    /// \}
 
-    /// \{
-    /// Operations on one attribute of a holder: its value; its generic option "NONE", "SYN" or
-    /// "NOSYN"; its synthesis option "NONE", "ASSIGN" or "ASSIGNNODEC"; the name of its type when
-    /// that is User.
+    /// Sets the value of a holder's attribute; null is read as "".
     /// \return false, nothing done, for a null holder, else true.
-    /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n" for any other
-    ///         option, "Invalid attribute type.\n" for a type name on an attribute that is not
-    ///         User.
+    /// \throws Exception "Attribute ... not found.\n".
     bool SetAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    /// Sets the generic option of a holder's attribute.
+    /// \param value "NONE", "SYN" or "NOSYN", letter case ignored.
+    /// \return false, nothing done, for a null holder, else true.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
     bool SetGenericAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    /// Sets the synthesis option of a holder's attribute.
+    /// \param value "NONE", "ASSIGN" or "ASSIGNNODEC", letter case ignored.
+    /// \return false, nothing done, for a null holder, else true.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
     bool SetSynAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
-    bool SetUserType(AttributeHolder* holder, const char* attribute, const char* value);
-    /// \}
+    /// Names the type of a holder's attribute, which has to be an `AttributeUser`.
+    /// \return false, nothing done, for a null holder, else true.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid attribute type.\n".
+    bool SetUserType(AttributeHolder* holder, const char* attribute, const char* type);
 
-    /// \{
-    /// The same by the object's name; an instance's attribute is looked for on its component too.
-    /// What is not there throws "... not found.\n".
+    /// Sets the value of an attribute of the module, as `SetAttrValue` does.
+    /// \throws Exception "Attribute ... not found.\n".
     bool SetModuleAttrValue(const char* attribute, const char* value);
+    /// Sets the value of an attribute of a component, as `SetAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
     bool SetComponentAttrValue(const char* component, const char* attribute, const char* value);
+    /// Sets the value of an attribute of an instance, or of its component, as `SetAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
     bool SetInstanceAttrValue(const char* instance, const char* attribute, const char* value);
+    /// Sets the value of an attribute of a signal, as `SetAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
     bool SetSignalAttrValue(const char* signal, const char* attribute, const char* value);
+    /// Sets the value of an attribute of a pin of a component, as `SetAttrValue` does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n".
     bool SetComponentPinAttrValue(const char* component, const char* pin, const char* attribute,
                                   const char* value);
+    /// Sets the value of an attribute of a pin of an instance, as `SetAttrValue` does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n".
     bool SetInstancePinAttrValue(const char* instance, const char* pin, const char* attribute,
                                  const char* value);
 
+    /// Sets the generic option of an attribute of the module, as `SetGenericAttrValue` does.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
     bool SetModuleGenericAttrValue(const char* attribute, const char* value);
+    /// Sets the generic option of an attribute of a component, as `SetGenericAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetComponentGenericAttrValue(const char* component, const char* attribute,
                                       const char* value);
+    /// Sets the generic option of an attribute of an instance, or of its component, as
+    /// `SetGenericAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetInstanceGenericAttrValue(const char* instance, const char* attribute,
                                      const char* value);
+    /// Sets the generic option of an attribute of a signal, as `SetGenericAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetSignalGenericAttrValue(const char* signal, const char* attribute, const char* value);
+    /// Sets the generic option of an attribute of a pin of a component, as `SetGenericAttrValue`
+    /// does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetComponentPinGenericAttrValue(const char* component, const char* pin,
                                          const char* attribute, const char* value);
+    /// Sets the generic option of an attribute of a pin of an instance, as `SetGenericAttrValue`
+    /// does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetInstancePinGenericAttrValue(const char* instance, const char* pin,
                                         const char* attribute, const char* value);
 
+    /// Sets the synthesis option of an attribute of the module, as `SetSynAttrValue` does.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
     bool SetModuleSynAttrValue(const char* attribute, const char* value);
+    /// Sets the synthesis option of an attribute of a component, as `SetSynAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetComponentSynAttrValue(const char* component, const char* attribute, const char* value);
+    /// Sets the synthesis option of an attribute of an instance, or of its component, as
+    /// `SetSynAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetInstanceSynAttrValue(const char* instance, const char* attribute, const char* value);
+    /// Sets the synthesis option of an attribute of a signal, as `SetSynAttrValue` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetSignalSynAttrValue(const char* signal, const char* attribute, const char* value);
+    /// Sets the synthesis option of an attribute of a pin of a component, as `SetSynAttrValue`
+    /// does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetComponentPinSynAttrValue(const char* component, const char* pin, const char* attribute,
                                      const char* value);
+    /// Sets the synthesis option of an attribute of a pin of an instance, as `SetSynAttrValue`
+    /// does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
+    ///         value.\n".
     bool SetInstancePinSynAttrValue(const char* instance, const char* pin, const char* attribute,
                                     const char* value);
 
+    /// Names the type of an attribute of the module, as `SetUserType` does.
+    /// \throws Exception "Attribute ... not found.\n", "Invalid attribute type.\n".
     bool SetModuleUserType(const char* attribute, const char* type);
+    /// Names the type of an attribute of a component, as `SetUserType` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
+    ///         type.\n".
     bool SetComponentUserType(const char* component, const char* attribute, const char* type);
+    /// Names the type of an attribute of an instance, or of its component, as `SetUserType` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
+    ///         type.\n".
     bool SetInstanceUserType(const char* instance, const char* attribute, const char* type);
+    /// Names the type of an attribute of a signal, as `SetUserType` does.
+    /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
+    ///         type.\n".
     bool SetSignalUserType(const char* signal, const char* attribute, const char* type);
+    /// Names the type of an attribute of a pin of a component, as `SetUserType` does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid attribute
+    ///         type.\n".
     bool SetComponentPinUserType(const char* component, const char* pin, const char* attribute,
                                  const char* type);
+    /// Names the type of an attribute of a pin of an instance, as `SetUserType` does.
+    /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid attribute
+    ///         type.\n".
     bool SetInstancePinUserType(const char* instance, const char* pin, const char* attribute,
                                 const char* type);
-    /// \}
 
     /// Adds a line to the module's comment; null adds nothing.
     bool AddNotes(const char* text);
-    /// \{
-    /// The same to the comment of an object by its name; what is not there throws "... not
-    /// found.\n".
+    /// Adds a line to the comment of a component; null is read as "".
+    /// \throws Exception "... not found.\n".
     bool AddComponentComment(const char* component, const char* text);
+    /// Adds a line to the comment of an instance; null is read as "".
+    /// \throws Exception "... not found.\n".
     bool AddInstanceComment(const char* instance, const char* text);
+    /// Adds a line to the comment of a signal; null is read as "".
+    /// \throws Exception "... not found.\n".
     bool AddSignalComment(const char* signal, const char* text);
+    /// Adds a line to the comment of a pin of a component; null adds nothing.
+    /// \throws Exception "Pin ... not found.\n".
     bool AddComponentPinComment(const char* component, const char* pin, const char* text);
+    /// Adds a line to the comment of a pin of an instance; null adds nothing.
+    /// \throws Exception "Pin ... not found.\n".
     bool AddInstancePinComment(const char* instance, const char* pin, const char* text);
-    /// \}
 
 private:
-    friend class CommandManager;
     friend class Engine;
     struct Implementation;
-    class Use;
 
-    /// Deletes a model, or, while there is a `Use` of it, leaves that to the last one. Null is
+    /// Deletes a model, or, while there is a `Use` of it, leaves that to the last `Use`. Null is
     /// ignored.
     static void Delete(std::unique_ptr<Model> model) noexcept;
 
     bool IsNamedUsed(const char* name) const;
-    Component* FindComponent(const char* name) const;
-    Instance* FindInstance(const char* name) const;
-    Signal* FindSignal(const char* name) const;
-    Pin* FindComponentPin(const char* component, const char* pin) const;
-    Pin* FindInstancePin(const char* instance, const char* pin) const;
-    Attribute* FindAttr(const char* name, const AttributeHolder* holder) const;
-    Attribute* FindInstanceAttr(const char* instance, const char* attribute) const;
-    Attribute* GetInstanceOrComponentAttr(const char* name, const Instance* instance) const;
-
-    bool SetAttrValue(Attribute* attribute, const char* value);
-    bool SetGenericAttrValue(Attribute* attribute, const char* value);
-    bool SetSynAttrValue(Attribute* attribute, const char* value);
-    bool SetUserType(Attribute* attribute, const char* type);
-    bool AddComment(Object& object, const char* text);
 
     /// These change the netlist without setting the modified flag: the operation that calls them
     /// may fail yet.
@@ -284,8 +379,8 @@ private:
     bool AssignConstant(Pin* pin, const char* value, const char* instance);
 
     std::unique_ptr<Implementation> implementation_;
-    /// How many uses there are, and whether the last one deletes the model.
-    unsigned uses_ = 0;
+    /// The innermost use, and whether the last one deletes the model.
+    Use* innermostUse_ = nullptr;
     bool endsUnused_ = false;
 };
 

@@ -3,6 +3,8 @@
 /// consulted, so the same input gives the same output on every machine.
 #pragma once
 
+#include "Port/TextView.h"
+
 #include <cstddef>
 #include <string_view>
 
@@ -28,8 +30,10 @@ constexpr char ToLower(char c) noexcept {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
 }
 
-/// True when both texts are equal but for the case of ASCII letters.
-constexpr bool EqualIgnoringCase(std::string_view a, std::string_view b) noexcept {
+/// Whether two texts are equal but for the case of ASCII letters; null is read as "".
+constexpr bool EqualIgnoringCase(TextView textA, TextView textB) noexcept {
+    const std::string_view a = textA;
+    const std::string_view b = textB;
     if (a.size() != b.size()) {
         return false;
     }
@@ -41,9 +45,13 @@ constexpr bool EqualIgnoringCase(std::string_view a, std::string_view b) noexcep
     return true;
 }
 
-/// Below, at or above zero as one text sorts before, with or after another, the case of ASCII
-/// letters ignored and bytes taken as unsigned.
-constexpr int OrderIgnoringCase(std::string_view a, std::string_view b) noexcept {
+/// Compares two texts as `memcmp` does, but for the case of ASCII letters; null is read as "".
+/// \return a number below, at or above zero as the first text sorts before, with or after the
+/// other,
+///         bytes taken as unsigned.
+constexpr int OrderIgnoringCase(TextView textA, TextView textB) noexcept {
+    const std::string_view a = textA;
+    const std::string_view b = textB;
     for (std::size_t i = 0; i < a.size() && i < b.size(); ++i) {
         const auto x = static_cast<unsigned char>(ToUpper(a[i]));
         const auto y = static_cast<unsigned char>(ToUpper(b[i]));
@@ -52,11 +60,6 @@ constexpr int OrderIgnoringCase(std::string_view a, std::string_view b) noexcept
         }
     }
     return a.size() == b.size() ? 0 : (a.size() < b.size() ? -1 : 1);
-}
-
-/// The text of a possibly null pointer: null reads as the empty text.
-constexpr std::string_view ViewOf(const char* text) noexcept {
-    return text == nullptr ? std::string_view() : std::string_view(text);
 }
 
 } // namespace Port

@@ -12,26 +12,30 @@ namespace Port {
 /// Carries the module, source unit, revision and line that raised it, and a description.
 class ORN_HDL_API Exception : public std::exception {
 public:
-    /// Null texts are read as "".
+    /// An exception without a description. The texts are copied; null is read as "".
     Exception(const char* module, const char* sourceUnit, const char* revision, int line);
+    /// A copy that stands alone.
     Exception(const Exception&);
+    /// Takes over place and description.
     Exception& operator=(const Exception&);
+    /// Ends the texts that the exception gave without a copy.
     ~Exception() override;
 
-    /// Sets what happened; null is read as "".
+    /// Sets what happened. The text is copied; null is read as "".
     void setDescription(const char* description);
-    /// The description alone, as it was set.
+    /// The description alone, as it was set, valid as long as the exception is.
     const String& getLocalized() const noexcept { return description_; }
     /// One text with the place and the description.
     String report() const;
 
-    /// \{
-    /// Where it was raised.
+    /// The module that raised it, valid as long as the exception is.
     const String& GetModule() const noexcept { return module_; }
+    /// The source unit that raised it, valid as long as the exception is.
     const String& GetSourceUnit() const noexcept { return sourceUnit_; }
+    /// The revision of that source unit, valid as long as the exception is.
     const String& GetRevision() const noexcept { return revision_; }
+    /// The line that raised it.
     int GetLine() const noexcept { return line_; }
-    /// \}
 
     /// The description, valid as long as the exception is.
     const char* what() const noexcept override { return description_.CStr(); }

@@ -5,10 +5,12 @@
 
 #include "Port/Export.h"
 #include "Port/Range.h"
+#include "Port/TextView.h"
 
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #include <utility>
 
 namespace Port {
@@ -16,10 +18,21 @@ namespace Port {
 class File;
 
 /// An owned text of bytes. Indices count from 0; a search that finds nothing gives -1.
+///
+/// It is compared with, extended by and joined to whatever a `TextView` is made from, and extended
+/// by and joined to single characters.
 template <class Char> class ORN_HDL_API StringBase {
+    template <class Text>
+    static constexpr bool IsText = std::is_convertible_v<const Text&, BasicTextView<Char>>;
+    /// What may stand before a string as well as behind it.
+    template <class Text>
+    static constexpr bool IsOtherText = IsText<Text> && !std::is_same_v<Text, StringBase>;
+
 public:
     /// A piece of such a text that someone else owns.
     using View = std::basic_string_view<Char>;
+    /// A parameter that takes any kind of text; null is read as "".
+    using TextView = BasicTextView<Char>;
 
     /// How letters compare.
     enum CompareType { CompareExact, CompareIgnoringCase };
@@ -28,33 +41,33 @@ public:
     /// What becomes of empty tokens.
     enum ParseType { KeepEmptyTokens = 0, SkipEmptyTokens = 1 };
 
+    /// The empty text.
     StringBase() = default;
-    /// A null pointer gives the empty text.
-    StringBase(const Char* text) : text_(text == nullptr ? View() : View(text)) {}
+    /// A copy of a text that ends in NUL; a null pointer gives the empty text.
+    StringBase(const Char* text) : text_(TextView(text).GetView()) {}
     /// A copy of a text.
     StringBase(View text) : text_(text) {}
     /// Takes over a text.
     StringBase(std::basic_string<Char> text) : text_(std::move(text)) {}
 
-    /// \{
-    /// Appends a text or a character; a null text appends nothing.
-    StringBase& operator+=(View text) {
-        text_ += text;
+    /// Appends a text, which may be this one or a piece of it; null appends nothing.
+    StringBase& operator+=(TextView text) {
+        text_ += text.GetView();
         return *this;
     }
-    StringBase& operator+=(const Char* text) { return *this += StringBase(text).GetView(); }
-    StringBase& operator+=(const StringBase& text) { return *this += text.GetView(); }
+    /// Appends a character.
     StringBase& operator+=(Char c) {
         text_ += c;
         return *this;
     }
-    /// \}
+    /// A number is no text: `+= 65` would append "A".
+    template <class Number, std::enable_if_t<std::is_arithmetic_v<Number>, int> = 0>
+    StringBase& operator+=(Number) = delete;
 
-    /// \{
     /// The text without a copy, valid until the string changes or ends.
     View GetView() const noexcept { return text_; }
+    /// The text without a copy, valid until the string changes or ends.
     operator View() const noexcept { return text_; }
-    /// \}
     /// The text with a closing NUL, valid until the string changes or ends.
     const Char* CStr() const noexcept { return text_.c_str(); }
     /// The number of characters.
@@ -68,37 +81,47 @@ public:
     /// Makes the text empty.
     void Empty() noexcept { text_.clear(); }
 
-    /// Below, at or above zero as this text sorts before, with or after `other` (bytes unsigned).
-    int Compare(View other, CompareType type = CompareExact) const noexcept;
-    /// The index of the first `c`.
+    /// Compares with another text, bytes taken as unsigned; null is read as "".
+    /// \return a number below, at or above zero as this text sorts before, with or after `other`.
+    int Compare(TextView other, CompareType type = CompareExact) const noexcept;
+    /// The index of the first `c`; -1 when there is none.
     int GetIndexOfFirstChar(Char c) const noexcept;
-    /// The index of the last `c`.
+    /// The index of the last `c`; -1 when there is none.
     int GetIndexOfLastChar(Char c) const noexcept;
-    /// The index of the first occurrence of a text.
-    int GetIndexOfString(View text) const noexcept;
+    /// The index of the first occurrence of a text, -1 when there is none. The empty text, as which
+    /// null is read, occurs at index 0.
+    int GetIndexOfString(TextView text) const noexcept;
 
     /// The piece that `range` names, cut to what the text has.
     StringBase Extract(const Port_Range& range) const;
-    /// Takes the piece that `range` names out of the text.
+    /// Takes the piece that `range` names, cut to what the text has, out of the text.
     void Remove(const Port_Range& range);
 
-    /// \{
-    /// Turns the letters of ASCII into upper or lower case.
+    /// Turns the letters of ASCII into upper case.
     void MakeUpper() noexcept;
+    /// Turns the letters of ASCII into lower case.
     void MakeLower() noexcept;
-    /// \}
     /// Takes every `c` off the chosen ends.
     void Trim(Char c, TrimType type = TrimBoth);
-    /// Replaces each character that occurs in `from` by `to`.
-    void ReplaceChars(View from, Char to) noexcept;
+    /// Replaces each character that occurs in `from` by `to`; null is read as "".
+    void ReplaceChars(TextView from, Char to) noexcept;
 
-    /// Steps to the next token after `range`.
-    /// \param range the present token, `Port_Range()` before the first; receives the next one.
-    /// \param separators the single characters that separate tokens.
+    /// Steps to the next token.
+    /// \param range the present token, `Port_Range()` or `Port_Range(1, 0)` before the first one;
+    ///        receives the next one, and is untouched when there is none.
+    /// \param separators the single characters that separate tokens; null for none.
     /// \return false when there is no further token.
-    bool NextTokenRange(Port_Range& range, const Char* separators, ParseType type) const;
+    bool NextTokenRange(Port_Range& range, TextView separators, ParseType type) const;
+    /// Steps to the next token, as the overload with a `ParseType` does.
+    /// \param type 0 keeps empty tokens, 1 skips them; with any other number there is no token.
+    bool NextTokenRange(Port_Range& range, TextView separators, int type) const;
+    /// An enumerator of another enumeration says nothing of empty tokens.
+    template <class Other, std::enable_if_t<std::is_enum_v<Other>, int> = 0>
+    bool NextTokenRange(Port_Range& range, TextView separators, Other type) const = delete;
 
     /// Finds the leftmost, longest match of `pattern`.
+    /// \param range receives the place of the match; untouched when there is none.
+    /// \return whether there is a match.
     bool GetRangeOfMatch(const Port_Regexp& pattern, Port_Range& range) const;
 
     /// Replaces the text by the file's next line without its line feed and without one carriage
@@ -106,30 +129,71 @@ public:
     /// \return false at the end of the file or when it cannot be read (`File::GetError` tells).
     bool ReadLine(File& file);
 
-    /// The text that printf would write. The format is the caller's, never a user's text.
+    /// The text that printf would write in the "C" locale, whatever locale is in use.
+    /// \param format the caller's own text, never a user's; null is read as "".
 #if defined(__GNUC__)
     __attribute__((format(printf, 1, 2)))
 #endif
     static StringBase
     Format(const char* format, ...);
 
-    friend bool operator==(const StringBase& a, const StringBase& b) noexcept {
-        return a.text_ == b.text_;
+    /// Whether two texts are equal; null is read as "".
+    template <class Text, std::enable_if_t<IsText<Text>, int> = 0>
+    friend bool operator==(const StringBase& a, const Text& b) noexcept {
+        return a.GetView() == TextView(b).GetView();
     }
-    friend bool operator==(const StringBase& a, const Char* b) noexcept {
-        return a.text_ == (b == nullptr ? View() : View(b));
+    /// Whether two texts are equal; null is read as "".
+    template <class Text, std::enable_if_t<IsOtherText<Text>, int> = 0>
+    friend bool operator==(const Text& a, const StringBase& b) noexcept {
+        return TextView(a).GetView() == b.GetView();
     }
-    friend bool operator!=(const StringBase& a, const StringBase& b) noexcept {
-        return !(a == b);
+    /// Whether two texts differ; null is read as "".
+    template <class Text, std::enable_if_t<IsText<Text>, int> = 0>
+    friend bool operator!=(const StringBase& a, const Text& b) noexcept {
+        return a.GetView() != TextView(b).GetView();
     }
-    friend bool operator!=(const StringBase& a, const Char* b) noexcept {
-        return !(a == b);
+    /// Whether two texts differ; null is read as "".
+    template <class Text, std::enable_if_t<IsOtherText<Text>, int> = 0>
+    friend bool operator!=(const Text& a, const StringBase& b) noexcept {
+        return TextView(a).GetView() != b.GetView();
     }
-    friend bool operator<(const StringBase& a, const StringBase& b) noexcept {
-        return a.text_ < b.text_;
+    /// Whether one text sorts before another by bytes taken as unsigned; null is read as "".
+    template <class Text, std::enable_if_t<IsText<Text>, int> = 0>
+    friend bool operator<(const StringBase& a, const Text& b) noexcept {
+        return a.GetView() < TextView(b).GetView();
     }
-    friend StringBase operator+(StringBase a, const StringBase& b) {
-        return a += b;
+    /// Whether one text sorts before another by bytes taken as unsigned; null is read as "".
+    template <class Text, std::enable_if_t<IsOtherText<Text>, int> = 0>
+    friend bool operator<(const Text& a, const StringBase& b) noexcept {
+        return TextView(a).GetView() < b.GetView();
+    }
+
+    /// A string with a text behind it; null adds nothing.
+    template <class Text, std::enable_if_t<IsText<Text>, int> = 0>
+    friend StringBase operator+(StringBase a, const Text& b) {
+        a += TextView(b);
+        return a;
+    }
+    /// A string with a text before it; null adds nothing.
+    template <class Text, std::enable_if_t<IsOtherText<Text>, int> = 0>
+    friend StringBase operator+(const Text& a, const StringBase& b) {
+        StringBase joined(TextView(a).GetView());
+        joined += b;
+        return joined;
+    }
+    /// A string with a character behind it.
+    template <class One, std::enable_if_t<std::is_same_v<One, Char>, int> = 0>
+    friend StringBase operator+(StringBase a, One b) {
+        a += b;
+        return a;
+    }
+    /// A string with a character before it.
+    template <class One, std::enable_if_t<std::is_same_v<One, Char>, int> = 0>
+    friend StringBase operator+(One a, const StringBase& b) {
+        StringBase joined;
+        joined += a;
+        joined += b;
+        return joined;
     }
 
 private:

@@ -1,36 +1,40 @@
 /// \file
-/// Helpers over C texts. A null pointer reads as the empty text everywhere.
+/// Helpers over texts: numbers, comparison, wildcards. A null pointer reads as the empty text.
 #pragma once
 
 #include "Port/Export.h"
+#include "Port/TextView.h"
 
 #include <cstddef>
-#include <string_view>
 
 namespace Port {
 
 /// Converts a text that is, as a whole, one decimal integer with an optional sign.
-/// \return false, `value` untouched, for any other text and for a number that does not fit.
-ORN_HDL_API bool strtol(const char* text, long& value) noexcept;
+/// \param value receives the number; untouched when the result is false.
+/// \return false for any other text and for a number that does not fit.
+ORN_HDL_API bool strtol(TextView text, long& value) noexcept;
 
 /// The integer at the start of a text by the rules of `atoi`: leading white space, an optional
 /// sign, digits up to the first other character; no digits give 0. Saturates at the limits of int.
-ORN_HDL_API int ToIntSaturated(std::string_view text) noexcept;
+ORN_HDL_API int ToIntSaturated(TextView text) noexcept;
 
-/// The number at the start of a text by the rules of `atof` in the "C" locale; 0.0 when the text
-/// gives no finite number.
-ORN_HDL_API double ToDouble(const char* text);
+/// The number at the start of a text by the rules of `atof` in the "C" locale, whatever locale is
+/// in use. A number too small for a double gives a zero of its sign, one that is not finite 0.0.
+ORN_HDL_API double ToDouble(TextView text);
 
-/// Compares ignoring the case of ASCII letters; below, at or above zero.
-ORN_HDL_API int stricmp(const char* a, const char* b) noexcept;
+/// Compares two texts ignoring the case of ASCII letters.
+/// \return a number below, at or above zero as `a` sorts before, with or after `b`.
+ORN_HDL_API int stricmp(TextView a, TextView b) noexcept;
 
-/// As `stricmp`, over at most the first `count` characters.
-ORN_HDL_API int strnicmp(const char* a, const char* b, std::size_t count) noexcept;
+/// Compares at most the first `count` characters of two texts, ignoring the case of ASCII letters.
+/// \return a number below, at or above zero as `a` sorts before, with or after `b`.
+ORN_HDL_API int strnicmp(TextView a, TextView b, std::size_t count) noexcept;
 
 /// Whether the whole text matches a pattern in which "*" stands for any characters, none included.
-ORN_HDL_API bool strmatch(const char* text, const char* pattern) noexcept;
+ORN_HDL_API bool strmatch(TextView text, TextView pattern) noexcept;
 
-/// As `strmatch`, ignoring the case of ASCII letters.
-ORN_HDL_API bool strimatch(const char* text, const char* pattern) noexcept;
+/// Whether the whole text matches a pattern in which "*" stands for any characters, none included,
+/// the case of ASCII letters ignored.
+ORN_HDL_API bool strimatch(TextView text, TextView pattern) noexcept;
 
 } // namespace Port

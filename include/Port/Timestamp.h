@@ -16,15 +16,18 @@ public:
     /// An instant in UTC.
     static UT_TIMESTAMP FromUtc(std::time_t instant);
 
-    /// \{
-    /// The fields as texts, padded with zeros.
+    /// The year in four digits.
     Port::String getTimeStampYear() const;
+    /// The month in two digits, "01" for January.
     Port::String getTimeStampMonthNumber() const;
+    /// The day of the month in two digits, from "01".
     Port::String getTimeStampMonthDay() const;
+    /// The hour of the day in two digits, from "00" to "23".
     Port::String getTimeStampHour() const;
+    /// The minute in two digits, from "00".
     Port::String getTimeStampMinute() const;
+    /// The second in two digits, from "00".
     Port::String getTimeStampSecond() const;
-    /// \}
 
 private:
     explicit UT_TIMESTAMP(const std::tm& fields) : fields_(fields) {}

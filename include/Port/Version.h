@@ -10,8 +10,8 @@ namespace Port {
 /// Names and values fixed when the library was built.
 class ORN_HDL_API Version {
 public:
-    /// \return the value of `key`: "version" gives the project's version, anything else "".
-    static String getValue(const char* key);
+    /// The value of a name: "version" gives the project's version, anything else "".
+    static String getValue(TextView key);
 };
 
 } // namespace Port

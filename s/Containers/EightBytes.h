@@ -22,12 +22,6 @@ constexpr std::uint64_t MarkRange(std::uint64_t text, char first, char last) noe
     return from & ~behind & ~text & High;
 }
 
-/// Whether there is a NUL. Of four characters or eight.
-template <class Bytes> constexpr bool HasNul(Bytes text) noexcept {
-    const Bytes each = static_cast<Bytes>(Each(1));
-    return ((text - each) & ~text & static_cast<Bytes>(High)) != 0;
-}
-
 /// Which byte in memory, counted from 0, is the first that is marked; one is.
 constexpr std::size_t FirstMarked(std::uint64_t marks) noexcept {
     static_assert(std::endian::native == std::endian::little,

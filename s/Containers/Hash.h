@@ -1,5 +1,6 @@
 // The hash that the walk order of `NameTable` is made of: h = h * 33 + byte from 5381, bytes taken
-// as signed, in 32 bits. Look-ups whose order nobody sees use `HashByEights`, which is faster.
+// as signed, in 32 bits. Look-ups whose order does not show use `HashByEights`, which is faster and
+// seeded.
 #pragma once
 
 #include "Port/Ascii.h"

@@ -10,6 +10,25 @@
 
 namespace Orn_Hdl {
 
+/// Differs from process to process where the system places programs at random: a command file
+/// cannot be made whose names all fall together. Nothing else may depend on it.
+inline std::uint64_t HashSeed() noexcept {
+    static const char place = 0;
+    return reinterpret_cast<std::uintptr_t>(&place);
+}
+
+/// Both halves of a product in one: every bit of it depends on the seed that went into a factor, so
+/// that names which collide with one seed do not with another.
+inline std::uint64_t MultiplyAndFold(std::uint64_t a, std::uint64_t b) noexcept {
+#if defined(__SIZEOF_INT128__)
+    __extension__ typedef unsigned __int128 Wide; // NOLINT(modernize-use-using)
+    const Wide product = static_cast<Wide>(a) * b;
+    return static_cast<std::uint64_t>(product) ^ static_cast<std::uint64_t>(product >> 64);
+#else
+    return (a * b) ^ ((a >> 32U) * (b >> 32U));
+#endif
+}
+
 /// Takes eight characters a step, since every look-up hashes a name; what is left over at the end
 /// is taken together with characters before it.
 /// \param fold gives what to hash in the place of eight characters; characters that are equal to a
@@ -20,17 +39,16 @@ template <class Fold> inline std::uint32_t HashByEights(std::string_view name, F
     constexpr std::uint64_t Factor = 0x9E3779B97F4A7C15U;
     const char* text = name.data();
     std::size_t left = name.size();
-    std::uint64_t hash = left;
+    std::uint64_t hash = left ^ HashSeed();
     const auto mix = [&hash, fold](std::uint64_t word) {
-        hash = (hash ^ fold(word)) * Factor;
-        hash ^= hash >> 32U;
+        hash = MultiplyAndFold(hash ^ fold(word), Factor);
     };
     for (; left > Step; left -= Step, text += Step) {
         mix(Load(text));
     }
     const bool isShort = name.size() < Step;
     mix(isShort ? LoadShort(text, left) : Load(text + left - Step));
-    return static_cast<std::uint32_t>(hash * Factor >> 32U);
+    return static_cast<std::uint32_t>(hash >> 32U);
 }
 
 /// Letter case ignored.

@@ -1,5 +1,7 @@
 #include "Orn_Hdl/Containers/PtrArray.h"
 
+#include "Containers/StableSort.h"
+
 #include <algorithm>
 #include <cstdlib>
 #include <cstring>
@@ -13,14 +15,36 @@ PtrArrayBase::PtrArrayBase(const PtrArrayBase& other) : PtrArrayBase() {
 }
 
 PtrArrayBase& PtrArrayBase::operator=(const PtrArrayBase& other) {
-    if (this != &other) {
-        Reserve(other.GetSize());
-        if (other.size_ > 0) {
-            std::memcpy(items_, other.items_, other.size_ * sizeof(void*));
-        }
-        size_ = other.size_;
+    if (this == &other) {
+        return *this;
     }
+    if (isOwner_ != 0) {
+        TakeOver(other);
+        return *this;
+    }
+    Reserve(other.GetSize());
+    if (other.size_ > 0) {
+        std::memcpy(items_, other.items_, other.size_ * sizeof(void*));
+    }
+    size_ = other.size_;
     return *this;
+}
+
+/// What an owner is assigned may hold a pointer twice, and must not have an owner.
+void PtrArrayBase::TakeOver(const PtrArrayBase& other) {
+    if (other.isOwner_ != 0) {
+        return;
+    }
+    Reserve(other.GetSize());
+    size_ = 0;
+    for (int i = 0; i < other.GetSize(); ++i) {
+        AddToOwner(other.GetAt(i));
+    }
+}
+
+int PtrArrayBase::AddToOwner(void* p) {
+    const int present = p == nullptr ? -1 : GetIndex(p);
+    return present >= 0 ? present : Append(p);
 }
 
 PtrArrayBase::~PtrArrayBase() {
@@ -82,7 +106,7 @@ int PtrArrayBase::GetIndex(const void* p) const noexcept {
 }
 
 void PtrArrayBase::SetAt(int i, void* p) {
-    if (i < 0) {
+    if (i < 0 || !Takes(p)) {
         return;
     }
     const auto index = static_cast<std::uint32_t>(i);
@@ -93,16 +117,16 @@ void PtrArrayBase::SetAt(int i, void* p) {
         }
         Reserve(i + 1);
         std::fill(items_ + size_, items_ + index, nullptr);
-        size_ = index + 1;
+        size_ = (index + 1) & MostElements;
     }
     items_[index] = p;
 }
 
 void PtrArrayBase::InsertAt(int i, void* p) {
-    if (i < 0 || i > GetSize()) {
+    if (i < 0 || i > GetSize() || !Takes(p)) {
         return;
     }
-    Add(p);
+    Append(p);
     const auto index = static_cast<std::uint32_t>(i);
     std::memmove(items_ + index + 1, items_ + index, (size_ - index - 1) * sizeof(void*));
     items_[index] = p;
@@ -118,13 +142,22 @@ void PtrArrayBase::RemoveAt(int i) noexcept {
     if (i >= 0 && i < GetSize()) {
         const auto index = static_cast<std::uint32_t>(i);
         std::memmove(items_ + index, items_ + index + 1, (size_ - index - 1) * sizeof(void*));
-        --size_;
+        RemoveTail();
     }
 }
 
 void PtrArrayBase::Sort(Less less, void* context) {
-    std::stable_sort(items_, items_ + size_,
-                     [less, context](void* a, void* b) { return less(a, b, context); });
+    if (less == nullptr) {
+        return;
+    }
+    // The predicate is the caller's and may do anything to the array, which is not touched before
+    // all is settled.
+    const std::vector<void*> before(items_, items_ + size_);
+    std::vector<void*> sorted = before;
+    StableSort(sorted, [less, context](void* a, void* b) { return less(a, b, context); });
+    if (std::equal(before.begin(), before.end(), items_, items_ + size_)) {
+        std::copy(sorted.begin(), sorted.end(), items_);
+    }
 }
 
 } // namespace Orn_Hdl

@@ -1,19 +1,21 @@
 #include "Orn_Hdl/Containers/StringArray.h"
 
 #include "Containers/EightBytes.h"
+#include "Containers/StableSort.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"
 
 #include <algorithm>
 #include <climits>
+#include <functional>
 #include <utility>
 
 namespace Orn_Hdl {
 
 using std::string_view;
 
-StringArray::StringArray(const char* text, const char* separators, bool skipEmpty,
-                         const char* quotes) {
+StringArray::StringArray(Port::TextView text, Port::TextView separators, bool skipEmpty,
+                         Port::TextView quotes) {
     Parse(text, separators, skipEmpty, quotes);
 }
 
@@ -27,7 +29,7 @@ bool StringArray::GetIntAt(int i, int& value, int /*unused*/) const {
     return true;
 }
 
-bool StringArray::Contains(const Port::StringBase<char>& text) const noexcept {
+bool StringArray::Contains(Port::TextView text) const noexcept {
     for (int i = 0; i < GetSize(); ++i) {
         if (GetView(i) == text.GetView()) {
             return true;
@@ -36,9 +38,9 @@ bool StringArray::Contains(const Port::StringBase<char>& text) const noexcept {
     return false;
 }
 
-bool StringArray::IContains(const Port::StringBase<char>& text) const noexcept {
+bool StringArray::IContains(Port::TextView text) const noexcept {
     for (int i = 0; i < GetSize(); ++i) {
-        if (Port::EqualIgnoringCase(GetView(i), text.GetView())) {
+        if (Port::EqualIgnoringCase(GetView(i), text)) {
             return true;
         }
     }
@@ -50,7 +52,7 @@ bool StringArray::Contains(const StringArray& other) const noexcept {
         return false;
     }
     for (int i = 0; i < other.GetSize(); ++i) {
-        if (!Contains(other.GetAt(i))) {
+        if (!Contains(other.GetView(i))) {
             return false;
         }
     }
@@ -62,14 +64,14 @@ bool StringArray::IContains(const StringArray& other) const noexcept {
         return false;
     }
     for (int i = 0; i < other.GetSize(); ++i) {
-        if (!IContains(other.GetAt(i))) {
+        if (!IContains(other.GetView(i))) {
             return false;
         }
     }
     return true;
 }
 
-Port::StringBase<char> StringArray::Concatenate(const Port::StringBase<char>& separator) const {
+Port::StringBase<char> StringArray::Concatenate(Port::TextView separator) const {
     Port::StringBase<char> text;
     for (int i = 0; i < GetSize(); ++i) {
         if (i > 0) {
@@ -93,6 +95,13 @@ std::string StringArray::JoinFrom(int first) const {
 
 void StringArray::ClosePiece(std::size_t start) {
     slots_.push_back({start, text_.size() - start});
+}
+
+/// Whether a text stands in the list's own buffer, which moves when it grows.
+bool StringArray::IsOwn(string_view text) const noexcept {
+    const std::less_equal<const char*> isNotAfter;
+    return isNotAfter(text_.data(), text.data()) &&
+           isNotAfter(text.data(), text_.data() + text_.size());
 }
 
 int StringArray::AddView(string_view text) {
@@ -131,24 +140,26 @@ void StringArray::MakeRoom(std::size_t length) {
     text_ = std::move(kept);
 }
 
-void StringArray::SetAt(int i, const Port::StringBase<char>& text) {
+void StringArray::SetAt(int i, Port::TextView set) {
     if (i < 0) {
         return;
     }
+    const std::string copy(IsOwn(set) ? set.GetView() : string_view());
+    const string_view text = IsOwn(set) ? string_view(copy) : set.GetView();
     const auto index = static_cast<std::size_t>(i);
     if (index >= slots_.size()) {
         slots_.resize(index + 1, Slot{0, 0});
     }
     Slot& slot = slots_[index];
-    if (text.GetLength() > slot.length) {
-        MakeRoom(text.GetLength());
+    if (text.size() > slot.length) {
+        MakeRoom(text.size());
         const std::size_t start = text_.size();
-        text_.append(text.GetView());
+        text_.append(text);
         slot.start = start;
     } else {
-        text_.replace(slot.start, text.GetLength(), text.GetView());
+        text_.replace(slot.start, text.size(), text);
     }
-    slot.length = text.GetLength();
+    slot.length = text.size();
 }
 
 void StringArray::Empty() noexcept {
@@ -166,33 +177,56 @@ void StringArray::Sort() {
 void StringArray::Sort(bool (*less)(const Port::StringBase<char>&, const Port::StringBase<char>&,
                                     void*),
                        void* context) {
+    if (less == nullptr) {
+        return;
+    }
+    // The predicate is the caller's and may do anything to the list, which is not touched before
+    // all is settled.
+    const StringArray before(*this);
     std::vector<Port::StringBase<char>> texts;
     texts.reserve(slots_.size());
-    for (int i = 0; i < GetSize(); ++i) {
-        texts.push_back(GetAt(i));
+    for (const string_view text : before) {
+        texts.emplace_back(text);
     }
-    std::stable_sort(texts.begin(), texts.end(),
-                     [less, context](const auto& a, const auto& b) { return less(a, b, context); });
-    Empty();
+    std::vector<const Port::StringBase<char>*> order;
+    order.reserve(texts.size());
     for (const auto& text : texts) {
-        AddView(text);
+        order.push_back(&text);
     }
+    StableSort(order,
+               [less, context](const auto* a, const auto* b) { return less(*a, *b, context); });
+    if (!std::equal(begin(), end(), before.begin(), before.end())) {
+        return;
+    }
+    StringArray sorted;
+    for (const auto* text : order) {
+        sorted.AddView(*text);
+    }
+    *this = std::move(sorted);
 }
 
-int StringArray::Parse(const char* text, const char* separators, bool skipEmpty,
-                       const char* quotes) {
-    return Parse(Port::ViewOf(text), Port::ViewOf(separators), skipEmpty, Port::ViewOf(quotes));
+int StringArray::Parse(Port::TextView text, Port::TextView separators, bool skipEmpty,
+                       Port::TextView quotes) {
+    if (IsOwn(text) || IsOwn(separators) || IsOwn(quotes)) {
+        return Split(std::string(text.GetView()), std::string(separators.GetView()), skipEmpty,
+                     std::string(quotes.GetView()));
+    }
+    return Split(text, separators, skipEmpty, quotes);
 }
 
-int StringArray::ParseCommandLine(string_view line) {
+int StringArray::ParseCommandLine(Port::TextView commandLine) {
+    if (IsOwn(commandLine)) {
+        return ParseCommandLine(std::string(commandLine.GetView()));
+    }
+    const string_view line = commandLine;
     // Without quotes the words stand in the line as they are: it is copied as a whole, and looked
     // through eight characters at a time. A blank behind it ends its last word; what follows fills
     // the last eight.
     constexpr std::size_t Step = sizeof(std::uint64_t);
-    constexpr string_view filling(" \0\0\0\0\0\0\0", Step);
+    constexpr string_view Filling(" \0\0\0\0\0\0\0", Step);
     const int before = GetSize();
     const std::size_t offset = text_.size();
-    text_.append(line).append(filling);
+    text_.append(line).append(Filling);
     std::size_t start = offset;
     for (std::size_t i = offset; i <= offset + line.size(); i += Step) {
         // Blanks and quotes, and some characters between them that mean nothing.
@@ -230,7 +264,7 @@ char ClosingOf(char c, string_view quotes) noexcept {
 
 } // namespace
 
-int StringArray::Parse(string_view text, string_view separators, bool skipEmpty,
+int StringArray::Split(string_view text, string_view separators, bool skipEmpty,
                        string_view quotes) {
     const int before = GetSize();
     const char separator = separators.empty() ? '\0' : separators.front();

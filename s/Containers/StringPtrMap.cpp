@@ -1,112 +1,83 @@
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 
 #include "Containers/HashByEights.h"
+#include "Containers/HashSlots.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
 #include <cstdint>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace Orn_Hdl {
 
-/// The entries stand in a plain list. Up to a few they are compared one by one; beyond that an open
-/// addressing table of their indices finds them by hash.
+/// The entries stand in a plain list. Up to a few they are compared one by one; beyond that a hash
+/// table of their indices finds them.
 struct IStringPtrMapBase::Table {
     struct Entry {
-        std::uint32_t hash;
         std::string name;
         void* pointer;
     };
 
     static constexpr std::size_t MostUnindexed = 8;
-    static constexpr std::uint32_t None = UINT32_MAX;
 
     std::vector<Entry> entries;
-    /// Indices into `entries`, `None` for a free place; a power of two long, at most half full.
-    std::vector<std::uint32_t> places;
+    /// The index of each entry plus 1; empty as long as there are few entries.
+    HashSlots<std::uint32_t> places;
 
-    bool Equal(std::size_t entry, std::uint32_t hash, std::string_view name) const noexcept {
-        return entries[entry].hash == hash && Port::EqualIgnoringCase(entries[entry].name, name);
+    static std::uint32_t PlaceValue(std::size_t entry) noexcept {
+        return static_cast<std::uint32_t>(entry + 1);
     }
 
-    std::size_t Find(std::uint32_t hash, std::string_view name) const noexcept {
-        if (places.empty()) {
-            std::size_t i = 0;
-            while (i < entries.size() && !Equal(i, hash, name)) {
-                ++i;
+    /// The entry of a name; null when there is none.
+    Entry* Find(std::string_view name) noexcept {
+        const auto isNamed = [name](const Entry& entry) {
+            return Port::EqualIgnoringCase(entry.name, name);
+        };
+        if (places.GetSize() == 0) {
+            const auto found = std::find_if(entries.begin(), entries.end(), isNamed);
+            return found == entries.end() ? nullptr : &*found;
+        }
+        const std::uint32_t hash = HashUpperByEights(name);
+        const std::uint32_t place =
+            places.Find(hash, [this, hash, &isNamed](std::uint32_t other, std::uint32_t value) {
+                return other == hash && isNamed(entries[value - 1]);
+            });
+        return place == 0 ? nullptr : &entries[place - 1];
+    }
+
+    void Insert(std::string_view name, void* pointer) {
+        // What can fail comes first, so that no entry is without its place.
+        if (places.GetSize() == 0 && entries.size() >= MostUnindexed) {
+            HashSlots<std::uint32_t> all;
+            for (std::size_t i = 0; i < entries.size(); ++i) {
+                all.Add(HashUpperByEights(entries[i].name), PlaceValue(i));
             }
-            return i;
+            places = std::move(all);
         }
-        const std::size_t mask = places.size() - 1;
-        for (std::size_t i = hash & mask; places[i] != None; i = (i + 1) & mask) {
-            if (Equal(places[i], hash, name)) {
-                return places[i];
-            }
+        if (places.GetSize() > 0) {
+            places.MakeRoom();
         }
-        return entries.size();
-    }
-
-    void Place(std::uint32_t entry) noexcept {
-        const std::size_t mask = places.size() - 1;
-        std::size_t i = entries[entry].hash & mask;
-        while (places[i] != None) {
-            i = (i + 1) & mask;
-        }
-        places[i] = entry;
-    }
-
-    void Rebuild(std::size_t size) {
-        places.assign(size, None);
-        for (std::uint32_t i = 0; i < entries.size(); ++i) {
-            Place(i);
+        entries.push_back({std::string(name), pointer});
+        if (places.GetSize() > 0) {
+            places.Add(HashUpperByEights(name), PlaceValue(entries.size() - 1));
         }
     }
 
-    void Insert(std::uint32_t hash, std::string_view name, void* pointer) {
-        // The places come first: an entry that found none would be removed in vain.
-        const std::size_t count = entries.size() + 1;
-        if (count > MostUnindexed && count * 2 > places.size()) {
-            Rebuild(std::max<std::size_t>(MostUnindexed * 4, places.size() * 2));
-        }
-        entries.push_back({hash, std::string(name), pointer});
-        if (!places.empty()) {
-            Place(static_cast<std::uint32_t>(entries.size() - 1));
-        }
-    }
-
-    /// Frees the place of an entry and moves up the entries that the freed place lets nearer home.
-    void Unplace(std::size_t entry) noexcept {
-        const std::size_t mask = places.size() - 1;
-        std::size_t hole = entries[entry].hash & mask;
-        while (places[hole] != entry) {
-            hole = (hole + 1) & mask;
-        }
-        for (std::size_t i = (hole + 1) & mask; places[i] != None; i = (i + 1) & mask) {
-            const std::size_t home = entries[places[i]].hash & mask;
-            if (((i - home) & mask) >= ((i - hole) & mask)) {
-                places[hole] = places[i];
-                hole = i;
+    void Erase(Entry& entry) noexcept {
+        Entry& last = entries.back();
+        if (places.GetSize() > 0) {
+            const auto placeOf = [this](const Entry& any) {
+                return PlaceValue(static_cast<std::size_t>(&any - entries.data()));
+            };
+            places.Remove(HashUpperByEights(entry.name), placeOf(entry));
+            if (&entry != &last) {
+                places.Replace(HashUpperByEights(last.name), placeOf(last), placeOf(entry));
             }
         }
-        places[hole] = None;
-    }
-
-    void Erase(std::size_t entry) noexcept {
-        const std::size_t last = entries.size() - 1;
-        if (!places.empty()) {
-            Unplace(entry);
-            if (entry != last) {
-                const std::size_t mask = places.size() - 1;
-                std::size_t i = entries[last].hash & mask;
-                while (places[i] != last) {
-                    i = (i + 1) & mask;
-                }
-                places[i] = static_cast<std::uint32_t>(entry);
-            }
-        }
-        if (entry != last) {
-            entries[entry] = std::move(entries[last]);
+        if (&entry != &last) {
+            entry = std::move(last);
         }
         entries.pop_back();
     }
@@ -130,33 +101,26 @@ void IStringPtrMapBase::Add(std::string_view name, void* pointer) {
     if (table_ == nullptr) {
         table_ = std::make_unique<Table>();
     }
-    const std::uint32_t hash = HashUpperByEights(name);
-    const std::size_t found = table_->Find(hash, name);
-    if (found < table_->entries.size()) {
-        table_->entries[found].pointer = pointer;
+    if (Table::Entry* found = table_->Find(name)) {
+        found->pointer = pointer;
     } else {
-        table_->Insert(hash, name, pointer);
+        table_->Insert(name, pointer);
     }
 }
 
 void* IStringPtrMapBase::Get(std::string_view name) const noexcept {
-    if (table_ == nullptr) {
-        return nullptr;
-    }
-    const std::size_t found = table_->Find(HashUpperByEights(name), name);
-    return found < table_->entries.size() ? table_->entries[found].pointer : nullptr;
+    const Table::Entry* const found = table_ == nullptr ? nullptr : table_->Find(name);
+    return found == nullptr ? nullptr : found->pointer;
 }
 
 bool IStringPtrMapBase::Contains(std::string_view name) const noexcept {
-    return table_ != nullptr &&
-           table_->Find(HashUpperByEights(name), name) < table_->entries.size();
+    return table_ != nullptr && table_->Find(name) != nullptr;
 }
 
 void IStringPtrMapBase::Remove(std::string_view name) noexcept {
     if (table_ != nullptr) {
-        const std::size_t found = table_->Find(HashUpperByEights(name), name);
-        if (found < table_->entries.size()) {
-            table_->Erase(found);
+        if (Table::Entry* found = table_->Find(name)) {
+            table_->Erase(*found);
         }
     }
 }

@@ -68,8 +68,12 @@ bool StringSet::IContains(std::string_view name) const noexcept {
 }
 
 void StringSet::Remove(const char* name) noexcept {
-    ignoringCase_->Remove(Port::ViewOf(name));
-    keepingCase_->Remove(Port::ViewOf(name));
+    Remove(Port::ViewOf(name));
+}
+
+void StringSet::Remove(std::string_view name) noexcept {
+    ignoringCase_->Remove(name);
+    keepingCase_->Remove(name);
 }
 
 bool StringSet::IsEmpty() const noexcept {

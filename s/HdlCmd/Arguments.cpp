@@ -1,50 +1,19 @@
 #include "HdlCmd/Arguments.h"
 
-#include "Containers/EightBytes.h"
 #include "Port/Pool.h"
 
 #include <algorithm>
-#include <cstdint>
 #include <cstring>
 
 namespace Orn_Hdl {
 
 namespace {
 
-/// Where in the room the pointer to a block stands: aligned, so that leak checkers see it.
+/// Where the pointer to a block stands in the room. It is aligned there, so that leak checkers find
+/// it.
 constexpr std::size_t BlockOffset = 4;
 constexpr std::size_t LeastRoom = BlockOffset + sizeof(char*);
 constexpr std::size_t MostRoom = 4096;
-
-/// Copies the first and the last bytes of a text, which may overlap. \return whether a NUL is
-/// there.
-template <class Bytes> bool CopyEnds(std::string_view text, char* place) noexcept {
-    const std::size_t last = text.size() - sizeof(Bytes);
-    Bytes ends[2];
-    std::memcpy(&ends[0], text.data(), sizeof(Bytes));
-    std::memcpy(&ends[1], text.data() + last, sizeof(Bytes));
-    std::memcpy(place, &ends[0], sizeof(Bytes));
-    std::memcpy(place + last, &ends[1], sizeof(Bytes));
-    return EightBytes::HasNul(ends[0]) || EightBytes::HasNul(ends[1]);
-}
-
-/// Copies a text up to its first NUL. \return behind its last character. Most texts are short
-/// names, for which it takes no longer than a copy.
-char* CopyToNul(std::string_view text, char* place) noexcept {
-    const std::size_t size = text.size();
-    if (size < sizeof(std::uint32_t)) {
-        for (std::size_t i = 0; i < size && text[i] != '\0'; ++i) {
-            *place++ = text[i];
-        }
-        return place;
-    }
-    if (size > 2 * sizeof(std::uint64_t)) {
-        return place + text.copy(place, text.find('\0'));
-    }
-    const bool hasNul = size < sizeof(std::uint64_t) ? CopyEnds<std::uint32_t>(text, place)
-                                                     : CopyEnds<std::uint64_t>(text, place);
-    return place + (hasNul ? std::strlen(place) : size);
-}
 
 } // namespace
 
@@ -86,19 +55,19 @@ char* Arguments::MakePlace(std::size_t size) {
     return block;
 }
 
-void Arguments::Set(std::initializer_list<std::string_view> texts, unsigned flags) {
+void Arguments::Set(std::initializer_list<std::string_view> texts) {
     std::size_t size = 0;
     for (const std::string_view text : texts) {
         size += text.size() + 1;
     }
     char* place = MakePlace(size);
     for (const std::string_view text : texts) {
-        // The texts are told apart by the NUL behind each.
-        place = CopyToNul(text, place);
+        // `Get` counts NULs, so a text must not contain one.
+        place += text.copy(place, text.find('\0'));
         *place++ = '\0';
     }
     count_ = static_cast<std::uint8_t>(count_ | texts.size());
-    flags_ = static_cast<std::uint8_t>(flags);
+    flags_ = 0;
 }
 
 const char* Arguments::Get(int index) const noexcept {

@@ -1,6 +1,8 @@
+#include "HdlModel/Netlist/ReadAhead.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
+#include "Port/LinesAtHand.h"
 
 #include <array>
 
@@ -12,7 +14,7 @@ struct CommandReader::Implementation {
         std::uint64_t bytes = 0;
     };
 
-    static constexpr std::size_t Distance = Model::ForeseenLines;
+    static constexpr std::size_t Distance = ReadAhead::Distance;
     /// Room for a line as long as this is kept for the next.
     static constexpr std::uint64_t LongLine = 1 << 20;
 
@@ -24,7 +26,7 @@ struct CommandReader::Implementation {
         line.words.Empty();
         line.words.ParseCommandLine(text.substr(0, text.find('\0')));
         ++count;
-        model.Foresee(line.words);
+        ReadAhead::Note(*model.GetNetlist(), line.words);
     }
 
     Model& model;
@@ -66,7 +68,7 @@ const StringArray* CommandReader::Next() {
     if (own.count == 0 && own.file.NextLine(text)) {
         own.Split(text);
     }
-    while (own.count < Implementation::Distance && own.file.NextLineAtHand(text)) {
+    while (own.count < Implementation::Distance && Port::LinesAtHand::Next(own.file, text)) {
         own.Split(text);
     }
     if (own.count == 0) {

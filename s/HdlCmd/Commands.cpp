@@ -7,26 +7,19 @@
 #include "Orn_Hdl/Containers/PtrArray.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
-#include "Port/Pool.h"
 
 #include <memory>
 #include <utility>
 
 namespace Orn_Hdl {
 
+static_assert(alignof(Model) > 1, "the lowest bit of its address is free");
+
 Command::~Command() = default;
-
-void* Command::operator new(std::size_t size) {
-    return Port::Pool::Allocate(size, Port::Pool::Commands);
-}
-
-void Command::operator delete(void* memory) noexcept {
-    Port::Pool::Free(memory);
-}
 
 CommandFactory::CommandFactory() : phrases_(std::make_shared<PhraseTable>()) {
     for (const RegisteredCommand& command : GetRegisteredCommands()) {
-        AddCommandCreator(command.entry->info.phrase, command.create);
+        AddCommandCreator(command.info.phrase, command.create);
     }
 }
 
@@ -71,7 +64,7 @@ const std::vector<CommandInfo>& CommandFactory::GetCatalogue() {
     static const std::vector<CommandInfo> catalogue = [] {
         std::vector<CommandInfo> entries;
         for (const RegisteredCommand& command : GetRegisteredCommands()) {
-            entries.push_back(command.entry->info);
+            entries.push_back(command.info);
         }
         return entries;
     }();
@@ -79,75 +72,89 @@ const std::vector<CommandInfo>& CommandFactory::GetCatalogue() {
 }
 
 struct CommandManager::Implementation {
-    struct Running;
+    struct Call;
 
-    /// Null while there are none.
-    std::unique_ptr<PtrArray<Command*>> done;
-    /// The innermost of the commands that are being carried out, since one may run another.
-    const Running* innermost = nullptr;
-
-    PtrArray<Command*>& GetDone() {
+    /// Takes a command into the done ones, or deletes it if the manager is being destroyed.
+    void Keep(std::unique_ptr<Command> command) {
+        if (isEnding) {
+            return;
+        }
         if (done == nullptr) {
             done = std::make_unique<PtrArray<Command*>>();
         }
-        return *done;
+        done->Add(command.get());
+        command.release();
     }
+
+    /// Null while there are none.
+    std::unique_ptr<PtrArray<Command*>> done;
+    /// The innermost of the calls that carry out a command, since a command may run another.
+    Call* innermost = nullptr;
+    bool isEnding = false;
 };
 
-/// A command from before it is parsed until it is kept or deleted.
-struct CommandManager::Implementation::Running {
-    explicit Running(Implementation& manager) noexcept : own(manager), outer(manager.innermost) {
+/// A call of `CreateAndExecute` that is under way. Its command may destroy the manager.
+struct CommandManager::Implementation::Call {
+    explicit Call(Implementation& own) noexcept : manager(&own), outer(own.innermost) {
         own.innermost = this;
     }
-    Running(const Running&) = delete;
-    Running& operator=(const Running&) = delete;
-    ~Running() { own.innermost = outer; }
+    Call(const Call&) = delete;
+    Call& operator=(const Call&) = delete;
+    ~Call() {
+        if (manager != nullptr) {
+            manager->innermost = outer;
+        }
+    }
 
-    Implementation& own;
-    const Running* outer;
-    const Command* command = nullptr;
+    /// Null when the manager has been destroyed.
+    Implementation* manager;
+    Call* outer;
 };
 
 CommandManager::CommandManager() : implementation_(std::make_unique<Implementation>()) {}
 
 CommandManager::~CommandManager() {
+    End();
+    for (auto* call = implementation_->innermost; call != nullptr; call = call->outer) {
+        call->manager = nullptr;
+    }
+}
+
+void CommandManager::End() noexcept {
+    implementation_->isEnding = true;
     Clear();
 }
 
 bool CommandManager::CreateAndExecute(const StringArray& tokens, Model* model,
                                       CommandFactory* factory) {
-    // The command may remove its model from the engine, and this manager is the model's.
+    // The command may destroy this manager and its model, or remove the model from the engine.
     const Model::Use use(model);
-    Implementation::Running running(*implementation_);
+    const Implementation::Call call(*implementation_);
     std::unique_ptr<Command> command(factory == nullptr ? nullptr
                                                         : factory->CreateCommand(model, tokens));
     if (command == nullptr) {
         Fail(CommandUnit, __LINE__, "Command not find.\n");
     }
-    running.command = command.get();
+    command->MarkOwned();
     if (!command->Parse(tokens)) {
         Fail(CommandUnit, __LINE__, "%s: Invalid Arguments.\n", {Port::ViewOf(command->GetName())});
     }
     command->Execute();
-    implementation_->GetDone().Add(command.get());
-    command.release();
+    if (!use.HasModel() && command->GetModel() == model) {
+        command->SetModel(nullptr);
+    }
+    if (call.manager != nullptr) {
+        call.manager->Keep(std::move(command));
+    }
     return true;
 }
 
 void CommandManager::AddDoneCommand(Command* command) {
-    if (command == nullptr ||
-        (implementation_->done != nullptr && implementation_->done->Contains(command))) {
+    if (command == nullptr || command->IsOwned()) {
         return;
     }
-    for (const auto* running = implementation_->innermost; running != nullptr;
-         running = running->outer) {
-        if (running->command == command) {
-            return;
-        }
-    }
-    std::unique_ptr<Command> taken(command);
-    implementation_->GetDone().Add(command);
-    taken.release();
+    command->MarkOwned();
+    implementation_->Keep(std::unique_ptr<Command>(command));
 }
 
 int CommandManager::GetDoneCommandCount() const noexcept {
@@ -155,7 +162,7 @@ int CommandManager::GetDoneCommandCount() const noexcept {
 }
 
 void CommandManager::Clear() {
-    // Taken out first: a command that ends may look at the manager.
+    // Taken out first: a command that is destroyed may look at the manager.
     const std::unique_ptr<PtrArray<Command*>> done = std::move(implementation_->done);
     for (Command* command : Iterator<Command*>(done.get())) {
         delete command;

@@ -1,6 +1,7 @@
 #include "HdlCmd/Executing.h"
 
 #include "Exception/Failure.h"
+#include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
@@ -20,7 +21,7 @@ void ExecuteAddPort(Model& model, const Arguments& arguments) {
 }
 
 void ExecuteConnection(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(OnAPin)) {
+    if (arguments.Has(TargetFlag::Pin)) {
         model.ConnectSignalToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
     } else {
         model.ConnectSignals(arguments.Get(0), arguments.Get(1));
@@ -28,7 +29,7 @@ void ExecuteConnection(Model& model, const Arguments& arguments) {
 }
 
 void ExecuteConstant(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(OnAPin)) {
+    if (arguments.Has(TargetFlag::Pin)) {
         model.AssignConstantToPin(arguments.Get(0), arguments.Get(1), arguments.Get(2));
     } else {
         model.AssignConstantToSignal(arguments.Get(0), arguments.Get(1));
@@ -53,23 +54,40 @@ void RequirePermission(const Model& model, const char* fileName) {
     }
 }
 
-/// Opens the file, lets `write` write into it, closes it, and tells the model how that went. A file
-/// that is there already is replaced when everything was written, and untouched otherwise.
+/// Opens a file in the folder that the model's guard keeps open, or by its name if there is none.
+TextFileOutStream Open(const Model& model, const char* fileName, TextFileOutStream::Mode mode) {
+    OutputGuard* const guard = model.GetOutputGuard();
+    Port::StringBase<char> path;
+    const Port::Folder* const folder =
+        guard == nullptr ? nullptr : guard->GetFolder(fileName, path);
+    if (folder == nullptr) {
+        return TextFileOutStream(fileName, mode);
+    }
+    return TextFileOutStream(*folder, path.CStr(), fileName, mode);
+}
+
+/// Opens the file, lets `write` write into it, closes it, and records the outcome in the model. An
+/// existing file is replaced once everything has been written, and stays as it is otherwise.
 template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
     const char* const fileName = arguments.Get(0);
+    const Model::Use use(&model);
     RequirePermission(model, fileName);
-    TextFileOutStream out(fileName, arguments.HasFlag(AppendToFile) ? TextFileOutStream::Append
-                                                                    : TextFileOutStream::Replace);
-    model.GetOptions()->writeHeader = !arguments.HasFlag(WithoutHeader);
+    if (!use.HasModel()) {
+        return;
+    }
+    TextFileOutStream out = Open(model, fileName,
+                                 arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
+                                                                  : TextFileOutStream::Replace);
+    model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
     write(out, *model.GetNetlist(), *model.GetOptions());
     out.Close();
-    model.RecordWrite(fileName, out.GetError());
+    model.RecordWrite(fileName, out.GetError(), out.GetLeftoverSize());
 }
 
 } // namespace
 
 void ExecuteWriteVerilog(Model& model, const Arguments& arguments) {
-    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, const HdlOptions& options) {
+    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, HdlOptions& options) {
         VerilogNetlister(out).WriteNetlist(&netlist, options);
     });
 }

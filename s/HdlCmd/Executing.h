@@ -12,6 +12,7 @@ namespace Orn_Hdl {
 
 namespace CommandDetail {
 
+/// Calls an operation of the model with one argument for each of its texts.
 template <class Result, class... Texts, std::size_t... Indices>
 void Call(Model& model, Result (Model::*operation)(Texts...), const Arguments& arguments,
           std::index_sequence<Indices...>) {
@@ -23,14 +24,17 @@ void Call(Model& model, Result (Model::*operation)(Texts...), const Arguments& a
     Call(model, operation, arguments, std::index_sequence_for<Texts...>());
 }
 
-/// As `Call`, with another text in the place of the last one.
+/// Calls an operation with the arguments in order, but with the argument at `last` as the last
+/// text.
 template <class Result, class... Texts, std::size_t... Indices>
 void CallWithLast(Model& model, Result (Model::*operation)(Texts...), const Arguments& arguments,
                   int last, std::index_sequence<Indices...>) {
-    constexpr std::size_t end = sizeof...(Texts) - 1;
-    (model.*operation)(arguments.Get(Indices == end ? last : static_cast<int>(Indices))...);
+    constexpr std::size_t End = sizeof...(Texts) - 1;
+    (model.*operation)(arguments.Get(Indices == End ? last : static_cast<int>(Indices))...);
 }
 
+/// Calls an operation with the arguments in order, but skips `behind` arguments before the last
+/// text.
 template <class Result, class... Texts>
 void CallWithLast(Model& model, Result (Model::*operation)(Texts...), const Arguments& arguments,
                   int behind) {
@@ -40,56 +44,63 @@ void CallWithLast(Model& model, Result (Model::*operation)(Texts...), const Argu
 
 } // namespace CommandDetail
 
-/// Calls an operation of the model with the arguments in order.
+/// Carries out a command that is one operation of the model on the command's arguments in order.
 template <auto Operation> void Apply(Model& model, const Arguments& arguments) {
     CommandDetail::Call(model, Operation, arguments);
 }
 
-/// Calls the operations of the attribute options that were given. Behind the names of the object
-/// and the attribute stand the generic value, then the synthesis-attribute value.
+/// Sets the attribute options that were given. The arguments are the names of the object and the
+/// attribute, then the generic value and the synthesis-attribute value.
 template <auto SetGeneric, auto SetSynAttr>
 void ApplyOptions(Model& model, const Arguments& arguments) {
-    if (arguments.HasFlag(GenericGiven)) {
+    if (arguments.Has(AttributeOptionFlag::Generic)) {
         CommandDetail::CallWithLast(model, SetGeneric, arguments, 0);
     }
-    if (arguments.HasFlag(SynAttrGiven)) {
+    if (arguments.Has(AttributeOptionFlag::SynAttr)) {
         CommandDetail::CallWithLast(model, SetSynAttr, arguments, 1);
     }
 }
 
-/// The parts of the options.
+/// The output options that hold for both languages.
 struct CommonPart {
     static HdlOptions& Of(Model& model) { return *model.GetOptions(); }
 };
+/// The output options of Verilog.
 struct VerilogPart {
     static HdlOptions::VerilogOption& Of(Model& model) { return model.GetOptions()->verilog; }
 };
+/// The output options of VHDL.
 struct VhdlPart {
     static HdlOptions::VhdlOption& Of(Model& model) { return model.GetOptions()->vhdl; }
 };
 
+/// Appends the argument to a list among the options.
 template <class Part, auto Field> void AppendOption(Model& model, const Arguments& arguments) {
     (Part::Of(model).*Field).Add(arguments.Get(0));
 }
 
+/// Sets an option to true or false, as the line says.
 template <class Part, auto Field> void SetFlag(Model& model, const Arguments& arguments) {
-    Part::Of(model).*Field = arguments.HasFlag(FlagOn);
+    Part::Of(model).*Field = arguments.Has(OptionFlag::On);
 }
 
+/// Sets an option to true.
 template <class Part, auto Field> void RaiseFlag(Model& model, const Arguments& /*arguments*/) {
     Part::Of(model).*Field = true;
 }
 
+/// Sets a text among the options to the argument.
 template <auto Field> void SetText(Model& model, const Arguments& arguments) {
     model.GetOptions()->*Field = arguments.Get(0);
 }
 
+/// Chooses the letter case of one kind of names in Verilog.
 template <HdlOptions::VerilogOption::CaseType Case>
 void ExecuteCase(Model& model, const Arguments& arguments) {
     HdlOptions::VerilogOption& options = VerilogPart::Of(model);
-    if (arguments.HasFlag(InstanceNames)) {
+    if (arguments.Has(NameKind::Instance)) {
         options.instanceCase = Case;
-    } else if (arguments.HasFlag(SignalNames)) {
+    } else if (arguments.Has(NameKind::Signal)) {
         options.signalCase = Case;
     } else {
         options.componentCase = Case;

@@ -3,6 +3,8 @@
 #include "Orn_Hdl/Model/Pins.h"
 #include "Port/Ascii.h"
 
+#include <optional>
+
 namespace Orn_Hdl {
 
 namespace {
@@ -29,29 +31,29 @@ struct PinPath {
     }
 };
 
-/// Whether a text is an option of the given prefix; `value` receives what follows it.
-bool IsOption(string_view text, string_view prefix, string_view& value) {
+/// What follows the prefix of an option such as "-TYPE="; none if the text has another prefix.
+std::optional<string_view> GetOptionValue(string_view text, string_view prefix) {
     if (!Port::EqualIgnoringCase(text.substr(0, prefix.size()), prefix)) {
-        return false;
+        return std::nullopt;
     }
-    value = text.substr(prefix.size());
-    return true;
+    return text.substr(prefix.size());
 }
 
 bool ParseNameKind(string_view text, string_view signalWord, Arguments& arguments) {
-    unsigned kind = 0;
+    arguments.Set({});
     if (Port::EqualIgnoringCase(text, "instance")) {
-        kind = InstanceNames;
+        arguments.Raise(NameKind::Instance);
     } else if (Port::EqualIgnoringCase(text, signalWord)) {
-        kind = SignalNames;
+        arguments.Raise(NameKind::Signal);
     } else if (Port::EqualIgnoringCase(text, "component")) {
-        kind = ComponentNames;
+        arguments.Raise(NameKind::Component);
+    } else {
+        return false;
     }
-    arguments.Set({}, kind);
-    return kind != 0;
+    return true;
 }
 
-/// The names at the front of an attribute command's arguments: none, an object's, or owner and pin.
+/// The names of what has an attribute: none for a module, an object's name, or owner and pin.
 struct OwnerNames {
     string_view first;
     string_view second;
@@ -59,9 +61,9 @@ struct OwnerNames {
 
     OwnerNames(const StringArray& tokens, AttributeOwner owner, int position) {
         const string_view text = tokens.GetView(position);
-        if (owner == OnObject) {
+        if (owner == AttributeOwner::Object) {
             first = text;
-        } else if (owner == OnPin) {
+        } else if (owner == AttributeOwner::Pin) {
             const PinPath path(text);
             first = path.owner;
             second = path.pin;
@@ -69,33 +71,33 @@ struct OwnerNames {
         }
     }
 
-    /// Sets the arguments of a command: the names that there are, then the other texts.
+    /// Sets the arguments of a command: the names of the owner, then the other texts.
     template <class... Texts>
-    void SetBefore(Arguments& arguments, AttributeOwner owner, unsigned flags,
-                   Texts... texts) const {
+    void SetBefore(Arguments& arguments, AttributeOwner owner, Texts... texts) const {
         switch (owner) {
-        case OnModule:
-            arguments.Set({texts...}, flags);
+        case AttributeOwner::Module:
+            arguments.Set({texts...});
             break;
-        case OnObject:
-            arguments.Set({first, texts...}, flags);
+        case AttributeOwner::Object:
+            arguments.Set({first, texts...});
             break;
-        case OnPin:
-            arguments.Set({first, second, texts...}, flags);
+        case AttributeOwner::Pin:
+            arguments.Set({first, second, texts...});
             break;
         }
     }
 };
 
-/// Where the owner's name stands when the words MODULE, COMPONENT PIN and so on stand at `kindWord`
-/// and `wordsAfter` words of the phrase follow them.
+/// Where the owner's name stands. The second word of the phrase is the kind of owner, one word or,
+/// for a pin, two; `wordsAfter` words of the phrase follow.
 constexpr int OwnerPosition(AttributeOwner owner, int wordsAfter) {
-    constexpr int kindWord = 1;
-    return kindWord + (owner == OnPin ? 2 : 1) + wordsAfter;
+    constexpr int KindWord = 1;
+    return KindWord + (owner == AttributeOwner::Pin ? 2 : 1) + wordsAfter;
 }
 
+/// Where the attribute's name stands: behind the owner's, which a module has not.
 constexpr int AttributePosition(AttributeOwner owner, int wordsAfter) {
-    return OwnerPosition(owner, wordsAfter) + (owner == OnModule ? 0 : 1);
+    return OwnerPosition(owner, wordsAfter) + (owner == AttributeOwner::Module ? 0 : 1);
 }
 
 } // namespace
@@ -121,15 +123,18 @@ bool ParseSignal(const StringArray& tokens, Arguments& arguments) {
 
 bool ParseConnection(const StringArray& tokens, Arguments& arguments) {
     const PinPath target(tokens.GetView(3));
-    arguments.Set({tokens.GetView(2), target.owner, target.pin},
-                  target.isPin ? unsigned(OnAPin) : 0U);
+    arguments.Set({tokens.GetView(2), target.owner, target.pin});
+    if (target.isPin) {
+        arguments.Raise(TargetFlag::Pin);
+    }
     return tokens.GetSize() >= 4;
 }
 
 bool ParseConstant(const StringArray& tokens, Arguments& arguments) {
     const PinPath target(tokens.GetView(2));
     if (target.isPin) {
-        arguments.Set({target.owner, target.pin, tokens.GetView(3)}, OnAPin);
+        arguments.Set({target.owner, target.pin, tokens.GetView(3)});
+        arguments.Raise(TargetFlag::Pin);
     } else {
         arguments.Set({target.owner, tokens.GetView(3)});
     }
@@ -139,20 +144,19 @@ bool ParseConstant(const StringArray& tokens, Arguments& arguments) {
 bool ParseWrite(const StringArray& tokens, Arguments& arguments) {
     const int count = tokens.GetSize();
     const int filePosition = count == 4 || count == 5 ? count - 1 : 2;
-    unsigned flags = 0;
+    arguments.Set({tokens.GetView(filePosition)});
     for (int i = 2; i < filePosition; ++i) {
         if (Port::EqualIgnoringCase(tokens.GetView(i), "-APPEND")) {
-            flags |= AppendToFile;
+            arguments.Raise(WriteFlag::Append);
         } else if (Port::EqualIgnoringCase(tokens.GetView(i), "-NOHEADER")) {
-            flags |= WithoutHeader;
+            arguments.Raise(WriteFlag::WithoutHeader);
         }
     }
-    arguments.Set({tokens.GetView(filePosition)}, flags);
     return !tokens.GetView(filePosition).empty();
 }
 
 bool ParseUppercase(const StringArray& tokens, Arguments& arguments) {
-    // The spelling is the language's own.
+    // The misspelling is part of the command language.
     return ParseNameKind(tokens.GetView(1), "siganl", arguments);
 }
 
@@ -172,27 +176,29 @@ bool ParsePinComment(const StringArray& tokens, Arguments& arguments) {
 }
 
 bool ParseFlagAt(const StringArray& tokens, int position, Arguments& arguments) {
-    const bool isOff = Port::EqualIgnoringCase(tokens.GetView(position), "false");
-    arguments.Set({}, isOff ? 0U : unsigned(FlagOn));
+    arguments.Set({});
+    if (!Port::EqualIgnoringCase(tokens.GetView(position), "false")) {
+        arguments.Raise(OptionFlag::On);
+    }
     return true;
 }
 
 bool ParseAddAttributeOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments) {
     const OwnerNames names(tokens, owner, OwnerPosition(owner, 1));
     int position = AttributePosition(owner, 1);
-    string_view type = "String";
-    if (IsOption(tokens.GetView(position), "-TYPE=", type)) {
+    const auto type = GetOptionValue(tokens.GetView(position), "-TYPE=");
+    if (type) {
         ++position;
     }
-    names.SetBefore(arguments, owner, 0, tokens.GetView(position), tokens.GetView(position + 1),
-                    type);
+    names.SetBefore(arguments, owner, tokens.GetView(position), tokens.GetView(position + 1),
+                    type.value_or("String"));
     return tokens.GetSize() > position && names.isValid;
 }
 
 bool ParseAttributeTextOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments) {
     const OwnerNames names(tokens, owner, OwnerPosition(owner, 2));
     const int position = AttributePosition(owner, 2);
-    names.SetBefore(arguments, owner, 0, tokens.GetView(position), tokens.GetView(position + 1));
+    names.SetBefore(arguments, owner, tokens.GetView(position), tokens.GetView(position + 1));
     return tokens.GetSize() > position + 1 && names.isValid;
 }
 
@@ -203,20 +209,26 @@ bool ParseAttributeOptionsOf(const StringArray& tokens, AttributeOwner owner,
     if (tokens.GetSize() <= position + 1 || !names.isValid) {
         return false;
     }
-    string_view generic;
-    string_view synAttr;
-    unsigned flags = 0;
+    std::optional<string_view> generic;
+    std::optional<string_view> synAttr;
     const int last = tokens.GetSize() - 1;
     for (int i = position + 1; i <= position + 2 && i <= last; ++i) {
-        if (IsOption(tokens.GetView(i), "-GENERIC=", generic)) {
-            flags |= GenericGiven;
-        } else if (IsOption(tokens.GetView(i), "-SYNATTR=", synAttr)) {
-            flags |= SynAttrGiven;
+        if (const auto value = GetOptionValue(tokens.GetView(i), "-GENERIC=")) {
+            generic = value;
+        } else if (const auto other = GetOptionValue(tokens.GetView(i), "-SYNATTR=")) {
+            synAttr = other;
         } else {
             return false;
         }
     }
-    names.SetBefore(arguments, owner, flags, tokens.GetView(position), generic, synAttr);
+    names.SetBefore(arguments, owner, tokens.GetView(position), generic.value_or(""),
+                    synAttr.value_or(""));
+    if (generic) {
+        arguments.Raise(AttributeOptionFlag::Generic);
+    }
+    if (synAttr) {
+        arguments.Raise(AttributeOptionFlag::SynAttr);
+    }
     return true;
 }
 

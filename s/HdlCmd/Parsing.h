@@ -1,5 +1,6 @@
-// How the lines of the command language are read: by fixed positions, counted from the first word
-// of the phrase.
+// How the lines of the command language are read. Each function takes the words of a line, those of
+// the phrase included, sets the arguments of the command, and returns false if words are missing or
+// invalid. Positions count from 0, the first word of the phrase.
 #pragma once
 
 #include "HdlCmd/Arguments.h"
@@ -10,76 +11,97 @@
 
 namespace Orn_Hdl {
 
-/// Bits of `Arguments::HasFlag`.
-enum ArgumentFlag : unsigned {
-    /// A flag command was not given "false".
-    FlagOn = 1,
-    /// The connection or constant is that of a pin.
-    OnAPin = 1,
-    /// A write command was given "-APPEND", "-NOHEADER".
-    AppendToFile = 1,
-    WithoutHeader = 2,
-    /// An option of that kind was given.
-    GenericGiven = 1,
-    SynAttrGiven = 2
-};
+/// The flag of the commands that set an option to true or false.
+enum class OptionFlag { On };
 
-/// The kinds of names that UPPERCASE and LOWERCASE know, as flags.
-enum NameKind : unsigned { InstanceNames = 1, SignalNames = 2, ComponentNames = 4 };
+/// The flag of CONNECT SIGNAL and ASSIGN CONSTANT: the line names a pin, not a signal.
+enum class TargetFlag { Pin };
 
-/// On what an attribute command acts; the value is the number of name texts that this takes.
-enum AttributeOwner { OnModule = 0, OnObject = 1, OnPin = 2 };
+/// The flags of the write commands.
+enum class WriteFlag { Append, WithoutHeader };
 
+/// Which options a SET ... ATTRIBUTE OPTION command was given.
+enum class AttributeOptionFlag { Generic, SynAttr };
+
+/// The kinds of names whose letter case UPPERCASE and LOWERCASE choose.
+enum class NameKind { Instance, Signal, Component };
+
+/// What has the attributes that a command is about: the module, which takes no name, an object with
+/// a name of its own, or a pin, which its line names as "owner.pin".
+enum class AttributeOwner { Module, Object, Pin };
+
+/// Takes any line.
 bool ParseNothing(const StringArray& tokens, Arguments& arguments);
+/// ADD PIN: sets pin, direction, component and default value.
 bool ParsePin(const StringArray& tokens, Arguments& arguments);
+/// ADD PORT: sets name and direction.
 bool ParsePort(const StringArray& tokens, Arguments& arguments);
+/// ADD SIGNAL: sets the name; a direction is checked and dropped.
 bool ParseSignal(const StringArray& tokens, Arguments& arguments);
+/// CONNECT SIGNAL: sets the signal, then another signal, or instance and pin and `TargetFlag::Pin`.
 bool ParseConnection(const StringArray& tokens, Arguments& arguments);
+/// ASSIGN CONSTANT: sets a signal, or instance and pin and `TargetFlag::Pin`, then the value.
 bool ParseConstant(const StringArray& tokens, Arguments& arguments);
+/// The write commands: sets the file name and `WriteFlag`s. Options count in lines of four or five
+/// words only; in others the word after the phrase is the file name.
 bool ParseWrite(const StringArray& tokens, Arguments& arguments);
+/// UPPERCASE: raises a `NameKind`.
 bool ParseUppercase(const StringArray& tokens, Arguments& arguments);
+/// LOWERCASE: raises a `NameKind`.
 bool ParseLowercase(const StringArray& tokens, Arguments& arguments);
+/// A comment on an object: sets its name and the joined text.
 bool ParseOwnerComment(const StringArray& tokens, Arguments& arguments);
+/// A comment on a pin: sets owner, pin and the joined text.
 bool ParsePinComment(const StringArray& tokens, Arguments& arguments);
 
+/// Raises `OptionFlag::On` unless the word at the position is "false".
 bool ParseFlagAt(const StringArray& tokens, int position, Arguments& arguments);
+/// ADD ... ATTRIBUTE: sets the names of the owner, then attribute, value and type.
 bool ParseAddAttributeOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments);
+/// SET ... ATTRIBUTE VALUE and USERTYPE: sets the names of the owner, then attribute and text.
 bool ParseAttributeTextOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments);
+/// SET ... ATTRIBUTE OPTION: sets the names of the owner, then attribute, generic value and
+/// synthesis-attribute value, and raises an `AttributeOptionFlag` for each that was given.
 bool ParseAttributeOptionsOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments);
 
-/// One text, which must not be empty.
+/// Sets the text at one position, which must not be empty.
 template <int Position> bool ParseText(const StringArray& tokens, Arguments& arguments) {
     arguments.Set({tokens.GetView(Position)});
     return !tokens.GetView(Position).empty();
 }
 
-/// The texts at some positions of a line that has at least `Least` words.
+/// Sets the texts at some positions of a line that has at least `Least` words.
 template <int Least, int... Positions>
 bool ParseTexts(const StringArray& tokens, Arguments& arguments) {
     arguments.Set({tokens.GetView(Positions)...});
     return tokens.GetSize() >= Least;
 }
 
-/// The words from a position on, joined by one blank.
+/// Sets one text: the words from a position on, joined by one blank, of a line that has at least
+/// `Least` words.
 template <int Least, int First> bool ParseJoined(const StringArray& tokens, Arguments& arguments) {
     arguments.Set({tokens.JoinFrom(First)});
     return tokens.GetSize() >= Least;
 }
 
+/// `ParseFlagAt` for a fixed position.
 template <int Position> bool ParseFlag(const StringArray& tokens, Arguments& arguments) {
     return ParseFlagAt(tokens, Position, arguments);
 }
 
+/// `ParseAddAttributeOf` for one kind of owner.
 template <AttributeOwner Owner>
 bool ParseAddAttribute(const StringArray& tokens, Arguments& arguments) {
     return ParseAddAttributeOf(tokens, Owner, arguments);
 }
 
+/// `ParseAttributeTextOf` for one kind of owner.
 template <AttributeOwner Owner>
 bool ParseAttributeText(const StringArray& tokens, Arguments& arguments) {
     return ParseAttributeTextOf(tokens, Owner, arguments);
 }
 
+/// `ParseAttributeOptionsOf` for one kind of owner.
 template <AttributeOwner Owner>
 bool ParseAttributeOptions(const StringArray& tokens, Arguments& arguments) {
     return ParseAttributeOptionsOf(tokens, Owner, arguments);

@@ -1,28 +1,12 @@
 #include "HdlCmd/PhraseTable.h"
 
-#include "Containers/EightBytes.h"
 #include "Port/Ascii.h"
 
 namespace Orn_Hdl {
 
-PhraseTable::Word::Word(std::string_view text) noexcept : text_(text) {
-    if (text.size() < sizeof start_) {
-        start_ = EightBytes::ToUpper(EightBytes::LoadShort(text.data(), text.size()));
-    } else {
-        start_ = EightBytes::ToUpper(EightBytes::Load(text.data()));
-        end_ = EightBytes::ToUpper(EightBytes::Load(text.data() + text.size() - sizeof end_));
-    }
-}
-
-bool PhraseTable::Word::operator==(const Word& other) const noexcept {
-    constexpr std::size_t compared = sizeof start_ + sizeof end_;
-    return start_ == other.start_ && end_ == other.end_ && text_.size() == other.text_.size() &&
-           (text_.size() <= compared || Port::EqualIgnoringCase(text_, other.text_));
-}
-
-std::size_t PhraseTable::GetChild(std::size_t node, const Word& word) const noexcept {
+std::size_t PhraseTable::GetChild(std::size_t node, std::string_view word) const noexcept {
     for (const Child& child : nodes_[node].children) {
-        if (child.word == word) {
+        if (Port::EqualIgnoringCase(child.word, word)) {
             return child.node;
         }
     }
@@ -36,11 +20,11 @@ void PhraseTable::Add(std::string_view phrase, CommandCreator creator) {
         const std::string_view text = phrase.substr(0, end);
         more = end != std::string_view::npos;
         phrase.remove_prefix(more ? end + 1 : phrase.size());
-        std::size_t child = GetChild(node, Word(text));
+        std::size_t child = GetChild(node, text);
         if (child == None) {
             child = nodes_.size();
             nodes_.emplace_back();
-            nodes_[node].children.push_back({Word(texts_.emplace_back(text)), child});
+            nodes_[node].children.push_back({std::string(text), child});
         }
         node = child;
     }
@@ -49,12 +33,11 @@ void PhraseTable::Add(std::string_view phrase, CommandCreator creator) {
 
 std::size_t PhraseTable::GetDescendant(std::size_t node, std::string_view words) const noexcept {
     std::size_t end = words.find(' ');
-    while (end != std::string_view::npos &&
-           (node = GetChild(node, Word(words.substr(0, end)))) != None) {
+    while (end != std::string_view::npos && (node = GetChild(node, words.substr(0, end))) != None) {
         words.remove_prefix(end + 1);
         end = words.find(' ');
     }
-    return node == None ? None : GetChild(node, Word(words));
+    return node == None ? None : GetChild(node, words);
 }
 
 CommandCreator PhraseTable::Find(const StringArray& words) const noexcept {
@@ -62,7 +45,7 @@ CommandCreator PhraseTable::Find(const StringArray& words) const noexcept {
     std::size_t node = 0;
     for (int i = 0; i < words.GetSize() && !nodes_[node].children.empty(); ++i) {
         const std::string_view word = words.GetView(i);
-        const std::size_t child = GetChild(node, Word(word));
+        const std::size_t child = GetChild(node, word);
         node = child != None ? child : GetDescendant(node, word);
         if (node == None) {
             break;

@@ -4,39 +4,26 @@
 #include "Orn_Hdl/Commands.h"
 
 #include <cstddef>
-#include <cstdint>
-#include <deque>
 #include <string>
 #include <string_view>
 #include <vector>
 
 namespace Orn_Hdl {
 
-/// The phrases of a factory, letter case ignored, as a tree with one word a node. A line is looked
-/// up word by word and given up at the first word that no phrase goes on with, so the words behind
-/// the phrase cost nothing.
+/// The phrases of a factory as a tree with one word a node; letter case is ignored. A line is
+/// looked up word by word until no phrase continues with the next word, so its arguments cost
+/// nothing.
 class PhraseTable {
 public:
-    /// Enters a phrase, or gives one that is present another creator.
+    /// Enters a phrase, or gives a present one another creator.
     void Add(std::string_view phrase, CommandCreator creator);
-    /// The creator of the longest phrase that the words, joined by one blank, begin with as whole
-    /// words; null when there is none.
+    /// The creator of the longest phrase that the words, joined by one blank, begin with; null if
+    /// there is none. A phrase ends where a word ends.
     CommandCreator Find(const StringArray& words) const noexcept;
 
 private:
-    /// A word in upper case that is compared sixteen characters at once.
-    class Word {
-    public:
-        explicit Word(std::string_view text) noexcept;
-        bool operator==(const Word& other) const noexcept;
-
-    private:
-        std::uint64_t start_ = 0;
-        std::uint64_t end_ = 0;
-        std::string_view text_;
-    };
     struct Child {
-        Word word;
+        std::string word;
         std::size_t node;
     };
     struct Node {
@@ -44,18 +31,16 @@ private:
         std::vector<Child> children;
     };
 
-    /// The root is nobody's child.
+    /// No node: index 0 is the root, which is no node's child.
     static constexpr std::size_t None = 0;
 
-    /// The node behind another one that a word leads to.
-    std::size_t GetChild(std::size_t node, const Word& word) const noexcept;
-    /// The same for a word that was in quotes, and may hold blanks and so several words of a
-    /// phrase.
+    /// The child of a node for one word; `None` if there is none.
+    std::size_t GetChild(std::size_t node, std::string_view word) const noexcept;
+    /// The descendant of a node for a quoted word, which may contain blanks and so several words of
+    /// a phrase; `None` if there is none.
     std::size_t GetDescendant(std::size_t node, std::string_view words) const noexcept;
 
     std::vector<Node> nodes_{1};
-    /// The words' characters, which stay where they are.
-    std::deque<std::string> texts_;
 };
 
 } // namespace Orn_Hdl

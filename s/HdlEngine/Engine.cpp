@@ -2,7 +2,7 @@
 
 #include "Exception/Failure.h"
 #include "HdlEngine/ModelRegistry.h"
-#include "Options/Keywords.h"
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Model.h"
 #include "Orn_Hdl/Streams.h"
@@ -90,11 +90,11 @@ bool Engine::WriteCommandFile(const char* modelName, const char* fileName) {
 }
 
 bool Engine::IsVhdlKeyword(const char* word) {
-    return IsReservedInVhdl(Port::ViewOf(word));
+    return TraitsOf(Language::Vhdl).isReserved(Port::ViewOf(word));
 }
 
 bool Engine::IsVerilogKeyword(const char* word) {
-    return IsReservedInVerilog(Port::ViewOf(word));
+    return TraitsOf(Language::Verilog).isReserved(Port::ViewOf(word));
 }
 
 void Engine::WriteHalvexHeader(const char* application, const char* command, const char* designName,

@@ -4,6 +4,7 @@
 #include "Port/Ascii.h"
 
 #include <iterator>
+#include <utility>
 
 namespace Orn_Hdl {
 
@@ -15,15 +16,15 @@ std::uint32_t HashOfName(const Model& model) noexcept {
 
 } // namespace
 
-ModelRegistry::Entry::Entry(ModelRegistry& owner, Number number) noexcept
-    : registry(owner), key(0, number) {}
+ModelRegistry::Entry::Entry(ModelRegistry& owner, Number ownNumber,
+                            std::unique_ptr<Model> ownModel) noexcept
+    : registry(owner), number(ownNumber), model(std::move(ownModel)), hash(HashOfName(*model)) {}
 
 void ModelRegistry::Entry::NameChanged() noexcept {
-    // The node moves to its new place, so nothing has to be allocated.
-    auto node = registry.byName_.extract(key);
-    key.first = HashOfName(*model);
-    node.value() = key;
-    registry.byName_.insert(std::move(node));
+    // What was taken out leaves room, so nothing is allocated.
+    registry.byName_.Remove(hash, this);
+    hash = HashOfName(*model);
+    registry.byName_.Add(hash, this);
 }
 
 ModelRegistry::~ModelRegistry() {
@@ -33,30 +34,26 @@ ModelRegistry::~ModelRegistry() {
 }
 
 void ModelRegistry::Add(std::unique_ptr<Model> model) {
+    byName_.MakeRoom();
     const Number number = next_++;
-    const Key key(HashOfName(*model), number);
-    byName_.insert(key);
-    try {
-        Entry& entry = entries_.try_emplace(entries_.end(), number, *this, number)->second;
-        entry.key = key;
-        entry.model = std::move(model);
-        entry.model->GetNetlist()->SetNameListener(&entry);
-    } catch (...) {
-        byName_.erase(key);
-        throw;
-    }
+    Entry& entry =
+        entries_.try_emplace(entries_.end(), number, *this, number, std::move(model))->second;
+    byName_.Add(entry.hash, &entry);
+    entry.model->GetNetlist()->SetNameListener(&entry);
 }
 
-const ModelRegistry::Entry* ModelRegistry::FindEntry(std::string_view name) const {
+ModelRegistry::Entry* ModelRegistry::FindEntry(std::string_view name) const {
     const std::uint32_t hash = HashUpperByEights(name);
-    for (auto key = byName_.lower_bound(Key(hash, 0)); key != byName_.end() && key->first == hash;
-         ++key) {
-        const Entry& entry = entries_.at(key->second);
-        if (Port::EqualIgnoringCase(entry.model->GetNetlist()->GetNameView(), name)) {
-            return &entry;
+    Entry* first = nullptr;
+    // Nothing matches, so that all of one name are looked at.
+    byName_.Find(hash, [hash, name, &first](std::uint32_t other, Entry* entry) {
+        if (other == hash && (first == nullptr || entry->number < first->number) &&
+            Port::EqualIgnoringCase(entry->model->GetNetlist()->GetNameView(), name)) {
+            first = entry;
         }
-    }
-    return nullptr;
+        return false;
+    });
+    return first;
 }
 
 Model* ModelRegistry::Find(std::string_view name) const {
@@ -65,15 +62,14 @@ Model* ModelRegistry::Find(std::string_view name) const {
 }
 
 std::unique_ptr<Model> ModelRegistry::Remove(std::string_view name) {
-    const Entry* const found = FindEntry(name);
-    if (found == nullptr) {
+    Entry* const entry = FindEntry(name);
+    if (entry == nullptr) {
         return nullptr;
     }
-    const auto entry = entries_.find(found->key.second);
-    std::unique_ptr<Model> model = std::move(entry->second.model);
+    std::unique_ptr<Model> model = std::move(entry->model);
     model->GetNetlist()->SetNameListener(nullptr);
-    byName_.erase(entry->second.key);
-    entries_.erase(entry);
+    byName_.Remove(entry->hash, entry);
+    entries_.erase(entry->number);
     return model;
 }
 

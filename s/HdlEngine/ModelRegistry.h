@@ -1,15 +1,14 @@
 // The models of an engine, found by name without asking each of them.
 #pragma once
 
+#include "Containers/HashSlots.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "Orn_Hdl/Model.h"
 
 #include <cstdint>
 #include <map>
 #include <memory>
-#include <set>
 #include <string_view>
-#include <utility>
 
 namespace Orn_Hdl {
 
@@ -30,25 +29,25 @@ public:
     std::unique_ptr<Model> Remove(std::string_view name);
 
 private:
-    /// Models are numbered as they come, so that the keys of one name stand in their order.
+    /// Models are numbered as they come.
     using Number = std::uint64_t;
-    /// The hash of the name, and the model's number.
-    using Key = std::pair<std::uint32_t, Number>;
 
+    /// A model, which tells its registry when it is renamed.
     struct Entry final : NameListener {
-        Entry(ModelRegistry& owner, Number number) noexcept;
+        Entry(ModelRegistry& owner, Number ownNumber, std::unique_ptr<Model> ownModel) noexcept;
         void NameChanged() noexcept override;
 
         ModelRegistry& registry;
-        /// That of the name under which the model is listed.
-        Key key;
+        Number number;
         std::unique_ptr<Model> model;
+        /// Of the name under which the model is listed.
+        std::uint32_t hash;
     };
 
-    const Entry* FindEntry(std::string_view name) const;
+    Entry* FindEntry(std::string_view name) const;
 
     std::map<Number, Entry> entries_;
-    std::set<Key> byName_;
+    HashSlots<Entry*> byName_;
     Number next_ = 0;
 };
 

@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Writers/NetlistHeader.h"
 
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Orn_Hdl/Options.h"
 #include "Writers/OneLine.h"
@@ -41,10 +42,18 @@ NetlistHeader::NetlistHeader(
     const Port::StringBase<char>& application, const Port::StringBase<char>& fileName,
     const Port::StringBase<char>& command, const Port::StringBase<char>& designName,
     const Port::StringBase<char>& device, const Port::StringBase<char>& purpose,
-    const Port::StringBase<char>& reference, bool vhdlComments, OutStream& out)
+    const Port::StringBase<char>& reference, Language language, OutStream& out)
     : application_(application), fileName_(fileName), command_(command), designName_(designName),
       device_(device), purpose_(purpose), reference_(reference),
-      prefix_(vhdlComments ? "--" : "//"), out_(out) {}
+      prefix_(TraitsOf(language).commentPrefix), out_(out) {}
+
+NetlistHeader::NetlistHeader(
+    const Port::StringBase<char>& application, const Port::StringBase<char>& fileName,
+    const Port::StringBase<char>& command, const Port::StringBase<char>& designName,
+    const Port::StringBase<char>& device, const Port::StringBase<char>& purpose,
+    const Port::StringBase<char>& reference, bool vhdlComments, OutStream& out)
+    : NetlistHeader(application, fileName, command, designName, device, purpose, reference,
+                    WithComments(vhdlComments), out) {}
 
 void NetlistHeader::Write() {
     WriteDivider();

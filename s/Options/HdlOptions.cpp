@@ -2,20 +2,9 @@
 
 #include "Port/Ascii.h"
 
-#include <iterator>
-
 namespace Orn_Hdl {
 
-void HdlOptions::VerilogOption::SetSynthesisType(const char* text) {
-    constexpr const char* names[] = {"QSN",      "EXEMPLAR",    "SYNPLICITY",
-                                     "SYNOPSYS", "VERILOG2001", "PRECISION"};
-    synthesisType = QSN;
-    for (int i = 0; i < static_cast<int>(std::size(names)); ++i) {
-        if (Port::EqualIgnoringCase(names[i], Port::ViewOf(text))) {
-            synthesisType = i;
-        }
-    }
-}
+// What depends on the table of dialects stands beside it, in Verilog/Dialects.cpp.
 
 HdlOptions::VerilogOption::CaseType HdlOptions::VerilogOption::GetCaseType(const char* text) {
     const std::string_view name = Port::ViewOf(text);

@@ -1,4 +1,6 @@
 #include "HdlModel/Names/Names.h"
+#include "Options/EffectiveAttrs.h"
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Containers/StringPtrMap.h"
 #include "Orn_Hdl/Model/Component.h"
 #include "Orn_Hdl/Options.h"
@@ -26,11 +28,11 @@ const Text HdlUtilities::GetVersion() {
 }
 
 const Text HdlUtilities::ConvertVhdlBase(int base) {
-    return base == 2 ? "b" : base == 8 ? "o" : "x";
+    return GetBaseLetter(Language::Vhdl, base);
 }
 
 const Text HdlUtilities::ConvertVerilogBase(int base) {
-    return base == 2 ? "b" : base == 8 ? "o" : "h";
+    return GetBaseLetter(Language::Verilog, base);
 }
 
 const Text HdlUtilities::AddDummySuffix(const char* name) {
@@ -46,6 +48,10 @@ const Text HdlUtilities::AddDummySuffix(const char* name) {
         result.append(text.substr(open, close - open + 1));
     }
     return result;
+}
+
+bool HdlUtilities::IsGeneratedName(const char* name) {
+    return Names::IsGenerated(Names::BeforeParenthesis(Port::ViewOf(name)));
 }
 
 const Text HdlUtilities::RemoveQuotes(const char* text) {
@@ -64,19 +70,15 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
     if (instance == nullptr) {
         return names;
     }
+    PtrArray<Attribute*> attributes;
+    const int own = GetEffectiveAttrs(*instance, attributes);
+    // Of several attributes of one name that the component has, the first counts.
     IStringPtrMap<const Attribute*> known;
-    const auto add = [&names, &known](const Attribute* attribute) {
-        names.Add(attribute->GetName());
-        known.Add(attribute->GetNameView(), attribute);
-    };
-    for (const Attribute* attribute : instance->GetAttrIterator()) {
-        add(attribute);
-    }
-    if (const Component* component = instance->GetComponent()) {
-        for (const Attribute* attribute : component->GetAttrIterator()) {
-            if (!known.Contains(attribute->GetName().CStr())) {
-                add(attribute);
-            }
+    for (int i = 0; i < attributes.GetSize(); ++i) {
+        const Attribute* const attribute = attributes.GetAt(i);
+        if (i < own || !known.Contains(attribute->GetNameView())) {
+            names.Add(attribute->GetName());
+            known.Add(attribute->GetNameView(), attribute);
         }
     }
     return names;
@@ -84,10 +86,15 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
 
 void HdlUtilities::WriteHeader(const Text& designName, bool vhdlComments, const HdlOptions& options,
                                OutStream& out) {
+    WriteHeader(designName, WithComments(vhdlComments), options, out);
+}
+
+void HdlUtilities::WriteHeader(const Text& designName, Language language, const HdlOptions& options,
+                               OutStream& out) {
     const auto* const file = dynamic_cast<const TextFileOutStream*>(&out);
     NetlistHeader(options.application, file == nullptr ? Text() : file->GetFileName(),
                   options.command, designName, options.device, options.purpose, options.reference,
-                  vhdlComments, out)
+                  language, out)
         .Write();
 }
 

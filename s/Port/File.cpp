@@ -34,11 +34,6 @@ int OpenFlags(File::Mode mode, bool fromStart) noexcept {
     return O_WRONLY | O_CREAT | O_APPEND;
 }
 
-bool IsDirectory(int descriptor) {
-    struct stat status {};
-    return System::Get().GetStatus(descriptor, &status) == 0 && S_ISDIR(status.st_mode);
-}
-
 /// The folder of a file, with its closing "/"; empty for the current folder.
 std::string FolderOf(const std::string& name) {
     return name.substr(0, name.rfind('/') + 1);
@@ -47,10 +42,10 @@ std::string FolderOf(const std::string& name) {
 /// Whether the system serves the name itself. Such names lead to open files and devices by ways
 /// that are no folders, so nothing can be put in their place.
 bool IsServedBySystem(std::string_view name) noexcept {
-    constexpr std::string_view devices = "/dev/";
-    constexpr std::string_view processes = "/proc/";
-    return name.substr(0, devices.size()) == devices ||
-           name.substr(0, processes.size()) == processes;
+    constexpr std::string_view Devices = "/dev/";
+    constexpr std::string_view Processes = "/proc/";
+    return name.substr(0, Devices.size()) == Devices ||
+           name.substr(0, Processes.size()) == Processes;
 }
 
 /// Replaces a name by the file that its chain of symbolic links leads to, whether it exists or not.
@@ -96,7 +91,8 @@ bool File::Fail(int error) noexcept {
 
 bool File::OpenDescriptor(const char* name, int flags, unsigned mode) {
     do {
-        descriptor_ = System::Get().Open(name, flags | O_CLOEXEC, mode);
+        descriptor_ = folder_.IsOpen() ? OpenInFolder(name, flags | O_CLOEXEC, mode)
+                                       : System::Get().Open(name, flags | O_CLOEXEC, mode);
     } while (descriptor_ < 0 && errno == EINTR);
     return descriptor_ >= 0;
 }
@@ -112,29 +108,142 @@ void File::CloseDescriptor() noexcept {
 
 bool File::open(const char* name, Mode mode, bool fromStart) {
     close();
+    folder_.Close();
+    return OpenNamed(name, mode, fromStart);
+}
+
+bool File::OpenBelow(const Folder& folder, const char* path, Mode mode, bool fromStart) {
+    close();
     error_ = 0;
-    lineStart_ = 0;
-    lineEnd_ = 0;
-    lineSize_ = 0;
-    atEnd_ = false;
-    name = name == nullptr ? "" : name;
-    if (mode == Replace) {
-        return OpenToReplace(name);
+    const char* name = nullptr;
+    if (const int error = folder.OpenParent(path, folder_, name); error != 0) {
+        folder_.Close();
+        return Fail(error);
     }
-    if (!OpenDescriptor(name, OpenFlags(mode, fromStart), DefaultPermissions)) {
-        return Fail(errno);
-    }
-    if (IsDirectory(descriptor_)) {
-        Fail(EISDIR);
-        Discard();
+    if (!OpenNamed(name, mode, fromStart)) {
+        folder_.Close();
         return false;
     }
     return true;
 }
 
+/// Opens a name in the folder that is open. \return the descriptor, or -1, errno set.
+int File::OpenInFolder(const char* name, int flags, unsigned mode) const {
+    // Without O_NONBLOCK, opening a pipe would wait for its other end.
+    const int opened =
+        System::Get().OpenAt(folder_.GetDescriptor(), name, flags | O_NOFOLLOW | O_NONBLOCK, mode);
+    // A file that the call has made is a regular one.
+    if (opened < 0 || (flags & O_EXCL) != 0) {
+        return opened;
+    }
+    struct stat status {};
+    const int error = System::Get().GetStatus(opened, &status) != 0 ? errno
+                      : S_ISREG(status.st_mode)                     ? 0
+                                                                    : EINVAL;
+    if (error == 0) {
+        return opened;
+    }
+    System::Get().Close(opened);
+    errno = error;
+    return -1;
+}
+
+int File::RenameTemporary() const {
+    return folder_.IsOpen() ? System::Get().RenameAt(folder_.GetDescriptor(), temporary_.c_str(),
+                                                     target_.c_str())
+                            : System::Get().Rename(temporary_.c_str(), target_.c_str());
+}
+
+void File::UnlinkTemporary() const {
+    if (folder_.IsOpen()) {
+        System::Get().UnlinkAt(folder_.GetDescriptor(), temporary_.c_str());
+    } else {
+        System::Get().Unlink(temporary_.c_str());
+    }
+}
+
+bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
+    error_ = 0;
+    lineStart_ = 0;
+    lineEnd_ = 0;
+    lineSize_ = 0;
+    atEnd_ = false;
+    appends_ = false;
+    written_ = 0;
+    leftover_ = 0;
+    name = name == nullptr ? "" : name;
+    if (mode == Replace) {
+        return OpenToReplace(name);
+    }
+    if (mode == Append) {
+        target_ = name;
+    }
+    if (!OpenDescriptor(name, OpenFlags(mode, fromStart), DefaultPermissions)) {
+        return Fail(errno);
+    }
+    struct stat status {};
+    const bool isKnown = System::Get().GetStatus(descriptor_, &status) == 0;
+    if (isKnown && S_ISDIR(status.st_mode)) {
+        Fail(EISDIR);
+        Discard();
+        return false;
+    }
+    if (mode == Append && (!isKnown || S_ISREG(status.st_mode))) {
+        // What is not known stays zero, which is no file's inode.
+        appends_ = true;
+        device_ = static_cast<std::uint64_t>(status.st_dev);
+        inode_ = static_cast<std::uint64_t>(status.st_ino);
+        formerSize_ = static_cast<std::uint64_t>(status.st_size);
+    }
+    return true;
+}
+
+/// Gives the file its former length back, unless somebody else has appended to it as well.
+bool File::CutAppended() noexcept {
+    struct stat status {};
+    if (System::Get().GetStatus(descriptor_, &status) != 0 || device_ != status.st_dev ||
+        inode_ != status.st_ino) {
+        return false;
+    }
+    const auto size = static_cast<std::uint64_t>(status.st_size);
+    return size <= formerSize_ ||
+           (size - formerSize_ <= written_ &&
+            System::Get().Truncate(descriptor_, static_cast<off_t>(formerSize_)) == 0);
+}
+
+void File::CloseAppended() noexcept {
+    const bool hasFailed = error_ != 0;
+    bool endsAsItBegan = !hasFailed || written_ == 0 || CutAppended();
+    CloseDescriptor();
+    if (!hasFailed && error_ != 0 && written_ > 0) {
+        // Only the closing told of the failure. Another file that bears the name by now must not
+        // make the opening wait.
+        endsAsItBegan = OpenDescriptor(target_.c_str(), O_WRONLY | O_NONBLOCK, 0) && CutAppended();
+        if (IsOpen()) {
+            CloseDescriptor();
+        }
+    }
+    leftover_ = endsAsItBegan ? 0 : written_;
+    appends_ = false;
+}
+
+bool File::open(const char* name, int mode, bool fromStart) {
+    switch (mode) {
+    case Read:
+    case Overwrite:
+    case Append:
+    case Replace:
+        return open(name, static_cast<Mode>(mode), fromStart);
+    default:
+        close();
+        error_ = EINVAL;
+        return false;
+    }
+}
+
 bool File::OpenToReplace(const char* name) {
     std::string target(name);
-    if (!FollowLinks(target)) {
+    if (!folder_.IsOpen() && !FollowLinks(target)) {
         return Fail(errno);
     }
     if (IsServedBySystem(target)) {
@@ -194,9 +303,13 @@ bool File::close() {
     if (!IsOpen()) {
         return true;
     }
+    if (appends_) {
+        CloseAppended();
+        return error_ == 0;
+    }
     CloseDescriptor();
     if (!temporary_.empty() && error_ == 0) {
-        if (System::Get().Rename(temporary_.c_str(), target_.c_str()) == 0) {
+        if (RenameTemporary() == 0) {
             temporary_.clear();
         } else {
             Fail(errno);
@@ -207,13 +320,16 @@ bool File::close() {
 }
 
 void File::Discard() noexcept {
-    if (IsOpen()) {
+    if (IsOpen() && appends_) {
+        CloseAppended();
+    } else if (IsOpen()) {
         CloseDescriptor();
     }
     if (!temporary_.empty()) {
-        System::Get().Unlink(temporary_.c_str());
+        UnlinkTemporary();
         temporary_.clear();
     }
+    folder_.Close();
 }
 
 std::size_t File::read(char* buffer, std::size_t size) {
@@ -245,6 +361,7 @@ bool File::write(const char* data, std::size_t size) {
         }
         data += count;
         size -= static_cast<std::size_t>(count);
+        written_ += static_cast<std::uint64_t>(count);
     }
     return true;
 }
@@ -291,15 +408,6 @@ bool File::NextLine(std::string_view& line) {
     return true;
 }
 
-bool File::NextLineAtHand(std::string_view& line) {
-    const std::size_t length = GetUnread().find('\n');
-    if (length == std::string_view::npos) {
-        return false;
-    }
-    line = TakeLine(length);
-    return true;
-}
-
 std::string_view File::TakeLine(std::size_t length) noexcept {
     std::string_view line = GetUnread().substr(0, length);
     lineSize_ = std::min(length + 1, GetUnread().size());
@@ -314,7 +422,8 @@ Stream::Stream(File& file) : file_(file), buffer_(new char[BufferSize]) {}
 
 Stream::~Stream() = default;
 
-Stream& Stream::operator<<(std::string_view text) {
+Stream& Stream::operator<<(TextView added) {
+    std::string_view text = added;
     while (!text.empty()) {
         if (used_ == BufferSize) {
             flush();

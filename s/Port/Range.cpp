@@ -27,8 +27,8 @@ std::size_t ReadClass(std::string_view pattern, std::size_t i, std::bitset<256>&
 
 } // namespace
 
-Port_Regexp::Port_Regexp(const char* patternText) {
-    const std::string_view pattern = Port::ViewOf(patternText);
+Port_Regexp::Port_Regexp(Port::TextView patternText) {
+    const std::string_view pattern = patternText;
     for (std::size_t i = 0; i < pattern.size();) {
         Step step;
         if (pattern[i] == '[') {
@@ -86,7 +86,8 @@ bool Port_Regexp::MatchAt(std::string_view text, std::size_t start, std::size_t&
     return matched;
 }
 
-bool Port_Regexp::Search(std::string_view text, Port_Range& range) const {
+bool Port_Regexp::Search(Port::TextView searched, Port_Range& range) const {
+    const std::string_view text = searched;
     for (std::size_t start = 0; start <= text.size(); ++start) {
         std::size_t length = 0;
         if (MatchAt(text, start, length)) {

@@ -1,6 +1,7 @@
 #include "Port/String.h"
 
 #include "Port/Ascii.h"
+#include "Port/CLocale.h"
 #include "Port/File.h"
 
 #include <algorithm>
@@ -17,7 +18,8 @@ int ToIndex(std::size_t position) noexcept {
 
 } // namespace
 
-template <class Char> int StringBase<Char>::Compare(View other, CompareType type) const noexcept {
+template <class Char>
+int StringBase<Char>::Compare(TextView other, CompareType type) const noexcept {
     return type == CompareExact ? GetView().compare(other) : OrderIgnoringCase(GetView(), other);
 }
 
@@ -29,8 +31,8 @@ template <class Char> int StringBase<Char>::GetIndexOfLastChar(Char c) const noe
     return ToIndex(text_.rfind(c));
 }
 
-template <class Char> int StringBase<Char>::GetIndexOfString(View text) const noexcept {
-    return ToIndex(text_.find(text));
+template <class Char> int StringBase<Char>::GetIndexOfString(TextView text) const noexcept {
+    return ToIndex(text_.find(text.GetView()));
 }
 
 template <class Char> StringBase<Char> StringBase<Char>::Extract(const Port_Range& range) const {
@@ -63,19 +65,25 @@ template <class Char> void StringBase<Char>::Trim(Char c, TrimType type) {
     }
 }
 
-template <class Char> void StringBase<Char>::ReplaceChars(View from, Char to) noexcept {
+template <class Char> void StringBase<Char>::ReplaceChars(TextView from, Char to) noexcept {
     for (Char& c : text_) {
-        if (from.find(c) != View::npos) {
+        if (from.GetView().find(c) != View::npos) {
             c = to;
         }
     }
 }
 
 template <class Char>
-bool StringBase<Char>::NextTokenRange(Port_Range& range, const Char* separators,
+bool StringBase<Char>::NextTokenRange(Port_Range& range, TextView separators,
                                       ParseType type) const {
-    const View set = ViewOf(separators);
-    std::size_t start = range.GetEnd() + 1;
+    std::size_t start = 0;
+    if (!range.IsBeforeText()) {
+        if (range.GetEnd() >= text_.size()) {
+            return false;
+        }
+        start = range.GetEnd() + 1;
+    }
+    const View set = separators;
     if (type == SkipEmptyTokens) {
         start = std::min(text_.find_first_not_of(set, start), text_.size());
     }
@@ -83,8 +91,20 @@ bool StringBase<Char>::NextTokenRange(Port_Range& range, const Char* separators,
         return false;
     }
     const std::size_t end = std::min(text_.find_first_of(set, start), text_.size());
-    range = Port_Range(start, end - start);
+    range = Port_Range::MakeToken(start, end - start);
     return true;
+}
+
+template <class Char>
+bool StringBase<Char>::NextTokenRange(Port_Range& range, TextView separators, int type) const {
+    switch (type) {
+    case KeepEmptyTokens:
+        return NextTokenRange(range, separators, KeepEmptyTokens);
+    case SkipEmptyTokens:
+        return NextTokenRange(range, separators, SkipEmptyTokens);
+    default:
+        return false;
+    }
 }
 
 template <class Char>
@@ -102,11 +122,15 @@ template <class Char> bool StringBase<Char>::ReadLine(File& file) {
 }
 
 template <class Char> StringBase<Char> StringBase<Char>::Format(const char* format, ...) {
+    if (format == nullptr) {
+        return StringBase();
+    }
+    const CLocale scope;
     std::va_list arguments;
     va_start(arguments, format);
     std::va_list again;
     va_copy(again, arguments);
-    // It begins three lines above. NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized)
+    // It was begun above. NOLINTNEXTLINE(clang-analyzer-valist.Uninitialized)
     const int length = std::vsnprintf(nullptr, 0, format, arguments);
     va_end(arguments);
     std::string text(length < 0 ? 0 : static_cast<std::size_t>(length), '\0');

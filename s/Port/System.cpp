@@ -35,6 +35,10 @@ int System::GetStatus(int descriptor, struct stat* status) {
     return ::fstat(descriptor, status);
 }
 
+int System::Truncate(int descriptor, off_t size) {
+    return ::ftruncate(descriptor, size);
+}
+
 int System::ChangeMode(int descriptor, unsigned mode) {
     return ::fchmod(descriptor, mode);
 }
@@ -49,6 +53,18 @@ int System::Rename(const char* from, const char* to) {
 
 int System::Unlink(const char* name) {
     return ::unlink(name);
+}
+
+int System::OpenAt(int folder, const char* name, int flags, unsigned mode) {
+    return ::openat(folder, name, flags, mode);
+}
+
+int System::RenameAt(int folder, const char* from, const char* to) {
+    return ::renameat(folder, from, folder, to);
+}
+
+int System::UnlinkAt(int folder, const char* name) {
+    return ::unlinkat(folder, name, 0);
 }
 
 System& System::Get() noexcept {

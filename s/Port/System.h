@@ -19,10 +19,18 @@ public:
     virtual ssize_t Write(int descriptor, const void* data, std::size_t size);
     virtual int Close(int descriptor);
     virtual int GetStatus(int descriptor, struct stat* status);
+    virtual int Truncate(int descriptor, off_t size);
     virtual int ChangeMode(int descriptor, unsigned mode);
     virtual ssize_t ReadLink(const char* name, char* target, std::size_t size);
     virtual int Rename(const char* from, const char* to);
     virtual int Unlink(const char* name);
+
+    /// \{
+    /// The calls for names below an open folder.
+    virtual int OpenAt(int folder, const char* name, int flags, unsigned mode);
+    virtual int RenameAt(int folder, const char* from, const char* to);
+    virtual int UnlinkAt(int folder, const char* name);
+    /// \}
 
     /// The calls in use.
     static System& Get() noexcept;

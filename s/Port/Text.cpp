@@ -1,10 +1,14 @@
 #include "Port/Text.h"
 
 #include "Port/Ascii.h"
+#include "Port/CLocale.h"
 
 #include <charconv>
 #include <climits>
 #include <cmath>
+#include <cstdlib>
+#include <string>
+#include <string_view>
 #include <system_error>
 
 namespace Port {
@@ -52,8 +56,8 @@ bool Matches(std::string_view text, std::string_view pattern, Same same) noexcep
 
 } // namespace
 
-bool strtol(const char* text, long& value) noexcept {
-    std::string_view digits = ViewOf(text);
+bool strtol(TextView text, long& value) noexcept {
+    std::string_view digits = text;
     if (!digits.empty() && digits.front() == '+') {
         digits.remove_prefix(1);
         if (!digits.empty() && digits.front() == '-') {
@@ -70,8 +74,8 @@ bool strtol(const char* text, long& value) noexcept {
     return true;
 }
 
-int ToIntSaturated(std::string_view text) noexcept {
-    text = WithoutLeadingBlanks(text);
+int ToIntSaturated(TextView number) noexcept {
+    std::string_view text = WithoutLeadingBlanks(number);
     const bool negative = !text.empty() && text.front() == '-';
     if (!text.empty() && (text.front() == '-' || text.front() == '+')) {
         text.remove_prefix(1);
@@ -89,45 +93,27 @@ int ToIntSaturated(std::string_view text) noexcept {
     return static_cast<int>(negative ? -value : value);
 }
 
-double ToDouble(const char* text) {
-    std::string_view number = WithoutLeadingBlanks(ViewOf(text));
-    const bool negative = !number.empty() && number.front() == '-';
-    if (!number.empty() && (number.front() == '-' || number.front() == '+')) {
-        number.remove_prefix(1);
-    }
-    std::chars_format format = std::chars_format::general;
-    if (number.size() > 2 && number[0] == '0' && ToLower(number[1]) == 'x') {
-        number.remove_prefix(2);
-        format = std::chars_format::hex;
-    }
-    // A second sign ends the number before it began; the conversion below would take a "-".
-    if (!number.empty() && (number.front() == '-' || number.front() == '+')) {
-        return 0.0;
-    }
-    double value = 0.0;
-    const auto result =
-        std::from_chars(number.data(), number.data() + number.size(), value, format);
-    if (result.ec != std::errc() || !std::isfinite(value)) {
-        return 0.0;
-    }
-    return negative ? -value : value;
+double ToDouble(TextView text) {
+    const std::string copy(text.GetView());
+    const CLocale scope;
+    const double value = std::strtod(copy.c_str(), nullptr);
+    return std::isfinite(value) ? value : 0.0;
 }
 
-int stricmp(const char* a, const char* b) noexcept {
-    return strnicmp(a, b, std::string_view::npos);
+int stricmp(TextView a, TextView b) noexcept {
+    return OrderIgnoringCase(a, b);
 }
 
-int strnicmp(const char* a, const char* b, std::size_t count) noexcept {
-    return OrderIgnoringCase(ViewOf(a).substr(0, count), ViewOf(b).substr(0, count));
+int strnicmp(TextView a, TextView b, std::size_t count) noexcept {
+    return OrderIgnoringCase(a.GetView().substr(0, count), b.GetView().substr(0, count));
 }
 
-bool strmatch(const char* text, const char* pattern) noexcept {
-    return Matches(ViewOf(text), ViewOf(pattern), [](char a, char b) { return a == b; });
+bool strmatch(TextView text, TextView pattern) noexcept {
+    return Matches(text, pattern, [](char a, char b) { return a == b; });
 }
 
-bool strimatch(const char* text, const char* pattern) noexcept {
-    return Matches(ViewOf(text), ViewOf(pattern),
-                   [](char a, char b) { return ToUpper(a) == ToUpper(b); });
+bool strimatch(TextView text, TextView pattern) noexcept {
+    return Matches(text, pattern, [](char a, char b) { return ToUpper(a) == ToUpper(b); });
 }
 
 } // namespace Port

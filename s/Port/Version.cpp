@@ -1,11 +1,9 @@
 #include "Port/Version.h"
 
-#include "Port/Ascii.h"
-
 namespace Port {
 
-String Version::getValue(const char* key) {
-    return ViewOf(key) == "version" ? String(ORN_HDL_VERSION) : String();
+String Version::getValue(TextView key) {
+    return key.GetView() == "version" ? String(ORN_HDL_VERSION) : String();
 }
 
 } // namespace Port

@@ -92,14 +92,37 @@ TextFileOutStream::TextFileOutStream()
 TextFileOutStream::TextFileOutStream(const char* fileName, bool append)
     : TextFileOutStream(fileName, append ? Append : Overwrite) {}
 
+TextFileOutStream::TextFileOutStream(const Port::StringBase<char>& fileName, bool append)
+    : TextFileOutStream(fileName.CStr(), append) {}
+
+TextFileOutStream::TextFileOutStream(const Port::StringBase<char>& fileName, Mode mode)
+    : TextFileOutStream(fileName.CStr(), mode) {}
+
 TextFileOutStream::TextFileOutStream(const char* fileName, Mode mode)
     : OutStream(new TextFileDst(fileName, mode)),
+      file_(static_cast<TextFileDst&>(*GetDestination())) {}
+
+TextFileOutStream::TextFileOutStream(const Port::Folder& folder, const char* path,
+                                     const char* fileName, Mode mode)
+    : OutStream(new TextFileDst(folder, path, fileName, mode)),
       file_(static_cast<TextFileDst&>(*GetDestination())) {}
 
 TextFileOutStream::~TextFileOutStream() = default;
 
 bool TextFileOutStream::Open(const char* fileName, bool append) {
-    return file_.Open(fileName, append ? Append : Overwrite);
+    return Open(fileName, append ? Append : Overwrite);
+}
+
+bool TextFileOutStream::Open(const Port::StringBase<char>& fileName, bool append) {
+    return Open(fileName.CStr(), append);
+}
+
+bool TextFileOutStream::Open(const char* fileName, Mode mode) {
+    return file_.Open(fileName, mode);
+}
+
+bool TextFileOutStream::Open(const Port::StringBase<char>& fileName, Mode mode) {
+    return Open(fileName.CStr(), mode);
 }
 
 bool TextFileOutStream::IsOpen() const noexcept {
@@ -118,7 +141,13 @@ int TextFileOutStream::GetError() const noexcept {
     return file_.GetError();
 }
 
-TextMemOutStream::TextMemOutStream(const char* initial)
+std::uint64_t TextFileOutStream::GetLeftoverSize() const noexcept {
+    return file_.GetLeftoverSize();
+}
+
+TextMemOutStream::TextMemOutStream(const char* initial) : TextMemOutStream(Port::ViewOf(initial)) {}
+
+TextMemOutStream::TextMemOutStream(std::string_view initial)
     : OutStream(new TextMemDst(initial)), memory_(static_cast<TextMemDst&>(*GetDestination())) {}
 
 TextMemOutStream::~TextMemOutStream() = default;
@@ -128,6 +157,10 @@ Port::StringBase<char> TextMemOutStream::GetValue() const {
 }
 
 void TextMemOutStream::SetValue(const char* text) {
+    SetValue(Port::ViewOf(text));
+}
+
+void TextMemOutStream::SetValue(std::string_view text) {
     memory_.SetText(text);
 }
 

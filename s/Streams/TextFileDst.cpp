@@ -49,6 +49,12 @@ TextFileDst::TextFileDst(const char* fileName, TextFileOutStream::Mode mode) : f
     }
 }
 
+TextFileDst::TextFileDst(const Port::Folder& folder, const char* path, const char* fileName,
+                         TextFileOutStream::Mode mode)
+    : replaces_(mode == TextFileOutStream::Replace), fileName_(fileName) {
+    file_.OpenBelow(folder, path, FileMode(mode), mode != TextFileOutStream::Append);
+}
+
 TextFileDst::~TextFileDst() {
     if (!replaces_) {
         Close();

@@ -5,6 +5,7 @@
 #include "Port/File.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <cstring>
 #include <memory>
 #include <string_view>
@@ -17,6 +18,9 @@ public:
 
     TextFileDst() = default;
     TextFileDst(const char* fileName, TextFileOutStream::Mode mode);
+    /// Opens the file at `path` below a folder.
+    TextFileDst(const Port::Folder& folder, const char* path, const char* fileName,
+                TextFileOutStream::Mode mode);
     TextFileDst(const TextFileDst&) = delete;
     TextFileDst& operator=(const TextFileDst&) = delete;
     ~TextFileDst() override;
@@ -26,6 +30,7 @@ public:
     void Close();
     const Port::StringBase<char>& GetFileName() const noexcept { return fileName_; }
     int GetError() const noexcept { return file_.GetError(); }
+    std::uint64_t GetLeftoverSize() const noexcept { return file_.GetLeftoverSize(); }
 
     void Flush() override;
     void Write(const char* text) override;

@@ -11,10 +11,10 @@ namespace Orn_Hdl {
 
 class TextMemDst final : public StreamDst {
 public:
-    explicit TextMemDst(const char* initial) : text_(Port::ViewOf(initial)) {}
+    explicit TextMemDst(std::string_view initial) : text_(initial) {}
 
     const std::string& GetText() const noexcept { return text_; }
-    void SetText(const char* text) { text_ = Port::ViewOf(text); }
+    void SetText(std::string_view text) { text_ = text; }
 
     void Write(const char* text) override { text_ += Port::ViewOf(text); }
     void Write(int number) override { text_ += std::to_string(number); }

@@ -1,11 +1,10 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Signals/SignalBits.h"
+#include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
-#include "Writers/Generics.h"
-#include "Writers/InstanceWalk.h"
-#include "Writers/SignalLists.h"
-#include "Writers/Text.h"
+#include "Writers/NetlistPass.h"
 
 namespace Orn_Hdl {
 
@@ -20,10 +19,6 @@ constexpr std::size_t ModuleHeadLength = 8;
 /// What stands before an instance's first pin besides both names.
 constexpr std::size_t InstanceHeadLength = 3;
 
-bool IsWritable(string_view name) {
-    return !name.empty();
-}
-
 /// Scalar signals and buses are named by the statements themselves.
 bool IsNamedPlainly(const Signal& signal) {
     return signal.GetSignalType() == SignalTypeScalar || signal.GetSignalType() == SignalTypeBus;
@@ -31,12 +26,12 @@ bool IsNamedPlainly(const Signal& signal) {
 
 } // namespace
 
-/// Writes one netlist: first the netlist is prepared, then it is only read.
-class VerilogNetlister::Writer {
+class VerilogNetlister::Writer : private Writers::NetlistPass {
 public:
     Writer(OutStream& out, VerilogStatements& statements, Netlist& netlist,
            const HdlOptions& options)
-        : out_(out), statements_(statements), netlist_(netlist), options_(options),
+        : NetlistPass(Language::Verilog, out, netlist, options), statements_(statements),
+          dialect_(DialectOf(options.verilog.synthesisType)),
           connection_(out, WriteSignalVisitor::Connection),
           reference_(out, WriteSignalVisitor::Assignment) {}
 
@@ -64,15 +59,12 @@ private:
     void WriteNextItem(std::size_t column);
     void WriteSemicolon() { PutLine(out_, ";"); }
     void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
-    void WriteSynthesisAttr(const Iterator<Attribute*>& attributes, const char* objectName);
     template <class WriteStatement>
-    void WriteGenericAttrs(const Writers::GenericAttrs& attributes, const Attribute* leftOut,
+    void WriteGenericAttrs(const Writers::GenericAttrs& attributes,
                            const WriteStatement& writeStatement);
 
-    OutStream& out_;
     VerilogStatements& statements_;
-    Netlist& netlist_;
-    const HdlOptions& options_;
+    const Dialect& dialect_;
     WriteSignalVisitor connection_;
     WriteSignalVisitor reference_;
     PtrArray<Attribute*> effectiveAttrs_;
@@ -90,9 +82,16 @@ void VerilogNetlister::WriteNetlist(Netlist* netlist, const HdlOptions& options)
     }
 }
 
+void VerilogNetlister::WriteNetlist(Netlist* netlist, HdlOptions& options) {
+    if (netlist != nullptr) {
+        options.hierarchicalInit = Writers::PassesInit(Language::Verilog, *netlist);
+    }
+    WriteNetlist(netlist, static_cast<const HdlOptions&>(options));
+}
+
 void VerilogNetlister::Writer::Write() {
     Prepare();
-    const Writers::SignalLists signals(netlist_, IsWritable);
+    const Writers::SignalLists signals(netlist_, Language::Verilog);
     WriteHead();
     WriteModulelAndPorts(signals.ports);
     out_.Indent();
@@ -106,13 +105,8 @@ void VerilogNetlister::Writer::Write() {
 }
 
 void VerilogNetlister::Writer::Prepare() {
-    netlist_.SortNetlist();
-    netlist_.CreateVhdlDummySignals();
+    NetlistPass::Prepare();
     SetNameCase();
-    const string_view name = netlist_.GetNameView();
-    options_.hierarchicalInit =
-        (name.find("MHALVEX") != string_view::npos || name.find("HHALVEX") != string_view::npos) &&
-        Writers::InitDefined(netlist_);
 }
 
 void VerilogNetlister::Writer::SetNameCase() {
@@ -142,10 +136,7 @@ void VerilogNetlister::Writer::SetNameCase(Object& object,
 }
 
 void VerilogNetlister::Writer::WriteHead() {
-    if (options_.writeHeader) {
-        HdlUtilities::WriteHeader(netlist_.GetName(), false, options_, out_);
-    }
-    statements_.WriteComment(&netlist_);
+    WriteOpening();
     statements_.WriteIncludePath(options_.verilog.includePaths);
     statements_.WriteTimeScale("1ns", "1ps");
     out_.WriteEmptyLine();
@@ -170,7 +161,7 @@ void VerilogNetlister::Writer::WriteModulelAndPorts(const std::vector<Signal*>& 
 void VerilogNetlister::Writer::WriteParameters() {
     const Writers::GenericAttrs attributes(netlist_.GetAttrIterator());
     if (!attributes.IsEmpty()) {
-        WriteGenericAttrs(attributes, nullptr, [this](Attribute* attribute) {
+        WriteGenericAttrs(attributes, [this](Attribute* attribute) {
             statements_.WriteParameterStatement(attribute);
         });
         out_.WriteEmptyLine();
@@ -196,28 +187,21 @@ void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*
 }
 
 void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists& signals) {
-    for (Signal* signal : signals.constants) {
-        WriteConstantAssignment(*signal);
-    }
-    for (Signal* signal : signals.aliased) {
-        for (Signal* alias : signal->GetSignalIterator()) {
-            if (IsWritable(alias->GetNameView())) {
-                WriteAlias(*signal, *alias);
-            }
-        }
-    }
+    WriteAssignments(
+        signals, [this](Signal& signal) { WriteConstantAssignment(signal); },
+        [this](Signal& signal, Signal& alias) { WriteAlias(signal, alias); });
 }
 
 void VerilogNetlister::Writer::WriteConstantAssignment(Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     if (IsNamedPlainly(signal)) {
         statements_.WriteConstantSignalAssignment(signal.GetNameView(),
-                                                  Writers::IsSingleBit(signal), value);
+                                                  SignalBits::IsSingle(signal), value);
     } else {
         Put(out_, "assign", " ");
         WriteReference(signal);
         Put(out_, " = ");
-        statements_.WriteConstant(Writers::IsSingleBit(signal), value);
+        statements_.WriteConstant(SignalBits::IsSingle(signal), value);
     }
     WriteSemicolon();
 }
@@ -239,7 +223,7 @@ void VerilogNetlister::Writer::WriteReference(Signal& signal) {
 }
 
 void VerilogNetlister::Writer::WriteInstances() {
-    Writers::ForEachInstance(netlist_, [this](const Instance& instance) {
+    ForEachInstance([this](const Instance& instance) {
         WriteInstance(instance);
         Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
         EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
@@ -283,12 +267,14 @@ void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
         return;
     }
     const Port::String name = instance.GetName();
-    Attribute* const init = options_.hierarchicalInit ? genericAttrs_.FindInit() : nullptr;
-    if (init != nullptr) {
+    if (Attribute* const init = FindPassedInit(genericAttrs_)) {
         statements_.WriteDefParamInitStatement(init, name.CStr());
         WriteSemicolon();
+        // One that is hidden from synthesis stays: simulation goes on with the instance's own
+        // value.
+        genericAttrs_.syn.Remove(init);
     }
-    WriteGenericAttrs(genericAttrs_, init, [this, &name](Attribute* attribute) {
+    WriteGenericAttrs(genericAttrs_, [this, &name](Attribute* attribute) {
         statements_.WriteDefParamStatement(attribute, name.CStr());
     });
 }
@@ -302,68 +288,35 @@ void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
     }
 }
 
-/// Ends a statement whose object has synthesis attributes: one tool wants them before the
-/// semicolon.
+/// Ends a statement whose object may have synthesis attributes.
 void VerilogNetlister::Writer::EndStatement(const Iterator<Attribute*>& attributes,
                                             string_view objectName) {
     if (attributes.IsAtEnd()) {
         WriteSemicolon();
         return;
     }
-    const bool semicolonFirst = options_.verilog.IsSemiColonWrittenBeforeAttr();
-    if (semicolonFirst) {
+    if (dialect_.isSemicolonFirst) {
         WriteSemicolon();
     }
-    WriteSynthesisAttr(attributes, Port::String(objectName).CStr());
-    if (!semicolonFirst) {
+    dialect_.write(statements_, attributes, Port::String(objectName).CStr());
+    if (!dialect_.isSemicolonFirst) {
         WriteSemicolon();
     }
 }
 
-void VerilogNetlister::Writer::WriteSynthesisAttr(const Iterator<Attribute*>& attributes,
-                                                  const char* objectName) {
-    switch (options_.verilog.synthesisType) {
-    case HdlOptions::VerilogOption::EXEMPLAR:
-        statements_.WriteExemplarAttr(attributes, objectName);
-        break;
-    case HdlOptions::VerilogOption::SYNPLICITY:
-        statements_.WriteSynplicityAttr(attributes);
-        break;
-    case HdlOptions::VerilogOption::SYNOPSYS:
-        statements_.WriteSynopsysAttr(attributes);
-        break;
-    case HdlOptions::VerilogOption::VERILOG2001:
-        break;
-    case HdlOptions::VerilogOption::PRECISION:
-        statements_.WritePrecisionAttr(attributes, objectName);
-        break;
-    default:
-        statements_.WriteQSNAttr(attributes, objectName);
-        break;
-    }
-}
-
-/// Writes a statement for each "SYN" attribute but one, then for each "NOSYN" attribute, hidden
-/// from synthesis.
 template <class WriteStatement>
 void VerilogNetlister::Writer::WriteGenericAttrs(const Writers::GenericAttrs& attributes,
-                                                 const Attribute* leftOut,
                                                  const WriteStatement& writeStatement) {
-    for (Attribute* attribute : Iterator<Attribute*>(&attributes.syn)) {
-        if (attribute != leftOut) {
+    const auto writeStatements = [this, &writeStatement](const PtrArray<Attribute*>& list) {
+        for (Attribute* attribute : Iterator<Attribute*>(&list)) {
             writeStatement(attribute);
             WriteSemicolon();
         }
+    };
+    writeStatements(attributes.syn);
+    if (!attributes.nosyn.IsEmpty()) {
+        WriteHidden([&attributes, &writeStatements] { writeStatements(attributes.nosyn); });
     }
-    if (attributes.nosyn.IsEmpty()) {
-        return;
-    }
-    PutLine(out_, "// synopsys translate_off");
-    for (Attribute* attribute : Iterator<Attribute*>(&attributes.nosyn)) {
-        writeStatement(attribute);
-        WriteSemicolon();
-    }
-    PutLine(out_, "// synopsys translate_on");
 }
 
 } // namespace Orn_Hdl

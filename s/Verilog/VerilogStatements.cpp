@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Verilog.h"
 
 #include "HdlModel/Names/Names.h"
+#include "Options/LanguageTraits.h"
 #include "Port/Ascii.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"
@@ -33,10 +34,12 @@ string_view DirectionKeyword(const Polarity& polarity) {
     }
 }
 
-void WriteBaseAndLength(const BitVectorValue& value, OutStream& out) {
+/// Writes a sized constant, or the bare digits of a value without base and length.
+void WriteNumber(const BitVectorValue& value, OutStream& out) {
     if (value.HasBaseAndLength()) {
-        Put(out, value.GetLength(), "'", HdlUtilities::ConvertVerilogBase(value.GetBase()));
+        Put(out, value.GetLength(), "'", GetBaseLetter(Language::Verilog, value.GetBase()));
     }
+    Put(out, OneLine(value.GetValue(), DigitSeparator).GetView());
 }
 
 /// Calls `write` with each attribute that has a synthesis option.
@@ -150,8 +153,7 @@ void VerilogStatements::WriteConstant(bool singleBit, const BitVectorValue& valu
     if (singleBit) {
         Put(out_, Writers::GetSingleBit(value));
     } else {
-        WriteBaseAndLength(value, out_);
-        Put(out_, OneLine(value.GetValue(), DigitSeparator).GetView());
+        WriteNumber(value, out_);
     }
 }
 
@@ -180,7 +182,7 @@ void VerilogStatements::WriteDefParamInitStatement(Attribute* attribute, const c
 
 void VerilogStatements::WriteComment(const Object* object) {
     if (object != nullptr) {
-        Writers::WriteCommentLines(out_, "// ", object->GetCommentView());
+        Writers::WriteComment(out_, Language::Verilog, *object);
     }
 }
 
@@ -221,7 +223,8 @@ void VerilogStatements::WriteSynopsysAttr(const Iterator<Attribute*>& attributes
             Put(out_, ListIndentation);
         }
         isFirst = false;
-        Put(out_, attribute.GetNameView(), " ", "\"", Writers::GetUnquotedValue(attribute), "\"");
+        Put(out_, attribute.GetNameView(), " ");
+        Writers::WriteQuotedValue(out_, attribute);
     });
     if (!isFirst) {
         PutLine(out_, " */");
@@ -270,7 +273,7 @@ void VerilogStatements::WritePrecisionAttrStatement(string_view name, const char
 
 void WriteVerilogAttrValueVisitor::VisitAttributeString(AttributeString* attribute) {
     if (attribute != nullptr) {
-        Put(out_, "\"", Writers::GetUnquotedValue(*attribute), "\"");
+        Writers::WriteQuotedValue(out_, *attribute);
     }
 }
 
@@ -294,9 +297,7 @@ void WriteVerilogAttrValueVisitor::VisitAttributeBit(AttributeBit* attribute) {
 
 void WriteVerilogAttrValueVisitor::VisitAttributeBitVector(AttributeBitVector* attribute) {
     if (attribute != nullptr) {
-        const BitVectorValue value = attribute->GetBitVectorValue();
-        WriteBaseAndLength(value, out_);
-        Put(out_, OneLine(value.GetValue(), DigitSeparator).GetView());
+        WriteNumber(attribute->GetBitVectorValue(), out_);
     }
 }
 

@@ -1,10 +1,10 @@
 #include "Verilog/WriteSignalVisitor.h"
 
+#include "HdlModel/Signals/SignalBits.h"
 #include "Writers/SignalLists.h"
 #include "Writers/Text.h"
 
 #include <algorithm>
-#include <cstdint>
 
 namespace Orn_Hdl {
 
@@ -23,13 +23,12 @@ void WriteSignalVisitor::WriteInBrackets(string_view name) {
 }
 
 void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
-    Put(out_, "{");
-    for (std::int64_t i = 0; i < slice.GetBits(); ++i) {
-        if (i > 0) {
-            Put(out_, ", ");
-        }
-        WriteInBrackets(Names::WithIndex(slice.base, slice.IndexAt(i)));
-    }
+    string_view separator = "{";
+    SignalBits::ForEach(slice, slice.GetBits(), [this, &separator](string_view bit) {
+        Put(out_, separator);
+        separator = ", ";
+        WriteInBrackets(bit);
+    });
     Put(out_, "}");
 }
 
@@ -59,7 +58,7 @@ void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
     const string_view name = slice->GetNameView();
     Names::BusName parsed;
     if (Writers::RunsAgainstParent(*slice) && Names::ParseBus(name, parsed) &&
-        parsed.GetBits() <= Names::MostExpandedBits) {
+        parsed.IsExpandable()) {
         WriteBits(parsed);
     } else {
         WriteInBrackets(name);

@@ -2,12 +2,10 @@
 
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/Primitives.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
-#include "Writers/Generics.h"
-#include "Writers/InstanceWalk.h"
-#include "Writers/SignalLists.h"
-#include "Writers/Text.h"
+#include "Writers/NetlistPass.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -23,8 +21,6 @@ using namespace std::literals::string_view_literals;
 
 namespace {
 
-constexpr const char* TranslateOff = "-- synopsys translate_off";
-constexpr const char* TranslateOn = "-- synopsys translate_on";
 constexpr string_view PortIndentation = "       ";      // 7 blanks
 constexpr string_view GenericIndentation = "         "; // 9 blanks
 constexpr string_view AssociationPerLine = ",\n          ";
@@ -39,7 +35,7 @@ constexpr GenericForm GenericClause = {"generic", ";", ";"};
 constexpr GenericForm GenericMap = {"generic map", ",", ""};
 
 bool IsWritable(string_view name) {
-    return !Writers::IsOpen(name);
+    return Writers::IsWritable(Language::Vhdl, name);
 }
 
 /// Whether only the signal's bits, not the signal, can stand in an assignment.
@@ -50,7 +46,7 @@ bool IsCompoundOrAgainst(const Signal& signal) {
 /// Whether an alias of the signal must be written bit by bit: a bus of one bit, a vector, may be
 /// aliased with a bit.
 bool IsAliasedByBits(const Signal& signal) {
-    return (!Writers::IsSingleBit(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
+    return (!SignalBits::IsSingle(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
 }
 
 /// Whether the signal is a slice of one bit of a bus that counts upwards. Its range reads as one
@@ -63,50 +59,11 @@ bool IsBitOfUpwardBus(const Signal& signal) {
     return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
 }
 
-/// How many bits the signal has; nothing when they cannot be listed.
-std::optional<std::int64_t> CountBits(const Signal& signal) {
-    if (Writers::IsSingleBit(signal)) {
-        return 1;
-    }
-    if (signal.GetSignalType() != SignalTypeCompoundBus) {
-        Names::BusName parsed;
-        const bool isListable = Names::ParseBus(signal.GetNameView(), parsed) &&
-                                parsed.GetBits() <= Names::MostExpandedBits;
-        return isListable ? std::optional(parsed.GetBits()) : std::nullopt;
-    }
-    std::int64_t count = 0;
-    for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-        const std::optional<std::int64_t> ofMember = CountBits(*member);
-        if (!ofMember) {
-            return std::nullopt;
-        }
-        count += *ofMember;
-    }
-    return count;
-}
-
-/// Appends the names of the signal's bits, which can be listed, leftmost first, until there are
-/// `most` names.
-void AddBitNames(const Signal& signal, std::int64_t most, StringArray& bits) {
-    if (bits.GetSize() >= most) {
-        return;
-    }
-    if (Writers::IsSingleBit(signal)) {
-        bits.Add(signal.GetName());
-        return;
-    }
-    Names::BusName parsed;
-    if (signal.GetSignalType() == SignalTypeCompoundBus) {
-        for (const Signal* member :
-             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
-            AddBitNames(*member, most, bits);
-        }
-    } else if (Names::ParseBus(signal.GetNameView(), parsed)) {
-        const std::int64_t count = std::min(parsed.GetBits(), most - bits.GetSize());
-        for (std::int64_t i = 0; i < count; ++i) {
-            bits.Add(Names::WithIndex(parsed.base, parsed.IndexAt(i)));
-        }
-    }
+/// The names of the leftmost `count` bits of a signal.
+StringArray GetBitNames(const Signal& signal, std::int64_t count) {
+    StringArray names;
+    SignalBits::ForEach(signal, count, [&names](string_view name) { names.Add(name); });
+    return names;
 }
 
 bool IsBinary(string_view digits) {
@@ -115,13 +72,12 @@ bool IsBinary(string_view digits) {
 
 } // namespace
 
-/// Writes one netlist: first the netlist is prepared, then it is only read.
-class VhdlNetlister::Writer {
+class VhdlNetlister::Writer : private Writers::NetlistPass {
 public:
     Writer(OutStream& out, VhdlStatements& statements, StringSet& declared, Netlist& netlist,
            const HdlOptions& options)
-        : out_(out), statements_(statements), declared_(declared), netlist_(netlist),
-          options_(options) {}
+        : NetlistPass(Language::Vhdl, out, netlist, options), statements_(statements),
+          declared_(declared) {}
 
     void Write();
 
@@ -152,19 +108,17 @@ private:
     template <class List, class WritePort>
     void WritePortClause(const List& ports, const WritePort& writePort);
     template <class WriteItem>
-    void WriteGenerics(const Writers::GenericAttrs& attributes, Attribute* init,
-                       const GenericForm& form, const WriteItem& writeItem);
+    void WriteGenerics(const Writers::GenericAttrs& attributes, const GenericForm& form,
+                       const WriteItem& writeItem);
+    template <class WriteItem>
+    void WriteGenericList(const Writers::GenericAttrs& attributes, const GenericForm& form,
+                          const WriteItem& writeItem);
     void WriteAttrDeclaration(const AttributeHolder* holder);
     void WriteAttrAssignment(const Signal& signal);
 
-    OutStream& out_;
     VhdlStatements& statements_;
     /// The names of the attributes that this file has declared.
     StringSet& declared_;
-    Netlist& netlist_;
-    const HdlOptions& options_;
-    /// Whether instances are given the entity's own generic INIT.
-    bool passesInit_ = false;
     /// The width of the column of names in the declarations of attributes.
     int attrWidth_ = 0;
     PtrArray<Attribute*> effectiveAttrs_;
@@ -189,35 +143,29 @@ void VhdlNetlister::WriteNetlist(Netlist* netlist, const HdlOptions* options) {
 
 void VhdlNetlister::Writer::Write() {
     Prepare();
-    const Writers::SignalLists signals(netlist_, IsWritable);
+    const Writers::SignalLists signals(netlist_, Language::Vhdl);
     const InstanceLists instances(netlist_);
     WriteHead();
     WriteEntity(signals.ports);
     WriteArchitecture(signals, instances);
     out_.WriteEmptyLine();
     if (!options_.vhdl.suppressConfiguration) {
-        WriteConfiguration(instances);
+        WriteHidden([this, &instances] { WriteConfiguration(instances); });
         out_.WriteEmptyLine();
     }
 }
 
 void VhdlNetlister::Writer::Prepare() {
-    netlist_.SortNetlist();
-    netlist_.CreateVhdlDummySignals();
+    NetlistPass::Prepare();
     netlist_.SetBoxTypeAttribute();
     if (!options_.vhdl.openPin) {
         netlist_.ConnectOpenPinToDummy();
     }
-    passesInit_ = netlist_.GetNameView().find("MHALVEX") != string_view::npos &&
-                  Writers::InitDefined(netlist_);
     attrWidth_ = Netlist::GetLongestAttrName(&netlist_);
 }
 
 void VhdlNetlister::Writer::WriteHead() {
-    if (options_.writeHeader) {
-        HdlUtilities::WriteHeader(netlist_.GetName(), true, options_, out_);
-    }
-    statements_.WriteComment(&netlist_);
+    WriteOpening();
     out_.WriteEmptyLine();
     statements_.WriteUserLibrary(options_.vhdl.libraries);
     statements_.WriteUseUserLibrary(options_.vhdl.useClauses);
@@ -288,16 +236,9 @@ void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signal
     out_.Unindent();
     PutLine(out_, "begin");
     out_.Indent();
-    for (const Signal* signal : signals.constants) {
-        WriteConstant(*signal);
-    }
-    for (const Signal* signal : signals.aliased) {
-        for (const Signal* alias : signal->GetSignalIterator()) {
-            if (IsWritable(alias->GetNameView())) {
-                WriteAlias(*signal, *alias);
-            }
-        }
-    }
+    WriteAssignments(
+        signals, [this](const Signal& signal) { WriteConstant(signal); },
+        [this](const Signal& signal, const Signal& alias) { WriteAlias(signal, alias); });
     WriteInstances();
     out_.Unindent();
     PutLine(out_, "end", " BEHAVIORAL;");
@@ -354,57 +295,49 @@ void VhdlNetlister::Writer::WriteComponent(const Component& component) {
 
 void VhdlNetlister::Writer::WriteGenericMap(const AttributeHolder& holder) {
     genericAttrs_.Split(holder.GetAttrIterator());
-    WriteGenerics(genericAttrs_, nullptr, GenericClause,
+    WriteGenerics(genericAttrs_, GenericClause,
                   [this](Attribute* attribute) { statements_.WriteGenericMapAttrType(attribute); });
 }
 
-/// Writes a generic clause or map. The items that are kept from synthesis come last; a clause of
-/// such items alone is kept from it as a whole. The attribute `init`, which may be null, gets its
-/// value from the entity's generic of its name.
+/// Writes a generic clause or map; one of which every item is hidden from synthesis is hidden as a
+/// whole.
 template <class WriteItem>
-void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attributes, Attribute* init,
+void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attributes,
                                           const GenericForm& form, const WriteItem& writeItem) {
-    if (attributes.IsEmpty() && init == nullptr) {
-        return;
+    if (!attributes.syn.IsEmpty()) {
+        WriteGenericList(attributes, form, writeItem);
+    } else if (!attributes.nosyn.IsEmpty()) {
+        WriteHidden([&] { WriteGenericList(attributes, form, writeItem); });
     }
-    const bool hasHidden = !attributes.nosyn.IsEmpty();
-    const bool isHidden = attributes.syn.IsEmpty() && init == nullptr;
+}
+
+/// The items that are hidden from synthesis come last.
+template <class WriteItem>
+void VhdlNetlister::Writer::WriteGenericList(const Writers::GenericAttrs& attributes,
+                                             const GenericForm& form, const WriteItem& writeItem) {
     bool isFirst = true;
-    const auto beginItem = [this, &form, &isFirst] {
-        if (!isFirst) {
-            PutLine(out_, form.separator);
-            Put(out_, GenericIndentation);
+    const auto writeItems = [&](const PtrArray<Attribute*>& items) {
+        for (Attribute* attribute : Iterator<Attribute*>(&items)) {
+            if (!isFirst) {
+                PutLine(out_, form.separator);
+                Put(out_, GenericIndentation);
+            }
+            isFirst = false;
+            writeItem(attribute);
         }
-        isFirst = false;
     };
-    if (isHidden) {
-        PutLine(out_, TranslateOff);
-    }
     Put(out_, form.keyword, "( ");
-    if (init != nullptr) {
-        beginItem();
-        statements_.WriteGenericMapInitAttr(init);
-    }
-    for (Attribute* attribute : Iterator<Attribute*>(&attributes.syn)) {
-        beginItem();
-        writeItem(attribute);
-    }
-    if (hasHidden && !isHidden) {
+    writeItems(attributes.syn);
+    if (attributes.syn.IsEmpty() || attributes.nosyn.IsEmpty()) {
+        writeItems(attributes.nosyn);
+    } else {
         PutLine(out_);
-        PutLine(out_, TranslateOff);
-    }
-    for (Attribute* attribute : Iterator<Attribute*>(&attributes.nosyn)) {
-        beginItem();
-        writeItem(attribute);
-    }
-    if (hasHidden && !isHidden) {
-        PutLine(out_);
-        PutLine(out_, TranslateOn);
+        WriteHidden([&] {
+            writeItems(attributes.nosyn);
+            PutLine(out_);
+        });
     }
     PutLine(out_, ")", form.closing);
-    if (isHidden) {
-        PutLine(out_, TranslateOn);
-    }
 }
 
 void VhdlNetlister::Writer::WriteSynthesisAttrAssignment(
@@ -435,12 +368,12 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
     if (IsCompoundOrAgainst(signal)) {
         WriteConstantBits(signal);
     } else if (IsBitOfUpwardBus(signal)) {
-        StringArray bits;
-        AddBitNames(signal, 1, bits);
-        statements_.WriteConstantSignalAssignment(bits.GetView(0), true, signal.GetConstantValue());
+        SignalBits::ForEach(signal, 1, [this, &signal](string_view bit) {
+            statements_.WriteConstantSignalAssignment(bit, true, signal.GetConstantValue());
+        });
     } else {
         statements_.WriteConstantSignalAssignment(
-            signal.GetNameView(), Writers::IsSingleBit(signal), signal.GetConstantValue());
+            signal.GetNameView(), SignalBits::IsSingle(signal), signal.GetConstantValue());
     }
 }
 
@@ -448,34 +381,28 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
 void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     const string_view digits = value.GetValue();
-    const std::optional<std::int64_t> count = CountBits(signal);
+    const std::optional<std::int64_t> count = SignalBits::Count(signal);
     if (value.GetBase() != 2 || !IsBinary(digits) || !count ||
         digits.size() != static_cast<std::size_t>(*count)) {
         return;
     }
-    StringArray bits;
-    AddBitNames(signal, *count, bits);
-    for (int i = 0; i < bits.GetSize(); ++i) {
-        if (IsWritable(bits.GetView(i))) {
-            const Port::String digit(digits.substr(static_cast<std::size_t>(i), 1));
-            statements_.WriteConstantSignalAssignment(bits.GetView(i), true,
-                                                      BitVectorValue(digit.CStr()));
+    std::size_t position = 0;
+    SignalBits::ForEach(signal, *count, [this, digits, &position](string_view bit) {
+        const Port::String digit(digits.substr(position++, 1));
+        if (IsWritable(bit)) {
+            statements_.WriteConstantSignalAssignment(bit, true, BitVectorValue(digit.CStr()));
         }
-    }
+    });
 }
 
 void VhdlNetlister::Writer::WriteAlias(const Signal& signal, const Signal& alias) {
     if (IsAliasedByBits(signal) || IsAliasedByBits(alias)) {
-        const std::optional<std::int64_t> count = CountBits(signal);
-        const std::optional<std::int64_t> aliasCount = CountBits(alias);
+        const std::optional<std::int64_t> count = SignalBits::Count(signal);
+        const std::optional<std::int64_t> aliasCount = SignalBits::Count(alias);
         // What is listed stands in memory, so the narrower side may not be too wide either.
         const std::int64_t narrower = std::min(count.value_or(0), aliasCount.value_or(0));
         if (count && aliasCount && narrower <= Names::MostExpandedBits) {
-            StringArray bits;
-            StringArray aliasBits;
-            AddBitNames(signal, narrower, bits);
-            AddBitNames(alias, narrower, aliasBits);
-            WriteAliasBits(bits, aliasBits);
+            WriteAliasBits(GetBitNames(signal, narrower), GetBitNames(alias, narrower));
             return;
         }
     }
@@ -493,8 +420,8 @@ void VhdlNetlister::Writer::WriteAliasBits(const StringArray& bits, const String
 void VhdlNetlister::Writer::WriteInstances() {
     const string_view separator = options_.onePortPerLine ? AssociationPerLine : ", "sv;
     WritePortAssignmentVisitor portMap(separator, statements_, out_);
-    Writers::ForEachInstance(
-        netlist_, [this, &portMap](const Instance& instance) { WriteInstance(instance, portMap); });
+    ForEachInstance(
+        [this, &portMap](const Instance& instance) { WriteInstance(instance, portMap); });
 }
 
 void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
@@ -521,18 +448,25 @@ void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
 void VhdlNetlister::Writer::WriteInstanceGenericMap(const Instance& instance) {
     Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
     genericAttrs_.Split(Iterator<Attribute*>(&effectiveAttrs_));
-    Attribute* const init = passesInit_ ? genericAttrs_.FindInit() : nullptr;
-    genericAttrs_.syn.Remove(init);
-    genericAttrs_.nosyn.Remove(init);
+    Attribute* const init = FindPassedInit(genericAttrs_);
+    if (init != nullptr) {
+        genericAttrs_.syn.Remove(init);
+        genericAttrs_.nosyn.Remove(init);
+        genericAttrs_.syn.InsertAt(0, init);
+    }
     out_.Indent();
-    WriteGenerics(genericAttrs_, init, GenericMap,
-                  [this](Attribute* attribute) { statements_.WriteGenericMapAttr(attribute); });
+    WriteGenerics(genericAttrs_, GenericMap, [this, init](Attribute* attribute) {
+        if (attribute == init) {
+            statements_.WriteGenericMapInitAttr(attribute);
+        } else {
+            statements_.WriteGenericMapAttr(attribute);
+        }
+    });
     out_.Unindent();
 }
 
 void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
     const string_view name = netlist_.GetNameView();
-    PutLine(out_, TranslateOff);
     PutLine(out_, "configuration", " ", "CFG_", name, " ", "of", "  ", name, " ", "is");
     out_.Indent();
     PutLine(out_, "for", " ", "BEHAVIORAL");
@@ -548,7 +482,6 @@ void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
     PutLine(out_, "end", " ", "for", ";");
     out_.Unindent();
     PutLine(out_, "end", " ", "CFG_", name, ";");
-    PutLine(out_, TranslateOn);
 }
 
 void VhdlNetlister::Writer::WriteConfigurationItem(const Component& component,

@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Writers/Vhdl.h"
 
 #include "HdlModel/Names/Names.h"
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
 #include "Writers/OneLine.h"
@@ -34,10 +35,12 @@ void WriteLines(OutStream& out, string_view keyword, const StringArray& items) {
     }
 }
 
-void WriteBasePrefix(const BitVectorValue& value, OutStream& out) {
+/// Writes a bit string literal; its base is left out of a value without base and length.
+void WriteBitString(const BitVectorValue& value, OutStream& out) {
     if (value.HasBaseAndLength()) {
-        Put(out, HdlUtilities::ConvertVhdlBase(value.GetBase()));
+        Put(out, GetBaseLetter(Language::Vhdl, value.GetBase()));
     }
+    Put(out, "\"", Writers::OneLine(value.GetValue()).GetView(), "\"");
 }
 
 } // namespace
@@ -77,13 +80,11 @@ void VhdlStatements::WriteIEEELibrary() {
 
 void VhdlStatements::WriteKestraLibrary(bool guard) {
     if (guard) {
-        PutLine(out_, "-- synopsys translate_off");
+        Writers::WriteHidden(out_, Language::Vhdl, [this] { WriteKestraLibrary(false); });
+        return;
     }
     PutLine(out_, "library", " KESTRA;");
     PutLine(out_, "use", " KESTRA.Vcomponents.ALL;");
-    if (guard) {
-        PutLine(out_, "-- synopsys translate_on");
-    }
 }
 
 void VhdlStatements::WriteUserLibrary(const StringArray& libraries) {
@@ -104,7 +105,7 @@ void VhdlStatements::WriteTimeStamp(const char* sourceFileName) {
 
 void VhdlStatements::WriteComment(const Object* object) {
     if (object != nullptr) {
-        Writers::WriteCommentLines(out_, "-- ", object->GetCommentView());
+        Writers::WriteComment(out_, Language::Vhdl, *object);
     }
 }
 
@@ -184,8 +185,7 @@ void VhdlStatements::WriteConstantSignalAssignment(string_view name, bool single
     if (singleBit) {
         Put(out_, "'", Writers::GetSingleBit(value), "'");
     } else {
-        WriteBasePrefix(value, out_);
-        Put(out_, "\"", Writers::OneLine(value.GetValue()).GetView(), "\"");
+        WriteBitString(value, out_);
     }
     PutLine(out_, ";");
 }
@@ -271,7 +271,7 @@ void VhdlStatements::WriteAttrValue(Attribute& attribute, bool typed) {
         WriteVhdlAttrValueVisitor value(out_);
         attribute.AcceptAttribute(value);
     } else {
-        Put(out_, "\"", Writers::GetUnquotedValue(attribute), "\"");
+        Writers::WriteQuotedValue(out_, attribute);
     }
 }
 
@@ -319,7 +319,7 @@ void WriteVhdlAttrTypeVisitor::VisitAttributeUser(AttributeUser* attribute) {
 
 void WriteVhdlAttrValueVisitor::VisitAttributeString(AttributeString* attribute) {
     if (attribute != nullptr) {
-        Put(out_, "\"", Writers::GetUnquotedValue(*attribute), "\"");
+        Writers::WriteQuotedValue(out_, *attribute);
     }
 }
 
@@ -343,9 +343,7 @@ void WriteVhdlAttrValueVisitor::VisitAttributeBit(AttributeBit* attribute) {
 
 void WriteVhdlAttrValueVisitor::VisitAttributeBitVector(AttributeBitVector* attribute) {
     if (attribute != nullptr) {
-        const BitVectorValue value = attribute->GetBitVectorValue();
-        WriteBasePrefix(value, out_);
-        Put(out_, "\"", Writers::OneLine(value.GetValue()).GetView(), "\"");
+        WriteBitString(attribute->GetBitVectorValue(), out_);
     }
 }
 

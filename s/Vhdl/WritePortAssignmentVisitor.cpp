@@ -1,6 +1,7 @@
 #include "Vhdl/WritePortAssignmentVisitor.h"
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Signals/SignalBits.h"
 #include "Writers/Text.h"
 
 #include <climits>
@@ -115,14 +116,15 @@ void WritePortAssignmentVisitor::VisitCompoundBus(CompoundBus* compound) {
 /// \return false, nothing written, when the slice cannot be expanded.
 bool WritePortAssignmentVisitor::WriteBitByBit(string_view slice) {
     Names::BusName range;
-    if (!Names::ParseBus(slice, range) || range.GetBits() > Names::MostExpandedBits) {
+    if (!Names::ParseBus(slice, range) || !range.IsExpandable()) {
         return false;
     }
     const std::string formal = formal_;
-    for (int i = 0; i < range.GetWidth(); ++i) {
-        SetFormalPiece(formal, i, 1);
-        WriteScalar(Names::WithIndex(range.base, range.IndexAt(i)));
-    }
+    int position = 0;
+    SignalBits::ForEach(range, range.GetBits(), [this, &formal, &position](string_view bit) {
+        SetFormalPiece(formal, position++, 1);
+        WriteScalar(bit);
+    });
     return true;
 }
 

@@ -1,7 +1,5 @@
 #include "Writers/Generics.h"
 
-#include "Orn_Hdl/Containers/StringPtrMap.h"
-
 namespace Orn_Hdl::Writers {
 
 namespace {
@@ -13,6 +11,21 @@ Attribute* FindInitIn(const PtrArray<Attribute*>& attributes) {
         }
     }
     return nullptr;
+}
+
+/// \{
+/// The marks, in any place of its name, of a netlist that stands for a cell of the HALVEX library
+/// and is made of such cells. INIT is the contents of such a cell, so whoever places the netlist
+/// says what the cells in it hold.
+constexpr std::string_view MacroMark = "MHALVEX";
+constexpr std::string_view VerilogMacroMark = "HHALVEX";
+/// \}
+
+/// The second mark counts in Verilog alone. Nothing in the languages asks for that: netlists have
+/// always been written so, and their bytes are kept.
+bool HasInitMark(Language language, std::string_view name) {
+    return name.find(MacroMark) != std::string_view::npos ||
+           (language == Language::Verilog && name.find(VerilogMacroMark) != std::string_view::npos);
 }
 
 } // namespace
@@ -37,29 +50,9 @@ Attribute* GenericAttrs::FindInit() const {
     return init != nullptr ? init : FindInitIn(nosyn);
 }
 
-void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes) {
-    attributes.Empty();
-    const Component* const component = instance.GetComponent();
-    const bool canHide = component != nullptr && component->HasAttrs();
-    // By their present names: the instance goes on finding a renamed attribute by its former one.
-    IStringPtrMap<const Attribute*> hiding;
-    for (Attribute* attribute : instance.GetAttrIterator()) {
-        attributes.Add(attribute);
-        if (canHide) {
-            hiding.Add(attribute->GetNameView(), attribute);
-        }
-    }
-    if (canHide) {
-        for (Attribute* attribute : component->GetAttrIterator()) {
-            if (!hiding.Contains(attribute->GetName().CStr())) {
-                attributes.Add(attribute);
-            }
-        }
-    }
-}
-
-bool InitDefined(const Netlist& netlist) {
-    return GenericAttrs(netlist.GetAttrIterator()).FindInit() != nullptr;
+bool PassesInit(Language language, const Netlist& netlist) {
+    return HasInitMark(language, netlist.GetNameView()) &&
+           GenericAttrs(netlist.GetAttrIterator()).FindInit() != nullptr;
 }
 
 } // namespace Orn_Hdl::Writers

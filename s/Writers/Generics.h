@@ -1,8 +1,10 @@
-// The attributes that take effect on an instance, and those that become parameters or generics.
+// The attributes that become parameters or generics.
 #pragma once
 
+#include "Options/EffectiveAttrs.h"
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
+#include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Netlist.h"
 
 namespace Orn_Hdl::Writers {
@@ -23,11 +25,10 @@ struct GenericAttrs {
     Attribute* FindInit() const;
 };
 
-/// Replaces the list by the instance's attributes and those of its component that it does not hide
-/// by one of the same name.
-void GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes);
+using Orn_Hdl::GetEffectiveAttrs;
 
-/// Whether the module itself has a parameter INIT that its instances can be given.
-bool InitDefined(const Netlist& netlist);
+/// Whether the instances in the netlist are given the module's own parameter or generic INIT in
+/// place of values of their own: the netlist has one, and its name has a mark of the language.
+bool PassesInit(Language language, const Netlist& netlist);
 
 } // namespace Orn_Hdl::Writers

@@ -1,10 +1,12 @@
 #include "Writers/SignalLists.h"
 
+#include "Writers/Text.h"
+
 namespace Orn_Hdl::Writers {
 
-SignalLists::SignalLists(const Netlist& netlist, NameTest isWritable) {
+SignalLists::SignalLists(const Netlist& netlist, Language language) {
     for (Signal* signal : netlist.GetSignalIterator()) {
-        if (!isWritable(signal->GetNameView())) {
+        if (!IsWritable(language, signal->GetNameView())) {
             continue;
         }
         if (signal->IsNeededToDeclared()) {
@@ -19,9 +21,8 @@ SignalLists::SignalLists(const Netlist& netlist, NameTest isWritable) {
     }
 }
 
-bool IsSingleBit(const Signal& signal) {
-    const int type = signal.GetSignalType();
-    return type == SignalTypeScalar || type == SignalTypeBusIndex;
+bool IsWritable(Language language, std::string_view name) {
+    return language == Language::Vhdl ? !IsOpen(name) : !name.empty();
 }
 
 bool RunsAgainstParent(const Signal& signal) {

@@ -1,6 +1,7 @@
 // Which signals a writer has something to write for.
 #pragma once
 
+#include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Netlist.h"
 
 #include <string_view>
@@ -11,10 +12,8 @@ namespace Orn_Hdl::Writers {
 /// The signals that are declared or assigned, gathered in one walk, each list in the netlist's
 /// order.
 struct SignalLists {
-    /// Tells whether a signal of that name can be written.
-    using NameTest = bool (*)(std::string_view name);
-
-    SignalLists(const Netlist& netlist, NameTest isWritable);
+    /// \param language the signals that it cannot write are left out.
+    SignalLists(const Netlist& netlist, Language language);
 
     std::vector<Signal*> ports;
     /// Declared, but no ports.
@@ -24,8 +23,9 @@ struct SignalLists {
     std::vector<Signal*> aliased;
 };
 
-/// Whether the signal is a scalar signal or a bit of a bus; a bus of one bit is neither.
-bool IsSingleBit(const Signal& signal);
+/// Whether a signal of that name can be written: it needs a name, and in VHDL another one than the
+/// reserved word "open".
+bool IsWritable(Language language, std::string_view name);
 
 /// Whether a slice of more than one bit counts the other way than the bus that it is a part of.
 bool RunsAgainstParent(const Signal& signal);

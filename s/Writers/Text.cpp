@@ -1,5 +1,6 @@
 #include "Writers/Text.h"
 
+#include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Options.h"
 #include "Writers/OneLine.h"
 
@@ -18,6 +19,10 @@ Port::String GetUnquotedValue(const Attribute& attribute) {
     return OneLine(value).GetView();
 }
 
+void WriteQuotedValue(OutStream& out, const Attribute& attribute) {
+    Put(out, "\"", GetUnquotedValue(attribute), "\"");
+}
+
 std::string_view GetSingleBit(const BitVectorValue& value) {
     const std::string_view digits = value.GetValue();
     return !digits.empty() && digits.back() == '0' ? "0" : "1";
@@ -32,11 +37,16 @@ void WriteBlanks(OutStream& out, std::size_t count) {
     }
 }
 
-void WriteCommentLines(OutStream& out, std::string_view prefix, std::string_view comment) {
+std::string InComment(Language language, std::string_view text) {
+    return std::string(TraitsOf(language).commentPrefix).append(" ").append(text);
+}
+
+void WriteComment(OutStream& out, Language language, const Object& object) {
+    std::string_view comment = object.GetCommentView();
     while (!comment.empty()) {
         const std::size_t end = std::min(comment.find('\n'), comment.size());
         if (end > 0) {
-            out << prefix << OneLine(comment.substr(0, end)).GetView() << "\n";
+            out << InComment(language, "") << OneLine(comment.substr(0, end)).GetView() << "\n";
         }
         comment.remove_prefix(std::min(end + 1, comment.size()));
     }

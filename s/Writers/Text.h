@@ -3,6 +3,7 @@
 
 #include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Pins.h"
 #include "Orn_Hdl/Streams.h"
 
@@ -22,6 +23,10 @@ std::string_view GetBaseName(const Pin& pin);
 
 /// The text of an attribute's value without the quotes around it, on one line.
 Port::String GetUnquotedValue(const Attribute& attribute);
+
+/// Writes the text of an attribute's value, on one line, between double quotes in place of those
+/// that it may have.
+void WriteQuotedValue(OutStream& out, const Attribute& attribute);
 
 /// The bit that a constant gives to a signal of one bit: only a last digit 0 gives "0".
 std::string_view GetSingleBit(const BitVectorValue& value);
@@ -48,7 +53,18 @@ template <class... Pieces> void PutLine(OutStream& out, const Pieces&... pieces)
 /// Writes blanks as one piece of text, which no line break divides.
 void WriteBlanks(OutStream& out, std::size_t count);
 
-/// Writes each line of a comment behind a prefix; lines without any text are left out.
-void WriteCommentLines(OutStream& out, std::string_view prefix, std::string_view comment);
+/// A text as one line of comment.
+std::string InComment(Language language, std::string_view text);
+
+/// Writes what `write` writes between two comments that hide it from synthesis.
+template <class Write> void WriteHidden(OutStream& out, Language language, const Write& write) {
+    PutLine(out, InComment(language, "synopsys translate_off"));
+    write();
+    PutLine(out, InComment(language, "synopsys translate_on"));
+}
+
+/// Writes each line of the object's comment as a line of comment; lines without any text are left
+/// out.
+void WriteComment(OutStream& out, Language language, const Object& object);
 
 } // namespace Orn_Hdl::Writers

@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
-#include <cstring>
 #include <string>
 
 using namespace Orn_Hdl;
@@ -45,15 +44,6 @@ TEST(EightBytes, MarksARange) {
         if (marks != 0) {
             ASSERT_EQ(EightBytes::FirstMarked(marks), first);
         }
-    });
-}
-
-TEST(EightBytes, FindsANul) {
-    ForEachText([](const std::string& text) {
-        ASSERT_EQ(EightBytes::HasNul(Load(text)), text.find('\0') != std::string::npos);
-        std::uint32_t four = 0;
-        std::memcpy(&four, text.data(), sizeof four);
-        ASSERT_EQ(EightBytes::HasNul(four), text.find('\0') < sizeof four);
     });
 }
 

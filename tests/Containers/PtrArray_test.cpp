@@ -5,8 +5,10 @@
 
 #include <algorithm>
 #include <climits>
+#include <iterator>
 #include <memory>
 #include <new>
+#include <ranges>
 #include <type_traits>
 #include <utility>
 #include <vector>
@@ -407,6 +409,228 @@ TEST(OwnPtrArray, DeletesAllOnRequest) {
     EXPECT_TRUE(owner.IsEmpty());
     owner.Add(new Heir(3, ended));
     EXPECT_EQ(owner.GetSize(), 1);
+}
+
+TEST(OwnPtrArray, IgnoresAPointerThatItHoldsByWhateverReferenceItIsCalled) {
+    std::vector<int> ended;
+    {
+        Owner owner;
+        PtrArray<Mortal*>& typed = owner;
+        Orn_Hdl::PtrArrayBase& untyped = owner;
+        Mortal* first = new Heir(1, ended);
+        Mortal* second = new Heir(2, ended);
+        EXPECT_EQ(typed.Add(first), 0);
+        EXPECT_EQ(untyped.Add(second), 1);
+        EXPECT_EQ(typed.Add(first), 0);
+        EXPECT_EQ(untyped.Add(second), 1);
+        for (int i = -1; i < 4; ++i) {
+            typed.SetAt(i, first);
+            untyped.SetAt(i, second);
+            typed.InsertAt(i, first);
+            untyped.InsertAt(i, second);
+        }
+        EXPECT_EQ(ElementsOf(owner), (std::vector<Mortal*>{first, second}));
+        EXPECT_EQ(typed.Add(nullptr), 2);
+        EXPECT_EQ(untyped.Add(nullptr), 3);
+    }
+    EXPECT_EQ(ended, (std::vector<int>{2, 1}));
+}
+
+TEST(OwnPtrArray, AssignedByAReferenceTakesEachPointerOnce) {
+    std::vector<int> ended;
+    const auto former = std::make_unique<Heir>(3, ended);
+    {
+        Owner owner;
+        Owner other;
+        other.Add(new Heir(2, ended));
+        owner.Add(former.get());
+        PtrArray<Mortal*>& typed = owner;
+        typed = other;
+        EXPECT_EQ(ElementsOf(owner), std::vector<Mortal*>{former.get()}) << "what has an owner";
+        PtrArray<Mortal*> plain;
+        Mortal* first = new Heir(1, ended);
+        plain.Add(first);
+        plain.Add(nullptr);
+        plain.Add(first);
+        typed = plain;
+        EXPECT_EQ(ElementsOf(owner), (std::vector<Mortal*>{first, nullptr}));
+        plain = owner;
+        EXPECT_EQ(plain.Add(first), 2) << "a plain array stays one";
+        PtrArray<Mortal*> copy = owner;
+        EXPECT_EQ(copy.Add(first), 2);
+    }
+    EXPECT_EQ(ended, (std::vector<int>{2, 1}));
+}
+
+/// What a predicate does at its first call, and later calls.
+struct Troublemaker {
+    Array* array = nullptr;
+    int calls = 0;
+    int throwingCall = 0;
+    void (*change)(Array& array) = nullptr;
+    unsigned random = 1;
+};
+
+bool MakesTrouble(int* a, int* b, void* context) {
+    auto& maker = *static_cast<Troublemaker*>(context);
+    if (++maker.calls == maker.throwingCall) {
+        throw std::bad_alloc();
+    }
+    if (maker.calls == 1 && maker.change != nullptr) {
+        maker.change(*maker.array);
+    }
+    return *a < *b;
+}
+
+TEST(PtrArray, AnExceptionOfThePredicateLeavesItAsItWas) {
+    int values[9] = {5, 3, 8, 1, 9, 2, 7, 4, 6};
+    Array array;
+    for (int& value : values) {
+        array.Add(&value);
+    }
+    const auto before = ElementsOf(array);
+    Troublemaker maker;
+    for (maker.throwingCall = 1;; ++maker.throwingCall) {
+        maker.calls = 0;
+        try {
+            array.Sort(&MakesTrouble, &maker);
+            break;
+        } catch (const std::bad_alloc&) {
+            ASSERT_EQ(ElementsOf(array), before);
+        }
+    }
+    EXPECT_GT(maker.throwingCall, 9);
+    EXPECT_NE(ElementsOf(array), before);
+}
+
+TEST(PtrArray, APredicateThatIsNoOrderLosesNothing) {
+    std::vector<int> values(300);
+    const auto always = [](int*, int*, void*) { return true; };
+    const auto never = [](int*, int*, void*) { return false; };
+    const auto atRandom = [](int*, int*, void* context) {
+        auto& random = static_cast<Troublemaker*>(context)->random;
+        random = random * 1664525 + 1013904223;
+        return (random >> 16) % 2 == 0;
+    };
+    Troublemaker maker;
+    for (bool (*less)(int*, int*, void*) : {+always, +never, +atRandom, +atRandom, +atRandom}) {
+        Array array;
+        std::vector<int*> expected;
+        for (int& value : values) {
+            array.Add(&value);
+            expected.push_back(&value);
+        }
+        array.Sort(less, &maker);
+        auto sorted = ElementsOf(array);
+        std::sort(sorted.begin(), sorted.end());
+        EXPECT_EQ(sorted, expected);
+    }
+}
+
+TEST(PtrArray, APredicateMayChangeIt) {
+    static int value = 10;
+    const auto empty = [](Array& array) { array.Empty(); };
+    const auto assign = [](Array& array) { array = Array(); };
+    const auto shrink = [](Array& array) { array.RemoveAt(0); };
+    const auto swap = [](Array& array) { array.Swap(0, 1); };
+    const auto grow = [](Array& array) {
+        for (int i = 0; i < 1000; ++i) {
+            array.Add(&value);
+        }
+    };
+    int values[5] = {5, 3, 4, 1, 2};
+    for (void (*change)(Array&) : {+empty, +assign, +shrink, +swap, +grow}) {
+        Array array;
+        for (int& element : values) {
+            array.Add(&element);
+        }
+        Array expected = array;
+        change(expected);
+        Troublemaker maker;
+        maker.array = &array;
+        maker.change = change;
+        array.Sort(&MakesTrouble, &maker);
+        EXPECT_EQ(ElementsOf(array), ElementsOf(expected));
+    }
+}
+
+TEST(PtrArray, ANullPredicateChangesNothing) {
+    int values[2] = {2, 1};
+    Array array;
+    array.Add(&values[0]);
+    array.Add(&values[1]);
+    array.Sort(nullptr, nullptr);
+    static_cast<Orn_Hdl::PtrArrayBase&>(array).Sort(nullptr, nullptr);
+    EXPECT_EQ(ElementsOf(array), (std::vector<int*>{&values[0], &values[1]}));
+}
+
+/// Makes its array on first use.
+struct LateOwner {
+    std::unique_ptr<Array> array;
+
+    Iterator<int*> GetIterator() const {
+        return Iterator<int*>(this, [](const void* owner) -> const Array* {
+            return static_cast<const LateOwner*>(owner)->array.get();
+        });
+    }
+};
+
+TEST(Iterator, SeesAnArrayThatItsOwnerMakesLater) {
+    int a = 0;
+    int b = 0;
+    LateOwner owner;
+    Iterator<int*> at = owner.GetIterator();
+    const Iterator<int*> start = at;
+    auto cursor = at.begin();
+    EXPECT_TRUE(at.IsAtEnd());
+    EXPECT_EQ(at.GetCurrent(), nullptr);
+    EXPECT_EQ(cursor, at.end());
+    EXPECT_EQ(*cursor, nullptr);
+    owner.array = std::make_unique<Array>();
+    owner.array->Add(&a);
+    EXPECT_FALSE(at.IsAtEnd());
+    EXPECT_EQ(at.GetCurrent(), &a);
+    EXPECT_NE(cursor, at.end());
+    EXPECT_EQ(*cursor, &a);
+    at.Next();
+    EXPECT_TRUE(at.IsAtEnd());
+    owner.array = std::make_unique<Array>();
+    owner.array->Add(&b);
+    owner.array->Add(&a);
+    EXPECT_EQ(at.GetCurrent(), &a);
+    EXPECT_EQ(std::vector<int*>(start.begin(), start.end()), (std::vector<int*>{&b, &a}));
+    owner.array.reset();
+    EXPECT_TRUE(at.IsAtEnd());
+}
+
+static_assert(std::forward_iterator<Iterator<int*>::Cursor>);
+static_assert(std::ranges::forward_range<Iterator<int*>>);
+static_assert(std::ranges::common_range<const Iterator<int*>>);
+static_assert(std::ranges::viewable_range<Iterator<int*>>);
+
+TEST(Iterator, WorksInAlgorithmsAndRanges) {
+    int values[4] = {3, 1, 4, 1};
+    Array array;
+    for (int& value : values) {
+        array.Add(&value);
+    }
+    const Iterator<int*> list(&array);
+    const auto isOne = [](const int* value) { return *value == 1; };
+    EXPECT_EQ(std::count_if(list.begin(), list.end(), isOne), 2);
+    EXPECT_EQ(std::ranges::count_if(list, isOne), 2);
+    EXPECT_EQ(*std::ranges::find_if(list, isOne), &values[1]);
+    EXPECT_EQ(std::ranges::max(list, {}, [](const int* value) { return *value; }), &values[2]);
+    std::vector<int> ones;
+    for (const int* value : Iterator<int*>(&array) | std::views::filter(isOne)) {
+        ones.push_back(*value);
+    }
+    EXPECT_EQ(ones, (std::vector<int>{1, 1}));
+    auto cursor = list.begin();
+    EXPECT_EQ(*cursor++, &values[0]);
+    EXPECT_EQ(*cursor, &values[1]);
+    EXPECT_NE(cursor, list.begin());
+    EXPECT_EQ(cursor, std::next(list.begin()));
+    EXPECT_EQ(std::distance(cursor, list.end()), 3);
 }
 
 TEST(OwnPtrArray, CannotBeCopied) {

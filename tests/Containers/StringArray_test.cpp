@@ -9,8 +9,12 @@
 #include <algorithm>
 #include <climits>
 #include <cstring>
+#include <iterator>
+#include <new>
 #include <ostream>
+#include <ranges>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -211,6 +215,135 @@ TEST(StringArray, SortsStablyWithTheCallersOrder) {
     array.Sort(&IsShorter, &calls);
     EXPECT_EQ(NamesOf(array), expected);
     EXPECT_GT(calls, 0);
+}
+
+TEST(StringArray, ANullPredicateChangesNothing) {
+    StringArray array = Make({"b", "a"});
+    array.Sort(nullptr, nullptr);
+    EXPECT_EQ(NamesOf(array), (Names{"b", "a"}));
+}
+
+TEST(StringArray, AnExceptionOfThePredicateLeavesItAsItWas) {
+    StringArray array = Make({"b", "a", "c"});
+    const auto fails = [](const Port::String&, const Port::String&, void*) -> bool {
+        throw std::bad_alloc();
+    };
+    EXPECT_THROW(array.Sort(+fails, nullptr), std::bad_alloc);
+    EXPECT_EQ(NamesOf(array), (Names{"b", "a", "c"}));
+}
+
+TEST(StringArray, APredicateThatIsNoOrderLosesNothing) {
+    StringArray array;
+    Names expected;
+    for (int i = 100; i < 400; ++i) {
+        expected.push_back(std::to_string(i));
+        array.Add(expected.back());
+    }
+    unsigned random = 1;
+    const auto atRandom = [](const Port::String&, const Port::String&, void* context) {
+        auto& number = *static_cast<unsigned*>(context);
+        number = number * 1664525 + 1013904223;
+        return (number >> 16) % 2 == 0;
+    };
+    for (int i = 0; i < 20; ++i) {
+        array.Sort(+atRandom, &random);
+        Names sorted = NamesOf(array);
+        std::sort(sorted.begin(), sorted.end());
+        ASSERT_EQ(sorted, expected);
+    }
+}
+
+TEST(StringArray, APredicateMayChangeIt) {
+    StringArray array = Make({"b", "a", "c"});
+    const auto grows = [](const Port::String& a, const Port::String& b, void* context) {
+        static_cast<StringArray*>(context)->Add("new");
+        return a < b;
+    };
+    array.Sort(+grows, &array);
+    EXPECT_GT(array.GetSize(), 3);
+    EXPECT_EQ(array.Concatenate(",").GetView().substr(0, 9), "b,a,c,new");
+    const auto empties = [](const Port::String& a, const Port::String& b, void* context) {
+        static_cast<StringArray*>(context)->Empty();
+        return a < b;
+    };
+    array.Sort(+empties, &array);
+    EXPECT_TRUE(array.IsEmpty());
+}
+
+static_assert(std::forward_iterator<StringArray::Cursor>);
+static_assert(std::ranges::forward_range<const StringArray>);
+static_assert(std::ranges::common_range<StringArray>);
+
+TEST(StringArray, IsARange) {
+    const StringArray array = Make({"b", "", "a"});
+    Names names;
+    for (const std::string_view text : array) {
+        names.emplace_back(text);
+    }
+    EXPECT_EQ(names, (Names{"b", "", "a"}));
+    names.clear();
+    for (const Port::String& text : array) {
+        names.emplace_back(text.GetView());
+    }
+    EXPECT_EQ(names, (Names{"b", "", "a"}));
+    EXPECT_EQ(Names(array.begin(), array.end()), names);
+    EXPECT_EQ(std::ranges::count(array, ""), 1);
+    EXPECT_EQ(*std::ranges::find(array, "a"), "a");
+    auto at = array.begin();
+    EXPECT_EQ(*at++, "b");
+    EXPECT_EQ(*at, "");
+    EXPECT_EQ(std::next(at, 2), array.end());
+    EXPECT_EQ(*array.end(), "");
+    EXPECT_EQ(*StringArray::Cursor(), "");
+    const StringArray empty;
+    EXPECT_EQ(empty.begin(), empty.end());
+}
+
+TEST(StringArray, TakesTextsInEveryForm) {
+    StringArray array;
+    array.Add(nullptr);
+    array.Add(std::string_view("a-").substr(0, 1));
+    array.Add(std::string("b"));
+    array.SetAt(3, std::string("c"));
+    array.SetAt(0, nullptr);
+    EXPECT_EQ(NamesOf(array), (Names{"", "a", "b", "c"}));
+    EXPECT_TRUE(array.Contains(nullptr));
+    EXPECT_TRUE(array.Contains(std::string("a")));
+    EXPECT_TRUE(array.IContains(std::string_view("B")));
+    EXPECT_EQ(array.Concatenate(nullptr), "abc");
+    EXPECT_EQ(array.Concatenate(std::string("+")), "+a+b+c");
+    EXPECT_EQ(StringArray(nullptr, nullptr, true, nullptr).GetSize(), 0);
+    EXPECT_EQ(NamesOf(StringArray(std::string("a b"), " ", true, nullptr)), (Names{"a", "b"}));
+    array.Empty();
+    EXPECT_EQ(array.Parse(std::string_view("a b"), " ", true, nullptr), 2);
+    EXPECT_EQ(array.ParseCommandLine(nullptr), 0);
+    EXPECT_EQ(NamesOf(array), (Names{"a", "b"}));
+}
+
+TEST(StringArray, SplitsATextOfItsOwn) {
+    StringArray array;
+    array.Add("one two three four five six seven eight nine ten");
+    array.Add(" ");
+    array.Add("\"\"");
+    const std::string whole(array.GetView(0));
+    for (int i = 0; i < 5; ++i) {
+        array.SetAt(0, whole);
+        EXPECT_EQ(array.Parse(array.GetView(0), array.GetView(1), true, array.GetView(2)), 10);
+        EXPECT_EQ(array.ParseCommandLine(array.GetView(0)), 10);
+        EXPECT_EQ(array.Parse("a b", array.GetView(1), true, nullptr), 2);
+    }
+    EXPECT_EQ(array.GetSize(), 3 + 5 * 22);
+    EXPECT_EQ(array.JoinFrom(3 + 4 * 22), whole + " " + whole + " a b");
+    StringArray quoted;
+    quoted.Add("\"a b\" 'c d' e");
+    quoted.Empty();
+    quoted.Add("\"a b\" 'c d' eeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeeee");
+    EXPECT_EQ(quoted.ParseCommandLine(quoted.GetView(0)), 3);
+    EXPECT_EQ(quoted.GetView(1), "a b");
+    quoted.SetAt(0, quoted.GetView(3));
+    EXPECT_EQ(quoted.GetView(0), quoted.GetView(3));
+    quoted.SetAt(1, quoted.GetView(3));
+    EXPECT_EQ(quoted.GetView(1), quoted.GetView(3));
 }
 
 TEST(StringArray, SortsEmptySlotsAsEmptyTexts) {

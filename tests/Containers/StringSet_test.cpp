@@ -7,7 +7,11 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
+#include <algorithm>
+#include <iterator>
+#include <ranges>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -383,6 +387,67 @@ TEST(StringSetIterator, GivesACopyOfTheName) {
         name = *set.GetBeginPos();
     }
     EXPECT_EQ(name, "long enough to live in memory of its own");
+}
+
+static_assert(std::input_iterator<StringSetIterator>);
+static_assert(std::sentinel_for<StringSetIterator, StringSetIterator>);
+static_assert(std::forward_iterator<StringSet::Cursor>);
+static_assert(std::ranges::forward_range<const StringSet>);
+static_assert(std::ranges::common_range<StringSet>);
+
+TEST(StringSet, IsARange) {
+    StringSet set;
+    set.Add("b");
+    set.Add("a name that is too long to stand in its object");
+    set.Add("a");
+    const Support::Names expected = Support::NamesOf(set);
+    Support::Names names;
+    for (const std::string_view name : set) {
+        names.emplace_back(name);
+    }
+    EXPECT_EQ(names, expected);
+    names.clear();
+    for (const Port::String& name : set) {
+        names.emplace_back(name.GetView());
+    }
+    EXPECT_EQ(names, expected);
+    EXPECT_EQ(Support::Names(set.begin(), set.end()), expected);
+    EXPECT_EQ(std::ranges::count(set, "a"), 1);
+    const std::ranges::subrange copies(set.GetBeginPos(), set.GetEndPos());
+    EXPECT_EQ(std::ranges::count_if(copies, [](const Port::String& name) { return name == "b"; }),
+              1);
+    auto at = set.begin();
+    EXPECT_EQ(*at++, expected[0]);
+    EXPECT_EQ(*at, expected[1]);
+    EXPECT_NE(at, set.begin());
+    EXPECT_EQ(std::distance(at, set.end()), 2);
+    EXPECT_EQ(*set.end(), "");
+    EXPECT_EQ(StringSet().begin(), StringSet().end());
+}
+
+TEST(StringSet, RemovesWhateverItAdds) {
+    StringSet set;
+    const std::string name("ab");
+    set.Add(std::string_view(name).substr(0, 1));
+    set.Add(name);
+    set.Add(Port::String("c"));
+    set.Add(nullptr);
+    set.Add(std::string_view("\0", 1));
+    set.Remove(std::string_view(name).substr(0, 1));
+    set.Remove(name);
+    set.Remove(Port::String("c"));
+    set.Remove(nullptr);
+    EXPECT_FALSE(set.IsEmpty());
+    set.Remove(std::string_view("\0", 1));
+    EXPECT_TRUE(set.IsEmpty());
+    EXPECT_FALSE(set.IContains(name));
+}
+
+TEST(StringSet, RemovesANameOfItsOwn) {
+    StringSet set;
+    set.Add("a name that is too long to stand in its object");
+    set.Remove(*set.begin());
+    EXPECT_TRUE(set.IsEmpty());
 }
 
 RC_GTEST_PROP(StringSet, BehavesAsItsSlowDouble, ()) {

@@ -7,6 +7,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <filesystem>
 #include <functional>
 #include <memory>
 #include <new>
@@ -149,7 +150,7 @@ TEST_F(CommandLine, TabsAreNoSeparators) {
     EXPECT_NE(model_.GetComponent("X\tY"), nullptr);
 }
 
-TEST_F(CommandLine, ALineEndsAtItsFirstNul) {
+TEST_F(CommandLine, EndsAtItsFirstNul) {
     EXPECT_TRUE(model_.ExecuteLine(std::string_view("ADD SIGNAL N\0M", 14)));
     EXPECT_NE(model_.GetSignal("N"), nullptr);
     EXPECT_TRUE(model_.ExecuteLine(std::string_view("\0MAKE COFFEE", 12)));
@@ -461,6 +462,185 @@ TEST_F(CommandLine, ACommandMayClearTheDoneOnes) {
     EXPECT_EQ(aliveCommands, 0);
 }
 
+TEST_F(CommandLine, ADoneCommandIsKeptOnce) {
+    CommandManager manager;
+    Command* const command = LoggedCommand::Create(&model_, StringArray());
+    manager.AddDoneCommand(command);
+    manager.AddDoneCommand(command);
+    EXPECT_EQ(manager.GetDoneCommandCount(), 1);
+    manager.Clear();
+    EXPECT_EQ(log, std::vector<std::string>{"delete "});
+
+    manager.CreateAndExecute(Words("LOGGED a"), &model_, &factory_);
+    EXPECT_EQ(manager.GetDoneCommandCount(), 1);
+    log.clear();
+    manager.Clear();
+    EXPECT_EQ(log, std::vector<std::string>{"delete a"});
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, ACommandGivenToTwoManagersStaysWithTheFirst) {
+    CommandManager first;
+    CommandManager second;
+    Command* const command = LoggedCommand::Create(&model_, StringArray());
+    first.AddDoneCommand(command);
+    second.AddDoneCommand(command);
+    EXPECT_EQ(first.GetDoneCommandCount(), 1);
+    EXPECT_EQ(second.GetDoneCommandCount(), 0);
+
+    action = [&](Command& running) { second.AddDoneCommand(&running); };
+    first.CreateAndExecute(Words("LOGGED act"), &model_, &factory_);
+    EXPECT_EQ(first.GetDoneCommandCount(), 2);
+    EXPECT_EQ(second.GetDoneCommandCount(), 0);
+    EXPECT_EQ(command->GetModel(), &model_);
+    command->SetModel(nullptr);
+    second.AddDoneCommand(command);
+    EXPECT_EQ(second.GetDoneCommandCount(), 0) << "another model makes it nobody else's";
+
+    EXPECT_EQ(aliveCommands, 2);
+    first.Clear();
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, AManagerMayBeDestroyedWithinItsCommand) {
+    auto manager = std::make_unique<CommandManager>();
+    EXPECT_TRUE(manager->CreateAndExecute(Words("LOGGED a"), &model_, &factory_));
+    action = [&](Command&) {
+        manager.reset();
+        EXPECT_EQ(aliveCommands, 1) << "the one that is being carried out stays";
+    };
+    EXPECT_TRUE(manager->CreateAndExecute(Words("LOGGED act"), &model_, &factory_));
+    EXPECT_EQ(aliveCommands, 0);
+
+    manager = std::make_unique<CommandManager>();
+    bool isInner = false;
+    action = [&](Command&) {
+        if (isInner) {
+            manager.reset();
+            return;
+        }
+        isInner = true;
+        manager->CreateAndExecute(Words("LOGGED act"), &model_, &factory_);
+        EXPECT_EQ(manager, nullptr);
+        EXPECT_EQ(aliveCommands, 1);
+        model_.Execute("LOGGED throw-in-execute");
+    };
+    EXPECT_EQ(
+        FailureOf([&] { manager->CreateAndExecute(Words("LOGGED act"), &model_, &factory_); }),
+        "as described\n");
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, AManagerThatIsBeingDestroyedKeepsNoMoreCommands) {
+    /// Runs and keeps further commands when it is destroyed.
+    struct Parting : LoggedCommand {
+        Parting(Model* model, CommandManager& owner, CommandFactory& commands)
+            : LoggedCommand(model, "parting"), manager(owner), factory(commands) {}
+        ~Parting() override {
+            manager.CreateAndExecute(Words("LOGGED last"), GetModel(), &factory);
+            manager.AddDoneCommand(LoggedCommand::Create(GetModel(), StringArray()));
+        }
+        CommandManager& manager;
+        CommandFactory& factory;
+    };
+    {
+        CommandManager manager;
+        manager.AddDoneCommand(new Parting(&model_, manager, factory_));
+    }
+    EXPECT_EQ(aliveCommands, 0);
+    EXPECT_EQ(log, (std::vector<std::string>{"parse LOGGED|last", "execute last", "delete last",
+                                             "delete ", "delete "}));
+
+    auto model = std::make_unique<Model>(&factory_);
+    model->GetCommandManager()->AddDoneCommand(
+        new Parting(model.get(), *model->GetCommandManager(), factory_));
+    model.reset();
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, AModelMayBeDestroyedWithinItsCommand) {
+    std::unique_ptr<Model> model;
+    action = [&](Command&) {
+        model.reset();
+        EXPECT_EQ(aliveCommands, 1) << "the one that is being carried out stays";
+    };
+    const std::function<bool()> runs[] = {
+        [&] { return model->Execute("LOGGED act"); },
+        [&] { return model->ExecuteLine("LOGGED act"); },
+        [&] { return model->Execute(Words("LOGGED act")); },
+        [&] {
+            return model->GetCommandManager()->CreateAndExecute(Words("LOGGED act"), model.get(),
+                                                                &factory_);
+        },
+    };
+    for (const auto& run : runs) {
+        model = std::make_unique<Model>(&factory_);
+        model->Execute("LOGGED a");
+        EXPECT_TRUE(run());
+        EXPECT_EQ(model, nullptr);
+        EXPECT_EQ(aliveCommands, 0);
+    }
+}
+
+TEST_F(CommandLine, AModelMayBeDestroyedWithinACommandThatFails) {
+    auto model = std::make_unique<Model>(&factory_);
+    action = [&](Command&) {
+        model.reset();
+        model_.Execute("LOGGED throw-in-execute");
+    };
+    EXPECT_EQ(FailureOf([&] { model->Execute("LOGGED act"); }), "as described\n");
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, AModelMayBeDestroyedWithinALineWithinALine) {
+    auto model = std::make_unique<Model>(&factory_);
+    int depth = 0;
+    action = [&](Command&) {
+        if (++depth < 3) {
+            model->Execute("LOGGED act");
+        } else {
+            model.reset();
+        }
+    };
+    EXPECT_TRUE(model->Execute("LOGGED act"));
+    EXPECT_EQ(depth, 3);
+    EXPECT_EQ(aliveCommands, 0);
+}
+
+TEST_F(CommandLine, ACommandKeptByAnotherManagerForgetsAModelThatItDestroyed) {
+    auto model = std::make_unique<Model>(&factory_);
+    CommandManager manager;
+    const Command* kept = nullptr;
+    action = [&](Command& command) {
+        kept = &command;
+        model.reset();
+    };
+    EXPECT_TRUE(manager.CreateAndExecute(Words("LOGGED act"), model.get(), &factory_));
+    EXPECT_EQ(manager.GetDoneCommandCount(), 1);
+    EXPECT_EQ(kept->GetModel(), nullptr);
+}
+
+TEST_F(CommandLine, AGuardMayDestroyTheModelThatAsksIt) {
+    const Support::TemporaryFolder folder;
+    struct Guard : OutputGuard {
+        explicit Guard(std::unique_ptr<Model>& asking) : model(asking) {}
+        Port::StringBase<char> WhyNot(const char* /*fileName*/) override {
+            model.reset();
+            return {};
+        }
+        std::unique_ptr<Model>& model;
+    };
+    for (const char* phrase : {"WRITE VERILOG ", "WRITE VHDL "}) {
+        auto model = std::make_unique<Model>(&factory_);
+        Guard guard(model);
+        model->SetOutputGuard(&guard);
+        const std::string file = folder / "top";
+        EXPECT_TRUE(model->Execute((phrase + file).c_str()));
+        EXPECT_EQ(model, nullptr);
+        EXPECT_FALSE(std::filesystem::exists(file));
+    }
+}
+
 TEST_F(CommandLine, ThousandsOfCommandsAreKept) {
     for (int i = 0; i < 20000; ++i) {
         model_.Execute("NOOP");
@@ -577,16 +757,21 @@ TEST_F(CommandFile, OneCarriageReturnBelongsToTheLineEnd) {
 }
 
 TEST_F(CommandFile, EmptyFilesAreFine) {
+    model_.SetModifiedFlag(true);
     EXPECT_TRUE(Read(""));
+    EXPECT_FALSE(model_.IsModified());
     EXPECT_TRUE(Read("\n"));
     EXPECT_TRUE(Read("\r\n"));
     EXPECT_EQ(GetDoneCount(), 0);
 }
 
-TEST_F(CommandFile, ALineEndsAtItsFirstNul) {
-    EXPECT_TRUE(Read(std::string("ADD SIGNAL A\0B C\nADD SIGNAL D\n", 30)));
-    EXPECT_NE(model_.GetSignal("A"), nullptr);
-    EXPECT_NE(model_.GetSignal("D"), nullptr);
+TEST_F(CommandFile, IsClosedOnEveryPath) {
+    const int before = Support::CountOpenFiles();
+    EXPECT_TRUE(Read("ADD COMPONENT A\n"));
+    EXPECT_THROW(Read("ADD COMPONENT B\nADD COMPONENT B\nADD COMPONENT C\n"), Exception);
+    EXPECT_EQ(Support::CountOpenFiles(), before);
+    EXPECT_NE(model_.GetComponent("B"), nullptr) << "the lines before the failure stay done";
+    EXPECT_EQ(model_.GetComponent("C"), nullptr);
 }
 
 TEST_F(CommandFile, AnExceptionStopsTheReplayAndKeepsTheFlag) {
@@ -611,6 +796,16 @@ TEST_F(CommandFile, AFileThatCannotBeOpenedClearsTheFlag) {
         EXPECT_FALSE(model_.Read(name));
         EXPECT_FALSE(model_.IsModified());
     }
+}
+
+TEST_F(CommandFile, ACommandThatDestroysTheModelIsTheLastOfItsFile) {
+    Support::WriteWholeFile(file_, "LOGGED a\nLOGGED act\nLOGGED b\n");
+    auto model = std::make_unique<Model>(&factory_);
+    action = [&](Command&) { model.reset(); };
+    EXPECT_TRUE(model->Read(file_.c_str()));
+    EXPECT_EQ(model, nullptr);
+    EXPECT_EQ(log, (std::vector<std::string>{"parse LOGGED|a", "execute a", "parse LOGGED|act",
+                                             "execute act", "delete a", "delete act"}));
 }
 
 TEST_F(CommandFile, ReadClosesTheFileOnEveryPath) {

@@ -1,6 +1,7 @@
 // What the option commands do to the options of a model.
 
 #include "Orn_Hdl/Orn_Hdl.h"
+#include "Support/DefaultOptions.h"
 #include "Support/EngineScript.h"
 
 #include <gtest/gtest.h>
@@ -10,33 +11,10 @@
 
 using namespace Orn_Hdl;
 using Support::EngineScript;
+using Support::ExpectDefaults;
 using VerilogOption = HdlOptions::VerilogOption;
 
 namespace {
-
-void ExpectDefaults(const HdlOptions& options) {
-    EXPECT_FALSE(options.vhdl.suppressConfiguration);
-    EXPECT_FALSE(options.vhdl.flattenBus);
-    EXPECT_TRUE(options.vhdl.useDefaultLibrary);
-    EXPECT_TRUE(options.vhdl.libraries.IsEmpty());
-    EXPECT_TRUE(options.vhdl.useClauses.IsEmpty());
-    EXPECT_FALSE(options.vhdl.useAttrType);
-    EXPECT_TRUE(options.vhdl.openPin);
-    EXPECT_FALSE(options.vhdl.suppressComponent);
-    EXPECT_EQ(options.verilog.synthesisType, 0);
-    EXPECT_EQ(options.verilog.signalCase, 10);
-    EXPECT_EQ(options.verilog.instanceCase, 10);
-    EXPECT_EQ(options.verilog.componentCase, 10);
-    EXPECT_TRUE(options.verilog.includePaths.IsEmpty());
-    EXPECT_TRUE(options.writeHeader);
-    EXPECT_EQ(options.application, "");
-    EXPECT_EQ(options.command, "");
-    EXPECT_EQ(options.device, "");
-    EXPECT_EQ(options.purpose, "");
-    EXPECT_EQ(options.reference, "");
-    EXPECT_TRUE(options.onePortPerLine);
-    EXPECT_FALSE(options.hierarchicalInit);
-}
 
 /// A command that sets a flag unless its word is "false".
 struct Flag {

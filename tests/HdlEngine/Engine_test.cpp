@@ -6,6 +6,7 @@
 #include <gtest/gtest.h>
 
 #include <functional>
+#include <memory>
 #include <string>
 #include <type_traits>
 #include <vector>
@@ -170,7 +171,8 @@ protected:
 } // namespace
 
 TEST_F(RemovalFromWithin, OfALine) {
-    engine_.Execute("REMOVE");
+    EXPECT_EQ(FailureOfLine(engine_, "REMOVE"), "");
+    EXPECT_EQ(endedRemovers, 1);
 }
 
 TEST_F(RemovalFromWithin, OfALineOfTheModel) {
@@ -221,6 +223,30 @@ TEST_F(RemovalFromWithin, OfACommandFile) {
     const std::string file = folder / "lines.cmd";
     WriteWholeFile(file, "ADD SIGNAL M\nREMOVE\nCONNECT SIGNAL N M\n");
     EXPECT_TRUE(engine_.ReadCommandFile("top", file.c_str())) << "its other lines are done, too";
+}
+
+TEST(EngineModels, AnEngineMayBeDestroyedWithinItsCommand) {
+    const TemporaryFolder folder;
+    const std::string file = folder / "lines.cmd";
+    WriteWholeFile(file, "NOOP\nREMOVE\nUNKNOWN\n");
+    std::unique_ptr<Engine> engine;
+    removal = [&engine](Model& /*model*/) { engine.reset(); };
+    farewell = nullptr;
+    const std::function<void()> runs[] = {
+        [&] { engine->Execute("REMOVE"); },
+        [&] { engine->Execute("top", "REMOVE"); },
+        [&] { EXPECT_TRUE(engine->ReadCommandFile("top", file.c_str())); },
+    };
+    for (const auto& run : runs) {
+        endedRemovers = 0;
+        engine = std::make_unique<Engine>();
+        engine->CreateAndAddModel("top", "");
+        engine->UseModel("top");
+        engine->GetModel("top")->GetCommandFactory()->AddCommandCreator("REMOVE", &Remover::Create);
+        run();
+        EXPECT_EQ(engine, nullptr);
+        EXPECT_EQ(endedRemovers, 1);
+    }
 }
 
 TEST(EngineModels, ARenamedModelIsFoundByItsNewName) {
@@ -294,15 +320,26 @@ TEST(EngineModels, EnginesAreIndependent) {
 }
 
 TEST(EngineModels, DestructionDeletesManyModelsWithDesigns) {
-    Engine engine;
-    for (int i = 0; i < 50; ++i) {
-        const std::string name = "m" + std::to_string(i);
-        engine.CreateAndAddModel(name.c_str(), "");
-        engine.Execute(name.c_str(), "ADD COMPONENT INV");
-        engine.Execute(name.c_str(), "ADD PIN INV I Input");
-        engine.Execute(name.c_str(), "ADD INSTANCE INV U1");
-        engine.Execute(name.c_str(), "CONNECT SIGNAL N U1.I");
+    constexpr int Models = 50;
+    endedRemovers = 0;
+    farewell = nullptr;
+    removal = [](Model&) {};
+    {
+        Engine engine;
+        for (int i = 0; i < Models; ++i) {
+            const std::string name = "m" + std::to_string(i);
+            engine.CreateAndAddModel(name.c_str(), "");
+            engine.GetModel(name.c_str())
+                ->GetCommandFactory()
+                ->AddCommandCreator("REMOVE", &Remover::Create);
+            for (const char* line : {"ADD COMPONENT INV", "ADD PIN INV I Input",
+                                     "ADD INSTANCE INV U1", "CONNECT SIGNAL N U1.I", "REMOVE"}) {
+                engine.Execute(name.c_str(), line);
+            }
+        }
+        EXPECT_EQ(endedRemovers, 0);
     }
+    EXPECT_EQ(endedRemovers, Models) << "each model has ended, with the commands that it keeps";
 }
 
 TEST(EngineModels, AnEngineIsNotCopied) {

@@ -4,7 +4,6 @@
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Support/EngineScript.h"
 #include "Support/Environment.h"
-#include "Support/Golden.h"
 #include "Support/NetlistText.h"
 
 #include <gtest/gtest.h>
@@ -423,10 +422,13 @@ RC_GTEST_PROP(RandomScripts, WritingAgainDeclaresNothingTwice, ()) {
     const std::string& verilog = verilogFirst ? early : late;
     const std::string& vhdl = verilogFirst ? late : early;
     ExpectDeclaredOnce(verilog, vhdl);
-    for (int i = 0; i < 2; ++i) {
-        RC_ASSERT(SortedLines(script.Verilog()) == SortedLines(verilog));
-        RC_ASSERT(SortedLines(script.Vhdl()) == SortedLines(vhdl));
-    }
+    // The dummy signals of the first write are sorted in by the second.
+    const std::string verilogAgain = script.Verilog();
+    const std::string vhdlAgain = script.Vhdl();
+    RC_ASSERT(SortedLines(verilogAgain) == SortedLines(verilog));
+    RC_ASSERT(SortedLines(vhdlAgain) == SortedLines(vhdl));
+    RC_ASSERT(script.Verilog() == verilogAgain);
+    RC_ASSERT(script.Vhdl() == vhdlAgain);
 }
 
 RC_GTEST_PROP(RandomScripts, CommandsBetweenWritesDeclareNothingTwice, ()) {

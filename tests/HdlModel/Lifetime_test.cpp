@@ -2,6 +2,7 @@
 #include "Orn_Hdl/Model.h"
 
 #include "Support/Names.h"
+#include "Support/Parts.h"
 
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
@@ -17,19 +18,11 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::In;
+using Support::MakeBuffer;
 using Support::Names;
 using Support::NamesOf;
-
-const Polarity In("in");
-const Polarity Out("out");
-
-std::unique_ptr<Component> MakeComponent(const char* name) {
-    auto component = std::make_unique<Component>(name);
-    component->AddPin("I", In, "");
-    component->AddPin("O", Out, "");
-    component->AddPin("D(3:0)", In, "");
-    return component;
-}
+using Support::Out;
 
 TEST(Lifetime, APinThatEndsLeavesEverySignalThatListsIt) {
     ScalarSignal first("N1");
@@ -54,6 +47,37 @@ TEST(Lifetime, APinThatOnlyPointsAtASignalMayEndBeforeOrAfterIt) {
     early.reset();
     signal.reset();
     EXPECT_EQ(late.GetSignal(), nullptr);
+}
+
+TEST(Lifetime, APinThatMovedOnIsNotOpenedByAnyFormerSignal) {
+    const auto pointedAt = [](Signal& signal, Pin& pin) { pin.Connect(&signal); };
+    const auto listed = [](Signal& signal, Pin& pin) { signal.Connect(&pin); };
+    const auto pointedAtThenListed = [](Signal& signal, Pin& pin) {
+        pin.Connect(&signal);
+        signal.Connect(&pin);
+    };
+    const auto listedThenPointedAt = [](Signal& signal, Pin& pin) {
+        signal.Connect(&pin);
+        signal.Disconnect(&pin);
+        pin.Connect(&signal);
+    };
+    const std::function<void(Signal&, Pin&)> ways[] = {pointedAt, listed, pointedAtThenListed,
+                                                       listedThenPointedAt};
+    for (const auto& before : ways) {
+        for (const auto& after : ways) {
+            ScalarPin pin("A", In);
+            ScalarSignal last("M");
+            auto former = std::make_unique<ScalarSignal>("N");
+            before(*former, pin);
+            after(last, pin);
+            former->DisconnectAll();
+            EXPECT_EQ(pin.GetSignal(), &last);
+            before(*former, pin);
+            after(last, pin);
+            former.reset();
+            EXPECT_EQ(pin.GetSignal(), &last);
+        }
+    }
 }
 
 TEST(Lifetime, ASignalThatEndsOpensItsPins) {
@@ -201,7 +225,7 @@ TEST(Lifetime, NestedCompoundsMayEndInsideOut) {
 }
 
 TEST(Lifetime, AnInstanceThatEndsLeavesTheSignals) {
-    const std::unique_ptr<Component> component = MakeComponent("C");
+    const std::unique_ptr<Component> component = MakeBuffer("C");
     ScalarSignal signal("N");
     {
         Instance instance("U", component.get());
@@ -213,21 +237,21 @@ TEST(Lifetime, AnInstanceThatEndsLeavesTheSignals) {
 }
 
 TEST(Lifetime, AComponentAndItsInstancesMayEndInAnyOrder) {
-    std::unique_ptr<Component> component = MakeComponent("C");
+    std::unique_ptr<Component> component = MakeBuffer("C");
     auto first = std::make_unique<Instance>("U1", component.get());
     auto second = std::make_unique<Instance>("U2", component.get());
     first.reset();
     component.reset();
     EXPECT_EQ(second->GetComponent(), nullptr);
-    EXPECT_EQ(NamesOf(second->GetPinIterator()), (Names{"I", "O", "D(3:0)"}));
-    component = MakeComponent("C");
+    EXPECT_EQ(NamesOf(second->GetPinIterator()), (Names{"I", "O", "B", "D(3:0)"}));
+    component = MakeBuffer("C");
     EXPECT_EQ(second->GetComponent(), nullptr);
 }
 
 TEST(Lifetime, AComponentWhosePinsAreWiredMayEnd) {
     ScalarSignal signal("N");
     {
-        const std::unique_ptr<Component> component = MakeComponent("C");
+        const std::unique_ptr<Component> component = MakeBuffer("C");
         signal.Connect(component->GetPin("I"));
         component->GetPin("O")->Connect(&signal);
     }
@@ -235,7 +259,7 @@ TEST(Lifetime, AComponentWhosePinsAreWiredMayEnd) {
 }
 
 TEST(Lifetime, ANetlistThatEndsLeavesForeignObjects) {
-    const std::unique_ptr<Component> component = MakeComponent("C");
+    const std::unique_ptr<Component> component = MakeBuffer("C");
     Instance foreign("U", component.get());
     ScalarSignal outside("OUT");
     CompoundBus compound("N,OUT");
@@ -285,7 +309,7 @@ TEST(Lifetime, ForeignObjectsThatEndLeaveANetlist) {
     netlist.Add(bus);
     Instance* instance = nullptr;
     {
-        const std::unique_ptr<Component> component = MakeComponent("C");
+        const std::unique_ptr<Component> component = MakeBuffer("C");
         instance = new Instance("U1", component.get());
         netlist.Add(instance);
         ScalarSignal outside("OUT");
@@ -313,7 +337,7 @@ TEST(Lifetime, TwoNetlistsMayBeWiredToOneAnother) {
         for (Netlist* netlist : netlists) {
             netlist->Add(new ScalarSignal("N"));
             netlist->Add(new Bus("D(7:0)"));
-            netlist->Add(MakeComponent("C").release());
+            netlist->Add(MakeBuffer("C").release());
             netlist->Add(new Instance("U", netlist->GetComponent("C")));
         }
         for (std::size_t i = 0; i < 2; ++i) {
@@ -347,7 +371,7 @@ TEST(Lifetime, ANetlistMayEndWithEverythingRenamed) {
     for (int i = 0; i < 40; ++i) {
         const std::string number = std::to_string(i);
         netlist.Add(new Bus(("D" + number + "(7:0)").c_str()));
-        netlist.Add(MakeComponent(("C" + number).c_str()).release());
+        netlist.Add(MakeBuffer(("C" + number).c_str()).release());
         netlist.Add(new Instance(("U" + number).c_str(), netlist.GetComponent("C" + number)));
     }
     int number = 0;
@@ -375,7 +399,7 @@ TEST(Lifetime, AttributesGoWithTheirHolders) {
     auto* signal = new ScalarSignal("N");
     signal->AddAttr(new AttributeBitVector("b", "8:H:A5"));
     netlist.Add(signal);
-    netlist.Add(MakeComponent("C").release());
+    netlist.Add(MakeBuffer("C").release());
     auto* instance = new Instance("U", netlist.GetComponent("C"));
     instance->AddAttr(new AttributeFloat("c", "1.5"));
     instance->GetPin("I")->AddAttr(new AttributeString("d", "v"));
@@ -611,7 +635,7 @@ private:
 
     void MakePlacement() {
         if (Next() % 2 == 0) {
-            components_.push_back(MakeComponent(ChooseName()));
+            components_.push_back(MakeBuffer(ChooseName()));
         } else {
             instances_.push_back(std::make_unique<Instance>(ChooseName(), Choose(Components())));
         }

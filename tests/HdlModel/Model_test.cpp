@@ -3,6 +3,7 @@
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Exception.h"
 #include "Support/Names.h"
+#include "Support/Parts.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
@@ -14,20 +15,16 @@
 namespace {
 
 using namespace Orn_Hdl;
+using Support::In;
 using Support::Names;
 using Support::NamesOf;
+using Support::Out;
 
-const Polarity In("in");
-const Polarity Out("out");
-
-/// A model with the component BUF (pins I, O and the bus pin D(3:0)) and its instance U1.
+/// A model with a buffer U1.
 class ModelTest : public testing::Test {
 protected:
     ModelTest() {
-        model_.AddComponent("BUF");
-        model_.AddPin("I", In, "BUF", "");
-        model_.AddPin("O", Out, "BUF", "");
-        model_.AddPin("D(3:0)", In, "BUF", "");
+        model_.GetNetlist()->Add(Support::MakeBuffer().release());
         model_.AddInstance("U1", "BUF");
         model_.SetModifiedFlag(false);
     }
@@ -152,7 +149,8 @@ TEST_F(ModelTest, AddPin) {
 TEST_F(ModelTest, AddInstance) {
     ExpectChange([&] { return model_.AddInstance("U[2]", "buf"); });
     EXPECT_EQ(model_.GetInstance("u(2)")->GetComponentName(), "BUF");
-    EXPECT_EQ(NamesOf(model_.GetInstance("U(2)")->GetPinIterator()), (Names{"I", "O", "D(3:0)"}));
+    EXPECT_EQ(NamesOf(model_.GetInstance("U(2)")->GetPinIterator()),
+              (Names{"I", "O", "B", "D(3:0)"}));
     ExpectFailure("Invalid Name.\n", [&] { model_.AddInstance(nullptr, "none"); });
     ExpectFailure("Identifier \"U1\" already defined.\n",
                   [&] { model_.AddInstance("U1", "none"); });
@@ -521,45 +519,6 @@ TEST_F(ModelTest, FilesOfCommandsThatCannotBeReadAreFalse) {
     EXPECT_FALSE(model_.Read(folder.GetPath().c_str())) << "a folder";
     EXPECT_FALSE(model_.Read(nullptr));
     EXPECT_EQ(Support::CountOpenFiles(), before);
-}
-
-class CommandFile : public testing::Test {
-protected:
-    bool Read(const std::string& text) {
-        Support::WriteWholeFile(folder_ / "top.cmd", text);
-        return model_.Read((folder_ / "top.cmd").c_str());
-    }
-
-    Names Components() { return NamesOf(model_.GetNetlist()->GetComponentIterator()); }
-
-    Support::TemporaryFolder folder_;
-    CommandFactory factory_;
-    Model model_{&factory_};
-};
-
-TEST_F(CommandFile, WithoutALineIsRead) {
-    model_.SetModifiedFlag(true);
-    EXPECT_TRUE(Read(""));
-    EXPECT_FALSE(model_.IsModified());
-}
-
-TEST_F(CommandFile, MayHaveLineEndsOfBothKindsAndNoneAtItsEnd) {
-    EXPECT_TRUE(Read("ADD COMPONENT A\r\n\r\n\nADD COMPONENT B\nADD COMPONENT C"));
-    EXPECT_EQ(Components(), (Names{"A", "B", "C"}));
-    EXPECT_FALSE(model_.IsModified());
-}
-
-TEST_F(CommandFile, ALineEndsAtItsFirstNul) {
-    EXPECT_TRUE(Read(std::string("ADD COMPONENT A\0B C D\nADD COMPONENT E\n", 38)));
-    EXPECT_EQ(Components(), (Names{"A", "E"}));
-}
-
-TEST_F(CommandFile, IsClosedOnEveryPath) {
-    const int before = Support::CountOpenFiles();
-    EXPECT_TRUE(Read("ADD COMPONENT A\n"));
-    EXPECT_THROW(Read("ADD COMPONENT B\nADD COMPONENT B\nADD COMPONENT C\n"), Exception);
-    EXPECT_EQ(Support::CountOpenFiles(), before);
-    EXPECT_EQ(Components(), (Names{"A", "B"})) << "the lines before the failure stay done";
 }
 
 } // namespace

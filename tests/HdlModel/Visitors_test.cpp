@@ -1,5 +1,7 @@
 #include "Orn_Hdl/Model.h"
 
+#include "Support/Names.h"
+
 #include <gtest/gtest.h>
 
 #include <string>
@@ -106,7 +108,7 @@ TEST(PinVisitor, MeetsEachPinOnce) {
         << "the general operation is never called";
 }
 
-TEST(Visitors, OfTheBaseDoNothing) {
+TEST(Visitors, OfTheBaseChangeNothing) {
     ObjectVisitor objects;
     SignalVisitor signals;
     PinVisitor pins;
@@ -117,13 +119,33 @@ TEST(Visitors, OfTheBaseDoNothing) {
     signals = signalsCopy;
     pins = pinsCopy;
     ScalarSignal signal("s");
+    BusPin pin("p(1:0)", Polarity("in"));
+    signal.Connect(&pin);
     signal.AcceptObject(objects);
     signal.AcceptSignal(signals);
-    BusPin pin("p(1:0)", Polarity("in"));
+    pin.AcceptObject(objects);
     pin.AcceptPin(pins);
     pins.VisitPin(&pin);
     signals.VisitSignal(nullptr);
     objects.VisitNetlist(nullptr);
+    EXPECT_EQ(Support::NamesOf(signal.GetPinIterator()), Support::Names{"p(1:0)"});
+    EXPECT_EQ(pin.GetSignal(), &signal);
+    EXPECT_EQ(signal.GetName(), "s");
+}
+
+TEST(Visitors, AnOperationLeftOutIsNoOther) {
+    class OnlyBuses : public SignalVisitor {
+    public:
+        void VisitBus(Bus* bus) override { calls.push_back(Call("bus", bus)); }
+
+        Calls calls;
+    };
+    ScalarSignal scalar("s");
+    Bus bus("b(1:0)");
+    OnlyBuses visitor;
+    scalar.AcceptSignal(visitor);
+    bus.AcceptSignal(visitor);
+    EXPECT_EQ(visitor.calls, Calls{"bus b(1:0)"});
 }
 
 } // namespace

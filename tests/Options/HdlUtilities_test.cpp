@@ -85,6 +85,18 @@ TEST(AddDummySuffix, StandsAtTheEndOfANameWithoutARange) {
     EXPECT_EQ(HdlUtilities::AddDummySuffix(nullptr), "_DUMMY");
 }
 
+TEST(IsGeneratedName, KnowsTheSuffixesInAnyLetterCase) {
+    for (const char* name : {"a_DUMMY", "_dummy", "a_DUMMY(3)", "u1_I_CONST_SIGNAL",
+                             "u_Const_Signal(7:0)", "u1_I_openSignal", "U1_I_OPENSIGNAL(1:0)"}) {
+        EXPECT_TRUE(HdlUtilities::IsGeneratedName(name)) << name;
+    }
+    for (const char* name : {"", "DUMMY", "a_DUMMY_", "a_DUMMYx", "CONST_SIGNAL", "u1_openSignals",
+                             "a(3)_DUMMY", "(_DUMMY)"}) {
+        EXPECT_FALSE(HdlUtilities::IsGeneratedName(name)) << name;
+    }
+    EXPECT_FALSE(HdlUtilities::IsGeneratedName(nullptr));
+}
+
 TEST(AddDummySuffix, TakesAnyText) {
     Support::ForEachText("a()", 6, [](const std::string& text) {
         const std::string result = Text(HdlUtilities::AddDummySuffix(text.c_str()));

@@ -5,10 +5,12 @@
 #include <gtest/gtest.h>
 #include <rapidcheck/gtest.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -54,6 +56,34 @@ TEST(File, AppendingMakesAFileThatIsMissing) {
     EXPECT_TRUE(file.write("x", 1));
     EXPECT_TRUE(file.close());
     EXPECT_EQ(Support::ReadWholeFile(folder / "new"), "x");
+}
+
+template <class Mode>
+concept IsFileMode = requires(File file, Mode mode) {
+    file.open("name", mode, false);
+};
+
+TEST(File, TakesItsModeAsANumber) {
+    const Support::TemporaryFolder folder;
+    const std::string name = folder / "text";
+    const auto write = [&name](int mode, bool fromStart, const char* text) {
+        File file;
+        return file.open(name.c_str(), mode, fromStart) && file.write(text, 1) && file.close();
+    };
+    EXPECT_TRUE(write(2, true, "a"));
+    EXPECT_TRUE(write(6, false, "b"));
+    EXPECT_EQ(Support::ReadWholeFile(name), "ab");
+    EXPECT_TRUE(write(10, true, "c"));
+    EXPECT_EQ(Support::ReadWholeFile(name), "c");
+    for (const int unknown : {-1, 0, 3, 7, 11}) {
+        File file;
+        EXPECT_FALSE(file.open(name.c_str(), unknown, true));
+        EXPECT_FALSE(file.IsOpen());
+        EXPECT_EQ(file.GetError(), EINVAL);
+    }
+    EXPECT_EQ(Support::ReadWholeFile(name), "c");
+    enum OtherMode { Overwriting };
+    static_assert(IsFileMode<File::Mode> && IsFileMode<int> && !IsFileMode<OtherMode>);
 }
 
 TEST(File, ReadsTheBytesOfAFile) {
@@ -194,6 +224,43 @@ TEST(Stream, HandsOverTextsOfAnySize) {
         EXPECT_TRUE(stream.flush());
     }
     EXPECT_TRUE(Support::ReadWholeFile(folder / "text") == expected);
+}
+
+TEST(Stream, KeepsEveryCharacterWhereverItsBufferEnds) {
+    constexpr std::size_t BufferSize = 262144;
+    const Support::TemporaryFolder folder;
+    std::string text;
+    for (std::size_t i = 0; i < 2 * BufferSize + 100; ++i) {
+        // 89 divides no buffer, so that no part looks like another.
+        text += static_cast<char>(' ' + i % 89);
+    }
+    for (std::size_t first = BufferSize - 4; first <= BufferSize + 4; ++first) {
+        for (const std::size_t size : {1u, 2u, 3u}) {
+            File file;
+            ASSERT_TRUE(file.open((folder / "text").c_str(), File::Overwrite, true));
+            Port::Stream stream(file);
+            std::string_view rest(text);
+            stream << rest.substr(0, first);
+            for (rest.remove_prefix(first); !rest.empty();
+                 rest.remove_prefix(std::min(size, rest.size()))) {
+                stream << rest.substr(0, size);
+            }
+            EXPECT_TRUE(stream.flush());
+            EXPECT_TRUE(file.close());
+            ASSERT_TRUE(Support::ReadWholeFile(folder / "text") == text) << first << ", " << size;
+        }
+    }
+}
+
+TEST(Stream, ANullTextWritesNothing) {
+    const Support::TemporaryFolder folder;
+    File file;
+    ASSERT_TRUE(file.open((folder / "text").c_str(), File::Overwrite, true));
+    Port::Stream stream(file);
+    stream << static_cast<const char*>(nullptr) << "a" << nullptr << std::string("b")
+           << Port::String("c");
+    EXPECT_TRUE(stream.flush());
+    EXPECT_EQ(Support::ReadWholeFile(folder / "text"), "abc");
 }
 
 TEST(Stream, AFailedWriteShowsAtEveryFlush) {

@@ -1,13 +1,17 @@
 #include "Port/String.h"
 
 #include "Port/File.h"
+#include "Support/DecimalComma.h"
 #include "Support/ShortTexts.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
 
 #include <climits>
+#include <clocale>
+#include <cstdint>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -46,6 +50,145 @@ TEST(String, AppendsTextsAndCharacters) {
     EXPECT_EQ(text + String("f"), "abcdef");
     text += text;
     EXPECT_EQ(text, "abcdeabcde");
+}
+
+template <class A, class B> void ExpectOrdered(const A& smaller, const B& larger) {
+    EXPECT_TRUE(smaller < larger);
+    EXPECT_FALSE(larger < smaller);
+    EXPECT_FALSE(smaller == larger);
+    EXPECT_TRUE(larger != smaller);
+}
+
+TEST(String, ComparesWithTextsOfEveryKind) {
+    const String a("a");
+    const String b("b");
+    ExpectOrdered(a, b);
+    ExpectOrdered(a, "b");
+    ExpectOrdered("a", b);
+    ExpectOrdered(a, std::string("b"));
+    ExpectOrdered(std::string("a"), b);
+    ExpectOrdered(a, std::string_view("b"));
+    ExpectOrdered(std::string_view("a"), b);
+    ExpectOrdered(static_cast<const char*>(nullptr), b);
+    EXPECT_TRUE(String() == nullptr);
+    EXPECT_TRUE(nullptr == String());
+    EXPECT_TRUE(a != nullptr);
+    EXPECT_TRUE(nullptr < a);
+    EXPECT_TRUE(String(std::string(1, '\0')) != nullptr);
+    EXPECT_TRUE(a == std::string("a"));
+    EXPECT_TRUE(std::string_view("a") == a);
+}
+
+TEST(String, IsExtendedByAndJoinedToTextsOfEveryKind) {
+    String text("a");
+    text += std::string("b");
+    text += std::string_view("c");
+    text += nullptr;
+    text += std::string(1, '\0');
+    EXPECT_EQ(text, std::string_view("abc\0", 4));
+    text = "0123456789abcdef";
+    text += text.GetView().substr(1, 2);
+    EXPECT_EQ(text, "0123456789abcdef12") << "a piece of its own";
+    const String a("a");
+    EXPECT_EQ(a + "b", "ab");
+    EXPECT_EQ("b" + a, "ba");
+    EXPECT_EQ(a + 'b', "ab");
+    EXPECT_EQ('b' + a, "ba");
+    EXPECT_EQ(a + std::string("b"), "ab");
+    EXPECT_EQ(std::string("b") + a, "ba");
+    EXPECT_EQ(a + std::string_view("b"), "ab");
+    EXPECT_EQ(std::string_view("b") + a, "ba");
+    EXPECT_EQ(a + nullptr + a, "aa");
+    EXPECT_EQ(String("x") + a, "xa");
+}
+
+template <class Text, class Other>
+concept Extendable = requires(Text text, Other other) {
+    text += other;
+};
+template <class Text, class Other>
+concept Joinable = requires(Text text, Other other) {
+    text + other;
+};
+
+TEST(String, IsNotExtendedByNumbers) {
+    static_assert(Extendable<String, char> && Joinable<String, char> && Joinable<char, String>);
+    static_assert(!Extendable<String, int> && !Joinable<String, int> && !Joinable<int, String>);
+    static_assert(!Extendable<String, double> && !Joinable<String, double>);
+    static_assert(!Extendable<String, bool> && !Extendable<String, wchar_t>);
+}
+
+TEST(String, ReadsNullAsTheEmptyTextEverywhere) {
+    const char* const null = nullptr;
+    String text("abc");
+    EXPECT_GT(text.Compare(null), 0);
+    EXPECT_GT(text.Compare(nullptr, String::CompareIgnoringCase), 0);
+    EXPECT_EQ(String().Compare(null), 0);
+    EXPECT_EQ(text.GetIndexOfString(null), 0);
+    EXPECT_EQ(text.GetIndexOfString(nullptr), 0);
+    text.ReplaceChars(null, 'x');
+    text.ReplaceChars(nullptr, 'x');
+    EXPECT_EQ(text, "abc");
+    Port_Range range;
+    EXPECT_TRUE(text.NextTokenRange(range, null, String::SkipEmptyTokens));
+    EXPECT_EQ(range, Port_Range(0, 3));
+    EXPECT_TRUE(text.GetRangeOfMatch(Port_Regexp(null), range));
+    EXPECT_EQ(range, Port_Range(0, 0));
+    EXPECT_EQ(String::Format(null), "");
+}
+
+TEST(String, TokensStartAtEitherRangeBeforeTheText) {
+    const String text("ab,c");
+    for (const String::ParseType type : {String::SkipEmptyTokens, String::KeepEmptyTokens}) {
+        Port_Range range(1, 0);
+        ASSERT_TRUE(text.NextTokenRange(range, ",", type));
+        EXPECT_EQ(range, Port_Range(0, 2));
+        ASSERT_TRUE(text.NextTokenRange(range, ",", type));
+        EXPECT_EQ(range, Port_Range(3, 1));
+        EXPECT_FALSE(text.NextTokenRange(range, ",", type));
+        EXPECT_EQ(range, Port_Range(3, 1));
+    }
+}
+
+TEST(String, AnEmptyTokenAtIndexOneIsNoStart) {
+    Port_Range range(1, 0);
+    const String text(",,x");
+    for (const std::size_t start : {0u, 1u}) {
+        ASSERT_TRUE(text.NextTokenRange(range, ",", String::KeepEmptyTokens));
+        EXPECT_EQ(range, Port_Range(start, 0));
+    }
+    ASSERT_TRUE(text.NextTokenRange(range, ",", String::KeepEmptyTokens));
+    EXPECT_EQ(range, Port_Range(2, 1));
+    EXPECT_FALSE(text.NextTokenRange(range, ",", String::KeepEmptyTokens));
+}
+
+TEST(String, BehindARangeThatReachesBeyondTheTextThereIsNoToken) {
+    for (Port_Range range : {Port_Range(0, SIZE_MAX), Port_Range(5, SIZE_MAX), Port_Range(3, 0),
+                             Port_Range(SIZE_MAX, 1), Port_Range(SIZE_MAX - 1, 1)}) {
+        EXPECT_FALSE(String("a,b").NextTokenRange(range, ",", String::SkipEmptyTokens));
+    }
+}
+
+template <class Type>
+concept IsParseType = requires(Type type, Port_Range range) {
+    String().NextTokenRange(range, ",", type);
+};
+
+TEST(String, TokensTakeTheKindOfParsingAsANumber) {
+    const String text(",a");
+    Port_Range range(1, 0);
+    EXPECT_TRUE(text.NextTokenRange(range, ",", 1));
+    EXPECT_EQ(range, Port_Range(1, 1));
+    range = Port_Range(1, 0);
+    EXPECT_TRUE(text.NextTokenRange(range, ",", 0));
+    EXPECT_EQ(range, Port_Range(0, 0));
+    for (const int unknown : {-1, 2, INT_MAX}) {
+        range = Port_Range(1, 0);
+        EXPECT_FALSE(text.NextTokenRange(range, ",", unknown));
+        EXPECT_EQ(range, Port_Range(1, 0));
+    }
+    static_assert(IsParseType<String::ParseType> && IsParseType<bool>);
+    static_assert(!IsParseType<String::CompareType>);
 }
 
 TEST(String, ComparesBytesUnsigned) {
@@ -172,6 +315,13 @@ TEST(String, FormatsAsPrintfDoes) {
     const std::string longText(100000, 'x');
     EXPECT_EQ(String::Format("<%s>", longText.c_str()), ("<" + longText + ">").c_str());
     EXPECT_EQ(String::Format("%s", "%n%s"), "%n%s");
+}
+
+TEST(String, FormatsInNoLocale) {
+    const Support::DecimalComma locale;
+    ASSERT_TRUE(locale.IsSet());
+    EXPECT_EQ(String::Format("%.2f", 1.5), "1.50");
+    EXPECT_EQ(std::localeconv()->decimal_point, std::string(",")) << "the locale is left in use";
 }
 
 TEST(String, ReadsLinesWithoutTheirEnds) {

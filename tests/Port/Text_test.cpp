@@ -1,5 +1,9 @@
 #include "Port/Text.h"
 
+#include "Port/Ascii.h"
+#include "Port/String.h"
+#include "Port/Version.h"
+#include "Support/DecimalComma.h"
 #include "Support/ShortTexts.h"
 
 #include <gtest/gtest.h>
@@ -12,6 +16,7 @@
 #include <locale>
 #include <regex>
 #include <string>
+#include <string_view>
 
 namespace {
 
@@ -90,7 +95,9 @@ TEST(ToIntSaturated, StaysWithinTheLimits) {
 TEST(ToDouble, FollowsTheRulesOfAtof) {
     Support::ForEachText("+-.05eE x", 5, [](const std::string& text) {
         const double value = std::atof(text.c_str());
-        ASSERT_EQ(Port::ToDouble(text.c_str()), std::isfinite(value) ? value : 0.0)
+        const double converted = Port::ToDouble(text.c_str());
+        ASSERT_EQ(converted, std::isfinite(value) ? value : 0.0) << "'" << text << "'";
+        ASSERT_EQ(std::signbit(converted), std::isfinite(value) && std::signbit(value))
             << "'" << text << "'";
     });
     EXPECT_EQ(Port::ToDouble("\t\n12.5rest"), 12.5);
@@ -106,8 +113,26 @@ TEST(ToDouble, GivesZeroForWhatIsNotFinite) {
     EXPECT_EQ(Port::ToDouble(("1" + std::string(1000, '0')).c_str()), 0.0);
 }
 
+TEST(ToDouble, KeepsTheSignOfWhatIsTooSmall) {
+    for (const char* text : {"-1e-400", "-0", "-0x", "-.0e5", "-1e-99999999999999999999"}) {
+        EXPECT_EQ(Port::ToDouble(text), 0.0) << text;
+        EXPECT_TRUE(std::signbit(Port::ToDouble(text))) << text;
+    }
+    for (const char* text : {"1e-400", "0", "-", "--1e-400", "-x"}) {
+        EXPECT_EQ(Port::ToDouble(text), 0.0) << text;
+        EXPECT_FALSE(std::signbit(Port::ToDouble(text))) << text;
+    }
+    EXPECT_EQ(Port::ToDouble("-5e-324"), -5e-324);
+}
+
+TEST(ToDouble, ReadsTheTextOfAViewOnly) {
+    EXPECT_EQ(Port::ToDouble(std::string_view("12345").substr(1, 2)), 23.0);
+}
+
 TEST(ToDouble, ConsultsNoLocale) {
     const ForeignLocale foreign;
+    const Support::DecimalComma comma;
+    ASSERT_TRUE(comma.IsSet());
     EXPECT_EQ(Port::ToDouble("1.5"), 1.5);
     EXPECT_EQ(Port::ToDouble("1,5"), 1.0);
 }
@@ -127,6 +152,23 @@ TEST(Stricmp, ReadsNullAsTheEmptyText) {
     EXPECT_EQ(Port::stricmp(nullptr, ""), 0);
     EXPECT_LT(Port::stricmp(nullptr, "a"), 0);
     EXPECT_GT(Port::stricmp("a", nullptr), 0);
+}
+
+TEST(Text, IsTakenInEveryForm) {
+    const std::string_view part = std::string_view("12ab34").substr(0, 2);
+    long value = 0;
+    EXPECT_TRUE(Port::strtol(part, value));
+    EXPECT_EQ(value, 12);
+    EXPECT_TRUE(Port::strtol(std::string("-7"), value));
+    EXPECT_EQ(value, -7);
+    EXPECT_EQ(Port::ToIntSaturated(nullptr), 0);
+    EXPECT_EQ(Port::ToIntSaturated(static_cast<const char*>(nullptr)), 0);
+    EXPECT_EQ(Port::ToIntSaturated(Port::String("5x")), 5);
+    EXPECT_EQ(Port::stricmp(part, "12"), 0);
+    EXPECT_TRUE(Port::strmatch(part, std::string("*2")));
+    EXPECT_TRUE(Port::EqualIgnoringCase(nullptr, ""));
+    EXPECT_LT(Port::OrderIgnoringCase(nullptr, "a"), 0);
+    EXPECT_EQ(Port::Version::getValue(std::string("version")), Port::Version::getValue("version"));
 }
 
 TEST(Strnicmp, ComparesAtMostTheFirstCharacters) {

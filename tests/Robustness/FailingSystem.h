@@ -40,6 +40,9 @@ public:
     int GetStatus(int descriptor, struct stat* status) override {
         return Fails() ? -1 : System::GetStatus(descriptor, status);
     }
+    int Truncate(int descriptor, off_t size) override {
+        return Fails() ? -1 : System::Truncate(descriptor, size);
+    }
     int ChangeMode(int descriptor, unsigned mode) override {
         return Fails() ? -1 : System::ChangeMode(descriptor, mode);
     }
@@ -48,6 +51,12 @@ public:
     }
     int Rename(const char* from, const char* to) override {
         return Fails() ? -1 : System::Rename(from, to);
+    }
+    int OpenAt(int folder, const char* name, int flags, unsigned mode) override {
+        return Fails() ? -1 : System::OpenAt(folder, name, flags, mode);
+    }
+    int RenameAt(int folder, const char* from, const char* to) override {
+        return Fails() ? -1 : System::RenameAt(folder, from, to);
     }
 
 private:

@@ -1,5 +1,6 @@
 // Whichever file call of a whole run fails: nothing is thrown, the failure is told, files are
 // whole.
+#include "Port/File.h"
 #include "Robustness/FailingSystem.h"
 #include "Robustness/MidSizedDesign.h"
 #include "Support/EngineScript.h"
@@ -9,6 +10,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <cstdint>
 #include <map>
 #include <string>
 
@@ -24,6 +26,7 @@ const std::string Former = "what stood here before\n";
 struct Outcome {
     bool isRead = false;
     std::map<std::string, int> errors;
+    std::map<std::string, std::uint64_t> leftovers;
     std::map<std::string, std::string> texts;
 };
 
@@ -57,6 +60,7 @@ protected:
             engine.Execute(model.c_str(),
                            ("WRITE " + line.substr(0, blank) + " -NOHEADER " + path).c_str());
             outcome.errors[name] = engine.GetModel(model.c_str())->GetWriteError();
+            outcome.leftovers[name] = engine.GetModel(model.c_str())->GetWriteLeftover();
             outcome.texts[name] = ReadWholeFile(path);
         }
         EXPECT_EQ(Support::CountOpenFiles(), openFiles);
@@ -76,6 +80,7 @@ protected:
                 EXPECT_FALSE(std::filesystem::exists(folder_ / "fresh"));
             } else if (told != 0) {
                 EXPECT_EQ(text.substr(0, Former.size()), Former);
+                EXPECT_EQ(text.size(), Former.size() + outcome.leftovers.at(name));
             }
         }
         for (const auto& entry : std::filesystem::directory_iterator(folder_.GetPath())) {
@@ -110,6 +115,7 @@ TEST_F(Faults, AnyOneCallMayFail) {
                 told += writeError != 0 ? 1 : 0;
             }
             EXPECT_LE(told, 1) << "one failure fails one write";
+            EXPECT_EQ(outcome.leftovers.at("longer"), 0u) << "one failure leaves nothing behind";
             CheckFiles(outcome, error, outcome.isRead);
         }
     }
@@ -158,6 +164,33 @@ private:
 
     int calls_ = 0;
 };
+
+/// Writes that take nothing and tell no error, a hundred times; then they fail.
+class IdleSystem : public Port::System {
+public:
+    IdleSystem() { System::Replace(this); }
+    IdleSystem(const IdleSystem&) = delete;
+    IdleSystem& operator=(const IdleSystem&) = delete;
+    ~IdleSystem() override { System::Replace(nullptr); }
+
+    ssize_t Write(int /*descriptor*/, const void* /*data*/, std::size_t /*size*/) override {
+        errno = ENOSPC;
+        return ++writes > 100 ? -1 : 0;
+    }
+
+    int writes = 0;
+};
+
+TEST_F(Faults, AWriteThatTakesNothingIsAFailureAndNotTriedAgain) {
+    const std::string name = folder_ / "file";
+    IdleSystem system;
+    Port::File file;
+    ASSERT_TRUE(file.open(name.c_str(), Port::File::Overwrite, true));
+    EXPECT_FALSE(file.write("text", 4));
+    EXPECT_EQ(system.writes, 1);
+    EXPECT_EQ(file.GetError(), EIO);
+    EXPECT_FALSE(file.close());
+}
 
 TEST_F(Faults, InterruptedAndPartialCallsAreNoFailures) {
     InterruptedSystem system;

@@ -1,20 +1,25 @@
 // A written netlist takes the place of a file as a whole, or not at all.
 #include "Orn_Hdl/Streams.h"
+#include "Port/Folder.h"
 #include "Port/System.h"
+#include "Robustness/FailingSystem.h"
 #include "Support/EngineScript.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cerrno>
 #include <cstdlib>
 #include <fcntl.h>
 #include <filesystem>
+#include <functional>
 #include <stdexcept>
 #include <string>
 #include <sys/stat.h>
 #include <thread>
 #include <unistd.h>
+#include <utility>
 
 namespace {
 
@@ -292,13 +297,106 @@ TEST_F(Replacing, OtherNamesOfAFileLeadToTheFormerText) {
     EXPECT_EQ(CountFiles(), 2);
 }
 
-TEST_F(Replacing, LeavesNoFileOpen) {
+TEST_F(Replacing, AFailureBelowAFolderLeavesTheFormerText) {
+    Port::Folder folder;
+    ASSERT_EQ(folder.Open(folder_.GetPath().c_str()), 0);
+    const int before = Support::CountOpenFiles();
+    int calls = 0;
+    // The first run fails nowhere and counts the calls.
+    for (int failing = 0; failing <= calls; ++failing) {
+        WriteWholeFile(Path("file"), "former");
+        int error = 0;
+        {
+            const Robustness::FailingSystem system(failing, EIO);
+            TextFileOutStream out(folder, "file", "file", TextFileOutStream::Replace);
+            out << "new" << OutStream::NewLine;
+            out.Close();
+            error = out.GetError();
+            calls = std::max(calls, system.GetCallCount());
+        }
+        EXPECT_EQ(ReadWholeFile(Path("file")), error == 0 ? "new\n" : "former") << failing;
+        EXPECT_EQ(CountFiles(), 1) << failing;
+        EXPECT_EQ(Support::CountOpenFiles(), before) << failing;
+    }
+    EXPECT_GT(calls, 8);
+}
+
+TEST_F(Replacing, LeavesNoFileOpenWhetherDoneOrRefused) {
     const int before = Support::CountOpenFiles();
     Replace(Path("file"));
     Replace(Path("file"));
     Replace(folder_.GetPath());
     Replace("/dev/full");
     EXPECT_EQ(Support::CountOpenFiles(), before);
+}
+
+/// Looks at each file that is made, before and after.
+class WatchedSystem : public Port::System {
+public:
+    WatchedSystem() { System::Replace(this); }
+    WatchedSystem(const WatchedSystem&) = delete;
+    WatchedSystem& operator=(const WatchedSystem&) = delete;
+    ~WatchedSystem() override { System::Replace(nullptr); }
+
+    int Open(const char* name, int flags, unsigned mode) override {
+        if ((flags & O_CREAT) != 0 && beforeMaking) {
+            std::exchange(beforeMaking, nullptr)(name);
+        }
+        const int descriptor = System::Open(name, flags, mode);
+        if (descriptor >= 0) {
+            ++opened;
+            inherited += (fcntl(descriptor, F_GETFD) & FD_CLOEXEC) == 0 ? 1 : 0;
+        }
+        return descriptor;
+    }
+
+    /// Called once, with the name of the first file that is about to be made.
+    std::function<void(const char* name)> beforeMaking;
+    int opened = 0;
+    /// Of these, the files that a program started by this one would have open.
+    int inherited = 0;
+};
+
+TEST_F(Replacing, NeverWritesIntoAFileThatItHasNotMade) {
+    WriteWholeFile(Path("file"), "former");
+    WriteWholeFile(Path("victim"), "untouched");
+    for (const bool byLink : {false, true}) {
+        WatchedSystem system;
+        std::string taken;
+        system.beforeMaking = [&](const char* name) {
+            taken = name;
+            if (byLink) {
+                fs::create_symlink(Path("victim"), name);
+            } else {
+                WriteWholeFile(name, "untouched");
+            }
+        };
+        EXPECT_EQ(Replace(Path("file")), 0);
+        ASSERT_NE(taken, "");
+        EXPECT_NE(taken, Path("file"));
+        EXPECT_EQ(ReadWholeFile(Path("file")), "new\n");
+        EXPECT_FALSE(fs::is_symlink(Path("file")));
+        EXPECT_EQ(ReadWholeFile(taken), "untouched");
+        EXPECT_EQ(fs::is_symlink(taken), byLink);
+        fs::remove(taken);
+    }
+    EXPECT_EQ(CountFiles(), 2);
+}
+
+TEST_F(Replacing, NoFileIsOpenInAProgramThatIsStarted) {
+    WatchedSystem system;
+    WriteWholeFile(Path("file"), "former");
+    EXPECT_EQ(Replace(Path("file")), 0);
+    EXPECT_EQ(Replace(Path("fresh")), 0);
+    for (const auto mode : {TextFileOutStream::Overwrite, TextFileOutStream::Append}) {
+        TextFileOutStream out(Path("file").c_str(), mode);
+        EXPECT_TRUE(out.IsOpen());
+    }
+    Support::EngineScript script;
+    WriteWholeFile(Path("lines"), "NOOP\n");
+    EXPECT_TRUE(script.GetEngine().ReadCommandFile("top", Path("lines").c_str()));
+    EXPECT_GE(system.opened, 6);
+    EXPECT_EQ(system.inherited, 0);
 }
 
 TEST_F(Replacing, TheWriteCommandsReplace) {

@@ -1,13 +1,17 @@
 #include "Orn_Hdl/Streams.h"
 
+#include "Port/File.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <climits>
+#include <cstddef>
 #include <filesystem>
 #include <functional>
 #include <string>
+#include <string_view>
 
 namespace {
 
@@ -357,6 +361,83 @@ TEST(FileStream, OverwritesOrAppendsByMode) {
     EXPECT_EQ(Support::ReadWholeFile(name), "new\n");
 }
 
+TEST(FileStream, OpensByMode) {
+    const TemporaryFolder folder;
+    const std::string name = folder / "text";
+    Support::WriteWholeFile(name, "former\n");
+    TextFileOutStream out;
+    EXPECT_TRUE(out.Open(name.c_str(), TextFileOutStream::Replace));
+    out << "new\n";
+    EXPECT_EQ(Support::ReadWholeFile(name), "former\n");
+    out.Close();
+    EXPECT_EQ(Support::ReadWholeFile(name), "new\n");
+    EXPECT_TRUE(out.Open(name.c_str(), TextFileOutStream::Append));
+    out << "more\n";
+    EXPECT_TRUE(out.Open(name.c_str(), TextFileOutStream::Overwrite));
+    EXPECT_EQ(Support::ReadWholeFile(name), "");
+}
+
+template <class Name, class Mode>
+concept Opens = requires(TextFileOutStream out, Name name, Mode mode) {
+    out.Open(name, mode);
+    TextFileOutStream(name, mode);
+};
+template <class Name>
+constexpr bool OpensByNothingElse =
+    Opens<Name, bool>&& Opens<Name, TextFileOutStream::Mode> && !Opens<Name, int> &&
+    !Opens<Name, OutStream::Operand> && !Opens<Name, Port::File::Mode> && !Opens<Name, void*> &&
+    !Opens<Name, double> && !Opens<Name, std::nullptr_t>;
+
+TEST(FileStream, OnlyABoolAndItsOwnModeSayHowAFileIsOpened) {
+    static_assert(OpensByNothingElse<const char*>);
+    static_assert(OpensByNothingElse<std::nullptr_t>);
+    static_assert(OpensByNothingElse<std::string>);
+    static_assert(OpensByNothingElse<std::string_view>);
+    static_assert(OpensByNothingElse<Port::String>);
+}
+
+TEST(FileStream, TakesNamesInEveryForm) {
+    const TemporaryFolder folder;
+    const std::string name = folder / "text";
+    TextFileOutStream(name, false) << "a\n";
+    TextFileOutStream(Port::String(name), TextFileOutStream::Append) << "b\n";
+    TextFileOutStream out(std::string_view(name), true);
+    EXPECT_EQ(out.GetFileName(), name);
+    out << "c\n";
+    EXPECT_TRUE(out.Open(Port::String(name), true));
+    out << "d\n";
+    EXPECT_TRUE(out.Open(name, TextFileOutStream::Append));
+    out << "e\n";
+    out.Close();
+    EXPECT_EQ(Support::ReadWholeFile(name), "a\nb\nc\nd\ne\n");
+}
+
+template <class T>
+concept Writable = requires(OutStream& out, T value) {
+    out << value;
+};
+
+TEST(OutStream, RefusesWhatItWouldWriteAsAnotherNumber) {
+    static_assert(!Writable<char> && !Writable<signed char> && !Writable<unsigned char>);
+    static_assert(!Writable<wchar_t> && !Writable<char16_t> && !Writable<char32_t>);
+    static_assert(!Writable<bool> && !Writable<float> && !Writable<double>);
+    static_assert(Writable<int> && Writable<const char*> && Writable<std::nullptr_t>);
+    static_assert(Writable<std::string> && Writable<std::string_view> && Writable<Port::String>);
+}
+
+TEST(OutStream, WritesIntegersOfEverySize) {
+    const auto write = [](OutStream& out) {
+        out << short(-1) << " " << static_cast<unsigned short>(65535) << " " << UINT_MAX << " "
+            << LONG_MIN << " " << ULLONG_MAX << " " << LLONG_MIN << "\n";
+    };
+    Orn_Hdl::TextMemOutStream memory;
+    write(memory);
+    EXPECT_EQ(memory.GetValue(), "-1 65535 4294967295 " + std::to_string(LONG_MIN) +
+                                     " 18446744073709551615 -9223372036854775808\n");
+    EXPECT_EQ(Written(write), "-1 65535 4294967295 -9223372036854775808 18446744073709551615 \n"
+                              "      -9223372036854775808\n");
+}
+
 TEST(FileStream, WithoutAFileDropsEverything) {
     TextFileOutStream none;
     EXPECT_FALSE(none.IsOpen());
@@ -424,13 +505,14 @@ TEST(FileStream, TellsThatADeviceIsFull) {
     EXPECT_EQ(out.GetError(), ENOSPC);
 }
 
-TEST(FileStream, LeavesNoFileOpen) {
+TEST(FileStream, HasOneFileOpenUntilItEnds) {
     const TemporaryFolder folder;
     const int before = Support::CountOpenFiles();
     {
         TextFileOutStream out((folder / "a").c_str(), false);
         out.Open((folder / "b").c_str(), false);
         out.Open((folder / "c").c_str(), true);
+        EXPECT_EQ(Support::CountOpenFiles(), before + 1);
     }
     EXPECT_EQ(Support::CountOpenFiles(), before);
 }
@@ -444,6 +526,26 @@ TEST(FileStream, WritesMegabytes) {
     });
     ASSERT_EQ(text.size(), 10000000u);
     EXPECT_EQ(text.find_first_not_of("x\n"), std::string::npos);
+}
+
+TEST(FileStream, KeepsEveryCharacterWhereverTheBufferEnds) {
+    // Numbered lines, moved on by one character at a time, and lines that outgrow the buffer.
+    for (std::size_t shift = 0; shift < 12; ++shift) {
+        std::string expected(shift, ' ');
+        const std::string text = Written([&](TextFileOutStream& out) {
+            out << expected.c_str();
+            for (int i = 0; i < 40000; ++i) {
+                expected += "line " + std::to_string(i) + "\n";
+                out << "line " << i << "\n";
+            }
+            for (int i = 0; i < 40000; ++i) {
+                expected += "//" + std::to_string(i);
+                out << "//" << i;
+            }
+            expected += "\n";
+        });
+        ASSERT_TRUE(text == expected) << "shifted by " << shift;
+    }
 }
 
 TEST(FileStream, WritesTextsOfMegabytesInTheirPlace) {

@@ -129,10 +129,12 @@ TEST(OutStream, ANullTextReachesNoDestination) {
 
 TEST(OutStream, WithoutADestinationDropsEverything) {
     OutStream out(nullptr);
-    out << "a" << 1 << OutStream::NewLine << OutStream::Flush << Port::String("b");
-    out.Indent();
-    out.Unindent();
-    out.WriteEmptyLine();
+    OutStream* const same = &(out << "a" << 1 << OutStream::NewLine << OutStream::Flush);
+    EXPECT_EQ(same, &out) << "operators can be chained";
+    EXPECT_EQ(&(out << Port::String("b")), &out);
+    EXPECT_NO_THROW(out.Indent());
+    EXPECT_NO_THROW(out.Unindent());
+    EXPECT_NO_THROW(out.WriteEmptyLine());
 }
 
 TEST(OutStream, CannotBeCopied) {
@@ -169,6 +171,19 @@ TEST(StreamDst, ACopyHasTheSameIndentLevel) {
     copy.Indent();
     destination = copy;
     EXPECT_EQ(destination.GetIndentLevel(), 2);
+}
+
+TEST(MemoryStream, TakesTextsInEveryForm) {
+    TextMemOutStream out(std::string("a") + std::string(1, '\0'));
+    EXPECT_EQ(out.GetValue(), std::string_view("a\0", 2));
+    out.SetValue(std::string_view("bcd").substr(0, 1));
+    EXPECT_EQ(out.GetValue(), "b");
+    out.SetValue(out.GetValue() + 'c');
+    EXPECT_EQ(out.GetValue(), "bc");
+    out.SetValue(nullptr);
+    EXPECT_EQ(out.GetValue(), "");
+    EXPECT_EQ(TextMemOutStream(nullptr).GetValue(), "");
+    EXPECT_EQ(TextMemOutStream(Port::String("d")).GetValue(), "d");
 }
 
 } // namespace

@@ -53,12 +53,4 @@ public:
     explicit GoldenDesign(const std::string& name) : EngineScript(GoldenText(name + ".cmd")) {}
 };
 
-/// The lines of a text in sorted order: two netlists that differ in the order of their statements
-/// only have the same.
-inline std::vector<std::string> SortedLines(const std::string& text) {
-    std::vector<std::string> lines = SplitLines(text);
-    std::sort(lines.begin(), lines.end());
-    return lines;
-}
-
 } // namespace Support

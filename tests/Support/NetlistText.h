@@ -5,6 +5,7 @@
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Support/EngineScript.h"
 
+#include <algorithm>
 #include <string>
 #include <vector>
 
@@ -20,6 +21,14 @@ inline std::vector<std::string> LinesThatBegin(const std::string& text, const st
         }
     }
     return found;
+}
+
+/// The lines of a text in sorted order: two netlists that differ in the order of their statements
+/// only have the same.
+inline std::vector<std::string> SortedLines(const std::string& text) {
+    std::vector<std::string> lines = SplitLines(text);
+    std::sort(lines.begin(), lines.end());
+    return lines;
 }
 
 /// The piece of a text from one mark up to the next one; empty when either is missing.

@@ -18,7 +18,7 @@ namespace {
 
 using Lines = std::vector<std::string>;
 
-std::string WriteToMemory(Netlist* netlist, const HdlOptions& options) {
+template <class Options> std::string WriteToMemory(Netlist* netlist, Options&& options) {
     TextMemOutStream out;
     VerilogNetlister netlister(out);
     netlister.WriteNetlist(netlist, options);
@@ -330,7 +330,7 @@ protected:
                             generic + "\n" + moduleLines);
         Netlist& netlist = script.GetNetlist();
         netlist.SetName(name.c_str());
-        const HdlOptions options = WithoutHeader();
+        HdlOptions options = WithoutHeader();
         const std::string text = WriteToMemory(&netlist, options);
         isSet_ = options.hierarchicalInit;
         return text;
@@ -375,11 +375,36 @@ TEST_F(HierarchicalInit, LeavesAnInitForSimulationInItsPlace) {
               (Lines{"defparam U1.INIT = INIT;", "defparam U1.INIT = \"own\";"}));
 }
 
+TEST_F(HierarchicalInit, IsNotRecordedInConstantOptions) {
+    EngineScript script("ADD COMPONENT C\nADD INSTANCE C U1\nADD INSTANCE ATTRIBUTE U1 INIT own\n"
+                        "SET INSTANCE ATTRIBUTE OPTION U1 INIT -GENERIC=SYN\n" +
+                        moduleInit_);
+    script.GetNetlist().SetName("MHALVEX");
+    for (const bool before : {false, true}) {
+        HdlOptions options = WithoutHeader();
+        options.hierarchicalInit = before;
+        const std::string text =
+            WriteToMemory(&script.GetNetlist(), static_cast<const HdlOptions&>(options));
+        EXPECT_EQ(LinesThatBegin(text, "defparam"), (Lines{"defparam U1.INIT = INIT;"}));
+        EXPECT_EQ(options.hierarchicalInit, before);
+    }
+}
+
+TEST_F(HierarchicalInit, StaysWhenThereIsNoNetlist) {
+    HdlOptions options;
+    options.hierarchicalInit = true;
+    EXPECT_EQ(WriteToMemory(nullptr, options), "");
+    EXPECT_TRUE(options.hierarchicalInit);
+}
+
 TEST_F(HierarchicalInit, IsSetAfreshByEveryWrite) {
     EngineScript script(moduleInit_);
     script.GetOptions().hierarchicalInit = true;
     script.Verilog();
     EXPECT_FALSE(script.GetOptions().hierarchicalInit);
+    script.GetNetlist().SetName("MHALVEX");
+    script.Verilog();
+    EXPECT_TRUE(script.GetOptions().hierarchicalInit);
 }
 
 // Name cases

@@ -661,7 +661,7 @@ class Banner(unittest.TestCase):
 
 
 class Verilog(unittest.TestCase):
-    def test_worked_example(self) -> None:
+    def test_and_gate(self) -> None:
         lines = verilog(
             AND2_DESIGN
             + "ADD INSTANCE ATTRIBUTE U1 LOC P1\n"
@@ -783,7 +783,7 @@ class Verilog(unittest.TestCase):
 
 
 class Vhdl(unittest.TestCase):
-    def test_worked_example(self) -> None:
+    def test_and_gate(self) -> None:
         lines = vhdl(AND2_DESIGN)
         self.assertEqual(
             lines,

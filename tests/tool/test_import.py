@@ -354,6 +354,26 @@ class Cells(ImportTest):
         self.refuse(design({}, {"u": cell("LEAF", "i", Q=[2])}, LEAF=black_box({"P": port("input", 2)})),
                     'modules.top.cells.u.connections.Q: the module "LEAF" has no such port')
 
+    def test_cells_with_few_pins_in_common(self) -> None:
+        # With one component for all, each of the 300 instances would have 299 open pins.
+        cells = {f"u{i}": cell("LEAF", "ib", **{f"P{i}": [2], f"Q{i}": [3]}) for i in range(299)}
+        cells["twin"] = cell("LEAF", "ib", P7=[2], Q7=[3, 4])
+        cells["same"] = cell("LEAF", "ib", P7=[2], Q7=[3])
+        file = self.write("d.json", json.dumps(design({"a": port("input", 2)}, cells)))
+        outcome = self.run_tool("import", file, "-o", "d.cmd")
+        self.assertEqual(outcome.status, SUCCESS)
+        lines = self.read("d.cmd").splitlines()
+        self.assertEqual(len([line for line in lines if line.startswith("ADD COMPONENT ")]), 300)
+        self.assertEqual([line for line in lines if line.startswith("ADD PIN LEAF_7 ")],
+                         ["ADD PIN LEAF_7 P7 Input", "ADD PIN LEAF_7 Q7 BiDirectional"])
+        self.assertEqual([line for line in lines if line.startswith("ADD PIN LEAF_299 ")],
+                         ["ADD PIN LEAF_299 P7 Input", "ADD PIN LEAF_299 Q7(1:0) BiDirectional"])
+        self.assertIn("ADD INSTANCE LEAF_7 same", lines)
+        self.assertIn("ADD INSTANCE LEAF_299 twin", lines)
+        self.assertIn("CONNECT SIGNAL a same.P7", lines)
+        self.assertIn("modules.top.cells.u7.type: the cells of the type have few pins in common; "
+                      "this component is called LEAF_7\n", outcome.err)
+
     def test_scope_information_is_no_cell(self) -> None:
         done = self.import_design(design({}, {"s": cell("$scopeinfo", "")}))
         self.assertEqual(done.lines("ADD COMPONENT"), [])

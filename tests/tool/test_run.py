@@ -5,8 +5,9 @@ from __future__ import annotations
 import os
 import pty
 import subprocess
-import time
+import threading
 import unittest
+from collections.abc import Callable
 
 from support import EXAMPLES, FAILED, FILE, INVERTER, SUCCESS, TOOL, USAGE, ToolTest
 
@@ -190,6 +191,11 @@ class Outputs(ToolTest):
         self.assertIn("module d(A", outcome.out)
 
 
+# Runs of a test in which another thread changes the folder. A check of the name alone lets about one run
+# in ten write outside.
+RACES = 16
+
+
 class WriteRules(ToolTest):
     """A command file that is not trusted writes below one folder, or nothing."""
 
@@ -287,6 +293,53 @@ class WriteRules(ToolTest):
                 self.assertIn("entity w is", self.read("b.vhd"))
                 (self.folder / "b.vhd").unlink()
 
+    def race(self, swap: Callable[[], None], *lines: str) -> None:
+        """Replays the lines while another thread swaps what their files lie in, and checks that
+        nothing is ever written outside of the folder."""
+        outside = {path.name for path in (self.folder / "outer").iterdir()}
+        done = threading.Event()
+
+        def keep_swapping() -> None:
+            while not done.is_set():
+                swap()
+
+        swapper = threading.Thread(target=keep_swapping)
+        swapper.start()
+        try:
+            for _ in range(RACES):
+                self.write("w.cmd", INVERTER + "".join(f"{line}\n" for line in lines))
+                self.run_tool("run", "w.cmd", "--output-dir", "out", "--keep-going")
+                if {path.name for path in (self.folder / "outer").iterdir()} != outside:
+                    break
+        finally:
+            done.set()
+            swapper.join()
+        self.assertEqual({path.name for path in (self.folder / "outer").iterdir()}, outside)
+        self.assertEqual(self.read("outer/kept"), "kept\n")
+
+    def test_a_folder_that_becomes_a_link_in_the_meantime(self) -> None:
+        way, real = self.folder / "out" / "sub", self.folder / "out" / "real"
+
+        def swap() -> None:
+            way.rename(real)
+            way.symlink_to("../outer")
+            way.unlink()
+            real.rename(way)
+
+        self.race(swap, *(f"WRITE VERILOG -APPEND sub/a{i}.v" for i in range(100)),
+                  *(f"WRITE VHDL sub/b{i}.vhd" for i in range(100)))
+
+    def test_a_file_that_becomes_a_link_in_the_meantime(self) -> None:
+        file, link = self.folder / "out" / "a.v", self.folder / "out" / "link"
+
+        def swap() -> None:
+            link.symlink_to("../outer/kept")
+            link.replace(file)
+            file.unlink()
+            file.touch()
+
+        self.race(swap, *["WRITE VERILOG -APPEND a.v", "WRITE VHDL a.v"] * 100)
+
     def test_no_write(self) -> None:
         self.write("w.cmd", INVERTER + "WRITE VERILOG a.v\nWRITE VHDL -APPEND /dev/null\nNOOP\n")
         before = self.all_files()
@@ -360,44 +413,57 @@ class Usage(ToolTest):
 
 
 class ProgressDisplay(ToolTest):
-    """The progress line needs a terminal and a replay of more than a second: a pipe that waits."""
+    """The progress line of a replay on a terminal, fed line by line until the line is there."""
 
-    def replay_slowly(self, *options: str) -> tuple[str, int]:
-        """What a slow replay shows on a terminal, and its exit status."""
+    LINES = 10_000  # the tool looks at its clock every some thousand lines
+
+    def replay_until(self, done: Callable[[bytes, int], bool], *options: str) -> tuple[str, int]:
+        """Feeds a replay until `done`, of what the terminal shows and the lines fed, and ends it with
+        a line that fails. Returns what it shows in all, and the number of the last line."""
         terminal, standard_error = pty.openpty()
-        process = subprocess.Popen([TOOL, "run", "-", *options], stdin=subprocess.PIPE,
-                                   stderr=standard_error, cwd=self.folder)
-        os.close(standard_error)
-        assert process.stdin is not None
-        with process.stdin as commands:
-            commands.write(b"NOOP\n")
-            commands.flush()
-            time.sleep(1.2)
-            commands.write(b"NOOP\n" * 100_000 + b"ADD\n")
-        status = process.wait(timeout=60)
-        shown = b""
-        try:
-            while piece := os.read(terminal, 65536):
-                shown += piece
-        except OSError:  # the other side is closed
-            pass
+        os.set_blocking(terminal, False)
+        shown, lines = b"", 0
+
+        def read_terminal() -> bool:
+            nonlocal shown
+            try:
+                while piece := os.read(terminal, 65536):
+                    shown += piece
+            except BlockingIOError:
+                return True
+            except OSError:  # the other side is closed
+                pass
+            return False
+
+        with subprocess.Popen([TOOL, "run", "-", *options], stdin=subprocess.PIPE,
+                              stderr=standard_error, cwd=self.folder) as process:
+            os.close(standard_error)
+            assert process.stdin is not None
+            while not done(shown, lines):
+                process.stdin.write(b"\n" * self.LINES)
+                process.stdin.flush()
+                lines += self.LINES
+                read_terminal()
+            process.stdin.write(b"ADD\n")
+            process.stdin.close()
+            os.set_blocking(terminal, True)
+            while read_terminal():
+                pass
+            self.assertEqual(process.wait(timeout=60), FAILED)
         os.close(terminal)
-        return shown.decode(), status
+        return shown.decode(), lines + 1
 
     def test_shown_and_erased(self) -> None:
-        shown, status = self.replay_slowly()
-        self.assertEqual(status, FAILED)
+        shown, last = self.replay_until(lambda shown, _: b" lines" in shown)
         self.assertRegex(shown, r"^orn-hdl: \d+ lines")
-        self.assertTrue(shown.endswith("\r\033[K-:100002: error: Command not find.\r\n"), shown)
-
-    def test_not_shown_when_quiet(self) -> None:
-        shown, status = self.replay_slowly("--quiet")
-        self.assertEqual(status, FAILED)
-        self.assertEqual(shown, "-:100002: error: Command not find.\r\n")
+        self.assertTrue(shown.endswith(f"\r\033[K-:{last}: error: Command not find.\r\n"), shown)
+        # As many lines, and the time that they take, show nothing when asked for quiet.
+        shown, last = self.replay_until(lambda _, lines: lines >= last, "--quiet")
+        self.assertEqual(shown, f"-:{last}: error: Command not find.\r\n")
 
 
 class Examples(ToolTest):
-    def test_worked_example(self) -> None:
+    def test_and_gate(self) -> None:
         self.expect(self.run_tool("run", EXAMPLES / "and2" / "and2.cmd", "--no-header",
                                   "--verilog", "o.v"), SUCCESS)
         self.assertEqual(self.read("o.v"), """\

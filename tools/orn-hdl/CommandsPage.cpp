@@ -24,7 +24,7 @@ bool IsPhrase(const CommandInfo& command, std::string_view words) {
     return Port::EqualIgnoringCase(command.phrase, words);
 }
 
-/// Whether the phrase begins with whole words and goes on behind them.
+/// Whether the phrase begins with these whole words and has more words.
 bool IsLongerPhrase(const CommandInfo& command, std::string_view words) {
     const std::string_view phrase(command.phrase);
     if (words.empty()) {
@@ -66,7 +66,7 @@ std::string FormatInFull(const CommandInfo& command) {
     return text.append("\n\n").append(command.help).append("\n");
 }
 
-/// A text as it stands in a table cell, which "|" would end, also within code.
+/// A text for a cell of a table: "|" is escaped, since it would end the cell even within code.
 std::string FormatCell(std::string_view text) {
     std::string cell;
     for (const char c : text) {

@@ -1,9 +1,10 @@
 #include "Draw.h"
 
-#include "DrawGraph.h"
 #include "Output.h"
 #include "Progress.h"
 #include "Run.h"
+#include "draw/DesignGraph.h"
+#include "draw/DotWriter.h"
 
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
@@ -27,7 +28,8 @@ namespace {
 /// Graphviz takes minutes for more.
 constexpr std::size_t MostBoxes = 5000;
 
-/// Stands for a write command that writes nothing: to draw a design is to read its file.
+/// Takes the place of the write commands: `draw` must not write the files that the command file
+/// names.
 class NoWriteCommand final : public Orn_Hdl::Command {
 public:
     using Command::Command;
@@ -42,7 +44,7 @@ public:
 
 using CFile = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
 
-/// A file of no name that holds a text, to be read from its start.
+/// A temporary file without a name that contains a text, at whose start the next read begins.
 CFile MakeTemporaryFile(std::string_view text) {
     CFile file(std::tmpfile(), &std::fclose);
     if (file != nullptr &&
@@ -68,7 +70,7 @@ int StartDot(int input, int output, pid_t& process) {
     return error;
 }
 
-/// Lets Graphviz turn the text of a graph into a picture.
+/// Has Graphviz draw a graph. \param picture gets the text of the picture.
 Status RunDot(std::string_view graph, std::string& picture) {
     const CFile input = MakeTemporaryFile(graph);
     const CFile output = MakeTemporaryFile("");
@@ -107,19 +109,19 @@ Status WritePicture(const std::string& name, std::string_view picture) {
 }
 
 Status DrawNetlist(const Orn_Hdl::Netlist& netlist, const DrawOptions& options) {
-    Graph graph(netlist);
+    DesignGraph graph(netlist);
     if (!options.around.empty() && !graph.KeepAround(options.around, options.depth)) {
         Complain("there is no instance and no signal " + options.around);
         return Status::Usage;
     }
-    if (graph.CountBoxes() > MostBoxes) {
-        Complain(std::to_string(graph.CountBoxes()) + " instances are too many for a picture, " +
-                 std::to_string(MostBoxes) +
+    if (graph.CountDrawnBoxes() > MostBoxes) {
+        Complain(std::to_string(graph.CountDrawnBoxes()) +
+                 " instances are too many for a picture, " + std::to_string(MostBoxes) +
                  " the most; choose a smaller part with --around and --depth");
         return Status::Usage;
     }
     std::string picture;
-    const Status drawn = RunDot(graph.Write(), picture);
+    const Status drawn = RunDot(DotWriter(graph).Write(), picture);
     return drawn == Status::Success ? WritePicture(options.output, picture) : drawn;
 }
 
@@ -129,8 +131,9 @@ Status Draw(const DrawOptions& options) {
     Orn_Hdl::Engine engine;
     engine.CreateAndAddModel("", options.file.c_str());
     Orn_Hdl::Model& model = *engine.GetModel("");
-    for (const char* phrase : {"WRITE VERILOG", "WRITE VHDL"}) {
-        model.GetCommandFactory()->AddCommandCreator(phrase, &NoWriteCommand::Create);
+    for (const Orn_Hdl::Language language : Orn_Hdl::Languages) {
+        const std::string phrase = std::string("WRITE ") + Orn_Hdl::GetLanguageName(language);
+        model.GetCommandFactory()->AddCommandCreator(phrase.c_str(), &NoWriteCommand::Create);
     }
     Progress progress(true, options.file);
     const Replayed replayed = Replay(model, options.file, false, progress);

@@ -1,9 +1,12 @@
 #include "Import.h"
 
-#include "ImportContext.h"
-#include "ImportNetlist.h"
-#include "ImportReader.h"
-#include "ImportSink.h"
+#include "import/CommandSink.h"
+#include "import/DesignReader.h"
+#include "import/EmitNetlist.h"
+#include "import/ImportedNetlist.h"
+#include "import/ModelSink.h"
+#include "import/NameMap.h"
+#include "import/TopModule.h"
 
 #include "Orn_Hdl/Engine.h"
 #include "Orn_Hdl/Model.h"
@@ -22,7 +25,8 @@ namespace {
 
 using namespace Import;
 
-/// Room behind the text that the reader fills up; with it the text is never copied.
+/// Room after the text for the padding that the JSON parser needs; without it the text would be
+/// copied.
 constexpr std::size_t Margin = 4096;
 
 Status ReadFile(const std::string& name, std::string& text) {
@@ -30,52 +34,51 @@ Status ReadFile(const std::string& name, std::string& text) {
     if (!file.open(SystemFileName(name.c_str()), Port::File::Read, true)) {
         return ComplainUnreadable(name, file.GetError());
     }
-    constexpr std::size_t piece = std::size_t(1) << 20;
+    constexpr std::size_t Piece = std::size_t(1) << 20;
     std::error_code unknown;
     const std::uintmax_t expected = std::filesystem::file_size(name, unknown);
-    text.reserve((unknown ? 0 : expected) + piece + Margin);
+    text.reserve((unknown ? 0 : expected) + Piece + Margin);
     std::size_t size = 0;
     std::size_t count = 0;
     do {
-        text.resize(size + piece);
-        count = file.read(text.data() + size, piece);
+        text.resize(size + Piece);
+        count = file.read(text.data() + size, Piece);
         size += count;
     } while (count > 0);
     text.resize(size);
     return file.GetError() == 0 ? Status::Success : ComplainUnreadable(name, file.GetError());
 }
 
-std::optional<Bit> GetUnknownAs(const ImportOptions& options) {
+UnknownValues GetUnknownValues(const ImportOptions& options) {
     if (options.unknownAs.empty()) {
-        return std::nullopt;
+        return UnknownValues(std::nullopt);
     }
-    return options.unknownAs == "1" ? One : Zero;
+    return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
-Status WriteNetlists(const Netlist& netlist, const ImportOptions& options) {
-    if (options.outputs.verilog.empty() && options.outputs.vhdl.empty()) {
+Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options) {
+    if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
     Orn_Hdl::Engine engine;
-    engine.CreateAndAddModel(netlist.GetName().c_str(), options.file.c_str());
-    Orn_Hdl::Model& model = *engine.GetModel(netlist.GetName().c_str());
+    engine.CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
+    Orn_Hdl::Model& model = *engine.GetModel(netlist.name.c_str());
     ModelSink sink(model);
-    netlist.Emit(sink);
+    EmitNetlist(netlist, sink);
     Progress progress(false, options.file);
     return WriteOutputs(model, options.outputs, progress);
 }
 
-/// The command file and the name map take their places last: when one of the files fails, neither
-/// does.
-Status WriteAll(const Netlist& netlist, const ImportOptions& options) {
+/// The command file and the name map take their places last, and only when all files are written.
+Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
     OutputFile commands(options.commandFile);
     if (Port::Stream* out = commands.GetStream()) {
         CommandSink sink(*out);
-        netlist.Emit(sink);
+        EmitNetlist(netlist, sink);
     }
     OutputFile nameMap(options.nameMap);
     if (Port::Stream* out = nameMap.GetStream()) {
-        netlist.WriteNameMap(*out);
+        WriteNameMap(netlist, *out);
     }
     Status status = Worse(commands.Flush(), nameMap.Flush());
     if (status == Status::Success) {
@@ -93,12 +96,14 @@ Status ImportDesign(const ImportOptions& options) {
         return read;
     }
     try {
-        const std::unique_ptr<Design> design = ReadDesign(std::move(text), options.attributes);
+        const std::unique_ptr<ImportedDesign> design =
+            ReadDesign(std::move(text), options.attributes);
         Module& top = FindTop(*design, options.top);
-        Context context(top, GetUnknownAs(options));
-        const Netlist netlist(*design, top, context);
+        Warnings warnings;
+        const ImportedNetlist netlist =
+            MakeNetlist(*design, top, GetUnknownValues(options), warnings);
         const Status written = WriteAll(netlist, options);
-        for (const std::string& warning : context.GetWarnings()) {
+        for (const std::string& warning : warnings.GetLines()) {
             PrintError(options.file + ": warning: " + warning);
         }
         return written;

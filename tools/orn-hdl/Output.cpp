@@ -3,11 +3,13 @@
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Progress.h"
 
+#include <algorithm>
+
 namespace Tool {
 
 namespace {
 
-Status WriteOutput(Orn_Hdl::Model& model, const char* language, const std::string& file,
+Status WriteOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, const std::string& file,
                    bool noHeader, Progress& progress) {
     if (file.empty()) {
         return Status::Success;
@@ -15,7 +17,7 @@ Status WriteOutput(Orn_Hdl::Model& model, const char* language, const std::strin
     progress.Writing(file);
     Orn_Hdl::StringArray words;
     words.Add("WRITE");
-    words.Add(language);
+    words.Add(Orn_Hdl::GetLanguageName(language));
     if (noHeader) {
         words.Add("-NOHEADER");
     }
@@ -27,6 +29,11 @@ Status WriteOutput(Orn_Hdl::Model& model, const char* language, const std::strin
 }
 
 } // namespace
+
+bool Outputs::IsEmpty() const {
+    return std::all_of(files.begin(), files.end(),
+                       [](const auto& output) { return output.second.empty(); });
+}
 
 OutputFile::OutputFile(const std::string& name) : name_(name) {
     if (!name_.empty() &&
@@ -51,9 +58,11 @@ Status OutputFile::Commit() {
 }
 
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress) {
-    const Status verilog =
-        WriteOutput(model, "VERILOG", outputs.verilog, outputs.noHeader, progress);
-    return Worse(verilog, WriteOutput(model, "VHDL", outputs.vhdl, outputs.noHeader, progress));
+    Status status = Status::Success;
+    for (const auto& [language, file] : outputs.files) {
+        status = Worse(status, WriteOutput(model, language, file, outputs.noHeader, progress));
+    }
+    return status;
 }
 
 } // namespace Tool

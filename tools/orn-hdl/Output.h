@@ -1,9 +1,11 @@
 // Writing the files that the user asked for on the command line.
 #pragma once
 
+#include "Orn_Hdl/Language.h"
 #include "Port/File.h"
 #include "Tool.h"
 
+#include <map>
 #include <optional>
 #include <string>
 
@@ -15,11 +17,14 @@ namespace Tool {
 
 class Progress;
 
-/// The netlists to write. An empty name writes none of that language.
+/// The netlists to write.
 struct Outputs {
-    std::string verilog;
-    std::string vhdl;
+    /// The file of each language. An empty name writes none.
+    std::map<Orn_Hdl::Language, std::string> files;
     bool noHeader = false;
+
+    /// Whether there is nothing to write.
+    bool IsEmpty() const;
 };
 
 /// A text file to be written as a whole: its name stands for what it stood for before until
@@ -45,7 +50,8 @@ private:
     Status status_ = Status::Success;
 };
 
-/// Writes the netlists, Verilog first, and complains of those that did not reach their file.
+/// Writes the netlists in the order of their languages, and complains of those that did not reach
+/// their file.
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress);
 
 } // namespace Tool

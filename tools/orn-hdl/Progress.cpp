@@ -5,6 +5,7 @@
 #include <filesystem>
 #include <system_error>
 #include <unistd.h>
+#include <utility>
 
 namespace Tool {
 
@@ -23,8 +24,12 @@ std::uint64_t GetFileSize(const std::string& file) noexcept {
 } // namespace
 
 Progress::Progress(bool quiet, const std::string& file)
-    : enabled_(!quiet && isatty(STDERR_FILENO) == 1), totalBytes_(enabled_ ? GetFileSize(file) : 0),
-      next_(Clock::now() + Patience) {}
+    : Progress(!quiet && isatty(STDERR_FILENO) == 1 ? stderr : nullptr, file, &Clock::now) {}
+
+Progress::Progress(std::FILE* terminal, const std::string& file,
+                   std::function<Clock::time_point()> now)
+    : terminal_(terminal), totalBytes_(terminal != nullptr ? GetFileSize(file) : 0),
+      now_(std::move(now)), next_(now_() + Patience) {}
 
 void Progress::Update(std::uint64_t lines, std::uint64_t bytes) {
     if (!IsDue()) {
@@ -45,10 +50,10 @@ void Progress::Writing(std::string_view file) {
 }
 
 bool Progress::IsDue() {
-    if (!enabled_) {
+    if (terminal_ == nullptr) {
         return false;
     }
-    const Clock::time_point now = Clock::now();
+    const Clock::time_point now = now_();
     if (now < next_) {
         return false;
     }
@@ -58,14 +63,14 @@ bool Progress::IsDue() {
 
 void Progress::Show(const std::string& text) {
     Erase();
-    std::fprintf(stderr, "orn-hdl: %s", text.c_str());
-    std::fflush(stderr);
+    std::fprintf(terminal_, "orn-hdl: %s", text.c_str());
+    std::fflush(terminal_);
     shown_ = true;
 }
 
 void Progress::Erase() {
     if (shown_) {
-        std::fputs("\r\033[K", stderr);
+        std::fputs("\r\033[K", terminal_);
         shown_ = false;
     }
 }

@@ -3,37 +3,45 @@
 
 #include <chrono>
 #include <cstdint>
+#include <cstdio>
+#include <functional>
 #include <string>
 #include <string_view>
 
 namespace Tool {
 
-/// Shows lines and percent on standard error once the work has lasted a second, if that is a
-/// terminal. What it shows is erased when it ends.
+/// Shows lines and percentage on standard error, if that is a terminal, once the work has lasted a
+/// second. The destructor erases the line.
 class Progress {
 public:
+    using Clock = std::chrono::steady_clock;
+
     /// \param quiet shows nothing at all.
-    /// \param file what is read; its size tells how far the work is.
+    /// \param file the file that is read; its size is needed for the percentage.
     Progress(bool quiet, const std::string& file);
+    /// Shows the line on `terminal`, by the time that `now` returns.
+    ///
+    /// \param terminal null shows nothing at all.
+    Progress(std::FILE* terminal, const std::string& file, std::function<Clock::time_point()> now);
     ~Progress() { Erase(); }
     Progress(const Progress&) = delete;
     Progress& operator=(const Progress&) = delete;
 
-    /// Tells how far the work is. Looks at the clock: call it every some thousand lines.
+    /// Shows the progress. Reads the clock, so call it once for some thousand lines.
     void Update(std::uint64_t lines, std::uint64_t bytes);
-    /// Tells that a file is being written.
+    /// Shows that a file is being written.
     void Writing(std::string_view file);
-    /// Takes the line off the terminal, so that a message can be printed.
+    /// Erases the line on the terminal, so that a message can be printed.
     void Erase();
 
 private:
-    using Clock = std::chrono::steady_clock;
-
     bool IsDue();
     void Show(const std::string& text);
 
-    const bool enabled_;
+    /// Null when nothing is shown.
+    std::FILE* const terminal_;
     const std::uint64_t totalBytes_;
+    const std::function<Clock::time_point()> now_;
     bool shown_ = false;
     Clock::time_point next_;
 };

@@ -63,6 +63,10 @@ private:
         std::string text("cannot write ");
         text.append(model_.GetWrittenFileName().GetView()).append(": ");
         text.append(Port::ErrorText(model_.GetWriteError()).GetView());
+        if (const std::uint64_t leftover = model_.GetWriteLeftover(); leftover != 0) {
+            text.append("; the last ").append(std::to_string(leftover));
+            text.append(" bytes of the file are a part of the new text");
+        }
         Report(text);
         status_ = Status::File;
         // Told once: the model remembers its last write until the next one.

@@ -1,14 +1,14 @@
-// What every command of the tool shares: exit statuses and messages.
+// Exit statuses and messages, for all commands of the tool.
 #pragma once
 
 #include <string_view>
 
 namespace Tool {
 
-/// How the tool ends. Of several failures the greatest status is the tool's.
+/// The exit status of the tool. Of several failures the greatest status counts.
 enum class Status {
     Success = 0,
-    /// A command failed, or the contents of a file are not what they have to be.
+    /// A command failed, or the contents of a file are invalid.
     Failed = 1,
     Usage = 2,
     /// A file could not be read or written.
@@ -19,18 +19,19 @@ inline Status Worse(Status a, Status b) noexcept {
     return a < b ? b : a;
 }
 
-/// Prints one line on standard error, as it is.
+/// Prints one line on standard error, unchanged.
 void PrintError(std::string_view line);
-/// The same, said by the tool itself: "orn-hdl: TEXT".
+/// Prints "orn-hdl: TEXT" on standard error.
 void Complain(std::string_view text);
-/// Complains that a file cannot be read or written, for the reason that `error` numbers.
+/// Reports that a file cannot be read. \param error the system's error number.
 Status ComplainUnreadable(std::string_view file, int error);
+/// Reports that a file cannot be written. \param error the system's error number.
 Status ComplainUnwritable(std::string_view file, int error);
 
-/// Prints a text on standard output and complains when it does not arrive.
+/// Prints a text on standard output, and reports a failure to do so.
 Status Print(std::string_view text);
 
-/// The name under which the system opens a file that the user named: "-" is standard input.
+/// The name to open for a file that the user named: "-" is standard input.
 const char* SystemFileName(const char* file) noexcept;
 
 } // namespace Tool

@@ -1,5 +1,7 @@
 #include "WriteRules.h"
 
+#include "Port/Folder.h"
+
 #include <algorithm>
 #include <filesystem>
 #include <system_error>
@@ -26,6 +28,10 @@ public:
     explicit OutputFolder(const fs::path& folder) : former_(fs::current_path()) {
         fs::current_path(folder);
         folder_ = fs::current_path();
+        if (const int error = open_.Open("."); error != 0) {
+            fs::current_path(former_);
+            throw std::system_error(error, std::generic_category());
+        }
     }
     ~OutputFolder() override {
         std::error_code error;
@@ -33,6 +39,10 @@ public:
     }
 
     Port::StringBase<char> WhyNot(const char* fileName) override;
+    const Port::Folder* GetFolder(const char* /*fileName*/, Port::StringBase<char>& path) override {
+        path = allowed_.c_str();
+        return &open_;
+    }
 
 private:
     /// Whether a path without links and ".." lies below the folder.
@@ -41,8 +51,18 @@ private:
                folder_.end();
     }
 
+    /// Allows the file at a path without links and "..". It is opened by that path below the open
+    /// folder: a link that someone puts there after the check is not followed.
+    Port::StringBase<char> Allow(const fs::path& path) {
+        allowed_ = path.string();
+        return "";
+    }
+
     const fs::path former_;
     fs::path folder_;
+    Port::Folder open_;
+    /// The file that was allowed last, below the folder.
+    std::string allowed_;
 };
 
 Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
@@ -53,8 +73,8 @@ Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
     std::error_code error;
     const fs::path parent = fs::canonical(folder_ / name.parent_path(), error);
     if (error) {
-        // There is no such folder: opening the file fails and tells why.
-        return "";
+        // There is no such folder. Opening the file fails with the reason.
+        return Allow(name);
     }
     if (!Holds(parent)) {
         return Outside;
@@ -63,11 +83,13 @@ Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
     case fs::file_type::not_found:
     case fs::file_type::regular:
     case fs::file_type::directory:
-        return "";
+        return Allow(parent.lexically_relative(folder_) / name.filename());
     case fs::file_type::symlink: {
         // A link that leads nowhere yet would make the file to which it leads.
         const fs::path target = fs::canonical(name, error);
-        return !error && Holds(target) && fs::is_regular_file(target, error) ? "" : Outside;
+        return !error && Holds(target) && fs::is_regular_file(target, error)
+                   ? Allow(target.lexically_relative(folder_))
+                   : Outside;
     }
     default:
         return "it is no regular file";

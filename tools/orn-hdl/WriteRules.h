@@ -1,4 +1,4 @@
-// What the WRITE lines of a command file may write: for command files that are not trusted.
+// Limits what the WRITE lines of a command file may write, for command files that are not trusted.
 #pragma once
 
 #include "Orn_Hdl/Model.h"
@@ -17,8 +17,8 @@ struct WriteRules {
     bool noWrite = false;
 };
 
-/// Keeps a model to the rules as long as this lives. With a folder, that is the current folder
-/// meanwhile.
+/// Keeps a model to the rules until it is destroyed. A folder of the rules is the current folder
+/// until then.
 class RulesInForce {
 public:
     /// \throws std::system_error when the folder cannot be entered.

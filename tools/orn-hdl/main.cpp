@@ -7,6 +7,8 @@
 #include "Tool.h"
 #include "check/Check.h"
 
+#include "Orn_Hdl/Language.h"
+#include "Port/String.h"
 #include "Port/Version.h"
 
 #include <CLI/CLI.hpp>
@@ -40,8 +42,12 @@ CLI::Option* AddFile(CLI::App& command, const std::string& option, std::string& 
 }
 
 void AddOutputs(CLI::App& command, Tool::Outputs& outputs) {
-    AddFile(command, "--verilog", outputs.verilog, "Write the design as Verilog");
-    AddFile(command, "--vhdl", outputs.vhdl, "Write the design as VHDL");
+    for (const Orn_Hdl::Language language : Orn_Hdl::Languages) {
+        const std::string name = Orn_Hdl::GetLanguageName(language);
+        Port::String option(("--" + name).c_str());
+        option.MakeLower();
+        AddFile(command, option.CStr(), outputs.files[language], "Write the design as " + name);
+    }
     command.add_flag("--no-header", outputs.noHeader, "Write these netlists without the header");
 }
 

@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <iterator>
 #include <type_traits>
 
 namespace Orn_Hdl {
@@ -18,9 +19,14 @@ public:
     /// Whether `a` comes before `b`; `context` is the caller's.
     using Less = bool (*)(void* a, void* b, void* context);
 
-    PtrArrayBase() noexcept : capacity_(0), ownsItems_(0) {}
+    /// An empty array.
+    PtrArrayBase() noexcept : size_(0), isOwner_(0), capacity_(0), ownsItems_(0) {}
+    /// Holds the same pointers in the same order; of an owner's elements the copy owns none.
     PtrArrayBase(const PtrArrayBase& other);
+    /// Holds the same pointers in the same order. An owner takes what it is assigned and lets go of
+    /// what it had, but for another owner's elements: then nothing changes.
     PtrArrayBase& operator=(const PtrArrayBase& other);
+    /// Leaves what the elements point at alone.
     virtual ~PtrArrayBase();
 
     /// The number of elements, nulls included.
@@ -37,20 +43,17 @@ public:
     int GetIndex(const void* p) const noexcept;
     /// Whether an element is equal to `p`.
     bool Contains(const void* p) const noexcept { return GetIndex(p) >= 0; }
-    /// Makes room for `capacity` elements in all.
+    /// Makes room for `capacity` elements in all, so that none of them takes memory when it is
+    /// added.
     void Reserve(int capacity);
-    /// Appends. \return the index of the new element.
-    int Add(void* p) {
-        if (size_ >= capacity_) {
-            Grow();
-        }
-        items_[size_] = p;
-        return static_cast<int>(size_++);
-    }
-    /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
+    /// Appends; a pointer that an owner holds already is ignored.
+    /// \return the index of the element.
+    int Add(void* p) { return isOwner_ != 0 ? AddToOwner(p) : Append(p); }
+    /// Stores at `i`, growing the array with nulls up to it. A negative index is ignored, and so is
+    /// a pointer that an owner holds already.
     void SetAt(int i, void* p);
-    /// Puts an element before the one at `i`; an index out of range is ignored, but for that behind
-    /// the last element.
+    /// Puts an element before the one at `i`. An index out of range is ignored, but for that behind
+    /// the last element, and so is a pointer that an owner holds already.
     void InsertAt(int i, void* p);
     /// Removes the first element equal to `p`, keeping the others' order.
     /// \return false when there is none.
@@ -62,20 +65,34 @@ public:
     /// Drops the last element without deleting it; an empty array stays as it is.
     void RemoveTail() noexcept {
         if (size_ > 0) {
-            --size_;
+            size_ = (size_ - 1) & MostElements;
         }
     }
     /// Exchanges two elements; an index out of range changes nothing.
     void Swap(int i, int j) noexcept;
-    /// Sorts stably with the caller's less-than predicate, which receives `context`.
+    /// Sorts stably with the caller's less-than predicate, which receives `context`; null changes
+    /// nothing. Whatever the predicate answers, each element is there once afterwards. When it
+    /// throws, or has changed the array, the array is left as it is by then, unsorted.
     void Sort(Less less, void* context);
 
 protected:
+    /// Marks an array whose elements are deleted by a derived class: no pointer is held twice.
+    void BecomeOwner() noexcept { isOwner_ = 1; }
+    /// Appends a pointer that an owner is known not to hold. \return its index.
+    int Append(void* p) {
+        if (size_ >= capacity_) {
+            Grow();
+        }
+        const std::uint32_t index = size_;
+        items_[index] = p;
+        size_ = (index + 1) & MostElements;
+        return static_cast<int>(index);
+    }
     /// Lets an empty array use memory that somebody else owns and that outlives the array, until it
     /// grows beyond it. The first `size` elements are there already.
     void Borrow(void** items, int size, int capacity) noexcept {
         items_ = items;
-        size_ = static_cast<std::uint32_t>(size);
+        size_ = static_cast<std::uint32_t>(size) & MostElements;
         capacity_ = static_cast<std::uint32_t>(capacity) & MostElements;
         ownsItems_ = 0;
     }
@@ -83,11 +100,18 @@ protected:
 private:
     static constexpr std::uint32_t MostElements = INT32_MAX;
 
+    void TakeOver(const PtrArrayBase& other);
+    int AddToOwner(void* p);
+    /// Whether `p` may be stored: an owner refuses what it holds.
+    bool Takes(const void* p) const noexcept {
+        return isOwner_ == 0 || p == nullptr || GetIndex(p) < 0;
+    }
     void Grow();
     void Reallocate(std::size_t capacity);
 
     void** items_ = nullptr;
-    std::uint32_t size_ = 0;
+    std::uint32_t size_ : 31;
+    std::uint32_t isOwner_ : 1;
     std::uint32_t capacity_ : 31;
     std::uint32_t ownsItems_ : 1;
 };
@@ -105,20 +129,27 @@ public:
     int GetIndex(T p) const noexcept { return PtrArrayBase::GetIndex(p); }
     /// Whether an element is equal to `p`.
     bool Contains(T p) const noexcept { return GetIndex(p) >= 0; }
-    /// Appends. \return the index of the new element.
+    /// Appends; a pointer that an owner holds already is ignored.
+    /// \return the index of the element.
     int Add(T p) { return PtrArrayBase::Add(p); }
-    /// Stores at `i`, growing the array with nulls up to it; a negative index is ignored.
+    /// Stores at `i`, growing the array with nulls up to it. A negative index is ignored, and so is
+    /// a pointer that an owner holds already.
     void SetAt(int i, T p) { PtrArrayBase::SetAt(i, p); }
-    /// Puts an element before the one at `i`; an index out of range is ignored, but for that behind
-    /// the last element.
+    /// Puts an element before the one at `i`. An index out of range is ignored, but for that behind
+    /// the last element, and so is a pointer that an owner holds already.
     void InsertAt(int i, T p) { PtrArrayBase::InsertAt(i, p); }
     /// Removes the first element equal to `p`, keeping the others' order.
     /// \return false when there is none.
     bool Remove(T p) noexcept { return PtrArrayBase::Remove(p); }
     /// Removes the element at `i`, keeping the others' order; an index out of range is ignored.
     void RemoveAt(int i) noexcept { PtrArrayBase::RemoveAt(i); }
-    /// Sorts stably with the caller's less-than predicate, which receives `context`.
+    /// Sorts stably with the caller's less-than predicate, which receives `context`; null changes
+    /// nothing. Whatever the predicate answers, each element is there once afterwards. When it
+    /// throws, or has changed the array, the array is left as it is by then, unsorted.
     void Sort(bool (*less)(T a, T b, void* context), void* context) {
+        if (less == nullptr) {
+            return;
+        }
         struct Caller {
             bool (*less)(T, T, void*);
             void* context;
@@ -135,6 +166,7 @@ public:
 /// A `PtrArray` with room for its first elements in itself.
 template <class T, int Room> class SmallPtrArray : public PtrArray<T> {
 public:
+    /// An empty array that takes no memory until it grows beyond its room.
     SmallPtrArray() noexcept { this->Borrow(first_, 0, Room); }
     SmallPtrArray(const SmallPtrArray&) = delete;
     SmallPtrArray& operator=(const SmallPtrArray&) = delete;
@@ -145,35 +177,23 @@ private:
 
 /// A `PtrArray` that owns its elements: its destructor deletes them, the last one first. Only the
 /// destructor and `DeleteAll` delete; `Empty`, `Remove`, `RemoveAt`, `RemoveTail` and `SetAt` let
-/// go of what they drop.
+/// go of what they drop. It holds no pointer twice but null, by whatever reference it is called.
 template <class T> class OwnPtrArray : public PtrArray<T> {
 public:
-    OwnPtrArray() noexcept = default;
+    /// An empty array.
+    OwnPtrArray() noexcept { this->BecomeOwner(); }
     OwnPtrArray(const OwnPtrArray&) = delete;
     OwnPtrArray& operator=(const OwnPtrArray&) = delete;
+    /// Deletes every element, the last one first.
     ~OwnPtrArray() override { DeleteAll(); }
 
-    /// Appends; a pointer that the array holds already is ignored.
-    /// \return the index of the element. Looks at every element: a caller who knows that the
-    ///         object is new uses `AddNew`.
-    int Add(T p) {
-        const int present = p == nullptr ? -1 : this->GetIndex(p);
-        return present >= 0 ? present : AddNew(p);
-    }
-    /// Appends an object that the array does not hold.
-    int AddNew(T p) { return PtrArray<T>::Add(p); }
-    /// As `PtrArray::SetAt`; a pointer that the array holds at another place is ignored.
-    void SetAt(int i, T p) {
-        if (p == nullptr || this->GetIndex(p) < 0) {
-            PtrArray<T>::SetAt(i, p);
-        }
-    }
-    /// As `PtrArray::InsertAt`; a pointer that the array holds already is ignored.
-    void InsertAt(int i, T p) {
-        if (p == nullptr || this->GetIndex(p) < 0) {
-            PtrArray<T>::InsertAt(i, p);
-        }
-    }
+    /// Appends and takes ownership; a pointer that the array holds already is ignored. Looks at
+    /// every element: a caller who knows that the object is new uses `AddNew`.
+    /// \return the index of the element.
+    int Add(T p) { return PtrArray<T>::Add(p); }
+    /// Appends an object that the array does not hold, and takes ownership.
+    /// \return its index.
+    int AddNew(T p) { return this->Append(p); }
     /// Deletes every element, the last one first.
     void DeleteAll() {
         while (!this->IsEmpty()) {
@@ -185,25 +205,41 @@ public:
 };
 
 /// Walks a `PtrArray<T>` by index, stored nulls included. It reads the array's present size at each
-/// step, so elements appended on the way are met too. The array must outlive it.
+/// step, so elements appended on the way are met too. The array must outlive it; of an object that
+/// makes its array on first use, the object must.
 ///
 /// \code
 /// for (Signal* signal : netlist.GetSignalIterator()) { ... }
 /// \endcode
 template <class T> class Iterator {
 public:
+    /// Gives the array of an object; null as long as it has none.
+    using Find = const PtrArray<T>* (*)(const void* owner);
+
     /// Over no array: yields nothing.
     Iterator() noexcept = default;
-    /// Starts at the first element; the array is not owned.
-    explicit Iterator(const PtrArray<T>* array) noexcept : array_(array) {}
+    /// Starts at the first element; the array is not owned, and null is no array.
+    explicit Iterator(const PtrArray<T>* array) noexcept : source_(array) {}
+    /// Starts at the first element of an array that its owner makes on first use, or makes anew:
+    /// `find(owner)` is asked for it at each step.
+    Iterator(const void* owner, Find find) noexcept : source_(owner), find_(find) {}
+    /// Stands at the same element of the same array.
     Iterator(const Iterator&) noexcept = default;
+    /// Moves to the same element of the same array.
     Iterator& operator=(const Iterator&) noexcept = default;
+    /// Leaves the array alone.
     virtual ~Iterator() = default;
 
     /// Whether there is no present element.
-    bool IsAtEnd() const noexcept { return array_ == nullptr || index_ >= array_->GetSize(); }
+    bool IsAtEnd() const noexcept {
+        const PtrArray<T>* const array = GetArray();
+        return array == nullptr || index_ >= array->GetSize();
+    }
     /// The present element; null at the end.
-    T GetCurrent() const noexcept { return array_ == nullptr ? nullptr : array_->GetAt(index_); }
+    T GetCurrent() const noexcept {
+        const PtrArray<T>* const array = GetArray();
+        return array == nullptr ? nullptr : array->GetAt(index_);
+    }
     /// Steps to the next element; at the end nothing happens.
     void Next() noexcept {
         if (!IsAtEnd()) {
@@ -211,35 +247,91 @@ public:
         }
     }
 
-    /// For range-based for loops, from the present element on.
+    /// A place in the array for range-based for loops, the algorithms of the standard library and
+    /// its ranges: a forward iterator that yields the pointers. It depends on what the `Iterator`
+    /// walks, not on the `Iterator`.
     class Cursor {
     public:
+#if defined(__cpp_concepts)
+        /// A second walk meets the same elements.
+        using iterator_concept = std::forward_iterator_tag;
+#endif
+        /// Elements are given by value, which C++17 knows of input iterators only.
+        using iterator_category = std::input_iterator_tag;
+        /// What is yielded.
+        using value_type = T;
+        /// The distance of two places.
+        using difference_type = std::ptrdiff_t;
+        /// There is no pointer to a place.
+        using pointer = void;
+        /// What `*` gives.
+        using reference = T;
+
+        /// The end of every array.
+        Cursor() noexcept = default;
         /// Starts at the iterator's present element.
-        explicit Cursor(const Iterator& from) noexcept : array_(from.array_), index_(from.index_) {}
-        /// The present element.
-        T operator*() const noexcept { return array_->GetAt(index_); }
+        explicit Cursor(const Iterator& from) noexcept
+            : source_(from.source_), find_(from.find_), index_(from.index_) {}
+        /// The present element; null at the end.
+        T operator*() const noexcept {
+            const PtrArray<T>* const array = GetArray();
+            return array == nullptr ? nullptr : array->GetAt(index_);
+        }
         /// Steps on.
         Cursor& operator++() noexcept {
             ++index_;
             return *this;
         }
-        /// Whether there is a present element.
-        friend bool operator!=(const Cursor& a, std::nullptr_t) noexcept {
-            return a.array_ != nullptr && a.index_ < a.array_->GetSize();
+        /// Steps on. \return the place before the step.
+        Cursor operator++(int) noexcept {
+            const Cursor before = *this;
+            ++*this;
+            return before;
+        }
+        /// Whether both are the same place, or both are at the end as it is now.
+        friend bool operator==(const Cursor& a, const Cursor& b) noexcept {
+            const bool isAtEnd = a.IsAtEnd();
+            return isAtEnd || b.IsAtEnd() ? isAtEnd == b.IsAtEnd()
+                                          : a.source_ == b.source_ && a.index_ == b.index_;
+        }
+        /// Whether they are different places, and not both at the end as it is now.
+        friend bool operator!=(const Cursor& a, const Cursor& b) noexcept {
+            return !(a == b);
         }
 
     private:
-        const PtrArray<T>* array_;
-        int index_;
+        const PtrArray<T>* GetArray() const noexcept {
+            return Iterator::GetArray(source_, find_);
+        }
+        bool IsAtEnd() const noexcept {
+            const PtrArray<T>* const array = GetArray();
+            return array == nullptr || index_ >= array->GetSize();
+        }
+
+        const void* source_ = nullptr;
+        Find find_ = nullptr;
+        int index_ = 0;
     };
-    /// \{
-    /// For range-based for loops.
-    Cursor begin() const noexcept { return Cursor(*this); }
-    std::nullptr_t end() const noexcept { return nullptr; }
-    /// \}
+    /// The present element's place.
+    Cursor begin() const noexcept {
+        return Cursor(*this);
+    }
+    /// The place behind the last element, wherever that is when it is compared.
+    Cursor end() const noexcept {
+        return Cursor();
+    }
 
 private:
-    const PtrArray<T>* array_ = nullptr;
+    static const PtrArray<T>* GetArray(const void* source, Find find) noexcept {
+        return find == nullptr ? static_cast<const PtrArray<T>*>(source) : find(source);
+    }
+    const PtrArray<T>* GetArray() const noexcept {
+        return GetArray(source_, find_);
+    }
+
+    /// The array, or the object that `find_` gives the array of.
+    const void* source_ = nullptr;
+    Find find_ = nullptr;
     int index_ = 0;
 };
 

@@ -5,6 +5,8 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstddef>
+#include <iterator>
 #include <memory>
 #include <string_view>
 
@@ -13,26 +15,42 @@ namespace Orn_Hdl {
 class NameTable;
 class StringSet;
 
-/// A position in a `StringSet`, valid until the set changes or ends.
+/// A position in a `StringSet`, valid until the set changes or ends. An input iterator that yields
+/// copies of the names.
 class ORN_HDL_API StringSetIterator {
 public:
+    /// The postfix `++` gives nothing, so that it is no more than an input iterator.
+    using iterator_category = std::input_iterator_tag;
+    /// What is yielded.
+    using value_type = Port::StringBase<char>;
+    /// The distance of two positions.
+    using difference_type = std::ptrdiff_t;
+    /// There is no pointer to a position.
+    using pointer = void;
+    /// What `*` gives.
+    using reference = const Port::StringBase<char>;
+
     /// The end position.
     StringSetIterator() noexcept = default;
     /// A position that a set gives.
     explicit StringSetIterator(const void* position) noexcept : position_(position) {}
 
-    /// The name at the position; the empty text at the end.
+    /// A copy of the name at the position; the empty text at the end.
     const Port::StringBase<char> operator*() const;
-    /// As `operator*`, without a copy: valid as long as the position is.
+    /// The name at the position without a copy, valid as long as the position is; the empty text at
+    /// the end.
     std::string_view GetView() const noexcept;
 
     /// Steps to the next name; at the end nothing happens.
     StringSetIterator& operator++() noexcept;
+    /// Steps to the next name and gives nothing; at the end nothing happens.
     void operator++(int) noexcept { ++*this; }
 
+    /// Whether both are the same position.
     friend bool operator==(const StringSetIterator& a, const StringSetIterator& b) noexcept {
         return a.position_ == b.position_;
     }
+    /// Whether they are different positions.
     friend bool operator!=(const StringSetIterator& a, const StringSetIterator& b) noexcept {
         return !(a == b);
     }
@@ -49,23 +67,33 @@ private:
 /// A table takes memory with its first name.
 class ORN_HDL_API StringSet {
 public:
+    /// The empty set.
     StringSet();
-    /// Copies keep the order of iteration.
+    /// Holds the same names and walks them in the same order.
     StringSet(const StringSet& other);
+    /// Holds the same names and walks them in the same order; the former names are dropped.
     StringSet& operator=(const StringSet& other);
+    /// Ends every position in the set.
     ~StringSet();
 
-    /// Adds a name to each table that does not have it yet.
+    /// Adds a copy of a name to each table that does not have it yet; null is read as "".
     void Add(const char* name);
+    /// Adds a copy of a name to each table that does not have it yet.
     void Add(std::string_view name);
-    /// Whether this very spelling is in the set.
+    /// Whether this very spelling is in the set; null is read as "".
     bool Contains(const char* name) const noexcept;
+    /// Whether this very spelling is in the set.
     bool Contains(std::string_view name) const noexcept;
-    /// Whether the name is in the set in any letter case.
+    /// Whether the name is in the set in any letter case; null is read as "".
     bool IContains(const char* name) const noexcept;
+    /// Whether the name is in the set in any letter case.
     bool IContains(std::string_view name) const noexcept;
-    /// Removes this spelling from the case-keeping table, any spelling from the other.
+    /// Removes this spelling from the case-keeping table and any spelling from the other one; null
+    /// is read as "". A name that is not there is ignored.
     void Remove(const char* name) noexcept;
+    /// Removes this spelling from the case-keeping table and any spelling from the other one. A
+    /// name that is not there is ignored.
+    void Remove(std::string_view name) noexcept;
     /// Whether the case-keeping table is empty.
     bool IsEmpty() const noexcept;
     /// Empties the case-keeping table only: `IContains` still knows the old names.
@@ -75,6 +103,66 @@ public:
     StringSetIterator GetBeginPos() const noexcept;
     /// The position behind the last name.
     StringSetIterator GetEndPos() const noexcept { return StringSetIterator(); }
+
+    /// A position for range-based for loops, the algorithms of the standard library and its ranges:
+    /// a forward iterator that yields views, each valid until the set changes or ends.
+    class Cursor {
+    public:
+#if defined(__cpp_concepts)
+        /// A second walk meets the same names.
+        using iterator_concept = std::forward_iterator_tag;
+#endif
+        /// Names are given by value, which C++17 knows of input iterators only.
+        using iterator_category = std::input_iterator_tag;
+        /// What is yielded.
+        using value_type = std::string_view;
+        /// The distance of two positions.
+        using difference_type = std::ptrdiff_t;
+        /// There is no pointer to a position.
+        using pointer = void;
+        /// What `*` gives.
+        using reference = std::string_view;
+
+        /// The end of every set.
+        Cursor() noexcept = default;
+        /// The position of an iterator.
+        explicit Cursor(StringSetIterator position) noexcept : position_(position) {}
+        /// The name at the position, valid until the set changes or ends; empty at the end.
+        std::string_view operator*() const noexcept {
+            return position_.GetView();
+        }
+        /// Steps to the next name; at the end nothing happens.
+        Cursor& operator++() noexcept {
+            ++position_;
+            return *this;
+        }
+        /// Steps to the next name; at the end nothing happens.
+        /// \return the position before the step.
+        Cursor operator++(int) noexcept {
+            const Cursor before = *this;
+            ++*this;
+            return before;
+        }
+        /// Whether both are the same position.
+        friend bool operator==(const Cursor& a, const Cursor& b) noexcept {
+            return a.position_ == b.position_;
+        }
+        /// Whether they are different positions.
+        friend bool operator!=(const Cursor& a, const Cursor& b) noexcept {
+            return !(a == b);
+        }
+
+    private:
+        StringSetIterator position_;
+    };
+    /// The position of the first name.
+    Cursor begin() const noexcept {
+        return Cursor(GetBeginPos());
+    }
+    /// The position behind the last name.
+    Cursor end() const noexcept {
+        return Cursor();
+    }
 
 private:
     std::unique_ptr<NameTable> ignoringCase_;

@@ -85,10 +85,10 @@ public:
     /// Gives every component of the level HALVEX that has no BOX_TYPE the attribute BOX_TYPE with
     /// the value BLACK_BOX.
     void SetBoxTypeAttribute();
-    /// Makes stand-ins for input ports that are driven inside.
+    /// Makes dummy signals for input ports that are driven inside.
     void CreateVerilogDummySignals();
-    /// Makes stand-ins for output ports that are read inside or have several drivers, and for input
-    /// ports that are driven inside.
+    /// Makes dummy signals for output ports that are read inside or have several drivers, and for
+    /// input ports that are driven inside.
     void CreateVhdlDummySignals();
     /// The stand-in that one of these has made for the signal; null when there is none.
     const Signal* GetStandIn(const Signal* signal) const noexcept;
@@ -107,16 +107,12 @@ public:
 private:
     friend class Model;
     friend class ModelRegistry;
+    friend class ReadAhead;
     struct Implementation;
 
-    /// Hints that a command line will be executed some lines later.
-    void Foresee(const StringArray& words) noexcept;
     /// Who is told of a new name; not owned, null for nobody.
     void SetNameListener(NameListener* listener) noexcept;
 
-    bool MayHaveFeedBack(bool outputPorts) const;
-    void GetFeedBackSignals(bool outputPorts, StringSet& names) const;
-    void GetWiredOrOutputSignals(StringSet& names) const;
     /// Puts `wider` in the place of a narrower bus of the same base name, which is destroyed;
     /// everything that named it names `slice` from then on.
     void ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider, std::unique_ptr<BusSlice> slice);

@@ -2,12 +2,11 @@
 /// `Object`, the base of every named thing of a design, and `ObjectVisitor`.
 #pragma once
 
-#include "Orn_Hdl/Model/ObjectName.h"
 #include "Port/Export.h"
+#include "Port/Pooled.h"
 #include "Port/String.h"
 
-#include <cstddef>
-#include <new>
+#include <cstdint>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -17,9 +16,11 @@ class BitVectorValue;
 class Component;
 class Instance;
 class Netlist;
+class ObjectName;
 class ObjectVisitor;
 class Pin;
 class Signal;
+struct ObjectDetails;
 
 /// Which kind of thing an `Object` is.
 enum ObjectType {
@@ -37,7 +38,7 @@ enum ObjectType {
 /// Whatever owns an object deletes it: the netlist its components, instances and signals, these
 /// their pins, an attribute holder its attributes. An object that is destroyed first takes itself
 /// out of every other object's lists, so no list ever names a dead object.
-class ORN_HDL_API Object {
+class ORN_HDL_API Object : public Port::Pooled<Port::Pool::DesignObjects> {
 public:
     virtual ~Object();
     /// The kind, an `ObjectType`.
@@ -49,8 +50,8 @@ public:
 
     /// The name, as a copy.
     Port::StringBase<char> GetName() const { return GetNameView(); }
-    /// The name without a copy, valid until the object changes or ends.
-    std::string_view GetNameView() const noexcept { return name_.GetView(); }
+    /// The name without a copy, valid until the object is changed or destroyed.
+    std::string_view GetNameView() const noexcept;
     /// Whether the text, as it stands, equals the name ignoring case.
     bool IsNamed(const char* name) const noexcept;
 
@@ -77,30 +78,12 @@ public:
     /// Whether the whole text is digits with an optional sign.
     static bool IsValidIntegerString(const Port::StringBase<char>& text) noexcept;
 
-    /// Objects come from pages of their own: no bookkeeping for each of millions of objects.
-    static void* operator new(std::size_t size);
-    /// Gives the memory back.
-    static void operator delete(void* memory) noexcept;
-    /// \{
-    /// For classes of larger alignment: as without these pages.
-    static void* operator new(std::size_t size, std::align_val_t alignment) {
-        return ::operator new(size, alignment);
-    }
-    static void operator delete(void* memory, std::align_val_t alignment) noexcept {
-        ::operator delete(memory, alignment);
-    }
-    /// \}
-    /// \{
-    /// In place: takes and gives back nothing.
-    static void* operator new(std::size_t, void* place) noexcept { return place; }
-    static void operator delete(void*, void*) noexcept {}
-    /// \}
-
 protected:
     /// A nameless object of a kind.
     explicit Object(ObjectType type) noexcept;
     /// Copies name, comment and type.
     Object(const Object& other);
+    /// Replaces name, comment and type by those of another object.
     Object& operator=(const Object& other);
 
     /// Stores a name as it stands.
@@ -109,22 +92,21 @@ protected:
     void CopyNameFrom(const Object& other);
 
     /// The parts that few objects have, made when first asked for.
-    ObjectDetails& MakeDetails() { return name_.MakeDetails(); }
-    /// The same, null when the object has none.
-    ObjectDetails* GetDetails() const noexcept { return name_.GetDetails(); }
+    ORN_HDL_LOCAL ObjectDetails& MakeDetails();
+    /// The parts that few objects have; null when this object has none of them.
+    ORN_HDL_LOCAL ObjectDetails* GetDetails() const noexcept;
 
     /// A direction, as pins and signals have one: -1 to 2 stand in spare bits, where they cost
     /// nothing, any other number in the details.
     int GetDirection() const noexcept {
-        const unsigned byte = name_.GetOwnerByte();
-        return (byte & OddDirectionBit) != 0 ? GetOddDirection()
-                                             : static_cast<int>((byte & DirectionMask) >> 5U) - 1;
+        return (bits_ & OddDirectionBit) != 0 ? GetOddDirection()
+                                              : static_cast<int>((bits_ & DirectionMask) >> 5U) - 1;
     }
     /// Sets the direction.
     void SetDirection(int direction);
 
-    /// Flags for the derived classes, kept in a spare byte.
-    bool HasFlag(unsigned flag) const noexcept { return (name_.GetOwnerByte() & flag) != 0; }
+    /// Whether a flag of the derived classes is set; their flags stand in a spare byte.
+    bool HasFlag(unsigned flag) const noexcept { return (bits_ & flag) != 0; }
     /// Sets or clears a flag.
     void SetFlag(unsigned flag, bool on) noexcept;
 
@@ -138,11 +120,15 @@ private:
     static constexpr unsigned DirectionMask = 0x60;
     static constexpr unsigned OddDirectionBit = 0x80;
 
+    ObjectName& Name() noexcept;
+    const ObjectName& Name() const noexcept;
     int GetOddDirection() const noexcept;
     std::string_view GetKeyName() const noexcept;
     void KeepKeyName(std::string_view newName);
 
-    ObjectName name_;
+    /// Holds an `ObjectName`, whose class is private to the library.
+    alignas(8) unsigned char nameStorage_[15];
+    std::uint8_t bits_ = 0;
 };
 
 /// Visits objects by kind; every operation of the base does nothing.

@@ -27,7 +27,7 @@ public:
     Polarity() noexcept = default;
     /// The direction of that value, which is not checked.
     explicit Polarity(int value) noexcept : value_(value) {}
-    /// As `GetValue`.
+    /// The direction that a text names, as `GetValue` reads it.
     explicit Polarity(const char* text) noexcept : value_(GetValue(text)) {}
 
     /// The direction whose name begins with the text, letter case ignored, tried in the order
@@ -49,10 +49,13 @@ public:
     /// "Input", "Output" or "BiDirectional"; "Output" for a value that is no direction.
     const char* GetValueName() const noexcept;
 
+    /// Whether both have the same value.
     friend bool operator==(const Polarity& a, const Polarity& b) noexcept {
         return a.value_ == b.value_;
     }
+    /// Whether the values differ.
     friend bool operator!=(const Polarity& a, const Polarity& b) noexcept { return !(a == b); }
+    /// Whether the value of `a` is less than that of `b`; an invalid one comes first.
     friend bool operator<(const Polarity& a, const Polarity& b) noexcept {
         return a.value_ < b.value_;
     }
@@ -64,14 +67,16 @@ private:
 /// Codes of the pin classes.
 enum PinType { PinTypeScalar = 1, PinTypeBus = 2, PinTypeBusIndex = 3 };
 
-/// A terminal of a component, or an instance's own copy of one. It points at the signal that it is
-/// wired to, if any.
+/// A terminal of a component, or an instance's own copy of one. It points at the signal to which it
+/// is wired; an open pin points at none.
 class ORN_HDL_API Pin : public Object, public AttributeHolder {
 public:
+    /// Takes the pin out of the list of every signal.
     ~Pin() override;
     /// `ObjectTypePin`, whatever was copied into the pin.
     int GetObjectType() const override;
     void AcceptObject(ObjectVisitor& visitor) override;
+    /// Stores a name, normalised; null is read as "".
     void SetName(const char* name) override;
     /// The class, a `PinType`.
     virtual int GetPinType() const = 0;
@@ -83,10 +88,12 @@ public:
     /// The name, of a bus pin or bus bit pin without its range or index.
     virtual Port::StringBase<char> GetBaseName() const = 0;
 
-    /// Points the pin at a signal, null for none. The signal's list of pins stays as it is:
-    /// `Signal::Connect` links both ways.
+    /// Points the pin at a signal, or opens it when that is null. The signal's list of pins stays
+    /// as it is: `Signal::Connect` links both ways. If allocation fails, nothing changes. \param
+    /// signal not owned.
     void Connect(Signal* signal);
-    /// Opens the pin.
+    /// Opens the pin. A signal that lists it goes on doing so. If allocation fails, nothing
+    /// changes.
     void Disconnect() { Connect(nullptr); }
     /// The signal that the pin points at; null when it is open.
     Signal* GetSignal() const noexcept { return signal_; }
@@ -95,12 +102,12 @@ public:
     void SetPolarity(const Polarity& polarity) { SetDirection(polarity.GetValue()); }
     /// The direction.
     Polarity GetPolarity() const noexcept { return Polarity(GetDirection()); }
-    /// As `Polarity::GetValueName`.
+    /// The name of the direction, as `Polarity::GetValueName` gives it.
     const char* GetPolarityName() const noexcept { return GetPolarity().GetValueName(); }
 
-    /// Stores a default value, which copies of the pin get too; the writers write none.
+    /// Stores a copy of a default value, which copies of the pin get too; the writers write none.
     void SetDefaultValue(const BitVectorValue& value);
-    /// Parses a bit-vector literal; null is read as "".
+    /// Stores the default value that a bit-vector literal gives; null is read as "".
     void SetDefaultValue(const char* value);
     /// The default value, with an empty text when there is none.
     const BitVectorValue& GetDefaultValue() const noexcept;
@@ -111,22 +118,18 @@ public:
 protected:
     /// An open pin; a null name is read as "".
     Pin(const char* name, const Polarity& polarity);
-    /// Copies name, polarity and default value; not the signal, the attributes or the comment.
+    /// An open pin with the name, polarity and default value of another one; its attributes and its
+    /// comment are not copied.
     Pin(const Pin& other);
+    /// Copies name, polarity and default value; signal, attributes and comment stay as they are.
     Pin& operator=(const Pin& other);
 
 private:
     friend class PinBlock;
-    friend class Signal;
-    friend class PinList;
+    friend class PinLinks;
 
     /// Makes a copy of this pin at `place`, which has room for any pin.
     virtual Pin* CloneInto(void* place) const = 0;
-
-    bool IsListedBy(const Signal* signal) const noexcept;
-    void NoteUnlisted(Signal* signal) noexcept;
-    void PrepareToLeave();
-    void PointAt(Signal* signal, bool isListed) noexcept;
 
     static constexpr unsigned ListedFlag = 0x10;
 
@@ -160,9 +163,9 @@ public:
     Pin* ClonePin() const override;
     void AcceptPin(PinVisitor& visitor) override;
     Port::StringBase<char> GetBaseName() const override;
-    /// The texts of both indices; untouched and false when the name is no bus name.
+    /// The texts of both indices. \return false, both untouched, when the name is no bus name.
     bool GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const;
-    /// Whether the left index is greater than the right one.
+    /// Whether the range is descending; that of D(3:3) is not.
     bool IsDownTo() const noexcept;
     /// The number of bits, at most INT_MAX; 0 when the name is no bus name.
     int GetWidth() const noexcept;
@@ -197,13 +200,14 @@ public:
     PinVisitor(const PinVisitor&) = default;
     PinVisitor& operator=(const PinVisitor&) = default;
     virtual ~PinVisitor();
-    /// \{
-    /// Called by a pin's `AcceptPin`, by its class.
+    /// For callers that treat pins of all classes alike.
     virtual void VisitPin(Pin* pin);
+    /// Called for a pin of one bit.
     virtual void VisitScalarPin(ScalarPin* pin);
+    /// Called for a pin with a range.
     virtual void VisitBusPin(BusPin* pin);
+    /// Called for a pin of one bit of a bus.
     virtual void VisitBusIndexPin(BusIndexPin* pin);
-    /// \}
 };
 
 /// Forms the name of the signal that carries a pin's constant: the instance's name, the pin's base
@@ -212,8 +216,11 @@ class ORN_HDL_API PinConstantSignalVisitor : public PinVisitor {
 public:
     /// For pins of an instance of that name.
     explicit PinConstantSignalVisitor(const char* instanceName) : instanceName_(instanceName) {}
+    /// Forms the name for a pin of one bit; null changes nothing.
     void VisitScalarPin(ScalarPin* pin) override;
+    /// Forms the name for a pin with a range; null changes nothing.
     void VisitBusPin(BusPin* pin) override;
+    /// Forms the name for a pin of one bit of a bus; null changes nothing.
     void VisitBusIndexPin(BusIndexPin* pin) override;
     /// The name that the last visit formed.
     const Port::StringBase<char>& GetName() const noexcept { return name_; }

@@ -2,6 +2,7 @@
 /// `NetlistHeader`, the comment banner that opens a netlist.
 #pragma once
 
+#include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Streams.h"
 #include "Port/Export.h"
 #include "Port/String.h"
@@ -13,6 +14,13 @@ namespace Orn_Hdl {
 /// Composes and writes the banner: who wrote the file, when, from which command and design.
 class ORN_HDL_API NetlistHeader {
 public:
+    /// A banner in the comments of a language.
+    /// \param out not owned; it must outlive the header.
+    NetlistHeader(const Port::StringBase<char>& application, const Port::StringBase<char>& fileName,
+                  const Port::StringBase<char>& command, const Port::StringBase<char>& designName,
+                  const Port::StringBase<char>& device, const Port::StringBase<char>& purpose,
+                  const Port::StringBase<char>& reference, Language language, OutStream& out);
+    /// A banner in the comments that a flag chooses.
     /// \param vhdlComments true for lines that begin with "--", false for "//".
     /// \param out not owned; it must outlive the header.
     NetlistHeader(const Port::StringBase<char>& application, const Port::StringBase<char>& fileName,

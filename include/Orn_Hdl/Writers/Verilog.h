@@ -18,8 +18,8 @@
 
 namespace Orn_Hdl {
 
-/// Writes single Verilog constructs (IEEE 1364-1995), literally as it is given them. Unless told
-/// otherwise a statement is left open: the caller writes ";" or goes on.
+/// Writes single Verilog constructs (IEEE 1364-1995), literally as it is given them. Unless its
+/// function says otherwise a statement is left open: the caller writes ";" or goes on.
 class ORN_HDL_API VerilogStatements {
 public:
     /// \param out not owned; it must outlive the statements.
@@ -54,20 +54,23 @@ public:
     /// An `include line for each file.
     void WriteIncludePath(const StringArray& fileNames);
 
-    /// The attributes whose synthesis option is not "NONE", in the syntax of one synthesis tool.
+    /// The attributes whose synthesis option is not "NONE", for Synplicity: one comment, which
+    /// stands before the semicolon of their object's statement.
     void WriteSynplicityAttr(const Iterator<Attribute*>& attributes);
-    /// \{
-    /// As above, for other tools.
+    /// The attributes whose synthesis option is not "NONE", for Synopsys: one comment and the line
+    /// end.
     void WriteSynopsysAttr(const Iterator<Attribute*>& attributes);
+    /// The attributes whose synthesis option is not "NONE", for QSN: a line of comment each.
     void WriteQSNAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
+    /// The attributes whose synthesis option is not "NONE", for Exemplar: a line of comment each.
     void WriteExemplarAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
+    /// The attributes whose synthesis option is not "NONE", for Precision: a line of comment each.
     void WritePrecisionAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
-    /// \}
 
 private:
     friend class VerilogNetlister;
 
-    /// As above, for names as the objects hold them.
+    // These take names as the objects hold them, without a copy.
     void WritePortDeclaration(std::string_view name, const Polarity& polarity);
     void WriteSignalDeclaration(std::string_view name);
     void WriteSignalName(std::string_view name);
@@ -93,16 +96,21 @@ class ORN_HDL_API WriteVerilogAttrValueVisitor : public AttributeVisitor {
 public:
     /// \param out not owned; it must outlive the visitor.
     explicit WriteVerilogAttrValueVisitor(OutStream& out) noexcept : out_(out) {}
-    /// \{
-    /// Writes it; null writes nothing.
+    /// Writes the text in double quotes; null writes nothing.
     void VisitAttributeString(AttributeString* attribute) override;
+    /// Writes the digits; null writes nothing.
     void VisitAttributeInteger(AttributeInteger* attribute) override;
+    /// Writes the digits; null writes nothing.
     void VisitAttributeFloat(AttributeFloat* attribute) override;
+    /// Writes a binary constant of one bit; null writes nothing.
     void VisitAttributeBit(AttributeBit* attribute) override;
+    /// Writes a sized constant, or the bare digits of a value without base and length; null writes
+    /// nothing.
     void VisitAttributeBitVector(AttributeBitVector* attribute) override;
+    /// Writes the text in double quotes; null writes nothing.
     void VisitAttributeBoolean(AttributeBoolean* attribute) override;
+    /// Writes the text in double quotes; null writes nothing.
     void VisitAttributeUser(AttributeUser* attribute) override;
-    /// \}
 
 private:
     OutStream& out_;
@@ -115,9 +123,13 @@ public:
     explicit VerilogNetlister(OutStream& out);
     ~VerilogNetlister();
 
-    /// Sorts the netlist, makes the stand-in signals that it needs, renames its objects when the
+    /// Sorts the netlist, makes the dummy signals that it needs, renames its objects when the
     /// options ask for upper or lower case, and writes it. A null netlist writes nothing.
     void WriteNetlist(Netlist* netlist, const HdlOptions& options);
+    /// Writes the netlist, as with constant options, and records in `options.hierarchicalInit`
+    /// whether its instances are given the module's INIT parameter. A null netlist writes nothing
+    /// and leaves the options as they are.
+    void WriteNetlist(Netlist* netlist, HdlOptions& options);
 
 private:
     class ORN_HDL_LOCAL Writer;

@@ -15,8 +15,8 @@
 
 namespace Orn_Hdl {
 
-/// Writes single VHDL constructs (IEEE 1076-1993), literally as it is given them. Unless told
-/// otherwise a construct ends its line.
+/// Writes single VHDL constructs (IEEE 1076-1993), literally as it is given them. Unless its
+/// function says otherwise a construct ends its line.
 class ORN_HDL_API VhdlStatements {
 public:
     /// \param out not owned; it must outlive the statements.
@@ -33,7 +33,7 @@ public:
     /// The clauses for the IEEE packages.
     void WriteIEEELibrary();
     /// The clauses for the package of cells.
-    /// \param guard whether the clauses stand between translate_off and translate_on.
+    /// \param guard whether comments hide the clauses from synthesis.
     void WriteKestraLibrary(bool guard);
     /// A library clause for each.
     void WriteUserLibrary(const StringArray& libraries);
@@ -44,11 +44,13 @@ public:
     /// The object's comment, every line behind "-- ".
     void WriteComment(const Object* object);
     /// signal NAME : std_logic;
-    /// \param width the column width to which the name is padded, here and below.
+    /// \param width the column width to which the name is padded.
     void WriteSignalStatement(const char* name, int width);
-    /// The same for a bus.
+    /// signal NAME : std_logic_vector (RANGE); of a name without a range, signal NAME : std_logic;
+    /// \param width the column width to which the name is padded.
     void WriteSignalVectorStatement(const char* name, int width);
     /// The declaration of a port, the line left open.
+    /// \param width the column width to which the name is padded.
     void WritePortStatement(const char* name, const Polarity& polarity, int width);
     /// LEFT <= RIGHT
     void WriteSignalAssignment(const char* left, const char* right);
@@ -56,23 +58,29 @@ public:
     /// \param singleBit writes a character literal, '0' or '1', whatever the value's base.
     void WriteConstantSignalAssignment(const char* name, bool singleBit,
                                        const BitVectorValue& value);
-    /// NAME : TYPE :=  VALUE, the line left open. Null writes nothing here and below.
+    /// NAME : TYPE :=  VALUE, the line left open. Null writes nothing.
     void WriteGenericMapAttrType(Attribute* attribute);
-    /// NAME => VALUE, the line left open.
+    /// NAME => VALUE, the line left open. Null writes nothing.
     void WriteGenericMapAttr(Attribute* attribute);
-    /// NAME => NAME, the line left open: passes the entity's generic of that name down.
+    /// NAME => NAME, the line left open: passes the entity's generic of that name down. Null writes
+    /// nothing.
     void WriteGenericMapInitAttr(Attribute* attribute);
-    /// attribute NAME : TYPE ;
-    /// \param typed whether the attribute has its own type or is a string, here and below.
+    /// attribute NAME : TYPE ; null writes nothing.
+    /// \param typed whether the attribute has its own type or is a string.
+    /// \param width the column width to which the name is padded.
     void WriteAttrDeclaration(Attribute* attribute, bool typed, int width);
-    /// Declares the attributes whose synthesis option is "ASSIGN" and whose names are not in
-    /// `declared` yet, and adds these.
+    /// Declares the holder's attributes whose synthesis option is "ASSIGN" and whose names are not
+    /// in `declared` yet, and adds their names. Null writes nothing.
+    /// \param typed whether attributes have their own types or are strings.
+    /// \param width the column width to which names are padded.
     void WriteAttrDeclaration(const AttributeHolder* holder, StringSet& declared, bool typed,
                               int width);
-    /// attribute NAME of OBJECT : CLASS is VALUE
+    /// attribute NAME of OBJECT : CLASS is VALUE; null writes nothing.
+    /// \param typed whether the value is a literal of the attribute's own type or a string.
     void WriteAttrAssignment(Attribute* attribute, const char* objectName, const char* objectClass,
                              bool typed);
-    /// The attributes whose synthesis option is not "NONE".
+    /// Specifies the holder's attributes whose synthesis option is not "NONE". Null writes nothing.
+    /// \param typed whether values are literals of the attributes' own types or strings.
     void WriteAttrAssignment(const AttributeHolder* holder, const char* objectName,
                              const char* objectClass, bool typed);
 
@@ -80,7 +88,7 @@ private:
     friend class VhdlNetlister;
     friend class WritePortAssignmentVisitor;
 
-    /// As above, for names as the objects hold them.
+    // These take names as the objects hold them, without a copy.
     void WriteBus(std::string_view name);
     void WriteSignalStatement(std::string_view name, int width);
     void WriteSignalVectorStatement(std::string_view name, int width);
@@ -99,16 +107,20 @@ class ORN_HDL_API WriteVhdlAttrTypeVisitor : public AttributeVisitor {
 public:
     /// \param out not owned; it must outlive the visitor.
     explicit WriteVhdlAttrTypeVisitor(OutStream& out) noexcept : out_(out) {}
-    /// \{
-    /// Writes it; null writes nothing.
+    /// Writes "string"; null writes nothing.
     void VisitAttributeString(AttributeString* attribute) override;
+    /// Writes "integer"; null writes nothing.
     void VisitAttributeInteger(AttributeInteger* attribute) override;
+    /// Writes "real"; null writes nothing.
     void VisitAttributeFloat(AttributeFloat* attribute) override;
+    /// Writes "bit"; null writes nothing.
     void VisitAttributeBit(AttributeBit* attribute) override;
+    /// Writes "bit_vector"; null writes nothing.
     void VisitAttributeBitVector(AttributeBitVector* attribute) override;
+    /// Writes "boolean"; null writes nothing.
     void VisitAttributeBoolean(AttributeBoolean* attribute) override;
+    /// Writes the user's own type; null writes nothing.
     void VisitAttributeUser(AttributeUser* attribute) override;
-    /// \}
 
 private:
     OutStream& out_;
@@ -119,16 +131,20 @@ class ORN_HDL_API WriteVhdlAttrValueVisitor : public AttributeVisitor {
 public:
     /// \param out not owned; it must outlive the visitor.
     explicit WriteVhdlAttrValueVisitor(OutStream& out) noexcept : out_(out) {}
-    /// \{
-    /// Writes it; null writes nothing.
+    /// Writes the text in double quotes; null writes nothing.
     void VisitAttributeString(AttributeString* attribute) override;
+    /// Writes the digits; null writes nothing.
     void VisitAttributeInteger(AttributeInteger* attribute) override;
+    /// Writes the digits; null writes nothing.
     void VisitAttributeFloat(AttributeFloat* attribute) override;
+    /// Writes a character literal; null writes nothing.
     void VisitAttributeBit(AttributeBit* attribute) override;
+    /// Writes a bit string literal; null writes nothing.
     void VisitAttributeBitVector(AttributeBitVector* attribute) override;
+    /// Writes the text as it is; null writes nothing.
     void VisitAttributeBoolean(AttributeBoolean* attribute) override;
+    /// Writes the text as it is, "" when it is empty; null writes nothing.
     void VisitAttributeUser(AttributeUser* attribute) override;
-    /// \}
 
 private:
     OutStream& out_;
@@ -142,7 +158,7 @@ public:
     VhdlNetlister(const VhdlNetlister& other);
     ~VhdlNetlister();
 
-    /// Sorts the netlist, makes the stand-in signals that it needs, and writes it. A null netlist,
+    /// Sorts the netlist, makes the dummy signals that it needs, and writes it. A null netlist,
     /// and null options, write nothing.
     void WriteNetlist(Netlist* netlist, const HdlOptions* options);
 

@@ -3,7 +3,6 @@
 #include "Port/Text.h"
 
 #include <algorithm>
-#include <climits>
 
 namespace Orn_Hdl::Names {
 
@@ -42,19 +41,6 @@ bool IsInteger(string_view text) noexcept {
     return !text.empty() && std::all_of(text.begin(), text.end(), Port::IsDigit);
 }
 
-std::int64_t BusName::GetBits() const noexcept {
-    const std::int64_t distance = std::int64_t(leftIndex) - rightIndex;
-    return (distance < 0 ? -distance : distance) + 1;
-}
-
-int BusName::GetWidth() const noexcept {
-    return static_cast<int>(std::min<std::int64_t>(GetBits(), INT_MAX));
-}
-
-int BusName::IndexAt(std::int64_t position) const noexcept {
-    return static_cast<int>(leftIndex >= rightIndex ? leftIndex - position : leftIndex + position);
-}
-
 bool ParseBus(string_view name, BusName& parsed) noexcept {
     if (name.empty() || name.back() != ')') {
         return false;
@@ -70,7 +56,7 @@ bool ParseBus(string_view name, BusName& parsed) noexcept {
     if (!IsBase(base) || !IsInteger(left) || !IsInteger(right)) {
         return false;
     }
-    parsed = {base, left, right, Port::ToIntSaturated(left), Port::ToIntSaturated(right)};
+    parsed = {{Port::ToIntSaturated(left), Port::ToIntSaturated(right)}, base, left, right};
     return true;
 }
 
@@ -88,6 +74,26 @@ bool ParseBit(string_view name, BitName& parsed) noexcept {
         return false;
     }
     parsed = {base, index, Port::ToIntSaturated(index)};
+    return true;
+}
+
+int GetWidth(string_view name) noexcept {
+    BusName parsed;
+    return ParseBus(name, parsed) ? parsed.GetWidth() : 0;
+}
+
+bool IsDownTo(string_view name) noexcept {
+    BusName parsed;
+    return ParseBus(name, parsed) && parsed.IsDownTo();
+}
+
+bool GetIndexTexts(string_view name, Port::StringBase<char>& left, Port::StringBase<char>& right) {
+    BusName parsed;
+    if (!ParseBus(name, parsed)) {
+        return false;
+    }
+    left = parsed.left;
+    right = parsed.right;
     return true;
 }
 
@@ -153,6 +159,20 @@ std::string WithRange(string_view base, int left, int right) {
     return WithRange(base, std::to_string(left), std::to_string(right));
 }
 
+bool IsDummy(string_view base) noexcept {
+    return base.size() >= DummySuffix.size() &&
+           IsNamed(base.substr(base.size() - DummySuffix.size()), DummySuffix);
+}
+
+std::string DummyOf(string_view base) {
+    return std::string(base).append(DummySuffix);
+}
+
+std::string DummyOfPart(string_view name) {
+    const string_view base = BeforeParenthesis(name);
+    return DummyOf(base).append(name.substr(base.size()));
+}
+
 namespace {
 
 std::size_t DigitRun(string_view text, std::size_t start) noexcept {
@@ -168,6 +188,19 @@ unsigned char Rank(char c) noexcept {
 }
 
 } // namespace
+
+std::size_t SharedLength(string_view a, string_view b, std::size_t known) noexcept {
+    const std::size_t common = std::min(a.size(), b.size());
+    std::size_t length = known;
+    while (length < common && Rank(a[length]) == Rank(b[length])) {
+        ++length;
+    }
+    // A run of digits counts as a whole.
+    while (length > known && Port::IsDigit(a[length - 1])) {
+        --length;
+    }
+    return length;
+}
 
 int CompareNatural(string_view a, string_view b) noexcept {
     const std::size_t common = std::min(a.size(), b.size());

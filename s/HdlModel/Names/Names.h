@@ -2,19 +2,18 @@
 // in one pass without recursion, and so hold up at names of any length.
 #pragma once
 
+#include "HdlModel/Names/GeneratedNames.h"
+#include "HdlModel/Names/Range.h"
 #include "Port/Ascii.h"
+#include "Port/String.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <string>
 #include <string_view>
 
 namespace Orn_Hdl::Names {
 
-/// The most bits that one name is ever expanded into.
-constexpr std::int64_t MostExpandedBits = 1048576;
-
-/// What the name of a signal that stands in for another one ends in.
-constexpr std::string_view DummySuffix = "_DUMMY";
 
 /// One character of a name in its normalised form.
 constexpr char Normalized(char c) noexcept {
@@ -54,35 +53,34 @@ private:
 bool IsBase(std::string_view text) noexcept;
 bool IsInteger(std::string_view text) noexcept;
 
-/// The pieces of a bus name such as D(7:0); the views point into the name.
-struct BusName {
+/// The range of a bus name such as D(7:0), and its texts, which are views of the name.
+struct BusName : Range {
     std::string_view base;
     std::string_view left;
     std::string_view right;
-    /// The indices, saturated to 32 bits.
-    int leftIndex = 0;
-    int rightIndex = 0;
-
-    bool IsDownTo() const noexcept { return leftIndex > rightIndex; }
-    bool IsOneBit() const noexcept { return leftIndex == rightIndex; }
-    /// The number of bits, exact.
-    std::int64_t GetBits() const noexcept;
-    /// The number of bits, at most INT_MAX.
-    int GetWidth() const noexcept;
-    /// The index of the bit at `position`, counted from the left.
-    int IndexAt(std::int64_t position) const noexcept;
 };
 
-/// The pieces of a bit name such as D(3); the views point into the name.
+/// The index of a bit name such as D(3), saturated to 32 bits, and its texts, which are views of
+/// the name.
 struct BitName {
     std::string_view base;
     std::string_view index;
     int value = 0;
 };
 
-/// Both take a normalised name; false, `parsed` untouched, for a name of another form.
+/// Reads a normalised bus name. \return false, `parsed` untouched, for a name of another form.
 bool ParseBus(std::string_view name, BusName& parsed) noexcept;
+/// Reads a normalised bit name. \return false, `parsed` untouched, for a name of another form.
 bool ParseBit(std::string_view name, BitName& parsed) noexcept;
+
+/// The number of bits of a bus name, at most INT_MAX; 0 for a name of another form.
+int GetWidth(std::string_view name) noexcept;
+/// Whether a name is a bus name with a descending range.
+bool IsDownTo(std::string_view name) noexcept;
+/// Copies the texts of a bus name's indices. \return false, both untouched, for a name of another
+/// form.
+bool GetIndexTexts(std::string_view name, Port::StringBase<char>& left,
+                   Port::StringBase<char>& right);
 
 /// Whether a normalised name is two or more base, bus or bit names separated by "," or "\".
 bool IsCompound(std::string_view name) noexcept;
@@ -110,6 +108,13 @@ std::string WithIndex(std::string_view base, int index);
 std::string WithRange(std::string_view base, std::string_view left, std::string_view right);
 std::string WithRange(std::string_view base, int left, int right);
 
+/// Whether a base name ends as those of dummy signals do, letter case ignored.
+bool IsDummy(std::string_view base) noexcept;
+/// The name of the dummy signal of a scalar signal.
+std::string DummyOf(std::string_view base);
+/// The name of the dummy signal of a bus or a part of one: the range or index stays behind.
+std::string DummyOfPart(std::string_view name);
+
 inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
     return Port::EqualIgnoringCase(name, other);
 }
@@ -118,11 +123,18 @@ inline bool IsNamed(std::string_view name, std::string_view other) noexcept {
 /// digit after every other character, the end of a name before any character.
 int CompareNatural(std::string_view a, std::string_view b) noexcept;
 
+/// How many characters both names begin with, letter case ignored, that tell nothing of their
+/// natural order: what follows them in each name sorts as the whole names do.
+/// \param known so many are known to be shared; a former result, or 0.
+std::size_t SharedLength(std::string_view a, std::string_view b, std::size_t known) noexcept;
+
 /// An object to sort, in sixteen bytes: its index, and a key made of its rank and the start of its
 /// name. A smaller key sorts first, by rank, then in natural order; equal keys say nothing.
 class NaturalKey {
 public:
     NaturalKey(int rank, std::string_view name, std::uint32_t index) noexcept;
+    /// The key of no name, which is yet to be replaced.
+    explicit NaturalKey(std::uint32_t index) noexcept : first_(0), second_(0), index_(index) {}
 
     std::uint32_t GetIndex() const noexcept { return index_; }
 

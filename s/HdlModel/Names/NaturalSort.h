@@ -5,11 +5,84 @@
 #include "Orn_Hdl/Containers/PtrArray.h"
 
 #include <algorithm>
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 #include <vector>
 
 namespace Orn_Hdl {
+
+/// Sorts the objects of a long list by keys. A key holds the first characters of a name only, so
+/// those that all names share are left out of it; objects whose keys are equal then get new keys
+/// behind the characters that they share.
+template <class T, class RankOf, class Compare> class NaturalKeySort {
+public:
+    NaturalKeySort(const PtrArray<T*>& objects, RankOf rankOf, Compare compare)
+        : objects_(objects), rankOf_(rankOf), compare_(compare) {
+        keys_.reserve(static_cast<std::size_t>(objects.GetSize()));
+        for (int i = 0; i < objects.GetSize(); ++i) {
+            keys_.emplace_back(static_cast<std::uint32_t>(i));
+        }
+        SortByKeys(keys_.begin(), keys_.end(), SharedOf(keys_.begin(), keys_.end(), 0));
+    }
+
+    T* GetAt(int i) const noexcept { return ObjectOf(keys_[static_cast<std::size_t>(i)]); }
+
+private:
+    using Key = Names::NaturalKey;
+    using Place = std::vector<Key>::iterator;
+
+    T* ObjectOf(const Key& key) const noexcept {
+        return objects_.GetAt(static_cast<int>(key.GetIndex()));
+    }
+
+    /// How many characters all names of a range begin with, `known` of them for certain.
+    std::size_t SharedOf(Place first, Place last, std::size_t known) const noexcept {
+        const std::string_view name = ObjectOf(*first)->GetNameView();
+        std::size_t shared = name.size();
+        for (Place key = first + 1; key != last && shared > known; ++key) {
+            const std::string_view other = ObjectOf(*key)->GetNameView();
+            shared = std::min(shared, Names::SharedLength(name, other, known));
+        }
+        return shared;
+    }
+
+    /// The index makes every comparison decide, so the order is the stable one.
+    void SortByKeys(Place first, Place last, std::size_t shared) {
+        for (Place key = first; key != last; ++key) {
+            const T* const object = ObjectOf(*key);
+            *key = Key(rankOf_(object), object->GetNameView().substr(shared), key->GetIndex());
+        }
+        std::sort(first, last, [](const Key& a, const Key& b) {
+            return a != b ? a < b : a.GetIndex() < b.GetIndex();
+        });
+        while (first != last) {
+            const Place next =
+                std::find_if(first + 1, last, [first](const Key& key) { return key != *first; });
+            if (next - first > 1) {
+                SortEqual(first, next, shared);
+            }
+            first = next;
+        }
+    }
+
+    void SortEqual(Place first, Place last, std::size_t known) {
+        const std::size_t shared = SharedOf(first, last, known);
+        if (shared > known) {
+            SortByKeys(first, last, shared);
+            return;
+        }
+        std::sort(first, last, [this](const Key& a, const Key& b) {
+            const int order = compare_(ObjectOf(a), ObjectOf(b));
+            return order != 0 ? order < 0 : a.GetIndex() < b.GetIndex();
+        });
+    }
+
+    const PtrArray<T*>& objects_;
+    RankOf rankOf_;
+    Compare compare_;
+    std::vector<Key> keys_;
+};
 
 /// Sorts stably. `rankOf(object)` gives an int. A short array is sorted by the names as they are;
 /// of a long one the keys are made once, and one that is in order already, as after a former write,
@@ -40,25 +113,9 @@ template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankO
         return;
     }
     const PtrArray<T*> unsorted = objects;
-    std::vector<Names::NaturalKey> keys;
-    keys.reserve(static_cast<std::size_t>(size));
+    const NaturalKeySort byKeys(unsorted, rankOf, compare);
     for (int i = 0; i < size; ++i) {
-        const T* const object = unsorted.GetAt(i);
-        keys.emplace_back(rankOf(object), object->GetNameView(), static_cast<std::uint32_t>(i));
-    }
-    const auto objectOf = [&unsorted](const Names::NaturalKey& key) {
-        return unsorted.GetAt(static_cast<int>(key.GetIndex()));
-    };
-    // The index makes every comparison decide, so this order is the stable one.
-    std::sort(keys.begin(), keys.end(), [&](const auto& a, const auto& b) {
-        if (a != b) {
-            return a < b;
-        }
-        const int order = compare(objectOf(a), objectOf(b));
-        return order != 0 ? order < 0 : a.GetIndex() < b.GetIndex();
-    });
-    for (int i = 0; i < size; ++i) {
-        objects.SetAt(i, objectOf(keys[static_cast<std::size_t>(i)]));
+        objects.SetAt(i, byKeys.GetAt(i));
     }
 }
 

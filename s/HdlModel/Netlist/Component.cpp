@@ -2,7 +2,7 @@
 
 #include "HdlModel/Names/NaturalSort.h"
 #include "HdlModel/Netlist/PinIndex.h"
-#include "Orn_Hdl/Model/Signals.h"
+#include "HdlModel/Signals/SignalCast.h"
 #include "Port/Ascii.h"
 #include "Port/Pool.h"
 
@@ -195,7 +195,7 @@ namespace {
 
 /// Whether a signal, or a signal of which it is made up, has a port polarity.
 bool IsOnPort(Signal* signal, int portPolarity) {
-    if (signal->GetSignalType() != SignalTypeCompoundBus) {
+    if (As<CompoundBus>(signal) == nullptr) {
         return signal->GetPortPolarity().GetValue() == portPolarity;
     }
     std::vector<const Signal*> rest{signal};
@@ -203,13 +203,13 @@ bool IsOnPort(Signal* signal, int portPolarity) {
     while (!rest.empty()) {
         const Signal* const next = rest.back();
         rest.pop_back();
-        if (next->GetSignalType() != SignalTypeCompoundBus) {
+        const CompoundBus* const compound = As<CompoundBus>(next);
+        if (compound == nullptr) {
             if (next->GetPortPolarity().GetValue() == portPolarity) {
                 return true;
             }
-        } else if (met.insert(next).second) {
-            for (const Signal* member :
-                 static_cast<const CompoundBus*>(next)->GetBusMemberIterator()) {
+        } else if (met.insert(compound).second) {
+            for (const Signal* member : compound->GetBusMemberIterator()) {
                 rest.push_back(member);
             }
         }

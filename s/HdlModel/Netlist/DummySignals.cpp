@@ -1,6 +1,7 @@
 #include "HdlModel/Netlist/DummySignals.h"
 
-#include "HdlModel/Signals/SignalLinks.h"
+#include "HdlModel/Signals/References.h"
+#include "HdlModel/Signals/SignalCast.h"
 
 #include <algorithm>
 #include <memory>
@@ -26,29 +27,14 @@ Signal* DummySignals::Find(const Signal* original) const noexcept {
     return found == dummyOf_.end() ? nullptr : found->second;
 }
 
-/// Whether the signal has a dummy already, or is none of this memory's business: the memory of
-/// another netlist knows it.
+/// Whether the signal has a dummy already, here or in another netlist.
 bool DummySignals::IsKeptAsOriginal(const Signal& signal) const noexcept {
-    const DummySignals* const keeper = signal.links_ == nullptr ? nullptr : signal.links_->keeper;
+    const DummySignals* const keeper = References::GetKeeper(signal);
     return keeper != nullptr && (keeper != this || Find(&signal) != nullptr);
 }
 
-/// \param signal has links already.
-void DummySignals::Keep(Signal& signal) noexcept {
-    Signal::Links& links = *signal.links_;
-    links.keeper = this;
-    ++links.timesKept;
-}
-
-void DummySignals::Release(Signal& signal) noexcept {
-    Signal::Links& links = *signal.links_;
-    if (--links.timesKept == 0) {
-        links.keeper = nullptr;
-    }
-}
-
 void DummySignals::Forget(const Signal* signal) noexcept {
-    if (signal->links_ == nullptr || signal->links_->keeper != this) {
+    if (References::GetKeeper(*signal) != this) {
         return;
     }
     const auto end = std::remove_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
@@ -56,8 +42,8 @@ void DummySignals::Forget(const Signal* signal) noexcept {
             return false;
         }
         dummyOf_.erase(entry.original);
-        Release(*entry.original);
-        Release(*entry.dummy);
+        References::Release(*entry.original);
+        References::Release(*entry.dummy);
         return true;
     });
     entries_.erase(end, entries_.end());
@@ -65,15 +51,15 @@ void DummySignals::Forget(const Signal* signal) noexcept {
 
 void DummySignals::Clear() noexcept {
     for (const Entry& entry : entries_) {
-        Release(*entry.original);
-        Release(*entry.dummy);
+        References::Release(*entry.original);
+        References::Release(*entry.dummy);
     }
     entries_.clear();
     dummyOf_.clear();
 }
 
-/// The dummy takes the pins that still point at its signal. In the place of an output port it takes
-/// the aliases and the constant away too, so that the port has no driver but the dummy.
+/// The dummy takes over the pins that still point at its signal. The dummy of an output port takes
+/// the aliases and the constant away as well, so that it is the port's only driver.
 void DummySignals::TakeOver(const Entry& entry) {
     Signal& original = *entry.original;
     Signal& dummy = *entry.dummy;
@@ -81,14 +67,7 @@ void DummySignals::TakeOver(const Entry& entry) {
     if (!entry.forOutputs) {
         return;
     }
-    PtrArray<Signal*>& aliases = original.links_->signals;
-    for (int i = aliases.GetSize() - 1; i >= 0; --i) {
-        Signal* const alias = aliases.GetAt(i);
-        if (alias != &dummy) {
-            aliases.RemoveAt(i);
-            alias->DropReferrer(&original);
-        }
-    }
+    References::RemoveAliases(original, &dummy);
     if (!original.GetConstantValue().GetValue().IsEmpty()) {
         dummy.AssignConstantValue(original.GetConstantValue());
         original.AssignConstantValue(BitVectorValue());
@@ -100,28 +79,28 @@ void DummySignals::Link(const Entry& entry) {
     driven->Connect(driven == entry.original ? entry.dummy : entry.original);
 }
 
-/// Puts the dummies in the place of their signals in all compounds that have one of these signals
-/// as a member; each compound is gone through once.
-/// \param firstEntry its signal and those of the entries behind it tell the compounds.
+/// Replaces signals by their dummies in all compounds that have one of them as a member; each
+/// compound is gone through once.
+/// \param firstEntry the first of the entries whose signals are looked for.
 void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
     std::unordered_set<const Signal*> met;
     for (std::size_t i = firstEntry; i < entries_.size(); ++i) {
-        const std::vector<Signal*> referrers = entries_[i].original->links_->referrers;
-        // The last first: that is where the original, which forgets each of them, looks first.
+        const std::vector<Signal*> referrers = References::GetReferrers(*entries_[i].original);
+        // The last first: that is where the original, which drops each note, looks first.
         for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
-            if ((*referrer)->GetSignalType() == SignalTypeCompoundBus &&
-                met.insert(*referrer).second) {
-                ReplaceMembers(static_cast<CompoundBus&>(**referrer), which);
+            CompoundBus* const compound = As<CompoundBus>(*referrer);
+            if (compound != nullptr && met.insert(compound).second) {
+                ReplaceMembers(*compound, which);
             }
         }
     }
 }
 
 void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
-    // From the end, for the same reason.
+    // From the end: that is where the notes of the members are looked for first.
     for (int i = compound.GetSize() - 1; i >= 0; --i) {
         const Signal* const member = compound.GetAt(i);
-        if (which == Members::All || member->GetSignalType() != SignalTypeCompoundBus) {
+        if (which == Members::All || As<CompoundBus>(member) == nullptr) {
             if (Signal* dummy = Find(member)) {
                 compound.SetAt(i, dummy);
             }
@@ -131,12 +110,12 @@ void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
 
 void DummySignals::Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs) {
     netlist.Add(dummy);
-    // What can fail for want of memory comes first: both are told of their end from here on.
-    original.MakeLinks();
-    dummy->MakeLinks();
+    // Room comes first: an entry whose signals are kept is dropped when either is destroyed.
+    References::PrepareToKeep(original);
+    References::PrepareToKeep(*dummy);
     entries_.push_back({&original, dummy, forOutputs});
-    Keep(original);
-    Keep(*dummy);
+    References::Keep(original, *this);
+    References::Keep(*dummy, *this);
     dummyOf_.emplace(&original, dummy);
     TakeOver(entries_.back());
 }
@@ -152,15 +131,16 @@ void DummySignals::MakeForScalar(Netlist& netlist, ScalarSignal& signal, bool fo
 
 void DummySignals::MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool forOutputs) {
     for (Signal* part : bus.GetBusSliceIterator()) {
-        const int type = part->GetSignalType();
-        const bool isPart = type == SignalTypeBusSlice || type == SignalTypeBusIndex;
-        if (!isPart || IsKeptAsOriginal(*part) || IsNameTaken(netlist, *part)) {
+        if (As<BusPart>(part) == nullptr || IsKeptAsOriginal(*part) ||
+            IsNameTaken(netlist, *part)) {
             continue;
         }
-        Signal* const partDummy =
-            type == SignalTypeBusSlice
-                ? static_cast<Signal*>(static_cast<BusSlice*>(part)->CreateDummySignal(&dummy))
-                : static_cast<BusIndex*>(part)->CreateDummySignal(&dummy);
+        Signal* partDummy = nullptr;
+        if (const BusSlice* const slice = As<BusSlice>(part)) {
+            partDummy = slice->CreateDummySignal(&dummy);
+        } else if (const BusIndex* const bit = As<BusIndex>(part)) {
+            partDummy = bit->CreateDummySignal(&dummy);
+        }
         Adopt(netlist, *part, partDummy, forOutputs);
     }
 }
@@ -194,11 +174,10 @@ void DummySignals::Make(Netlist& netlist, const StringSet& names, bool forOutput
     std::vector<CompoundBus*> compounds;
     for (StringSetIterator i = names.GetBeginPos(); i != names.GetEndPos(); ++i) {
         Signal* const signal = netlist.GetSignal(i.GetView());
-        const int type = signal == nullptr ? 0 : signal->GetSignalType();
-        if (type == SignalTypeScalar) {
-            MakeForScalar(netlist, static_cast<ScalarSignal&>(*signal), forOutputs);
-        } else if (type == SignalTypeCompoundBus) {
-            compounds.push_back(static_cast<CompoundBus*>(signal));
+        if (ScalarSignal* const scalar = As<ScalarSignal>(signal)) {
+            MakeForScalar(netlist, *scalar, forOutputs);
+        } else if (CompoundBus* const compound = As<CompoundBus>(signal)) {
+            compounds.push_back(compound);
         } else if (Bus* bus = netlist.GetParentBus(std::string(i.GetView()).c_str())) {
             MakeForBus(netlist, *bus, forOutputs);
         }
@@ -214,9 +193,8 @@ void DummySignals::Refresh(Netlist& netlist) {
     for (std::size_t i = 0; i < entries_.size(); ++i) {
         const Entry entry = entries_[i];
         TakeOver(entry);
-        if (entry.original->GetSignalType() == SignalTypeBus) {
-            MakeForParts(netlist, static_cast<Bus&>(*entry.original),
-                         static_cast<Bus&>(*entry.dummy), entry.forOutputs);
+        if (Bus* const bus = As<Bus>(entry.original)) {
+            MakeForParts(netlist, *bus, *As<Bus>(entry.dummy), entry.forOutputs);
         }
     }
     ReplaceInCompounds(0, Members::All);

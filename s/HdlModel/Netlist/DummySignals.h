@@ -1,5 +1,5 @@
-// The stand-ins that a netlist makes for ports which are used against their direction: an output
-// port that is read inside, or has several drivers, and an input port that is driven inside.
+// The dummy signals that a netlist gets for ports that are used against their direction: output
+// ports that are read inside or have several drivers, and input ports that are driven inside.
 #pragma once
 
 #include "Orn_Hdl/Model/Netlist.h"
@@ -11,9 +11,9 @@
 
 namespace Orn_Hdl {
 
-/// Remembers which dummy stands in for which signal, so that a netlist can be written any number of
-/// times. It owns nothing: the netlist owns the dummies, and the signals but for slices and bits of
-/// its buses that it was never given.
+/// Remembers which dummy was made for which signal, so that a netlist can be written any number of
+/// times. It owns nothing: the netlist owns the dummies, and the signals for which they were made,
+/// but for slices and bits of its buses that were never added to it.
 class DummySignals {
 public:
     DummySignals() = default;
@@ -28,9 +28,9 @@ public:
     void Make(Netlist& netlist, const StringSet& names, bool forOutputs);
     /// The dummy that was made for a signal; null when there is none.
     Signal* Find(const Signal* original) const noexcept;
-    /// Drops a signal that is about to end, be it a dummy or not.
+    /// Drops the entries of a signal that is about to be destroyed, be it a dummy or not.
     void Forget(const Signal* signal) noexcept;
-    /// Forgets everything, before the signals of the netlist end.
+    /// Drops all entries, before the signals of the netlist are destroyed.
     void Clear() noexcept;
 
 private:
@@ -46,8 +46,6 @@ private:
     void MakeForCompound(Netlist& netlist, CompoundBus& compound, bool forOutputs);
     /// Adds a dummy to the netlist and to the memory, and lets it take over for the first time.
     void Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs);
-    void Keep(Signal& signal) noexcept;
-    static void Release(Signal& signal) noexcept;
     bool IsKeptAsOriginal(const Signal& signal) const noexcept;
     static void TakeOver(const Entry& entry);
     static void Link(const Entry& entry);

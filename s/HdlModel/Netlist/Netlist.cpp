@@ -5,10 +5,16 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Names/NaturalSort.h"
 #include "HdlModel/Netlist/DummySignals.h"
+#include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/Foresight.h"
 #include "HdlModel/Netlist/Primitives.h"
+#include "HdlModel/Netlist/ReadAhead.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Signals/BusParts.h"
+#include "HdlModel/Signals/PinLinks.h"
+#include "HdlModel/Signals/References.h"
+#include "HdlModel/Signals/SignalCast.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
@@ -66,14 +72,8 @@ struct Netlist::Implementation {
 
     ~Implementation() {
         dummies.Clear();
-        // Signals end first: an instance then has nothing to leave. They part all at once, while
-        // all of them are alive.
-        for (Signal* signal : Iterator<Signal*>(&signals)) {
-            signal->MarkDying();
-        }
-        for (Signal* signal : Iterator<Signal*>(&signals)) {
-            signal->LeaveAll();
-        }
+        // Signals are destroyed first: an instance then has nothing to leave.
+        References::LeaveTogether(signals);
         signals.DeleteAll();
         instances.DeleteAll();
         components.DeleteAll();
@@ -84,7 +84,7 @@ struct Netlist::Implementation {
         if (object == nullptr || OwnedFlag::Get(*object)) {
             return;
         }
-        // What can fail for want of memory comes first: what is held is found.
+        // All allocation comes first, so that what the netlist holds can always be found.
         std::unique_ptr<T> taken(object);
         MakeRoomFor(object);
         objects.AddNew(object);
@@ -106,23 +106,23 @@ struct Netlist::Implementation {
     void MakeRoomFor(const Object* /*object*/) { byName.MakeRoom(); }
     void MakeRoomFor(const Signal* signal) {
         byName.MakeRoom();
-        if (signal->GetSignalType() == SignalTypeBus) {
+        if (As<Bus>(signal) != nullptr) {
             busesByBaseName.MakeRoom();
         }
     }
 
     void Enter(Object* /*object*/) {}
     void Enter(Signal* signal) {
-        if (signal->GetSignalType() == SignalTypeBus) {
-            busesByBaseName.Add(static_cast<Bus*>(signal));
+        if (Bus* const bus = As<Bus>(signal)) {
+            busesByBaseName.Add(bus);
         }
     }
 
     void Forget(Object* /*object*/) noexcept {}
     void Forget(Signal* signal) noexcept {
         dummies.Forget(signal);
-        if (signal->GetSignalType() == SignalTypeBus) {
-            busesByBaseName.Remove(static_cast<Bus*>(signal));
+        if (Bus* const bus = As<Bus>(signal)) {
+            busesByBaseName.Remove(bus);
         }
     }
 };
@@ -197,8 +197,8 @@ bool Netlist::IsNameUsed(std::string_view name) const noexcept {
     return implementation_->byName.Contains(NameKey(name));
 }
 
-void Netlist::Foresee(const StringArray& words) noexcept {
-    implementation_->foresight.Note(implementation_->byName, words);
+void ReadAhead::Note(Netlist& netlist, const StringArray& words) noexcept {
+    netlist.implementation_->foresight.Note(netlist.implementation_->byName, words);
 }
 
 Bus* Netlist::GetParentBus(const char* name) const {
@@ -254,7 +254,10 @@ void Netlist::ConnectOpenPinToDummy() {
             const bool isBus = pin->GetPinType() == PinTypeBus;
             const std::string_view base = isBus ? Names::BeforeParenthesis(pinName) : pinName;
             std::string name(instance->GetNameView());
-            name.append("_").append(base).append("_openSignal").append(pinName.substr(base.size()));
+            name.append("_")
+                .append(base)
+                .append(Names::OpenSuffix)
+                .append(pinName.substr(base.size()));
             Signal* signal = GetSignal(std::string_view(name));
             if (signal == nullptr) {
                 signal = isBus ? static_cast<Signal*>(new Bus(name.c_str()))
@@ -277,62 +280,11 @@ void Netlist::SetBoxTypeAttribute() {
     }
 }
 
-bool Netlist::MayHaveFeedBack(bool outputPorts) const {
-    const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
-    const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;
-    for (const Signal* signal : GetSignalIterator()) {
-        const int type = signal->GetSignalType();
-        // A compound has a polarity of its own only when its members agree; any member counts here.
-        const bool isCandidate =
-            type == SignalTypeCompoundBus || signal->GetPortPolarity().GetValue() == portPolarity;
-        if ((isCandidate && signal->HasPinOf(pinPolarity)) || signal->HasLooseCompound()) {
-            return true;
-        }
-        if (isCandidate && type == SignalTypeBus) {
-            // The netlist need not hold the parts of its buses.
-            for (const Signal* part : static_cast<const Bus*>(signal)->GetBusSliceIterator()) {
-                if (part->HasPinOf(pinPolarity) || part->HasLooseCompound()) {
-                    return true;
-                }
-            }
-        }
-    }
-    return false;
-}
-
-void Netlist::GetFeedBackSignals(bool outputPorts, StringSet& names) const {
-    // Most designs use no port against its direction; the ports tell that faster than all pins do.
-    if (!MayHaveFeedBack(outputPorts)) {
-        return;
-    }
-    for (const Instance* instance : GetInstanceIterator()) {
-        PtrArray<Pin*> pins;
-        if (outputPorts) {
-            instance->GetOutPortConnectedToInPin(pins);
-        } else {
-            instance->GetInPortConnectedToOutPin(pins);
-        }
-        for (const Pin* pin : Iterator<Pin*>(&pins)) {
-            if (pin->GetSignal() != nullptr) {
-                pin->GetSignal()->GetBaseName(names);
-            }
-        }
-    }
-}
-
-void Netlist::GetWiredOrOutputSignals(StringSet& names) const {
-    for (const Signal* signal : GetSignalIterator()) {
-        if (signal->GetPortPolarity().GetValue() == Polarity::Output && signal->HasMultiDriver()) {
-            signal->GetBaseName(names);
-        }
-    }
-}
-
 void Netlist::CreateVerilogDummySignals() {
     DummySignals& dummies = implementation_->dummies;
     dummies.Refresh(*this);
     StringSet names;
-    GetFeedBackSignals(false, names);
+    FeedBack::AddSignals(*this, false, names);
     dummies.Make(*this, names, false);
 }
 
@@ -341,11 +293,11 @@ void Netlist::CreateVhdlDummySignals() {
     dummies.Refresh(*this);
     StringSet names;
     for (const bool outputPorts : {true, false}) {
-        GetFeedBackSignals(outputPorts, names);
+        FeedBack::AddSignals(*this, outputPorts, names);
         dummies.Make(*this, names, outputPorts);
         names.Empty();
     }
-    GetWiredOrOutputSignals(names);
+    FeedBack::AddWiredOrOutputs(*this, names);
     dummies.Make(*this, names, true);
 }
 
@@ -353,17 +305,32 @@ const Signal* Netlist::GetStandIn(const Signal* signal) const noexcept {
     return implementation_->dummies.Find(signal);
 }
 
+namespace {
+
+/// \param to has no comment yet.
+void CopyComment(const Object& from, Object& to) {
+    std::string_view comment = from.GetCommentView();
+    if (!comment.empty()) {
+        // AddComment puts the last line feed back.
+        comment.remove_suffix(1);
+        to.AddComment(std::string(comment).c_str());
+    }
+}
+
+} // namespace
+
 void Netlist::ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider,
                          std::unique_ptr<BusSlice> slice) {
     wider->SetPortPolarity(narrower->GetPortPolarity());
     static_cast<AttributeHolder&>(*wider) = *narrower;
-    wider->TakeCommentOf(*narrower);
+    CopyComment(*narrower, *wider);
     slice->CloneConnection(narrower);
     if (!narrower->GetConstantValue().GetValue().IsEmpty()) {
         slice->AssignConstantValue(narrower->GetConstantValue());
     }
-    narrower->ReplaceEverywhereBy(slice.get());
-    wider->TakeParts(*narrower);
+    PinLinks::MoveUnlisted(*narrower, *slice);
+    References::ReplaceEverywhere(*narrower, *slice);
+    BusParts::TakeOver(*wider, *narrower);
     Remove(narrower);
     Add(wider.release());
     Add(slice.release());

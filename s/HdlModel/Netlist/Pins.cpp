@@ -3,11 +3,9 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/PinIndex.h"
 #include "HdlModel/Objects/ObjectDetails.h"
-#include "Orn_Hdl/Model/Signals.h"
+#include "HdlModel/Signals/PinLinks.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"
-
-#include <algorithm>
 
 namespace Orn_Hdl {
 
@@ -60,19 +58,7 @@ Pin& Pin::operator=(const Pin& other) {
 }
 
 Pin::~Pin() {
-    // In this order: what still lists the pin lets go of it, then what it points at.
-    if (const ObjectDetails* details = GetDetails()) {
-        for (Signal* former : details->formerSignals) {
-            former->Unlist(this);
-        }
-    }
-    if (signal_ != nullptr) {
-        if (HasFlag(ListedFlag)) {
-            signal_->Unlist(this);
-        } else {
-            signal_->RemoveUnlistedPin(this);
-        }
-    }
+    PinLinks::Leave(*this);
 }
 
 int Pin::GetObjectType() const {
@@ -88,74 +74,8 @@ void Pin::SetName(const char* name) {
     PinIndex::NoteRenaming();
 }
 
-bool Pin::IsListedBy(const Signal* signal) const noexcept {
-    if (signal == signal_) {
-        return HasFlag(ListedFlag);
-    }
-    const ObjectDetails* const details = GetDetails();
-    if (details == nullptr) {
-        return false;
-    }
-    // Whichever side knows fewer of the other tells.
-    const auto& former = details->formerSignals;
-    if (former.size() <= static_cast<std::size_t>(signal->pins_.GetSize())) {
-        return std::find(former.begin(), former.end(), signal) != former.end();
-    }
-    for (const Pin* pin : signal->GetPinIterator()) {
-        if (pin == this) {
-            return true;
-        }
-    }
-    return false;
-}
-
-void Pin::NoteUnlisted(Signal* signal) noexcept {
-    if (signal == signal_) {
-        SetFlag(ListedFlag, false);
-    } else if (ObjectDetails* details = GetDetails()) {
-        auto& former = details->formerSignals;
-        const auto found = std::find(former.begin(), former.end(), signal);
-        if (found != former.end()) {
-            *found = former.back();
-            former.pop_back();
-        }
-    }
-}
-
 void Pin::Connect(Signal* signal) {
-    if (signal == signal_) {
-        return;
-    }
-    const bool isListed = signal != nullptr && IsListedBy(signal);
-    // What can fail for want of memory comes first.
-    PrepareToLeave();
-    if (signal != nullptr && !isListed) {
-        signal->AddUnlistedPin(this);
-    }
-    PointAt(signal, isListed);
-}
-
-/// Makes room for remembering the present signal, if that goes on listing the pin.
-void Pin::PrepareToLeave() {
-    if (signal_ != nullptr && HasFlag(ListedFlag)) {
-        auto& former = MakeDetails().formerSignals;
-        if (former.size() == former.capacity()) {
-            former.reserve(std::max<std::size_t>(1, former.size() * 2));
-        }
-    }
-}
-
-void Pin::PointAt(Signal* signal, bool isListed) noexcept {
-    if (signal_ != nullptr && HasFlag(ListedFlag)) {
-        GetDetails()->formerSignals.push_back(signal_);
-    } else if (signal_ != nullptr) {
-        signal_->RemoveUnlistedPin(this);
-    }
-    if (isListed && GetDetails() != nullptr) {
-        NoteUnlisted(signal);
-    }
-    signal_ = signal;
-    SetFlag(ListedFlag, isListed);
+    PinLinks::PointAt(*this, signal);
 }
 
 void Pin::SetDefaultValue(const BitVectorValue& value) {
@@ -213,23 +133,15 @@ Port::StringBase<char> BusPin::GetBaseName() const {
 }
 
 bool BusPin::GetIndex(Port::StringBase<char>& left, Port::StringBase<char>& right) const {
-    Names::BusName parsed;
-    if (!Names::ParseBus(GetNameView(), parsed)) {
-        return false;
-    }
-    left = parsed.left;
-    right = parsed.right;
-    return true;
+    return Names::GetIndexTexts(GetNameView(), left, right);
 }
 
 bool BusPin::IsDownTo() const noexcept {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) && parsed.IsDownTo();
+    return Names::IsDownTo(GetNameView());
 }
 
 int BusPin::GetWidth() const noexcept {
-    Names::BusName parsed;
-    return Names::ParseBus(GetNameView(), parsed) ? parsed.GetWidth() : 0;
+    return Names::GetWidth(GetNameView());
 }
 
 Pin* BusIndexPin::ClonePin() const {
@@ -263,7 +175,7 @@ void PinConstantSignalVisitor::SetResult(std::string_view baseName, std::string_
     name_ = instanceName_;
     name_ += '_';
     name_ += baseName;
-    name_ += "_CONST_SIGNAL";
+    name_ += Names::ConstantSuffix;
     name_ += index;
 }
 

@@ -314,7 +314,11 @@ Attribute* AttributeHolder::GetAttr(const char* name) const {
 }
 
 Iterator<Attribute*> AttributeHolder::GetAttrIterator() const noexcept {
-    return Iterator<Attribute*>(table_ == nullptr ? nullptr : &table_->attributes);
+    // The table is made with the first attribute, and made anew by an assignment.
+    return Iterator<Attribute*>(this, [](const void* holder) -> const PtrArray<Attribute*>* {
+        const Table* const table = static_cast<const AttributeHolder*>(holder)->table_.get();
+        return table == nullptr ? nullptr : &table->attributes;
+    });
 }
 
 const IStringPtrMap<AttributeFactory::Creator>& AttributeFactory::GetCreators() {

@@ -3,17 +3,30 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Objects/ObjectDetails.h"
 #include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Objects/ObjectName.h"
 #include "Port/Ascii.h"
-#include "Port/Pool.h"
+
+#include <new>
 
 namespace Orn_Hdl {
 
+inline ObjectName& Object::Name() noexcept {
+    return *std::launder(reinterpret_cast<ObjectName*>(nameStorage_));
+}
+
+inline const ObjectName& Object::Name() const noexcept {
+    return *std::launder(reinterpret_cast<const ObjectName*>(nameStorage_));
+}
+
 Object::Object(ObjectType type) noexcept {
+    static_assert(sizeof(ObjectName) == sizeof nameStorage_ && alignof(ObjectName) == 1);
+    ::new (nameStorage_) ObjectName();
     SetFlag(static_cast<unsigned>(type - ObjectTypeAttribute), true);
 }
 
-Object::Object(const Object& other) : name_(other.name_) {
-    SetFlag(other.name_.GetOwnerByte() & TypeMask, true);
+Object::Object(const Object& other)
+    : Object(static_cast<ObjectType>(ObjectTypeAttribute + (other.bits_ & TypeMask))) {
+    Name() = other.Name();
     if (!other.GetCommentView().empty()) {
         MakeDetails().comment = other.GetCommentView();
     }
@@ -23,7 +36,7 @@ Object& Object::operator=(const Object& other) {
     if (this != &other) {
         CopyNameFrom(other);
         SetFlag(TypeMask, false);
-        SetFlag(other.name_.GetOwnerByte() & TypeMask, true);
+        SetFlag(other.bits_ & TypeMask, true);
         if (GetDetails() != nullptr || !other.GetCommentView().empty()) {
             MakeDetails().comment = other.GetCommentView();
         }
@@ -31,19 +44,24 @@ Object& Object::operator=(const Object& other) {
     return *this;
 }
 
-Object::~Object() = default;
-
-void* Object::operator new(std::size_t size) {
-    return Port::Pool::Allocate(size, Port::Pool::DesignObjects);
+Object::~Object() {
+    Name().~ObjectName();
 }
 
-void Object::operator delete(void* memory) noexcept {
-    Port::Pool::Free(memory);
+std::string_view Object::GetNameView() const noexcept {
+    return Name().GetView();
+}
+
+ObjectDetails& Object::MakeDetails() {
+    return Name().MakeDetails();
+}
+
+ObjectDetails* Object::GetDetails() const noexcept {
+    return Name().GetDetails();
 }
 
 void Object::SetFlag(unsigned flag, bool on) noexcept {
-    const unsigned byte = name_.GetOwnerByte();
-    name_.SetOwnerByte(static_cast<std::uint8_t>(on ? byte | flag : byte & ~flag));
+    bits_ = static_cast<std::uint8_t>(on ? bits_ | flag : bits_ & ~flag);
 }
 
 void Object::SetDirection(int direction) {
@@ -61,7 +79,7 @@ int Object::GetOddDirection() const noexcept {
 }
 
 int Object::GetObjectType() const {
-    return ObjectTypeAttribute + static_cast<int>(name_.GetOwnerByte() & TypeMask);
+    return ObjectTypeAttribute + static_cast<int>(bits_ & TypeMask);
 }
 
 void Object::SetName(const char* name) {
@@ -70,12 +88,12 @@ void Object::SetName(const char* name) {
 
 void Object::SetNameVerbatim(std::string_view name) {
     KeepKeyName(name);
-    name_.Assign(name);
+    Name().Assign(name);
 }
 
 void Object::CopyNameFrom(const Object& other) {
     KeepKeyName(other.GetNameView());
-    name_ = other.name_;
+    Name() = other.Name();
 }
 
 void Object::KeepKeyName(std::string_view newName) {
@@ -115,7 +133,7 @@ std::string_view Object::GetCommentView() const noexcept {
 
 bool Object::operator==(const Object& other) const noexcept {
     return GetCommentView() == other.GetCommentView() && GetNameView() == other.GetNameView() &&
-           ((name_.GetOwnerByte() ^ other.name_.GetOwnerByte()) & TypeMask) == 0;
+           ((bits_ ^ other.bits_) & TypeMask) == 0;
 }
 
 void Object::NormalizeName(Port::StringBase<char>& name) {

@@ -2,6 +2,7 @@
 // millions that do not need them do not pay for them.
 #pragma once
 
+#include "HdlModel/Objects/ObjectName.h"
 #include "Orn_Hdl/Attributes.h"
 
 #include <memory>

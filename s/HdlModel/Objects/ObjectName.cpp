@@ -1,4 +1,4 @@
-#include "Orn_Hdl/Model/ObjectName.h"
+#include "HdlModel/Objects/ObjectName.h"
 
 #include "HdlModel/Objects/ObjectDetails.h"
 
@@ -67,7 +67,8 @@ ObjectName::ObjectName(const ObjectName& other) noexcept : ObjectName() {
     *this = other;
 }
 
-// Itself is told apart behind the details. NOLINTNEXTLINE(bugprone-unhandled-self-assignment)
+// Assignment to itself is found out where the names stand, which may be in the details.
+// NOLINTNEXTLINE(bugprone-unhandled-self-assignment)
 ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
     ObjectName& to = GetPlain();
     const ObjectName& from = other.GetPlain();

@@ -1,8 +1,9 @@
-// The links of a signal that most signals do not have.
+// The links of a signal that most signals do not have. PinLinks and References say what they mean.
 #pragma once
 
-#include "Orn_Hdl/Model/Signals.h"
+#include "Orn_Hdl/Model/Signals/Signal.h"
 
+#include <algorithm>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -10,17 +11,26 @@ namespace Orn_Hdl {
 class DummySignals;
 
 struct Signal::Links {
-    /// The aliases of this signal.
-    PtrArray<Signal*> signals;
-    /// Every signal that names this one, as an alias, a member or a slice, once each time.
-    std::vector<Signal*> referrers;
     /// Pins that point at this signal without being listed.
     std::vector<Pin*> unlistedPins;
-    /// Who remembers this signal, as a dummy or as one for which a dummy stands in, and is told
-    /// when it ends; null for nobody.
+    /// The aliases of this signal.
+    PtrArray<Signal*> aliases;
+    /// The signals that name this one as an alias, a member or a slice, once for each time.
+    std::vector<Signal*> referrers;
+    /// The dummy signals of a netlist that have this one as a port or as its dummy; null for none.
     DummySignals* keeper = nullptr;
-    /// How often it does.
+    /// How many entries of the keeper name this signal.
     int timesKept = 0;
 };
+
+/// Takes one occurrence out of a list whose order does not matter. The last one is looked for
+/// first: what is destroyed was mostly added last.
+template <class T> void EraseOne(std::vector<T*>& list, const T* element) noexcept {
+    const auto found = std::find(list.rbegin(), list.rend(), element);
+    if (found != list.rend()) {
+        *found = list.back();
+        list.pop_back();
+    }
+}
 
 } // namespace Orn_Hdl

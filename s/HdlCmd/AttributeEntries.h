@@ -1,0 +1,94 @@
+// The entries of the attribute commands: each of four operations for each of six kinds of objects
+// that have attributes.
+#pragma once
+
+#include "HdlCmd/Catalogue.h"
+#include "HdlCmd/Executing.h"
+#include "HdlCmd/Parsing.h"
+
+#include <algorithm>
+#include <array>
+#include <cstddef>
+
+namespace Orn_Hdl {
+
+/// A text as a template argument.
+template <std::size_t Size> struct FixedText {
+    static constexpr std::size_t Length = Size - 1;
+
+    /// Not explicit, so that a template argument can be a literal.
+    constexpr FixedText(const char (&literal)[Size]) { std::copy_n(literal, Size, characters); }
+
+    char characters[Size] = {};
+};
+
+/// Texts joined while compiling.
+template <FixedText... Parts>
+constexpr auto JoinedTexts = [] {
+    std::array<char, (Parts.Length + ... + 1)> joined{};
+    char* place = joined.data();
+    ((place = std::copy_n(Parts.characters, Parts.Length, place)), ...);
+    return joined;
+}();
+
+/// A kind of object that has attributes: how the arguments of a command name the object, what its
+/// help calls it, and how its name is read.
+template <FixedText Argument, FixedText Noun, AttributeOwner Owner> struct AttributeOwnerTraits {
+    static constexpr auto argument = Argument;
+    static constexpr auto noun = Noun;
+    static constexpr AttributeOwner owner = Owner;
+};
+
+using OfModule = AttributeOwnerTraits<"", "the module", AttributeOwner::Module>;
+using OfComponent = AttributeOwnerTraits<"<component> ", "a component", AttributeOwner::Object>;
+using OfInstance = AttributeOwnerTraits<"<instance> ", "an instance", AttributeOwner::Object>;
+using OfSignal = AttributeOwnerTraits<"<signal> ", "a signal", AttributeOwner::Object>;
+using OfComponentPin =
+    AttributeOwnerTraits<"<component.pin> ", "a pin of a component", AttributeOwner::Pin>;
+using OfInstancePin =
+    AttributeOwnerTraits<"<instance.pin> ", "a pin of an instance", AttributeOwner::Pin>;
+
+template <class Owner, auto Operation> constexpr CommandEntry AddAttribute(const char* phrase) {
+    return {{phrase,
+             JoinedTexts<Owner::argument, "[-TYPE=<type>] <attribute> [value]">.data(),
+             JoinedTexts<"Adds an attribute to ",
+                         Owner::noun,
+                         ", or sets its value; the type is String, Integer, Float, Boolean, Bit, "
+                         "BitVector or User.">.data()},
+            ParseAddAttribute<Owner::owner>,
+            Apply<Operation>};
+}
+
+/// The entry of a command that sets the value of an attribute.
+template <class Owner, auto Operation>
+constexpr CommandEntry SetAttributeValue(const char* phrase) {
+    return {{phrase, JoinedTexts<Owner::argument, "<attribute> <value>">.data(),
+             JoinedTexts<"Sets the value of an attribute of ", Owner::noun, ".">.data()},
+            ParseAttributeText<Owner::owner>,
+            Apply<Operation>};
+}
+
+/// The entry of a command that names the type of an attribute of type User.
+template <class Owner, auto Operation>
+constexpr CommandEntry SetAttributeUserType(const char* phrase) {
+    return {
+        {phrase, JoinedTexts<Owner::argument, "<attribute> <type>">.data(),
+         JoinedTexts<"Names the type of an attribute of type User of ", Owner::noun, ".">.data()},
+        ParseAttributeText<Owner::owner>,
+        Apply<Operation>};
+}
+
+/// The entry of a command that sets how an attribute is written.
+template <class Owner, auto SetGeneric, auto SetSynAttr>
+constexpr CommandEntry SetAttributeOption(const char* phrase) {
+    return {{phrase,
+             JoinedTexts<Owner::argument, "<attribute> <option> [option]">.data(),
+             JoinedTexts<"Sets how an attribute of ",
+                         Owner::noun,
+                         " is written: -GENERIC=NONE|SYN|NOSYN, "
+                         "-SYNATTR=NONE|ASSIGN|ASSIGNNODEC.">.data()},
+            ParseAttributeOptions<Owner::owner>,
+            ApplyOptions<SetGeneric, SetSynAttr>};
+}
+
+} // namespace Orn_Hdl

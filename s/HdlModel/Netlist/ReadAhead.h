@@ -1,0 +1,22 @@
+// What the reader of command files tells a netlist of the lines to come.
+#pragma once
+
+#include "HdlModel/Netlist/Foresight.h"
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Orn_Hdl/Model/Netlist.h"
+
+#include <cstddef>
+
+namespace Orn_Hdl {
+
+/// The way past the public interface of `Netlist` to its `Foresight`.
+class ReadAhead {
+public:
+    /// How many lines ahead a line is noted.
+    static constexpr std::size_t Distance = Foresight::Distance;
+    /// Hints that a line, split into words, will be executed `Distance` lines later, so that what
+    /// it names is fetched in the meantime. Changes nothing.
+    static void Note(Netlist& netlist, const StringArray& words) noexcept;
+};
+
+} // namespace Orn_Hdl

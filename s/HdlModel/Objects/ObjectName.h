@@ -1,0 +1,74 @@
+// The compact name that every object of a design holds.
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <cstring>
+#include <string_view>
+
+namespace Orn_Hdl {
+
+struct ObjectDetails;
+
+/// A name in 15 bytes of any alignment. Up to 14 characters stand in the object itself; a longer
+/// name stands in a block that copies share, so that the pins of a thousand instances hold a long
+/// pin name once.
+///
+/// It also leads to the parts of the owner that few objects have, so that the millions without them
+/// pay nothing: an object that has details keeps its name there.
+class ObjectName {
+public:
+    ObjectName() noexcept : bytes_(), length_(0) {}
+    /// Copies the name; the details stay with their owner.
+    ObjectName(const ObjectName& other) noexcept;
+    /// Copies the name; the details stay with their owner.
+    ObjectName& operator=(const ObjectName& other) noexcept;
+    ~ObjectName() {
+        if (length_ > InlineCapacity) {
+            Release();
+        }
+    }
+
+    /// Stores a text. When allocation fails the name stays as it was.
+    void Assign(std::string_view text);
+
+    /// The name, valid until it changes or the details are made.
+    std::string_view GetView() const noexcept {
+        return length_ <= InlineCapacity ? std::string_view(bytes_, length_) : LongView();
+    }
+
+    /// The owner's details; null when it has none.
+    ObjectDetails* GetDetails() const noexcept {
+        return length_ == DetailedLength ? static_cast<ObjectDetails*>(GetPointer()) : nullptr;
+    }
+    /// The owner's details, made when there are none.
+    ObjectDetails& MakeDetails();
+
+private:
+    struct Shared;
+    static constexpr std::size_t InlineCapacity = 14;
+    /// Stands in `length_` when `bytes_` hold a pointer to a shared name.
+    static constexpr std::uint8_t SharedLength = 255;
+    /// Stands in `length_` when `bytes_` hold a pointer to the details.
+    static constexpr std::uint8_t DetailedLength = 254;
+
+    std::string_view LongView() const noexcept;
+    void* GetPointer() const noexcept {
+        void* pointer = nullptr;
+        std::memcpy(&pointer, bytes_, sizeof pointer);
+        return pointer;
+    }
+    void SetPointer(void* pointer, std::uint8_t length) noexcept {
+        std::memcpy(bytes_, &pointer, sizeof pointer);
+        length_ = length;
+    }
+    Shared* GetShared() const noexcept;
+    const ObjectName& GetPlain() const noexcept;
+    ObjectName& GetPlain() noexcept;
+    void Release() noexcept;
+
+    char bytes_[InlineCapacity];
+    std::uint8_t length_;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,91 @@
+// What the writers of all languages do alike.
+#pragma once
+
+#include "Orn_Hdl/Language.h"
+#include "Orn_Hdl/Model/Netlist.h"
+#include "Orn_Hdl/Options.h"
+#include "Orn_Hdl/Streams.h"
+#include "Port/Prefetch.h"
+#include "Writers/Generics.h"
+#include "Writers/SignalLists.h"
+#include "Writers/Text.h"
+
+namespace Orn_Hdl::Writers {
+
+/// One write of one netlist: first the netlist is prepared, then it is only read. The writer of
+/// each language derives from it.
+class NetlistPass {
+public:
+    NetlistPass(const NetlistPass&) = delete;
+    NetlistPass& operator=(const NetlistPass&) = delete;
+
+protected:
+    NetlistPass(Language language, OutStream& out, Netlist& netlist,
+                const HdlOptions& options) noexcept
+        : out_(out), netlist_(netlist), options_(options), language_(language) {}
+    ~NetlistPass() = default;
+
+    /// Sorts the netlist and makes the dummy signals that it needs.
+    void Prepare();
+    /// Writes the header, when the options ask for it, and the netlist's comment.
+    void WriteOpening();
+    /// Writes what `write` writes between two comments that hide it from synthesis.
+    template <class Write> void WriteHidden(const Write& write);
+    /// Lets `writeConstant` write each signal that has a constant, then `writeAlias` each signal
+    /// with each of its aliases.
+    template <class WriteConstant, class WriteAlias>
+    void WriteAssignments(const SignalLists& signals, const WriteConstant& writeConstant,
+                          const WriteAlias& writeAlias) const;
+    template <class Write> void ForEachInstance(const Write& write) const;
+    /// The attribute INIT of an instance that gets its value from the module's own INIT; null when
+    /// there is none, or when this netlist passes none down.
+    Attribute* FindPassedInit(const GenericAttrs& attributes) const;
+
+    OutStream& out_;
+    Netlist& netlist_;
+    const HdlOptions& options_;
+
+private:
+    const Language language_;
+    bool passesInit_ = false;
+};
+
+template <class Write> void NetlistPass::WriteHidden(const Write& write) {
+    Writers::WriteHidden(out_, language_, write);
+}
+
+template <class WriteConstant, class WriteAlias>
+void NetlistPass::WriteAssignments(const SignalLists& signals, const WriteConstant& writeConstant,
+                                   const WriteAlias& writeAlias) const {
+    for (Signal* signal : signals.constants) {
+        writeConstant(*signal);
+    }
+    for (Signal* signal : signals.aliased) {
+        for (Signal* alias : signal->GetSignalIterator()) {
+            if (IsWritable(language_, alias->GetNameView())) {
+                writeAlias(*signal, *alias);
+            }
+        }
+    }
+}
+
+/// The signals of the pins are spread over the memory of a large design. They are asked for a few
+/// instances ahead, since waiting for them takes a seventh of the time of a Verilog write.
+template <class Write> void NetlistPass::ForEachInstance(const Write& write) const {
+    constexpr int lead = 4;
+    Iterator<Instance*> ahead = netlist_.GetInstanceIterator();
+    for (int i = 0; i < lead; ++i) {
+        ahead.Next();
+    }
+    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+        if (const Instance* const coming = ahead.GetCurrent()) {
+            for (const Pin* pin : coming->GetPinIterator()) {
+                Port::Prefetch(pin->GetSignal());
+            }
+            ahead.Next();
+        }
+        write(*instance);
+    }
+}
+
+} // namespace Orn_Hdl::Writers

@@ -1,0 +1,331 @@
+#!/usr/bin/env python3
+"""Puts small mistakes into s/, one at a time, and sees whether the unit tests find them.
+
+    scripts/mutate.py --count 12                  # the first dozen of seed 1
+    scripts/mutate.py --seed 2 --count 300        # other ones; goes on where an earlier run stopped
+    scripts/mutate.py --file s/Port/File.cpp --count 20
+    scripts/mutate.py --list --count 20           # only shows them
+    scripts/mutate.py --report                    # what the results say, with every survivor
+
+The mistakes go into a copy of the tree in build/mutation, which is built with ccache. Each result is a
+line of JSON in build/mutation/results.jsonl: "killed" by a test program, "survived" all of them, or
+"invalid" when it does not compile. The same seed gives the same mistakes in the same order, taken from each
+file in turn, and one that has a result is not tried again.
+"""
+
+from __future__ import annotations
+
+import argparse
+import dataclasses
+import hashlib
+import json
+import os
+import random
+import re
+import resource
+import shutil
+import subprocess
+import sys
+import tempfile
+import time
+from collections import Counter
+from collections.abc import Iterator
+from pathlib import Path
+
+PROJECT = Path(__file__).resolve().parents[1]
+WORK = PROJECT / "build" / "mutation"
+TREE = WORK / "tree"
+BUILD = WORK / "build"
+
+# All programs, quick ones first; the folder of the changed file comes before them.
+PROGRAMS = ["Writers", "Options", "Header", "Verilog", "Vhdl", "HdlCmd", "Port", "Streams", "HdlModel",
+            "Containers", "HdlEngine", "Robustness", "Threads"]
+# Where no folder below tests/ has the name of the one below s/.
+TESTED_BY = {"Exception": "HdlEngine"}
+# Large designs take minutes and find nothing that small ones do not.
+FILTER = "-LargeInput.*"
+MOST_MEMORY = 8 << 30
+MOST_WRITTEN = 4 << 30
+
+
+@dataclasses.dataclass(frozen=True)
+class Mutant:
+    """One change of one line."""
+
+    file: str
+    line: int
+    operator: str
+    before: str
+    after: str
+
+    @property
+    def name(self) -> str:
+        """Stays the same while lines are added above."""
+        text = "\0".join([self.file, self.operator, self.before, self.after])
+        return hashlib.sha256(text.encode()).hexdigest()[:12]
+
+
+# The operators
+
+
+def swaps(line: str, pairs: dict[str, str]) -> Iterator[str]:
+    """The line with one operator between blanks exchanged for another."""
+    pattern = "|".join(re.escape(word) for word in sorted(pairs, key=len, reverse=True))
+    for found in re.finditer(rf"(?<= )(?:{pattern})(?= )", line):
+        yield line[:found.start()] + pairs[found[0]] + line[found.end():]
+
+
+def words(line: str, pairs: dict[str, str]) -> Iterator[str]:
+    """The line with one word exchanged for another."""
+    for found in re.finditer(rf"\b(?:{'|'.join(pairs)})\b", line):
+        yield line[:found.start()] + pairs[found[0]] + line[found.end():]
+
+
+def boundaries(line: str) -> Iterator[str]:
+    yield from swaps(line, {"<": "<=", "<=": "<", ">": ">=", ">=": ">"})
+
+
+def comparisons(line: str) -> Iterator[str]:
+    yield from swaps(line, {"==": "!=", "!=": "=="})
+
+
+def connectives(line: str) -> Iterator[str]:
+    yield from swaps(line, {"&&": "||", "||": "&&"})
+
+
+def sums(line: str) -> Iterator[str]:
+    yield from swaps(line, {"+": "-", "-": "+", "+=": "-=", "-=": "+="})
+
+
+def steps(line: str) -> Iterator[str]:
+    for found in re.finditer(r"\+\+|--", line):
+        other = "--" if found[0] == "++" else "++"
+        yield line[:found.start()] + other + line[found.end():]
+
+
+def constants(line: str) -> Iterator[str]:
+    yield from words(line, {"true": "false", "false": "true"})
+    for found in re.finditer(r"(?<![\w.'\"])\d+(?![\w.'\"])", line):
+        yield line[:found.start()] + str(int(found[0]) + 1) + line[found.end():]
+
+
+def negations(line: str) -> Iterator[str]:
+    """A condition that stands on one line, negated."""
+    if found := re.fullmatch(r"(\s*(?:\} else )?(?:if|while) \()(.*)(\) \{)", line):
+        if found[2].count("(") == found[2].count(")") and " = " not in found[2]:
+            yield f"{found[1]}!({found[2]}){found[3]}"
+
+
+DECLARATION = re.compile(r"\s*(?:const|auto|static|constexpr|using|return|throw|delete|break|continue|"
+                         r"case|default|namespace|friend|template|typedef|struct|class|enum|extern|"
+                         r"public|private|protected|virtual|explicit)\b|.*= (?:default|delete);|"
+                         r"\s*[\w:]+(?:<.*>)?[*&]* (?:const )?[*&]?\w+(?: =|\(|;|\{)|"
+                         r"\s*[A-Z]\w+\(.*\w& \w+")
+STATEMENT = re.compile(r"\s+[*(\w][^{}]*(?:\)| = .*|\+\+|--|\+= .*);")
+
+
+def removals(line: str, former: str) -> Iterator[str]:
+    """A call or assignment that stands on one line, left out."""
+    begins = not former.strip() or former.rstrip().endswith((";", "{", "}", ":")) or \
+        former.lstrip().startswith("//")
+    if begins and STATEMENT.fullmatch(line) and not DECLARATION.match(line):
+        yield re.sub(r"\S.*", ";", line)
+
+
+OPERATORS = [boundaries, comparisons, connectives, sums, steps, constants, negations]
+
+
+def hidden(line: str) -> bool:
+    """Whether a line is of no interest: preprocessor, comments, tables of texts, declarations of names."""
+    start = line.lstrip()
+    return not start or start.startswith(("#", "//", "static_assert", "using ", "namespace ", "template",
+                                          "friend ")) or '"' in line or "R(" in line
+
+
+def mutants_of(file: str) -> list[Mutant]:
+    """Every mistake that can be put into a file."""
+    found = []
+    former = ""
+    for number, line in enumerate((PROJECT / file).read_text().splitlines(), 1):
+        code, comment = re.fullmatch(r"(.*?)(\s*//.*)?", line).groups()
+        if not hidden(code):
+            for operator in OPERATORS:
+                found += [Mutant(file, number, operator.__name__, line, after + (comment or ""))
+                          for after in operator(code)]
+            found += [Mutant(file, number, "removals", line, after) for after in removals(code, former)]
+        former = line
+    return found
+
+
+def chosen(files: list[str], seed: int) -> list[Mutant]:
+    """All mistakes, shuffled, from each file in turn."""
+    dice = random.Random(seed)
+    ranked = []
+    for file in sorted(files):
+        mutants = sorted(mutants_of(file), key=lambda mutant: (mutant.line, mutant.name))
+        dice.shuffle(mutants)
+        ranked += [(rank, dice.random(), mutant) for rank, mutant in enumerate(mutants)]
+    return [mutant for _, _, mutant in sorted(ranked, key=lambda entry: entry[:2])]
+
+
+# The copy
+
+
+def environment() -> dict[str, str]:
+    return dict(os.environ, CMAKE_CXX_COMPILER_LAUNCHER="ccache", CCACHE_BASEDIR=str(TREE),
+                CCACHE_NOHASHDIR="1", RC_PARAMS="seed=20261120", TMPDIR=str(WORK / "tmp"))
+
+
+def build(*targets: str) -> bool:
+    return subprocess.run(["ninja", "-C", BUILD, *targets], env=environment(), check=False,
+                          stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL).returncode == 0
+
+
+def target(program: str) -> str:
+    return f"orn_hdl_{program}_tests"
+
+
+def prepare(programs: list[str]) -> dict[str, float]:
+    """Brings the copy up to date and builds it. Returns how long each program takes when all is well."""
+    tracked = subprocess.run(["git", "ls-files", "-z"], cwd=PROJECT, check=True, capture_output=True,
+                             text=True).stdout.split("\0")
+    kept = {name for name in tracked if name and (PROJECT / name).is_file()}
+    for name in kept:
+        source, copy = PROJECT / name, TREE / name
+        if not copy.exists() or copy.read_bytes() != source.read_bytes():
+            copy.parent.mkdir(parents=True, exist_ok=True)
+            shutil.copyfile(source, copy)
+    for copy in list(TREE.rglob("*")):
+        if copy.is_file() and copy.relative_to(TREE).as_posix() not in kept:
+            copy.unlink()
+    subprocess.run(["cmake", "-S", TREE, "-B", BUILD, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
+                    "-DCMAKE_CXX_FLAGS_DEBUG=-O1", "-DORN_HDL_BUILD_TOOL=OFF"],
+                   env=environment(), check=True, stdout=subprocess.DEVNULL)
+    print("building the tests", file=sys.stderr)
+    if not build(*map(target, programs)):
+        sys.exit("the tree does not build")
+    times = {}
+    for program in programs:
+        print(f"running {program}", file=sys.stderr)
+        start = time.monotonic()
+        if failure := run(program, 1800):
+            sys.exit(f"{program} fails without any mistake: {failure}")
+        times[program] = time.monotonic() - start
+    return times
+
+
+def limit() -> None:
+    """What a program gone wild may take."""
+    resource.setrlimit(resource.RLIMIT_AS, (MOST_MEMORY, MOST_MEMORY))
+    resource.setrlimit(resource.RLIMIT_FSIZE, (MOST_WRITTEN, MOST_WRITTEN))
+
+
+def run(program: str, seconds: float) -> str:
+    """Why a test program fails; empty when it passes."""
+    with tempfile.TemporaryDirectory(dir=WORK / "tmp") as folder:
+        command = [BUILD / "tests" / target(program), "--gtest_brief=1", "--gtest_fail_fast",
+                   f"--gtest_filter={FILTER}"]
+        try:
+            ended = subprocess.run(command, env=environment() | {"TMPDIR": folder}, cwd=folder,
+                                   preexec_fn=limit, timeout=seconds, check=False, text=True,
+                                   errors="replace", stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
+                                   stderr=subprocess.DEVNULL)
+        except subprocess.TimeoutExpired:
+            return "time"
+    if ended.returncode == 0:
+        return ""
+    failed = re.search(r"^\[  FAILED  \] ([\w./]+)", ended.stdout, re.M)
+    return failed[1] if failed else f"status {ended.returncode}"
+
+
+def order(file: str, programs: list[str]) -> list[str]:
+    """The programs, those that know the file best first."""
+    folder = Path(file).parts[1]
+    own = TESTED_BY.get(folder, folder)
+    return sorted(programs, key=lambda program: program != own)
+
+
+def attempt(mutant: Mutant, times: dict[str, float]) -> dict[str, str]:
+    """Builds the copy with the mistake and runs the programs until one of them fails."""
+    copy = TREE / mutant.file
+    original = copy.read_text()
+    lines = original.split("\n")
+    lines[mutant.line - 1] = mutant.after
+    copy.write_text("\n".join(lines))
+    try:
+        for program in order(mutant.file, list(times)):
+            if not build(target(program)):
+                return {"status": "invalid"}
+            if failure := run(program, 20 + 10 * times[program]):
+                return {"status": "killed", "by": program, "test": failure}
+        return {"status": "survived"}
+    finally:
+        copy.write_text(original)
+
+
+# The results
+
+
+def results(path: Path) -> list[dict]:
+    return [json.loads(line) for line in path.read_text().splitlines()] if path.exists() else []
+
+
+def report(path: Path) -> None:
+    """The latest word on each mistake, and the survivors."""
+    latest = {result["name"]: result for result in results(path)}
+    counts = Counter(result["status"] for result in latest.values())
+    tried = counts["killed"] + counts["survived"]
+    print(f"{len(latest)} mistakes: " + ", ".join(f"{counts[status]} {status}" for status in
+                                                   ("killed", "survived", "invalid")))
+    if tried:
+        print(f"{100 * counts['killed'] / tried:.1f} % of those that compile are found")
+    for result in latest.values():
+        if result["status"] == "survived":
+            print(f"\n{result['file']}:{result['line']} ({result['operator']})\n"
+                  f"- {result['before'].strip()}\n+ {result['after'].strip()}")
+
+
+def main() -> None:
+    parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
+    parser.add_argument("--seed", type=int, default=1, help="chooses the mistakes")
+    parser.add_argument("--count", type=int, default=12, help="how many, those with a result included")
+    parser.add_argument("--file", action="append", help="only in this file; may be repeated")
+    parser.add_argument("--program", action="append", choices=PROGRAMS,
+                        help="only this test program; may be repeated")
+    parser.add_argument("--results", type=Path, default=WORK / "results.jsonl", help="one JSON a line")
+    parser.add_argument("--list", action="store_true", help="show the mistakes and stop")
+    parser.add_argument("--report", action="store_true", help="show what is known and stop")
+    options = parser.parse_args()
+    if options.report:
+        report(options.results)
+        return
+    files = options.file or [path.relative_to(PROJECT).as_posix()
+                             for path in (PROJECT / "s").rglob("*.[ch]*")]
+    mutants = chosen(files, options.seed)
+    print(f"{len(mutants)} mistakes in {len(files)} files", file=sys.stderr)
+    mutants = mutants[:options.count]
+    if options.list:
+        for mutant in mutants:
+            print(f"{mutant.file}:{mutant.line} ({mutant.operator})\n- {mutant.before.strip()}\n"
+                  f"+ {mutant.after.strip()}")
+        return
+    known = {result["name"] for result in results(options.results)}
+    mutants = [mutant for mutant in mutants if mutant.name not in known]
+    (WORK / "tmp").mkdir(parents=True, exist_ok=True)
+    options.results.parent.mkdir(parents=True, exist_ok=True)
+    times = prepare([program for program in PROGRAMS
+                     if not options.program or program in options.program])
+    with options.results.open("a") as out:
+        for mutant in mutants:
+            start = time.monotonic()
+            result = attempt(mutant, times)
+            entry = {"name": mutant.name, **dataclasses.asdict(mutant), **result,
+                     "seconds": round(time.monotonic() - start, 1)}
+            print(json.dumps(entry), file=out, flush=True)
+            print(f"{result['status']} {mutant.file}:{mutant.line} {result.get('test', '')}",
+                  file=sys.stderr)
+    report(options.results)
+
+
+if __name__ == "__main__":
+    main()

@@ -1,0 +1,308 @@
+// Whichever allocation of a whole run, or of making one object, fails: what comes out is
+// std::bad_alloc or a message, nothing leaks, and the engine can be used on and ends.
+#include "Robustness/MidSizedDesign.h"
+#include "Support/EngineScript.h"
+#include "Support/TemporaryFolder.h"
+
+#include <gtest/gtest.h>
+
+#include <atomic>
+#include <cerrno>
+#include <cstdlib>
+#include <memory>
+#include <new>
+#include <string>
+#include <sys/mman.h>
+#include <sys/syscall.h>
+#include <unistd.h>
+
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#define ORN_HDL_SANITIZED 1
+#endif
+
+namespace {
+
+/// How many allocations succeed before one fails; below zero none fails (any more).
+std::atomic<long> allowed{-1};
+/// Blocks taken and not given back yet.
+std::atomic<long> alive{0};
+
+/// Whether the allocation in hand is the one that fails. There is only one.
+bool Fails() noexcept {
+    return allowed.load() >= 0 && allowed.fetch_sub(1) == 0;
+}
+
+void* Allocate(std::size_t size, std::size_t alignment) {
+    if (Fails()) {
+        throw std::bad_alloc();
+    }
+    const std::size_t rounded = (size + alignment - 1) / alignment * alignment;
+    void* const memory = std::aligned_alloc(alignment, rounded == 0 ? alignment : rounded);
+    if (memory == nullptr) {
+        throw std::bad_alloc();
+    }
+    ++alive;
+    return memory;
+}
+
+void Release(void* memory) noexcept {
+    if (memory != nullptr) {
+        --alive;
+        std::free(memory);
+    }
+}
+
+constexpr std::size_t Usual = alignof(std::max_align_t);
+
+} // namespace
+
+void* operator new(std::size_t size) {
+    return Allocate(size, Usual);
+}
+void* operator new[](std::size_t size) {
+    return Allocate(size, Usual);
+}
+void* operator new(std::size_t size, std::align_val_t alignment) {
+    return Allocate(size, static_cast<std::size_t>(alignment));
+}
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    try {
+        return Allocate(size, Usual);
+    } catch (const std::bad_alloc&) {
+        return nullptr;
+    }
+}
+void operator delete(void* memory) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, const std::nothrow_t&) noexcept {
+    Release(memory);
+}
+void operator delete[](void* memory) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, std::size_t) noexcept {
+    Release(memory);
+}
+void operator delete[](void* memory, std::size_t) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, std::align_val_t) noexcept {
+    Release(memory);
+}
+void operator delete(void* memory, std::size_t, std::align_val_t) noexcept {
+    Release(memory);
+}
+
+#if !defined(ORN_HDL_SANITIZED)
+// The library's other two ways to memory; the sanitizers keep these for themselves.
+extern "C" void* __libc_realloc(void* memory, std::size_t size);
+
+extern "C" void* realloc(void* memory, std::size_t size) noexcept {
+    if (Fails()) {
+        errno = ENOMEM;
+        return nullptr;
+    }
+    return __libc_realloc(memory, size);
+}
+
+extern "C" void* mmap(void* address, std::size_t size, int protection, int flags, int file,
+                      off_t offset) noexcept {
+    if (Fails()) {
+        errno = ENOMEM;
+        return MAP_FAILED;
+    }
+    return reinterpret_cast<void*>(
+        syscall(SYS_mmap, address, size, protection, flags, file, offset));
+}
+#endif
+
+namespace {
+
+const std::vector<std::string> Lines = Support::SplitLines(Robustness::MidSizedDesign());
+
+/// Carries out what it can of the design, and writes it in both languages.
+void BuildAndWrite(Orn_Hdl::Model& model, const std::string& file) {
+    std::vector<std::string> lines = Lines;
+    lines.push_back("WRITE VERILOG " + file);
+    lines.push_back("WRITE VHDL " + file);
+    for (const std::string& line : lines) {
+        try {
+            model.ExecuteLine(line);
+        } catch (const Orn_Hdl::Exception&) {
+            // What failed before may be missed now.
+        }
+    }
+}
+
+/// Builds and writes the design in an engine of its own, and once more when an allocation fails.
+/// \return whether one failed.
+bool RunOnce(const std::string& file, long allocations) {
+    allowed = allocations;
+    bool failed = false;
+    try {
+        Orn_Hdl::Engine engine;
+        engine.CreateAndAddModel("top", "");
+        Orn_Hdl::Model& model = *engine.GetModel("top");
+        try {
+            BuildAndWrite(model, file);
+        } catch (const std::bad_alloc&) {
+            failed = true;
+            BuildAndWrite(model, file);
+        }
+    } catch (const std::bad_alloc&) {
+        failed = true;
+    }
+    allowed = -1;
+    return failed;
+}
+
+/// Carries out an action again and again, its first allocation failing, then its second, and so on,
+/// until none is left that could fail.
+template <class Action> void FailInTurn(const Action& action) {
+    bool failed = true;
+    for (long count = 0; failed; ++count) {
+        const long before = alive;
+        allowed = count;
+        try {
+            action();
+            failed = false;
+        } catch (const std::bad_alloc&) {
+            // Whatever it left behind is counted below.
+        }
+        allowed = -1;
+        ASSERT_EQ(alive, before) << "allocation " << count << " failed, and something leaked";
+        ASSERT_TRUE(failed || count > 0) << "the action makes some allocations";
+    }
+}
+
+constexpr const char* LongName = "a name that is too long for the object that bears it";
+
+TEST(FailingAllocation, AComponentThatIsNotMadeLeavesNothingBehind) {
+    FailInTurn([] { const Orn_Hdl::Component component(LongName); });
+}
+
+TEST(FailingAllocation, ACompoundThatIsNotMadeIsForgottenByItsMembers) {
+    Orn_Hdl::PtrArray<Orn_Hdl::Signal*> members;
+    FailInTurn([&] {
+        // These end after the compound that could not be made.
+        const auto first = std::make_unique<Orn_Hdl::ScalarSignal>("A");
+        const auto second = std::make_unique<Orn_Hdl::ScalarSignal>("B");
+        members.Empty();
+        members.Add(first.get());
+        members.Add(second.get());
+        const auto compound = std::make_unique<Orn_Hdl::CompoundBus>("A,B", members);
+    });
+    members.Empty();
+}
+
+TEST(FailingAllocation, ASetThatIsNotCopiedLeavesNothingBehind) {
+    Orn_Hdl::StringSet set;
+    for (const char* name : {"A", "b", LongName}) {
+        set.Add(name);
+    }
+    FailInTurn([&] { const Orn_Hdl::StringSet copy(set); });
+}
+
+TEST(FailingAllocation, ATextThatFindsNoRoomLeavesTheListAsItWas) {
+    Orn_Hdl::StringArray texts;
+    texts.Add("first");
+    texts.Add("second");
+    const Port::String longer(std::string(1000, 'x'));
+    FailInTurn([&] {
+        Orn_Hdl::StringArray copy = texts;
+        try {
+            copy.SetAt(0, longer);
+        } catch (const std::bad_alloc&) {
+            EXPECT_EQ(copy.GetView(0), "first");
+            EXPECT_EQ(copy.GetView(1), "second");
+            throw;
+        }
+    });
+}
+
+TEST(FailingAllocation, ANameThatFindsNoPlaceIsNotInTheMap) {
+    int object = 0;
+    Orn_Hdl::IStringPtrMap<int*> names;
+    // As many as have places before there must be more of them.
+    for (int i = 0; i < 16; ++i) {
+        names.Add(("N" + std::to_string(i)).c_str(), &object);
+    }
+    FailInTurn([&] {
+        Orn_Hdl::IStringPtrMap<int*> copy(names);
+        try {
+            copy.Add(LongName, &object);
+        } catch (const std::bad_alloc&) {
+            copy.Add(LongName, &object);
+            copy.Remove(LongName);
+            EXPECT_FALSE(copy.Contains(LongName));
+            throw;
+        }
+    });
+}
+
+TEST(FailingAllocation, WhatANetlistHoldsIsFound) {
+    FailInTurn([] {
+        Orn_Hdl::Netlist netlist;
+        try {
+            for (int i = 0; i < 40; ++i) {
+                const std::string number = std::to_string(i);
+                netlist.Add(new Orn_Hdl::Component(("C" + number).c_str()));
+                netlist.Add(new Orn_Hdl::Bus(("B" + number + "(3:0)").c_str()));
+            }
+        } catch (const std::bad_alloc&) {
+            for (const Orn_Hdl::Component* component : netlist.GetComponentIterator()) {
+                EXPECT_EQ(netlist.GetComponent(component->GetNameView()), component);
+            }
+            for (const Orn_Hdl::Signal* bus : netlist.GetSignalIterator()) {
+                EXPECT_EQ(netlist.GetSignal(bus->GetNameView()), bus);
+                EXPECT_EQ(netlist.GetParentBus(bus->GetName().CStr()), bus);
+            }
+            throw;
+        }
+    });
+}
+
+TEST(FailingAllocation, ADoneCommandThatIsNotKeptEnds) {
+    int ended = 0;
+    struct Done final : Orn_Hdl::Command {
+        explicit Done(int& count) noexcept : Command(nullptr), ended(count) {}
+        ~Done() override { ++ended; }
+        bool Parse(const Orn_Hdl::StringArray& /*tokens*/) override { return true; }
+        void Execute() override {}
+        const char* GetName() const override { return "DONE"; }
+        int& ended;
+    };
+    int made = 0;
+    FailInTurn([&] {
+        Orn_Hdl::CommandManager manager;
+        auto* const done = new Done(ended);
+        ++made;
+        manager.AddDoneCommand(done);
+    });
+    EXPECT_EQ(ended, made);
+}
+
+TEST(FailingAllocation, AnyOneMayFail) {
+    const Support::TemporaryFolder folder;
+    const std::string file = folder / "netlist";
+    // The tables that the process keeps are filled first.
+    ASSERT_FALSE(RunOnce(file, -1));
+    ASSERT_FALSE(RunOnce(file, -1));
+    const int openFiles = Support::CountOpenFiles();
+    long count = 0;
+    for (bool failed = true; failed; ++count) {
+        const long before = alive;
+        failed = RunOnce(file, count);
+        ASSERT_EQ(alive, before) << "allocation " << count << " failed, and something leaked";
+        ASSERT_TRUE(!std::filesystem::is_empty(folder.GetPath()));
+    }
+    EXPECT_GT(count, 200) << "the run makes some allocations";
+    EXPECT_EQ(Support::CountOpenFiles(), openFiles);
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.GetPath()),
+                            std::filesystem::directory_iterator()),
+              1)
+        << "no temporary file stays behind";
+}
+
+} // namespace

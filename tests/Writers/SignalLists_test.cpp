@@ -1,0 +1,86 @@
+#include "Writers/SignalLists.h"
+
+#include "Support/Names.h"
+#include "Support/Parts.h"
+#include "Writers/InstanceWalk.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace {
+
+using namespace Orn_Hdl;
+using namespace Orn_Hdl::Writers;
+using Support::Names;
+
+Names NamesOf(const std::vector<Signal*>& signals) {
+    Names names;
+    for (const Signal* signal : signals) {
+        names.push_back(Support::Text(signal->GetName()));
+    }
+    return names;
+}
+
+template <class T> T* Added(Netlist& netlist, T* object) {
+    netlist.Add(object);
+    return object;
+}
+
+TEST(SignalLists, HoldEachSignalWhereItIsWritten) {
+    Netlist netlist;
+    Added(netlist, new ScalarSignal("port"))->SetPortPolarity(Support::In);
+    Signal* const net = Added(netlist, new ScalarSignal("net"));
+    Added(netlist, new ScalarSignal("hidden"))->AssignConstantValue("1");
+    Bus* const bus = Added(netlist, new Bus("b(1:0)"));
+    Signal* const bit = Added(netlist, new BusIndex("b(0)", bus));
+    bit->AssignConstantValue("1");
+    net->Connect(bit);
+    const SignalLists lists(netlist, [](std::string_view name) { return name != "hidden"; });
+    EXPECT_EQ(NamesOf(lists.ports), Names{"port"});
+    EXPECT_EQ(NamesOf(lists.internals), (Names{"net", "b(1:0)"})) << "a bit comes with its bus";
+    EXPECT_EQ(NamesOf(lists.constants), Names{"b(0)"});
+    EXPECT_EQ(NamesOf(lists.aliased), Names{"net"});
+}
+
+TEST(IsSingleBit, NotEvenOfABusOfOneBit) {
+    Bus bus("b(0:0)");
+    EXPECT_TRUE(IsSingleBit(ScalarSignal("s")));
+    EXPECT_TRUE(IsSingleBit(BusIndex("b(0)", &bus)));
+    EXPECT_FALSE(IsSingleBit(bus));
+    EXPECT_FALSE(IsSingleBit(BusSlice("b(0:0)", &bus)));
+    EXPECT_FALSE(IsSingleBit(CompoundBus("s,b(0)")));
+}
+
+TEST(RunsAgainstParent, OnlyOfASliceOfSeveralBits) {
+    Bus descending("d(3:0)");
+    Bus ascending("a(0:3)");
+    EXPECT_FALSE(RunsAgainstParent(BusSlice("d(2:1)", &descending)));
+    EXPECT_TRUE(RunsAgainstParent(BusSlice("d(1:2)", &descending)));
+    EXPECT_FALSE(RunsAgainstParent(BusSlice("a(1:2)", &ascending)));
+    EXPECT_TRUE(RunsAgainstParent(BusSlice("a(2:1)", &ascending)));
+    EXPECT_FALSE(RunsAgainstParent(BusSlice("a(1:1)", &ascending)));
+    EXPECT_FALSE(RunsAgainstParent(descending));
+}
+
+TEST(ForEachInstance, VisitsEachOnceInOrderInDesignsOfAnySize) {
+    for (const int count : {0, 1, 3, 4, 5, 12, 13, 40}) {
+        Netlist netlist;
+        Component* const component = Support::MakeBuffer().release();
+        netlist.Add(component);
+        Names expected;
+        for (int i = 0; i < count; ++i) {
+            expected.push_back("U" + std::to_string(i));
+            netlist.Add(new Instance(expected.back().c_str(), component));
+        }
+        Names visited;
+        ForEachInstance(netlist, [&](const Instance& instance) {
+            visited.push_back(Support::Text(instance.GetName()));
+        });
+        EXPECT_EQ(visited, expected);
+    }
+}
+
+} // namespace

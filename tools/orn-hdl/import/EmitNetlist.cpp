@@ -1,0 +1,213 @@
+#include "import/EmitNetlist.h"
+
+#include "import/SignalReferences.h"
+#include "import/Spelling.h"
+#include "import/Values.h"
+
+#include <cstddef>
+#include <string>
+
+namespace Tool::Import {
+
+namespace {
+
+class NetlistEmitter {
+public:
+    NetlistEmitter(const ImportedNetlist& netlist, Sink& sink)
+        : netlist_(netlist), top_(netlist.top), owners_(netlist.owners),
+          references_(netlist.top, netlist.owners, netlist.unknown), sink_(sink) {}
+
+    void Emit();
+
+private:
+    void EmitComponents();
+    void EmitSignals();
+    void EmitConstantSignal(Bit bit, const char* value);
+    void EmitPortBits(const ImportedSignal& signal, std::uint32_t index);
+    void EmitPortConstant(const ImportedSignal& signal, std::uint32_t& left);
+    void EmitAlias(const ImportedSignal& signal, std::uint32_t& left);
+    void EmitCell(std::size_t index);
+    void EmitConnection(const std::string& cell, const ImportedPin& pin, std::uint32_t index);
+    void EmitAttributes();
+    template <class Add> void ForEachAttribute(const Span& attributes, Add add) const;
+
+    const ImportedNetlist& netlist_;
+    const Module& top_;
+    const BitOwners& owners_;
+    const SignalReferences references_;
+    Sink& sink_;
+};
+
+void NetlistEmitter::Emit() {
+    sink_.SetName(netlist_.name);
+    // The leaf cells need not have configurations.
+    sink_.SuppressConfiguration();
+    if (netlist_.hasOpenInputs) {
+        sink_.WireOpenPins();
+    }
+    EmitComponents();
+    EmitSignals();
+    sink_.BeginGroup();
+    for (std::size_t c = 0; c < top_.cells.size(); ++c) {
+        EmitCell(c);
+    }
+    EmitAttributes();
+}
+
+void NetlistEmitter::EmitComponents() {
+    for (const ImportedComponent& component : netlist_.components.GetAll()) {
+        sink_.BeginGroup();
+        sink_.AddComponent(component.name);
+        for (const ImportedPin& pin : component.pins) {
+            sink_.AddPin(component.name, pin.name, GetDirectionName(pin.direction));
+        }
+        for (const ImportedGeneric& generic : component.generics) {
+            sink_.AddComponentGeneric(component.name, generic.value);
+        }
+    }
+}
+
+void NetlistEmitter::EmitSignals() {
+    sink_.BeginGroup();
+    for (const ImportedSignal& signal : owners_.GetSignals()) {
+        if (signal.port != nullptr) {
+            sink_.AddPort(GetFullName(signal), GetDirectionName(signal.port->direction));
+        }
+    }
+    sink_.BeginGroup();
+    for (const ImportedSignal& signal : owners_.GetSignals()) {
+        if (signal.port == nullptr) {
+            sink_.AddSignal(GetFullName(signal));
+        }
+    }
+    EmitConstantSignal(Zero, "0");
+    EmitConstantSignal(One, "1");
+    for (std::uint32_t index = 0; index < top_.ports.size(); ++index) {
+        EmitPortBits(owners_.GetSignals()[index], index);
+    }
+}
+
+void NetlistEmitter::EmitConstantSignal(Bit bit, const char* value) {
+    if (const ImportedSignal* signal = owners_.GetConstant(bit)) {
+        sink_.AssignSignal(signal->name, value);
+    }
+}
+
+/// Connects the bits of a port that the port does not own.
+void NetlistEmitter::EmitPortBits(const ImportedSignal& signal, std::uint32_t index) {
+    for (std::uint32_t left = signal.width; left-- > 0;) {
+        const Bit bit = references_.GetBit(signal.port->bits, left);
+        if (bit == Zero || bit == One) {
+            EmitPortConstant(signal, left);
+        } else if (IsNet(bit) &&
+                   (owners_.Get(bit).signal != index || owners_.Get(bit).position != left)) {
+            EmitAlias(signal, left);
+        }
+    }
+}
+
+/// \param left the leftmost bit of a run of constants; becomes the rightmost one.
+void NetlistEmitter::EmitPortConstant(const ImportedSignal& signal, std::uint32_t& left) {
+    const Span& bits = signal.port->bits;
+    const auto isConstant = [&](std::uint32_t i) {
+        const Bit bit = references_.GetBit(bits, i);
+        return bit == Zero || bit == One;
+    };
+    const std::uint32_t start = left;
+    while (left > 0 && isConstant(left - 1)) {
+        --left;
+    }
+    const Span run{bits.start + left, start - left + 1};
+    const bool bare = run.count == 1 && (signal.IsScalar() || signal.width > 1);
+    sink_.AssignSignal(GetPartName(signal, start, left),
+                       MakeConstant(references_.GetDigits(run), bare));
+}
+
+/// \param left the leftmost bit of a run with neighbouring owners; becomes the rightmost one.
+void NetlistEmitter::EmitAlias(const ImportedSignal& signal, std::uint32_t& left) {
+    const Span& bits = signal.port->bits;
+    const std::uint32_t start = left;
+    const BitOwner first = owners_.Get(references_.GetBit(bits, left));
+    BitOwner last = first;
+    while (left > 0) {
+        const Bit next = references_.GetBit(bits, left - 1);
+        if (!IsNet(next) || owners_.Get(next).signal != first.signal ||
+            owners_.Get(next).position + 1 != last.position) {
+            break;
+        }
+        last = owners_.Get(next);
+        --left;
+    }
+    const std::string own = GetPartName(signal, start, left);
+    const std::string owner =
+        GetPartName(owners_.GetSignals()[first.signal], first.position, last.position);
+    // An input port does not own a bit only when an inout port has the bit too.
+    const bool drives = signal.port->direction == Direction::Input;
+    sink_.Alias(drives ? owner : own, drives ? own : owner);
+}
+
+void NetlistEmitter::EmitCell(std::size_t index) {
+    const Cell& cell = top_.cells[index];
+    const ImportedComponent& component = netlist_.components.GetOf(index);
+    const std::string& name = netlist_.cellNames[index];
+    sink_.AddInstance(name, component.name);
+    for (std::uint32_t k = 0; k < cell.connections.count; ++k) {
+        const std::uint32_t connection = cell.connections.start + k;
+        EmitConnection(name, component.GetPin(top_.connections[connection].pin), connection);
+    }
+    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+        const NamedValue& value = top_.values[cell.parameters.start + i];
+        const std::string& generic = component.GetGeneric(value.name).value.name;
+        sink_.AddInstanceGeneric(name, MakeGeneric(generic, value.value, netlist_.unknown));
+    }
+}
+
+void NetlistEmitter::EmitConnection(const std::string& cell, const ImportedPin& pin,
+                                    std::uint32_t index) {
+    const Span& bits = top_.connections[index].bits;
+    switch (netlist_.connections[index]) {
+    case ConnectionKind::Open:
+        break;
+    case ConnectionKind::Constant:
+        sink_.AssignPin(cell, pin.name, MakeConstant(references_.GetDigits(bits), pin.scalar));
+        break;
+    case ConnectionKind::Signal:
+        sink_.Connect(references_.GetReference(bits), cell, pin.name);
+        break;
+    }
+}
+
+template <class Add> void NetlistEmitter::ForEachAttribute(const Span& attributes, Add add) const {
+    for (std::uint32_t i = 0; i < attributes.count; ++i) {
+        const NamedValue& value = top_.values[attributes.start + i];
+        add(MakeAttribute(netlist_.attributeNames.at(value.name), value.value));
+    }
+}
+
+void NetlistEmitter::EmitAttributes() {
+    if (netlist_.attributeNames.empty()) {
+        return;
+    }
+    sink_.BeginGroup();
+    for (const ImportedSignal& signal : owners_.GetSignals()) {
+        if (signal.net != nullptr) {
+            const std::string name = GetFullName(signal);
+            ForEachAttribute(signal.net->attributes, [&](const TypedValue& value) {
+                sink_.AddSignalAttribute(name, value);
+            });
+        }
+    }
+    for (std::size_t c = 0; c < top_.cells.size(); ++c) {
+        ForEachAttribute(top_.cells[c].attributes, [&](const TypedValue& value) {
+            sink_.AddInstanceAttribute(netlist_.cellNames[c], value);
+        });
+    }
+}
+
+} // namespace
+
+void EmitNetlist(const ImportedNetlist& netlist, Sink& sink) {
+    NetlistEmitter(netlist, sink).Emit();
+}
+
+} // namespace Tool::Import

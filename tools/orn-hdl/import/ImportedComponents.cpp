@@ -1,0 +1,275 @@
+#include "import/ImportedComponents.h"
+
+#include "import/LegalNames.h"
+#include "import/Spelling.h"
+#include "import/Values.h"
+
+#include <algorithm>
+#include <cstddef>
+#include <iterator>
+#include <map>
+#include <utility>
+
+namespace Tool::Import {
+
+namespace {
+
+/// The differences of a component from others of its type, as sorted numbers: `PinKey` for pins
+/// whose width is not the type's (for all pins of a type that is split by pins), then
+/// `ParameterKey` for parameters that other cells lack and that have no default. Only what the cell
+/// itself has takes part, so that many different cells of one type cost no more than their own
+/// sizes.
+using Variant = std::vector<std::uint64_t>;
+
+constexpr std::uint64_t PinKey(std::uint32_t pin, std::uint32_t width) noexcept {
+    return std::uint64_t(pin) << 32 | width;
+}
+
+constexpr std::uint64_t ParameterBit = std::uint64_t(1) << 63;
+
+constexpr std::uint64_t ParameterKey(std::uint32_t parameter) noexcept {
+    return ParameterBit | parameter;
+}
+
+constexpr std::uint32_t GetPinOf(std::uint64_t key) noexcept {
+    return static_cast<std::uint32_t>(key >> 32);
+}
+
+/// The lower half of a key: a pin's width or a parameter's index.
+constexpr std::uint32_t GetNumberOf(std::uint64_t key) noexcept {
+    return static_cast<std::uint32_t>(key);
+}
+
+class ComponentFinder {
+public:
+    ComponentFinder(const ImportedDesign& design, const Module& top,
+                    const std::vector<TypeUse>& types, const UnknownValues& unknown,
+                    Warnings& warnings)
+        : design_(design), top_(top), types_(types), unknown_(unknown), warnings_(warnings),
+          variants_(types.size()) {}
+
+    std::uint32_t GetOrAdd(const Cell& cell);
+    std::vector<ImportedComponent>& GetComponents() noexcept { return components_; }
+
+private:
+    Variant GetVariant(const TypeUse& type, const Cell& cell) const;
+    void Add(std::uint32_t index, const Variant& variant, const Cell& cell);
+    void AddPins(ImportedComponent& component, std::uint32_t type, const Variant& variant);
+    void AddPin(ImportedComponent& component, const std::vector<TypePin>& pins,
+                std::uint32_t typePin, std::uint32_t width);
+    void AddGenerics(ImportedComponent& component, const TypeUse& type, const Variant& variant);
+    void AddGeneric(ImportedComponent& component, const TypeUse& type,
+                    const TypeUse::Parameter& parameter);
+    void NameParts(ImportedComponent& component, const TypeUse& type);
+    void ClaimSimilar(UniqueNames& scope, const ImportedComponent& component, std::string_view part,
+                      std::string_view oldName, std::string& name);
+
+    const ImportedDesign& design_;
+    const Module& top_;
+    const std::vector<TypeUse>& types_;
+    const UnknownValues& unknown_;
+    Warnings& warnings_;
+    std::vector<ImportedComponent> components_;
+    /// The components of each type.
+    std::vector<std::map<Variant, std::uint32_t>> variants_;
+};
+
+std::uint32_t ComponentFinder::GetOrAdd(const Cell& cell) {
+    const Variant variant = GetVariant(types_[cell.type], cell);
+    const auto [place, isNew] =
+        variants_[cell.type].try_emplace(variant, static_cast<std::uint32_t>(components_.size()));
+    if (isNew) {
+        Add(cell.type, variant, cell);
+    }
+    return place->second;
+}
+
+Variant ComponentFinder::GetVariant(const TypeUse& type, const Cell& cell) const {
+    Variant variant;
+    for (std::uint32_t i = 0; i < cell.connections.count; ++i) {
+        const Connection& connection = top_.connections[cell.connections.start + i];
+        const std::uint32_t usual = type.pins[connection.pin].width;
+        const std::uint32_t width = connection.bits.count > 0 ? connection.bits.count : usual;
+        if (type.splitsByPins || width != usual) {
+            variant.push_back(PinKey(connection.pin, width));
+        }
+    }
+    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+        const std::string_view name = top_.values[cell.parameters.start + i].name;
+        const std::uint32_t index = type.parameterIndex.find(name)->second;
+        if (type.IsPartial(type.parameters[index])) {
+            variant.push_back(ParameterKey(index));
+        }
+    }
+    std::sort(variant.begin(), variant.end());
+    variant.erase(std::unique(variant.begin(), variant.end()), variant.end());
+    return variant;
+}
+
+void ComponentFinder::Add(std::uint32_t index, const Variant& variant, const Cell& cell) {
+    const TypeUse& type = types_[index];
+    ImportedComponent& component = components_.emplace_back();
+    component.oldName = design_.types[index].name;
+    component.firstCell = &cell;
+    component.splitByPins = type.splitsByPins;
+    AddPins(component, index, variant);
+    AddGenerics(component, type, variant);
+    NameParts(component, type);
+}
+
+void ComponentFinder::AddPins(ImportedComponent& component, std::uint32_t type,
+                              const Variant& variant) {
+    const std::vector<TypePin>& pins = design_.types[type].pins;
+    auto key = variant.begin();
+    const auto isPin = [&] { return key != variant.end() && *key < ParameterBit; };
+    if (component.splitByPins) {
+        for (; isPin(); ++key) {
+            AddPin(component, pins, GetPinOf(*key), GetNumberOf(*key));
+        }
+        return;
+    }
+    for (std::uint32_t pin = 0; pin < pins.size(); ++pin) {
+        const bool differs = isPin() && GetPinOf(*key) == pin;
+        AddPin(component, pins, pin, differs ? GetNumberOf(*key++) : types_[type].pins[pin].width);
+    }
+}
+
+void ComponentFinder::AddPin(ImportedComponent& component, const std::vector<TypePin>& pins,
+                             std::uint32_t typePin, std::uint32_t width) {
+    ImportedPin& pin = component.pins.emplace_back();
+    pin.oldName = pins[typePin].name;
+    pin.typePin = typePin;
+    pin.direction = pins[typePin].direction;
+    pin.width = width;
+    if (pin.direction == Direction::Unspecified) {
+        warnings_.Add(top_.GetPath("cells", component.firstCell->name).AddKey("port_directions"),
+                      "nothing tells the direction of pin \"" + std::string(pin.oldName) +
+                          "\"; taken for inout");
+        pin.direction = Direction::InOut;
+    }
+}
+
+void ComponentFinder::AddGenerics(ImportedComponent& component, const TypeUse& type,
+                                  const Variant& variant) {
+    std::vector<std::uint32_t> parameters = type.commonParameters;
+    const auto common = static_cast<std::ptrdiff_t>(parameters.size());
+    const auto own = std::lower_bound(variant.begin(), variant.end(), ParameterBit);
+    std::transform(own, variant.end(), std::back_inserter(parameters), GetNumberOf);
+    std::inplace_merge(parameters.begin(), parameters.begin() + common, parameters.end());
+    for (const std::uint32_t index : parameters) {
+        AddGeneric(component, type, type.parameters[index]);
+    }
+}
+
+void ComponentFinder::AddGeneric(ImportedComponent& component, const TypeUse& type,
+                                 const TypeUse::Parameter& parameter) {
+    component.genericIndex.emplace(parameter.name,
+                                   static_cast<std::uint32_t>(component.generics.size()));
+    ImportedGeneric& generic = component.generics.emplace_back();
+    generic.oldName = parameter.name;
+    Place place = top_.GetPlace(*component.firstCell, "parameters", parameter.name);
+    const Value* value = parameter.first;
+    if (type.NeedsDefault(parameter) && parameter.defaultValue != nullptr) {
+        value = parameter.defaultValue;
+        place = Place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
+    }
+    CheckParameter(*value, place, unknown_, warnings_);
+    generic.value = MakeGeneric("", *value, unknown_);
+}
+
+void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& type) {
+    // In VHDL, pins and generics share the scope of the component.
+    UniqueNames scope;
+    const auto claimUnchanged = [&](std::string_view oldName, std::string& name) {
+        if (IsLegalName(oldName) && scope.Claim(oldName)) {
+            name = oldName;
+        }
+    };
+    for (ImportedPin& pin : component.pins) {
+        claimUnchanged(pin.oldName, pin.baseName);
+    }
+    for (ImportedGeneric& generic : component.generics) {
+        claimUnchanged(generic.oldName, generic.value.name);
+    }
+    for (ImportedPin& pin : component.pins) {
+        ClaimSimilar(scope, component, "connections", pin.oldName, pin.baseName);
+    }
+    for (ImportedGeneric& generic : component.generics) {
+        ClaimSimilar(scope, component, "parameters", generic.oldName, generic.value.name);
+    }
+    for (ImportedPin& pin : component.pins) {
+        const ModulePort* port = type.pins[pin.typePin].port;
+        const BitRange range = Normalize(port == nullptr ? BitRange() : port->range, pin.width);
+        pin.scalar = pin.width == 1 && range.offset == 0;
+        pin.name = pin.scalar ? pin.baseName
+                              : MakeBusName(pin.baseName, GetIndex(range, pin.width, pin.width - 1),
+                                            GetIndex(range, pin.width, 0));
+    }
+}
+
+/// Gives a pin or generic that could not keep its name another one.
+void ComponentFinder::ClaimSimilar(UniqueNames& scope, const ImportedComponent& component,
+                                   std::string_view part, std::string_view oldName,
+                                   std::string& name) {
+    if (name.empty()) {
+        name = scope.ClaimSimilar(oldName, 'p');
+        warnings_.Add(top_.GetPlace(*component.firstCell, part, oldName).ToPath(),
+                      "no name in both languages; of component \"" +
+                          std::string(component.oldName) + "\" called " + name);
+    }
+}
+
+/// Why a component could not keep the name of its type.
+const char* GetReason(const ImportedComponent& component) {
+    if (!IsLegalName(component.oldName)) {
+        return "no name in both languages";
+    }
+    return component.splitByPins
+               ? "the cells of the type have few pins in common"
+               : "other cells of the type have pins of other widths, or parameters whose default "
+                 "is not told";
+}
+
+void NameComponents(std::vector<ImportedComponent>& components, const Module& top,
+                    UniqueNames& names, Warnings& warnings) {
+    for (ImportedComponent& component : components) {
+        if (IsLegalName(component.oldName) && names.Claim(component.oldName)) {
+            component.name = component.oldName;
+        }
+    }
+    for (ImportedComponent& component : components) {
+        if (component.name.empty()) {
+            component.name = names.ClaimSimilar(component.oldName, 'c');
+            warnings.Add(top.GetPath("cells", component.firstCell->name).AddKey("type"),
+                         std::string(GetReason(component)) + "; this component is called " +
+                             component.name);
+        }
+    }
+}
+
+} // namespace
+
+const ImportedPin& ImportedComponent::GetPin(std::uint32_t typePin) const {
+    if (!splitByPins) {
+        return pins[typePin];
+    }
+    return *std::lower_bound(
+        pins.begin(), pins.end(), typePin,
+        [](const ImportedPin& pin, std::uint32_t wanted) { return pin.typePin < wanted; });
+}
+
+ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
+                                  const UnknownValues& unknown, UniqueNames& names,
+                                  Warnings& warnings) {
+    const std::vector<TypeUse> types = CountTypeUses(design, top, warnings);
+    ComponentFinder finder(design, top, types, unknown, warnings);
+    std::vector<std::uint32_t> componentOf;
+    componentOf.reserve(top.cells.size());
+    for (const Cell& cell : top.cells) {
+        componentOf.push_back(finder.GetOrAdd(cell));
+    }
+    NameComponents(finder.GetComponents(), top, names, warnings);
+    return ImportedComponents(std::move(finder.GetComponents()), std::move(componentOf));
+}
+
+} // namespace Tool::Import

@@ -1,0 +1,89 @@
+// The components whose instances the cells of an imported design become.
+#pragma once
+
+#include "import/ImportedDesign.h"
+#include "import/Sink.h"
+#include "import/TypeUses.h"
+#include "import/UniqueNames.h"
+#include "import/UnknownValues.h"
+#include "import/Warnings.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <utility>
+#include <vector>
+
+namespace Tool::Import {
+
+struct ImportedPin {
+    std::string_view oldName;
+    /// Its index in the pins of the type.
+    std::uint32_t typePin = 0;
+    /// Without the range.
+    std::string baseName;
+    /// With the range, if the pin has one.
+    std::string name;
+    Direction direction = Direction::InOut;
+    std::uint32_t width = 1;
+    bool scalar = true;
+};
+
+struct ImportedGeneric {
+    std::string_view oldName;
+    /// With the value for cells that have none of their own.
+    TypedValue value;
+};
+
+struct ImportedComponent {
+    std::string_view oldName;
+    /// The first cell that needs it.
+    const Cell* firstCell = nullptr;
+    std::string name;
+    /// Whether it only has the pins of the cells that need it.
+    bool splitByPins = false;
+    /// In the order of the type's pins.
+    std::vector<ImportedPin> pins;
+    std::vector<ImportedGeneric> generics;
+    std::unordered_map<std::string_view, std::uint32_t> genericIndex;
+
+    /// A pin, by its index in the pins of the type.
+    const ImportedPin& GetPin(std::uint32_t typePin) const;
+    /// A generic, by the name of the parameter.
+    const ImportedGeneric& GetGeneric(std::string_view parameter) const {
+        return generics[genericIndex.find(parameter)->second];
+    }
+};
+
+/// One component for each type of cell, and further ones where cells of one type differ in the
+/// widths of their pins, or in parameters whose default is not in the file, or have few pins in
+/// common.
+class ImportedComponents {
+public:
+    /// \param components those that the cells need, in the order of the first cell that needs them.
+    /// \param componentOf the component of each cell, by its index.
+    ImportedComponents(std::vector<ImportedComponent> components,
+                       std::vector<std::uint32_t> componentOf) noexcept
+        : components_(std::move(components)), componentOf_(std::move(componentOf)) {}
+
+    const std::vector<ImportedComponent>& GetAll() const noexcept { return components_; }
+    const ImportedComponent& GetOf(std::size_t cell) const {
+        return components_[componentOf_[cell]];
+    }
+
+private:
+    std::vector<ImportedComponent> components_;
+    std::vector<std::uint32_t> componentOf_;
+};
+
+/// Checks the cells of the top module against the leaf modules of the design, and makes and names
+/// their components.
+/// \param names the scope that components share with instances and signals.
+/// \throws Error when a cell has contents, or does not fit its leaf module.
+ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
+                                  const UnknownValues& unknown, UniqueNames& names,
+                                  Warnings& warnings);
+
+} // namespace Tool::Import

@@ -1,0 +1,90 @@
+#include "import/ImportedNetlist.h"
+
+#include "import/BitUses.h"
+#include "import/NetlistConnections.h"
+#include "import/NetlistNames.h"
+#include "import/UniqueNames.h"
+#include "import/Values.h"
+
+#include <cstddef>
+#include <utility>
+
+namespace Tool::Import {
+
+namespace {
+
+/// Whether a bit of a pin drives nothing and nothing is driven by it, although it is a constant.
+bool IsOpenConstant(const ImportedPin& pin, Bit bit) noexcept {
+    return pin.direction == Direction::Output
+               ? !IsNet(bit)
+               : pin.direction == Direction::InOut && bit == HighImpedance;
+}
+
+void OpenConstants(Module& top, const Cell& cell, const ImportedPin& pin, const Span& bits,
+                   Warnings& warnings) {
+    for (std::uint32_t i = 0; i < bits.count; ++i) {
+        Bit& bit = top.bits[bits.start + i];
+        if (!IsOpenConstant(pin, bit)) {
+            continue;
+        }
+        if (bit < Unknown) {
+            warnings.Add(top.GetPinPath(cell, pin.oldName).AddIndex(i),
+                         "an output pin stands at a constant; left open");
+        }
+        bit = top.netBits++;
+    }
+}
+
+/// Gives each constant at an output pin, which drives nothing, a net bit of its own.
+void OpenConstantOutputs(Module& top, const ImportedComponents& components, Warnings& warnings) {
+    for (std::size_t c = 0; c < top.cells.size(); ++c) {
+        const Cell& cell = top.cells[c];
+        for (std::uint32_t k = 0; k < cell.connections.count; ++k) {
+            const Connection& connection = top.connections[cell.connections.start + k];
+            OpenConstants(top, cell, components.GetOf(c).GetPin(connection.pin), connection.bits,
+                          warnings);
+        }
+    }
+}
+
+void WarnOfModule(const Module& top, Warnings& warnings) {
+    if (top.hasMemories) {
+        warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("memories"),
+                     "memories are not imported; map them to cells first");
+    }
+    if (top.ports.empty()) {
+        warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("ports"),
+                     "VHDL does not allow a design without ports");
+    }
+}
+
+void CheckParameters(const Module& top, const UnknownValues& unknown, Warnings& warnings) {
+    for (const Cell& cell : top.cells) {
+        for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+            const NamedValue& value = top.values[cell.parameters.start + i];
+            CheckParameter(value.value, top.GetPlace(cell, "parameters", value.name), unknown,
+                           warnings);
+        }
+    }
+}
+
+} // namespace
+
+ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const UnknownValues& unknown,
+                            Warnings& warnings) {
+    UniqueNames names;
+    ImportedComponents components = FindComponents(design, top, unknown, names, warnings);
+    OpenConstantOutputs(top, components, warnings);
+    const BitUses uses = BitUses::Count(top, components, unknown);
+    BitOwners owners = BitOwners::Choose(top, uses, warnings);
+    WarnOfModule(top, warnings);
+    CheckParameters(top, unknown, warnings);
+    ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
+    NameDesign(netlist, names, warnings);
+    NameCellsAndSignals(netlist, names);
+    DecideConnections(netlist, uses, names);
+    NameAttributes(netlist, names, warnings);
+    return netlist;
+}
+
+} // namespace Tool::Import

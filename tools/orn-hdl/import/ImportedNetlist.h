@@ -1,0 +1,45 @@
+// One imported netlist: every name and every connection is decided.
+#pragma once
+
+#include "import/BitOwners.h"
+#include "import/ImportedComponents.h"
+#include "import/ImportedDesign.h"
+#include "import/UnknownValues.h"
+#include "import/Warnings.h"
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+namespace Tool::Import {
+
+/// How a pin is connected: not at all, to a constant of its own, or to a signal.
+enum class ConnectionKind : std::uint8_t { Open, Constant, Signal };
+
+/// The design must outlive it.
+struct ImportedNetlist {
+    const Module& top;
+    UnknownValues unknown;
+    ImportedComponents components;
+    BitOwners owners;
+    std::string name;
+    /// By the index of the cell.
+    std::vector<std::string> cellNames;
+    /// The new name of each attribute.
+    std::unordered_map<std::string_view, std::string> attributeNames;
+    /// By the index of the connection.
+    std::vector<ConnectionKind> connections;
+    /// Whether an input pin of some cell is open.
+    bool hasOpenInputs = false;
+};
+
+/// Decides everything, and so finds all errors before anything is written. In the design, constants
+/// at output pins are replaced by net bits.
+/// \param top a module of the design.
+/// \throws Error when the design cannot be imported.
+ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const UnknownValues& unknown,
+                            Warnings& warnings);
+
+} // namespace Tool::Import

@@ -1,0 +1,45 @@
+// Builds an imported design in a model.
+#pragma once
+
+#include "import/Sink.h"
+
+#include <string>
+
+namespace Orn_Hdl {
+class Model;
+}
+
+namespace Tool::Import {
+
+/// Builds the design in a model.
+class ModelSink final : public Sink {
+public:
+    /// \param model not owned; it must outlive the sink.
+    explicit ModelSink(Orn_Hdl::Model& model) noexcept : model_(model) {}
+
+    void BeginGroup() override {}
+    void SetName(const std::string& name) override;
+    void SuppressConfiguration() override;
+    void WireOpenPins() override;
+    void AddComponent(const std::string& name) override;
+    void AddPin(const std::string& component, const std::string& pin,
+                const char* direction) override;
+    void AddComponentGeneric(const std::string& component, const TypedValue& generic) override;
+    void AddPort(const std::string& name, const char* direction) override;
+    void AddSignal(const std::string& name) override;
+    void Alias(const std::string& target, const std::string& source) override;
+    void AssignSignal(const std::string& signal, const std::string& value) override;
+    void AddSignalAttribute(const std::string& signal, const TypedValue& attribute) override;
+    void AddInstance(const std::string& name, const std::string& component) override;
+    void AddInstanceGeneric(const std::string& instance, const TypedValue& generic) override;
+    void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) override;
+    void Connect(const std::string& signal, const std::string& instance,
+                 const std::string& pin) override;
+    void AssignPin(const std::string& instance, const std::string& pin,
+                   const std::string& value) override;
+
+private:
+    Orn_Hdl::Model& model_;
+};
+
+} // namespace Tool::Import

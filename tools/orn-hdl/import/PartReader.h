@@ -1,0 +1,59 @@
+// Reads the small parts that ports, nets and cells consist of.
+#pragma once
+
+#include "import/BitNumbers.h"
+#include "import/ImportedDesign.h"
+#include "import/JsonWalker.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <memory_resource>
+#include <string_view>
+#include <unordered_set>
+
+namespace Tool::Import {
+
+/// All functions fail with the place of a part that is not of the expected form.
+class PartReader {
+public:
+    /// \param fileSize bounds the bit numbers that a program writes into such a file.
+    PartReader(ImportedDesign& design, JsonWalker& walker, std::size_t fileSize)
+        : design_(design), walker_(walker), bitNumbers_(fileSize) {}
+
+    /// Begins a module, whose bits have indices of their own.
+    void StartModule() { bitNumbers_.StartModule(); }
+    /// The number of net bits that the present module has.
+    std::uint32_t CountNetBits() const noexcept { return bitNumbers_.GetCount(); }
+
+    Direction ReadDirection(JsonValue& value);
+    /// \return false, with nothing read, when `key` is no part of a range.
+    bool ReadRange(std::string_view key, JsonValue& value, BitRange& range);
+    Span ReadBits(Module& module, JsonValue& value);
+    /// The value of a parameter or attribute. A text of the digits 0, 1, x and z is a bit vector. A
+    /// text that would look like one is followed by one blank more than it contains.
+    Value ReadValue(JsonValue& value);
+    Span ReadValues(Module& module, JsonValue& value);
+
+    /// Calls `visit` with the name, kept in the design, and the value of each field. Fails when a
+    /// name occurs twice.
+    template <class Visit> void ForEachNamed(JsonValue& value, Visit visit) {
+        std::pmr::monotonic_buffer_resource memory;
+        std::pmr::unordered_set<std::string_view> names(&memory);
+        walker_.ForEachField(value, [&](std::string_view name, JsonValue& member) {
+            const std::string_view kept = design_.Keep(name);
+            if (!names.insert(kept).second) {
+                walker_.Fail("the name occurs twice");
+            }
+            visit(kept, member);
+        });
+    }
+
+private:
+    Bit ReadBit(JsonValue& value);
+
+    ImportedDesign& design_;
+    JsonWalker& walker_;
+    BitNumbers bitNumbers_;
+};
+
+} // namespace Tool::Import

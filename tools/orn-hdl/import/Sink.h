@@ -1,0 +1,51 @@
+// Where an imported design goes. A model and a command file get the same sequence of operations, so
+// that the command file, replayed, gives the same netlist.
+#pragma once
+
+#include <string>
+
+namespace Tool::Import {
+
+/// An attribute of a given type, as the command language spells both.
+struct TypedValue {
+    std::string name;
+    std::string type;
+    std::string value;
+};
+
+class Sink {
+public:
+    Sink() = default;
+    Sink(const Sink&) = delete;
+    Sink& operator=(const Sink&) = delete;
+    virtual ~Sink() = default;
+
+    /// Begins a new group of operations.
+    virtual void BeginGroup() = 0;
+    virtual void SetName(const std::string& name) = 0;
+    virtual void SuppressConfiguration() = 0;
+    /// VHDL gets a signal for every open input pin.
+    virtual void WireOpenPins() = 0;
+
+    virtual void AddComponent(const std::string& name) = 0;
+    virtual void AddPin(const std::string& component, const std::string& pin,
+                        const char* direction) = 0;
+    virtual void AddComponentGeneric(const std::string& component, const TypedValue& generic) = 0;
+
+    virtual void AddPort(const std::string& name, const char* direction) = 0;
+    virtual void AddSignal(const std::string& name) = 0;
+    /// The source drives the target.
+    virtual void Alias(const std::string& target, const std::string& source) = 0;
+    virtual void AssignSignal(const std::string& signal, const std::string& value) = 0;
+    virtual void AddSignalAttribute(const std::string& signal, const TypedValue& attribute) = 0;
+
+    virtual void AddInstance(const std::string& name, const std::string& component) = 0;
+    virtual void AddInstanceGeneric(const std::string& instance, const TypedValue& generic) = 0;
+    virtual void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) = 0;
+    virtual void Connect(const std::string& signal, const std::string& instance,
+                         const std::string& pin) = 0;
+    virtual void AssignPin(const std::string& instance, const std::string& pin,
+                           const std::string& value) = 0;
+};
+
+} // namespace Tool::Import

@@ -1,0 +1,18 @@
+// Which modules of a design are which.
+#pragma once
+
+#include "import/ImportedDesign.h"
+
+#include <string_view>
+
+namespace Tool::Import {
+
+/// The module to import: the named one, or, when `name` is empty, the one marked as top, or the
+/// only one that is no black box.
+/// \throws Error when there is none, or more than one.
+Module& FindTop(ImportedDesign& design, std::string_view name);
+
+/// Whether a module is a leaf: marked as a black box, or without contents.
+bool IsLeaf(const Module& module);
+
+} // namespace Tool::Import

@@ -1,0 +1,199 @@
+#include "import/TypeUses.h"
+
+#include "import/TopModule.h"
+
+#include <algorithm>
+#include <string>
+
+namespace Tool::Import {
+
+namespace {
+
+bool LooksReal(const Value& value) noexcept {
+    return value.kind == Value::Text && value.text.find('.') != std::string_view::npos &&
+           value.text.find_first_not_of("0123456789.+-eE") == std::string_view::npos;
+}
+
+bool MayBeInteger(const Value& value) noexcept {
+    return value.kind == Value::Bits && value.text.size() == 32;
+}
+
+/// Types with more open pins for each connection are split by the pins that cells have.
+constexpr std::uint64_t MostPinsPerConnection = 8;
+/// So many pins of instances are no burden, open or not.
+constexpr std::uint64_t FewPins = 65536;
+
+void AppendName(std::string& list, std::string_view name) {
+    list.append(list.empty() ? "" : ", ").append(name);
+}
+
+class TypeUseCounter {
+public:
+    TypeUseCounter(ImportedDesign& design, const Module& top)
+        : design_(design), top_(top), uses_(design.types.size()) {
+        for (const Module& module : design.modules) {
+            modules_.emplace(module.name, &module);
+        }
+    }
+
+    void CountCell(const Cell& cell);
+    std::vector<TypeUse>& GetUses() noexcept { return uses_; }
+
+private:
+    void FindLeaf(std::uint32_t index, const Cell& firstCell);
+    static void AddLeaf(TypeUse& type, CellType& cellType, const Module& leaf);
+    void CountPins(TypeUse& type, const Cell& cell);
+    void CountParameters(TypeUse& type, const Cell& cell);
+
+    ImportedDesign& design_;
+    const Module& top_;
+    std::vector<TypeUse> uses_;
+    std::unordered_map<std::string_view, const Module*> modules_;
+};
+
+void TypeUseCounter::CountCell(const Cell& cell) {
+    TypeUse& type = uses_[cell.type];
+    if (++type.cells == 1) {
+        FindLeaf(cell.type, cell);
+        type.pins.resize(design_.types[cell.type].pins.size());
+    }
+    CountPins(type, cell);
+    CountParameters(type, cell);
+}
+
+void TypeUseCounter::FindLeaf(std::uint32_t index, const Cell& firstCell) {
+    TypeUse& type = uses_[index];
+    CellType& cellType = design_.types[index];
+    type.firstCell = &firstCell;
+    const auto module = modules_.find(cellType.name);
+    if (module == modules_.end()) {
+        return;
+    }
+    if (!IsLeaf(*module->second)) {
+        Fail(top_.GetPath("cells", firstCell.name).AddKey("type"),
+             "\"" + std::string(cellType.name) +
+                 "\" is a module with contents; flatten the design first");
+    }
+    AddLeaf(type, cellType, *module->second);
+}
+
+void TypeUseCounter::AddLeaf(TypeUse& type, CellType& cellType, const Module& leaf) {
+    type.leaf = &leaf;
+    for (const ModulePort& port : leaf.ports) {
+        const std::uint32_t pin = cellType.GetOrAddPin(port.name);
+        cellType.pins[pin].direction = port.direction;
+        type.pins.resize(cellType.pins.size());
+        type.pins[pin].port = &port;
+        type.pins[pin].width = port.bits.count;
+    }
+    for (const NamedValue& value : leaf.defaults) {
+        TypeUse::Parameter& parameter = type.parameters.emplace_back();
+        parameter.name = value.name;
+        parameter.defaultValue = &value.value;
+        type.parameterIndex.emplace(value.name,
+                                    static_cast<std::uint32_t>(type.parameters.size() - 1));
+    }
+}
+
+void TypeUseCounter::CountPins(TypeUse& type, const Cell& cell) {
+    type.connections += cell.connections.count;
+    for (std::uint32_t i = 0; i < cell.connections.count; ++i) {
+        const Connection& connection = top_.connections[cell.connections.start + i];
+        TypeUse::Pin& pin = type.pins[connection.pin];
+        const std::uint32_t width = connection.bits.count;
+        if (type.leaf != nullptr && pin.port == nullptr) {
+            const CellType& cellType = design_.types[cell.type];
+            Fail(top_.GetPinPath(cell, cellType.pins[connection.pin].name),
+                 "the module \"" + std::string(cellType.name) + "\" has no such port");
+        }
+        if (pin.width == 0) {
+            pin.width = width;
+        }
+    }
+}
+
+void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
+    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+        const NamedValue& value = top_.values[cell.parameters.start + i];
+        const auto [place, isNew] = type.parameterIndex.try_emplace(
+            value.name, static_cast<std::uint32_t>(type.parameters.size()));
+        if (isNew) {
+            type.parameters.emplace_back().name = value.name;
+        }
+        TypeUse::Parameter& parameter = type.parameters[place->second];
+        ++parameter.cells;
+        if (parameter.first == nullptr) {
+            parameter.first = &value.value;
+        }
+        parameter.kindVaries |= parameter.first->kind != value.value.kind;
+    }
+}
+
+/// Decides what the components of a type have in common.
+void CompareCells(TypeUse& type) {
+    for (TypeUse::Pin& pin : type.pins) {
+        pin.width = std::max<std::uint32_t>(pin.width, 1);
+    }
+    for (std::uint32_t i = 0; i < type.parameters.size(); ++i) {
+        const TypeUse::Parameter& parameter = type.parameters[i];
+        if (parameter.cells > 0 && !type.IsPartial(parameter)) {
+            type.commonParameters.push_back(i);
+        }
+    }
+    const std::uint64_t pins = std::uint64_t(type.cells) * type.pins.size();
+    type.splitsByPins =
+        type.leaf == nullptr && pins > FewPins && pins > type.connections * MostPinsPerConnection;
+}
+
+void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& warnings) {
+    std::string integers;
+    std::string reals;
+    std::string mixed;
+    for (const TypeUse::Parameter& parameter : type.parameters) {
+        if (parameter.cells == 0) {
+            continue;
+        }
+        if (MayBeInteger(*parameter.first)) {
+            AppendName(integers, parameter.name);
+        }
+        if (LooksReal(*parameter.first)) {
+            AppendName(reals, parameter.name);
+        }
+        if (parameter.kindVaries) {
+            AppendName(mixed, parameter.name);
+        }
+    }
+    const JsonPath path = top.GetPath("cells", type.firstCell->name).AddKey("parameters");
+    if (!integers.empty()) {
+        warnings.Add(path, "the file does not tell integers from vectors of 32 bits; written as "
+                           "bit vectors: " +
+                               integers);
+    }
+    if (!reals.empty()) {
+        warnings.Add(path,
+                     "the file does not tell real numbers from texts; written as texts: " + reals);
+    }
+    if (!mixed.empty()) {
+        warnings.Add(path, "other cells of the type have values of another kind, which VHDL does "
+                           "not allow: " +
+                               mixed);
+    }
+}
+
+} // namespace
+
+std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top, Warnings& warnings) {
+    TypeUseCounter counter(design, top);
+    for (const Cell& cell : top.cells) {
+        counter.CountCell(cell);
+    }
+    for (TypeUse& type : counter.GetUses()) {
+        CompareCells(type);
+        if (type.cells > 0) {
+            WarnOfAmbiguousValues(type, top, warnings);
+        }
+    }
+    return std::move(counter.GetUses());
+}
+
+} // namespace Tool::Import

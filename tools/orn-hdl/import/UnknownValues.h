@@ -1,0 +1,33 @@
+// The values x and z, which a netlist cannot hold.
+#pragma once
+
+#include "import/ImportedDesign.h"
+
+#include <optional>
+
+namespace Tool::Import {
+
+/// What the user wants x and z to become.
+class UnknownValues {
+public:
+    /// \param replacement `Zero` or `One`; without one, x and z are refused.
+    explicit UnknownValues(std::optional<Bit> replacement) noexcept : replacement_(replacement) {}
+
+    bool HasReplacement() const noexcept { return replacement_.has_value(); }
+    /// The bit itself, or the replacement of x or z.
+    Bit Replace(Bit bit) const noexcept {
+        return bit >= Unknown && replacement_ ? *replacement_ : bit;
+    }
+    bool IsRefused(Bit bit) const noexcept { return bit >= Unknown && !replacement_; }
+    /// Ends the import because of an x or z at `path`.
+    [[noreturn]] static void Refuse(Bit bit, const JsonPath& path) {
+        Fail(path, bit == Unknown
+                       ? "the value x cannot be written; choose another one with --x-as"
+                       : "the value z cannot be written; choose another one with --x-as");
+    }
+
+private:
+    std::optional<Bit> replacement_;
+};
+
+} // namespace Tool::Import
