@@ -14,8 +14,13 @@ namespace Orn_Hdl::Checking {
 
 namespace {
 
-using Writers::IsSingleBit;
 using Writers::RunsAgainstParent;
+
+/// Whether the signal is a scalar signal or a bit of a bus; a bus of one bit is neither.
+bool IsSingleBit(const Signal& signal) {
+    const int type = signal.GetSignalType();
+    return type == SignalTypeScalar || type == SignalTypeBusIndex;
+}
 
 bool HasDirection(const Signal& signal, int direction) {
     return signal.GetPortPolarity().GetValue() == direction;

@@ -157,6 +157,8 @@ public:
 private:
     void CheckModule();
     void CheckSignals(bool ports);
+    void DeclareAll(const Holder& holder);
+    void DeclareOfInstances();
     void CheckComponents();
     void CheckInstances();
     void CheckHolder(const Holder& holder);
@@ -193,7 +195,13 @@ AttributeWalk::AttributeWalk(Context& context)
 
 Finding* AttributeWalk::Add(RuleId rule, const Verdicts& verdicts, const Holder& holder,
                             const Attribute& attribute) {
-    Finding* const finding = context_.Add(rule, verdicts, holder.CauseOf(attribute));
+    Verdicts counted = verdicts;
+    if (attribute.GetGenericOption() == Attribute::GenericNoSyn && rule != RuleId::CommentInValue &&
+        rule != RuleId::HiddenGeneric) {
+        // Yosys does not read what is kept from synthesis.
+        counted.Set(Check::Target::Yosys, Check::Verdict::Accepts);
+    }
+    Finding* const finding = context_.Add(rule, counted, holder.CauseOf(attribute));
     if (finding != nullptr) {
         finding->objects = {holder.object, &attribute};
     }
@@ -248,21 +256,7 @@ void AttributeWalk::CheckSignals(bool ports) {
                 Declare({signal, signal, Kind::SignalAttribute}, *attribute);
             }
         }
-        for (const Component* component : context_.netlist.GetComponentIterator()) {
-            if (context_.used.count(component) == 0) {
-                continue;
-            }
-            for (const Attribute* attribute : component->GetAttrIterator()) {
-                Declare({component, component, Kind::ComponentAttribute}, *attribute);
-            }
-        }
-        for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
-            if (instance->HasAttrs()) {
-                for (const Attribute* attribute : instance->GetAttrIterator()) {
-                    Declare({instance, instance, Kind::InstanceAttribute}, *attribute);
-                }
-            }
-        }
+        DeclareOfInstances();
     }
     for (const Signal* signal : signals) {
         const Holder holder = {signal, signal, Kind::SignalAttribute};
@@ -278,6 +272,38 @@ void AttributeWalk::CheckSignals(bool ports) {
                 CheckValue(holder, *attribute, {false, isInBlockComment_, true, isTyped_});
             }
         }
+    }
+}
+
+void AttributeWalk::DeclareAll(const Holder& holder) {
+    for (const Attribute* attribute : holder.attributes->GetAttrIterator()) {
+        Declare(holder, *attribute);
+    }
+}
+
+/// In the order of the instances' names, each component with its first instance. The order tells
+/// which type is declared, and matters only where types do.
+void AttributeWalk::DeclareOfInstances() {
+    std::vector<const Instance*> instances;
+    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+        const Component* const component = instance->GetComponent();
+        if (instance->HasAttrs() || (component != nullptr && component->HasAttrs())) {
+            instances.push_back(instance);
+        }
+    }
+    if (isTyped_) {
+        std::stable_sort(instances.begin(), instances.end(),
+                         [](const Instance* a, const Instance* b) {
+                             return Names::CompareNatural(a->GetNameView(), b->GetNameView()) < 0;
+                         });
+    }
+    std::unordered_set<const Component*> met;
+    for (const Instance* instance : instances) {
+        const Component* const component = instance->GetComponent();
+        if (component != nullptr && met.insert(component).second) {
+            DeclareAll({component, component, Kind::ComponentAttribute});
+        }
+        DeclareAll({instance, instance, Kind::InstanceAttribute});
     }
 }
 
@@ -409,7 +435,8 @@ void AttributeWalk::CheckNamesOf(const Holder& holder, const Attribute& attribut
     const bool isGeneric = IsGeneric(attribute);
     const bool isSynthesis = IsSynthesis(attribute) && holder.kind != Kind::ModuleAttribute;
     std::string key(attribute.GetNameView());
-    key.push_back(isGeneric ? 'g' : '-');
+    const bool isHidden = attribute.GetGenericOption() == Attribute::GenericNoSyn;
+    key.push_back(isHidden ? 'h' : isGeneric ? 'g' : '-');
     key.push_back(isSynthesis ? 's' : '-');
     if (!checkedNames_.insert(std::move(key)).second) {
         return;
@@ -423,6 +450,7 @@ void AttributeWalk::CheckNamesOf(const Holder& holder, const Attribute& attribut
     use.second = cause.second;
     use.object = &attribute;
     use.isInVerilog = isGeneric;
+    use.isHiddenFromYosys = isHidden;
     CheckName(context_, use);
     if (isSynthesis && IsOneOf(PredefinedAttributes, Lower(attribute.GetNameView()))) {
         if (Finding* finding = Add(RuleId::PredefinedAttribute,

@@ -2,7 +2,7 @@
 
 #include "Check/Bits.h"
 #include "Check/Context.h"
-#include "Writers/InstanceWalk.h"
+#include "Port/Prefetch.h"
 #include "Writers/Text.h"
 
 #include <unordered_set>
@@ -11,8 +11,31 @@ namespace Orn_Hdl::Checking {
 
 namespace {
 
-/// How far ahead the places of signals are asked for.
-constexpr int Lookahead = 3;
+/// How many instances ahead their signals are asked for, and what is known of these.
+constexpr int SignalLead = 6;
+constexpr int UseLead = 3;
+
+/// The pins of an instance some way ahead of the one in hand.
+class Ahead {
+public:
+    Ahead(const Netlist& netlist, int lead) noexcept : instances_(netlist.GetInstanceIterator()) {
+        for (int i = 0; i < lead; ++i) {
+            instances_.Next();
+        }
+    }
+    /// Calls `visit` with each signal, and goes one instance on.
+    template <class Visit> void Step(const Visit& visit) {
+        if (const Instance* const instance = instances_.GetCurrent()) {
+            for (const Pin* pin : instance->GetPinIterator()) {
+                visit(pin->GetSignal());
+            }
+            instances_.Next();
+        }
+    }
+
+private:
+    Iterator<Instance*> instances_;
+};
 
 bool IsInput(int direction) {
     return direction == Polarity::Input;
@@ -75,15 +98,14 @@ Finding* Walk::Add(RuleId rule, const Verdicts& verdicts, const Instance& instan
 }
 
 void Walk::CheckAll() {
-    Writers::InstanceLookahead ahead(context_.netlist, Lookahead);
-    Writers::ForEachInstance(context_.netlist, [this, &ahead](const Instance& instance) {
-        if (const Instance* const coming = ahead.Next()) {
-            for (const Pin* pin : coming->GetPinIterator()) {
-                context_.uses.Prefetch(pin->GetSignal());
-            }
-        }
-        CheckInstance(instance);
-    });
+    // The signals of the pins are spread over the memory of a large design.
+    Ahead far(context_.netlist, SignalLead);
+    Ahead near(context_.netlist, UseLead);
+    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+        far.Step([](const Signal* signal) { Port::Prefetch(signal); });
+        near.Step([this](const Signal* signal) { context_.uses.Prefetch(signal); });
+        CheckInstance(*instance);
+    }
 }
 
 void Walk::CheckInstance(const Instance& instance) {

@@ -23,6 +23,8 @@ struct NameUse {
     const Object* object = nullptr;
     bool isInVerilog = true;
     bool isInVhdl = true;
+    /// Whether Yosys does not read where it is written.
+    bool isHiddenFromYosys = false;
     /// How the Verilog writer spells it.
     CaseType nameCase = HdlOptions::VerilogOption::DEFSULT;
 

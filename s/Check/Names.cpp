@@ -23,7 +23,11 @@ constexpr std::size_t LongestInStandard = 1024;
 
 void AddFinding(Context& context, RuleId rule, const Verdicts& verdicts, const NameUse& use,
                 std::string_view what) {
-    if (Finding* finding = context.Add(rule, verdicts, use.MakeCause())) {
+    Verdicts counted = verdicts;
+    if (use.isHiddenFromYosys) {
+        counted.Set(Check::Target::Yosys, Check::Verdict::Accepts);
+    }
+    if (Finding* finding = context.Add(rule, counted, use.MakeCause())) {
         if (use.object != nullptr) {
             finding->objects = {use.object};
         }

@@ -67,6 +67,7 @@ private:
     void CheckAttributeNames();
     void CheckComponents();
     void CheckHidden();
+    void CheckDesignName();
     void CheckHiddenBy(const Declared& declared);
     void CheckPredefined(string_view name);
     void CheckComments();
@@ -312,6 +313,7 @@ void Scopes::CheckHidden() {
                                    string_view("kestra"), string_view("work")}) {
         ForEachInScope(name, {}, [this](const Declared& declared) { CheckHiddenBy(declared); });
     }
+    CheckDesignName();
     context_.usedTypes.insert("std_logic");
     context_.usedTypes.insert("std_logic_vector");
     for (const std::string& name : context_.usedTypes) {
@@ -324,6 +326,27 @@ void Scopes::CheckHidden() {
             }
         });
         CheckPredefined(name);
+    }
+}
+
+/// The entity's own name hides types, and cannot be that of a library which a clause names.
+void Scopes::CheckDesignName() {
+    const std::string name = Lower(netlist_.GetNameView());
+    const Cause cause = Named(Kind::DesignName, "");
+    if (name == "std_logic" || name == "std_logic_vector" || context_.usedTypes.count(name) != 0) {
+        if (Finding* finding = context_.Add(RuleId::PredefinedName, cause)) {
+            finding->message = "the name of the design hides what VHDL knows by that name";
+        }
+    }
+    bool isLibrary = options_.vhdl.useDefaultLibrary && (name == "ieee" || name == "kestra");
+    for (int i = 0; i < options_.vhdl.libraries.GetSize(); ++i) {
+        isLibrary = isLibrary || Port::EqualIgnoringCase(options_.vhdl.libraries.GetView(i), name);
+    }
+    if (isLibrary) {
+        if (Finding* finding =
+                context_.Add(RuleId::HiddenLibrary, Verdicts("...rr...r"), cause)) {
+            finding->message = "the design bears the name of a library that it uses";
+        }
     }
 }
 
