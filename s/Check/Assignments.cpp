@@ -149,7 +149,8 @@ void Assignments::CheckTarget(const Signal& signal, const Cause& cause, std::str
 
 void Assignments::CheckRange(const Run& run, bool isWritten, bool isInVhdl, const Cause& cause) {
     const bool isBit = run.reference->GetSignalType() == SignalTypeBusIndex;
-    const bool isRejected = isWritten && (isBit || run.isBeyondRight);
+    const bool isRejected =
+        isWritten && (isBit || run.isBeyondRight || RunsAgainstParent(*run.reference));
     const Verdicts verdicts =
         OnlyWritten(Verdicts(isRejected ? "rrrrrrwwr" : "wwwrrwwwr"), isInVhdl);
     if (Finding* finding = context_.Add(RuleId::SliceOutside, verdicts, cause)) {
@@ -243,6 +244,9 @@ void Assignments::CheckDigits(const Signal& signal, const Digits& digits) {
         const bool isName = !digits.hasLength && Identifier(digits.digits).isVerilog;
         verdicts.Worsen(Verdicts(isName ? "rrr..rrw" : "rrr..rrr"));
     }
+    if (digits.HasHighImpedance()) {
+        verdicts.Worsen(Verdicts(".......w"));
+    }
     if (!IsCompoundOrAgainst(signal) && !IsBitOfUpwardBus(signal)) {
         if (!digits.IsVhdlString(false)) {
             verdicts.Worsen(Verdicts("...r....r"));
@@ -253,7 +257,7 @@ void Assignments::CheckDigits(const Signal& signal, const Digits& digits) {
     }
     if (Finding* finding = AddForConstant(RuleId::ConstantCharacter, verdicts, signal)) {
         finding->message = "the constant " + Quoted(digits.digits) + " of " +
-                           Quoted(signal.GetNameView()) + " has a character that is no digit";
+                           Quoted(signal.GetNameView()) + " has a character that is no digit everywhere";
     }
 }
 

@@ -165,6 +165,8 @@ private:
     bool IsHidden(const Holder& component, const Attribute& attribute) const;
     void NoteGeneric(const Holder& holder, const Attribute& attribute);
     void CheckGenericMap(const Instance& instance);
+    void CheckAgainstPins(const Holder& holder, const Instance& instance,
+                          const Attribute& attribute);
     void CheckNamesOf(const Holder& holder, const Attribute& attribute);
     void Declare(const Holder& holder, const Attribute& attribute);
     void CheckDeclared(const Holder& holder, const Attribute& attribute);
@@ -407,6 +409,7 @@ void AttributeWalk::CheckGenericMap(const Instance& instance) {
         if (!IsGeneric(*attribute)) {
             continue;
         }
+        CheckAgainstPins(holder, instance, *attribute);
         const Attribute* const formal = instance.GetComponentAttr(attribute->GetName().CStr());
         if (formal == nullptr || !IsGeneric(*formal)) {
             if (Finding* finding =
@@ -426,6 +429,21 @@ void AttributeWalk::CheckGenericMap(const Instance& instance) {
                     Named(Kind::ComponentAttribute, instance.GetComponentName().GetView(),
                           attribute->GetNameView());
             }
+        }
+    }
+}
+
+/// The cell can have no parameter of the name of a port.
+void AttributeWalk::CheckAgainstPins(const Holder& holder, const Instance& instance,
+                                     const Attribute& attribute) {
+    for (const Pin* pin : instance.GetPinIterator()) {
+        if (Writers::GetBaseName(*pin) != attribute.GetNameView()) {
+            continue;
+        }
+        if (Finding* finding =
+                Add(RuleId::NameClash, Verdicts("rrr..rr"), holder, attribute)) {
+            finding->message = holder.Describe(attribute) + " and the pin " +
+                               Quoted(pin->GetNameView()) + " bear one name";
         }
     }
 }

@@ -27,6 +27,10 @@ struct Digits {
     int BitsPerDigit() const noexcept { return base == 16 ? 4 : base == 8 ? 3 : 1; }
     /// Whether Verilog reads a number.
     bool IsVerilogNumber() const;
+    /// Whether Verilog reads a bit z.
+    bool HasHighImpedance() const {
+        return hasLength && digits.find_first_of("zZ?") != std::string::npos;
+    }
     /// Whether VHDL-93, or 2008, reads a bit string or, without a length, a string of std_logic.
     bool IsVhdlString(bool is2008) const;
     /// The same for a bit vector, which has no bits but 0 and 1.

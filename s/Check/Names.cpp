@@ -79,7 +79,9 @@ void CheckSpelling(Context& context, const NameUse& use) {
     const bool badInVerilog = use.isInVerilog && !identifier.isVerilog;
     const bool badInVhdl = use.isInVhdl && !identifier.isVhdl;
     if (badInVerilog || badInVhdl) {
-        Verdicts verdicts(badInVerilog ? "rrr..rrr" : "");
+        // Yosys takes a name with a dot.
+        const bool hasDot = use.name.find('.') != std::string_view::npos;
+        Verdicts verdicts(!badInVerilog ? "" : hasDot ? "rrr..rrw" : "rrr..rrr");
         verdicts.Worsen(Verdicts(badInVhdl ? "...rr...r" : ""));
         AddFinding(context, RuleId::IllegalName, verdicts, use,
                    badInVerilog && badInVhdl ? " is no identifier"

@@ -21,6 +21,8 @@ struct Words {
 /// The words of IEEE 1364-1995, 1364-2005 and 1800-2017, and what of them each tool reserves when it
 /// reads a file as Verilog. Verilator warns of the words of C++.
 constexpr Words VerilogWords[] = {
+    // Types of the package std, which cannot name an instance.
+    {Verdicts("......w"), "mailbox process semaphore"},
     {Verdicts("rrr..rrr."),
      "always and assign begin buf bufif0 bufif1 case casex casez default defparam else "
      "end endcase endfunction endmodule endspecify endtask for function if initial "

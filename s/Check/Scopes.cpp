@@ -39,6 +39,8 @@ struct Directive {
 constexpr Directive Directives[] = {
     {"synopsys translate_off", "......wr."}, {"synthesis translate_off", "......wr."},
     {"synopsys translate_on", ".......w"},   {"synthesis translate_on", ".......w"},
+    {"synopsys full_case", "......wr."},     {"synthesis full_case", "......wr."},
+    {"synopsys parallel_case", "......wr."}, {"synthesis parallel_case", "......wr."},
     {"synopsys", "......ww"},                {"synthesis", "......ww"},
     {"verilator", "......r"}};
 
@@ -384,9 +386,11 @@ void Scopes::CheckHiddenBy(const Declared& declared) {
         if (isComponent) {
             return;
         }
-        if (Finding* finding =
-                context_.Add(RuleId::ModuleName, Verdicts(isPort && isSame ? "......r.w" : "........w"),
-                             declared.cause)) {
+        // An attribute of the port is then taken for one of the entity.
+        const bool hasAttrs = isPort && static_cast<const Signal*>(declared.object)->HasAttrs();
+        Verdicts verdicts(hasAttrs ? "........r" : "........w");
+        verdicts.Worsen(Verdicts(isPort && isSame ? "......r" : ""));
+        if (Finding* finding = context_.Add(RuleId::ModuleName, verdicts, declared.cause)) {
             finding->message = declared.what + " bears the name of the design";
             finding->other = Named(Kind::DesignName, "");
         }

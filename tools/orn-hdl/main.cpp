@@ -117,6 +117,7 @@ private:
         AddOutputs(command, run_.outputs);
         AddWriteRules(command, run_.writeRules);
         command.add_flag("--keep-going", run_.keepGoing, "Go on behind a line that failed");
+        command.add_flag("--check", run_.check, "Write nothing that has errors for its language");
         command.add_flag("--quiet", run_.quiet, "Show no progress");
     }
 
@@ -145,6 +146,7 @@ private:
             ->check(CheckFileName);
         command.add_option("--model", check_.model, "The name of the design")->type_name("NAME");
         command.add_option("--target", check_.targets, "Whose rules count; without it, all")
+            ->allow_extra_args(false)
             ->type_name("TARGET,...")
             ->delimiter(',');
         command.add_option("--fail-on", check_.failOn, "What makes the exit status 1")
