@@ -151,7 +151,8 @@ public:
             Pin,
             /// Added the instance `first`.
             Instance,
-            /// Named the signal `first`, or a bus, bit or slice of that base name, first.
+            /// Was the first to name the signal `first`, or a bus, bit or slice of that base name.
+            /// When both a bus and a scalar signal have the name, `second` is "bus" or "scalar".
             Signal,
             /// Wired the pin `second` of the instance `first`, or tied it to a constant.
             Connection,

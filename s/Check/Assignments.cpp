@@ -77,7 +77,8 @@ private:
     void CheckLength(const Signal& signal, const Digits& digits);
     void CheckVhdlConstant(const Signal& signal, const Digits& digits);
     void CheckMeaning(const Signal& signal, const Digits& digits);
-    void CheckTarget(const Signal& signal, const Cause& cause, std::string_view what, bool isInVhdl);
+    void CheckTarget(const Signal& signal, const Cause& cause, std::string_view what,
+                     bool isInVhdl);
     void CheckRange(const Run& run, bool isWritten, bool isInVhdl, const Cause& cause);
     void CheckOpen(const Signal& signal);
     void CheckLoop(const Signal& signal);
@@ -135,10 +136,9 @@ void Assignments::CheckTarget(const Signal& signal, const Cause& cause, std::str
         if (!HasDirection(*run.declared, Polarity::Input)) {
             return;
         }
-        if (Finding* finding = context_.Add(RuleId::AssignedInput,
-                                            OnlyWritten(GetRule(RuleId::AssignedInput).verdicts,
-                                                        isInVhdl),
-                                            cause)) {
+        if (Finding* finding = context_.Add(
+                RuleId::AssignedInput,
+                OnlyWritten(GetRule(RuleId::AssignedInput).verdicts, isInVhdl), cause)) {
             finding->objects = {run.declared};
             finding->message = std::string(what) + " assigns the input port " +
                                Quoted(run.declared->GetNameView());
@@ -178,7 +178,8 @@ void Assignments::CheckAliasWidth(const Signal& signal, const Signal& alias) {
     const int left = signal.GetWidth();
     const int right = alias.GetWidth();
     const bool byBits = IsAliasedByBits(signal) || IsAliasedByBits(alias);
-    const bool isOpen = Writers::IsOpen(signal.GetNameView()) || Writers::IsOpen(alias.GetNameView());
+    const bool isOpen =
+        Writers::IsOpen(signal.GetNameView()) || Writers::IsOpen(alias.GetNameView());
     if (left == right) {
         return;
     }
@@ -186,9 +187,9 @@ void Assignments::CheckAliasWidth(const Signal& signal, const Signal& alias) {
     const Verdicts verdicts = isOpen ? Verdicts("......w") : GetRule(rule).verdicts;
     if (Finding* finding = context_.Add(rule, verdicts, AliasCause(signal, alias))) {
         finding->objects = {&signal, &alias};
-        finding->message = Quoted(signal.GetNameView()) + " has the width " +
-                           std::to_string(left) + ", its alias " + Quoted(alias.GetNameView()) +
-                           " has " + std::to_string(right);
+        finding->message = Quoted(signal.GetNameView()) + " has the width " + std::to_string(left) +
+                           ", its alias " + Quoted(alias.GetNameView()) + " has " +
+                           std::to_string(right);
         if (byBits) {
             finding->notes = {"Verilog assigns from the right and pads with 0, VHDL assigns " +
                               std::to_string(std::min(left, right)) + " from the left"};
@@ -210,8 +211,8 @@ void Assignments::CheckOutputRead(const Signal& signal, const Signal& alias) {
         }
         if (Finding* finding = context_.Add(RuleId::OutputRead, AliasCause(signal, alias))) {
             finding->objects = {&signal, run.declared};
-            finding->message = "an alias reads the output port " +
-                               Quoted(run.declared->GetNameView());
+            finding->message =
+                "an alias reads the output port " + Quoted(run.declared->GetNameView());
             finding->other = SignalCause(Names::BaseName(run.declared->GetNameView()));
         }
     });
@@ -257,7 +258,8 @@ void Assignments::CheckDigits(const Signal& signal, const Digits& digits) {
     }
     if (Finding* finding = AddForConstant(RuleId::ConstantCharacter, verdicts, signal)) {
         finding->message = "the constant " + Quoted(digits.digits) + " of " +
-                           Quoted(signal.GetNameView()) + " has a character that is no digit everywhere";
+                           Quoted(signal.GetNameView()) +
+                           " has a character that is no digit everywhere";
     }
 }
 
@@ -310,7 +312,8 @@ void Assignments::CheckVhdlConstant(const Signal& signal, const Digits& digits) 
         return;
     }
     if (digits.GetVhdlLength() != width) {
-        if (Finding* finding = AddForConstant(RuleId::ConstantWidth, Verdicts("...rr...r"), signal)) {
+        if (Finding* finding =
+                AddForConstant(RuleId::ConstantWidth, Verdicts("...rr...r"), signal)) {
             finding->message = "the constant " + Quoted(digits.digits) + " has " +
                                std::to_string(digits.GetVhdlLength()) + " bits in VHDL, " +
                                Quoted(signal.GetNameView()) + " has " + std::to_string(width);
@@ -352,12 +355,12 @@ void Assignments::CheckMeaning(const Signal& signal, const Digits& digits) {
 
 /// The signal that VHDL knows as no signal, used as any other.
 void Assignments::CheckOpen(const Signal& signal) {
-    if (Finding* finding =
-            context_.Add(RuleId::OpenSignal, SignalCause(signal.GetNameView()))) {
+    if (Finding* finding = context_.Add(RuleId::OpenSignal, SignalCause(signal.GetNameView()))) {
         finding->objects = {&signal};
-        finding->message = "the signal " + Quoted(signal.GetNameView()) +
-                           (signal.IsPort() ? " is a port, which VHDL does not get"
-                                            : " has a constant or an alias, which VHDL does not get");
+        finding->message =
+            "the signal " + Quoted(signal.GetNameView()) +
+            (signal.IsPort() ? " is a port, which VHDL does not get"
+                             : " has a constant or an alias, which VHDL does not get");
     }
 }
 
@@ -372,11 +375,12 @@ void Assignments::CheckLoop(const Signal& signal) {
         }
         at = aliases.GetCurrent();
         if (at == &signal) {
-            if (Finding* finding = context_.Add(RuleId::AliasLoop,
-                                                AliasCause(signal, *signal.GetSignalIterator().GetCurrent()))) {
+            if (Finding* finding =
+                    context_.Add(RuleId::AliasLoop,
+                                 AliasCause(signal, *signal.GetSignalIterator().GetCurrent()))) {
                 finding->objects = {&signal};
-                finding->message = "the aliases of " + Quoted(signal.GetNameView()) +
-                                   " lead back to it";
+                finding->message =
+                    "the aliases of " + Quoted(signal.GetNameView()) + " lead back to it";
             }
             return;
         }
@@ -458,10 +462,10 @@ void Drivers::LocateDrivers() {
         }
         if (Finding* finding = context_.Add(RuleId::TwoDrivers, cause)) {
             finding->objects = {signal};
-            finding->message = Quoted(signal->GetNameView()) +
-                               (signal->GetSignalType() == SignalTypeBus
-                                    ? ", or a bit of it, has two drivers"
-                                    : " has two drivers");
+            finding->message =
+                Quoted(signal->GetNameView()) + (signal->GetSignalType() == SignalTypeBus
+                                                     ? ", or a bit of it, has two drivers"
+                                                     : " has two drivers");
         }
     }
 }

@@ -53,20 +53,37 @@ template <std::size_t N> bool IsOneOf(const string_view (&words)[N], string_view
 }
 
 /// Types that every netlist can see.
-constexpr string_view VisibleTypes[] = {
-    "bit",        "bit_vector", "boolean",   "character",        "integer",  "natural",
-    "positive",   "real",       "signed",    "std_logic",        "std_logic_vector",
-    "std_ulogic", "string",     "time",      "std_ulogic_vector", "unsigned", "severity_level",
-    "x01",        "x01z",       "ux01",      "ux01z",            "delay_length"};
+constexpr string_view VisibleTypes[] = {"bit",
+                                        "bit_vector",
+                                        "boolean",
+                                        "character",
+                                        "integer",
+                                        "natural",
+                                        "positive",
+                                        "real",
+                                        "signed",
+                                        "std_logic",
+                                        "std_logic_vector",
+                                        "std_ulogic",
+                                        "string",
+                                        "time",
+                                        "std_ulogic_vector",
+                                        "unsigned",
+                                        "severity_level",
+                                        "x01",
+                                        "x01z",
+                                        "ux01",
+                                        "ux01z",
+                                        "delay_length"};
 
 /// Attributes of the language, which no design can declare.
 constexpr string_view PredefinedAttributes[] = {
-    "active",       "ascending",   "base",       "delayed",      "driving",   "driving_value",
-    "element",      "event",       "high",       "image",        "instance_name", "last_active",
-    "last_event",   "last_value",  "left",       "leftof",       "length",    "low",
-    "path_name",    "pos",         "pred",       "quiet",        "reverse_range", "right",
-    "rightof",      "simple_name", "stable",     "subtype",      "succ",      "transaction",
-    "val",          "value"};
+    "active",     "ascending",   "base",   "delayed", "driving",       "driving_value",
+    "element",    "event",       "high",   "image",   "instance_name", "last_active",
+    "last_event", "last_value",  "left",   "leftof",  "length",        "low",
+    "path_name",  "pos",         "pred",   "quiet",   "reverse_range", "right",
+    "rightof",    "simple_name", "stable", "subtype", "succ",          "transaction",
+    "val",        "value"};
 
 bool IsNumber(string_view text, bool isReal) {
     if (!text.empty() && (text.front() == '-' || text.front() == '+')) {
@@ -74,9 +91,9 @@ bool IsNumber(string_view text, bool isReal) {
     }
     const bool hasPoint = text.find('.') != string_view::npos;
     return !text.empty() && Port::IsDigit(text.front()) && Port::IsDigit(text.back()) &&
-           hasPoint == isReal &&
-           std::all_of(text.begin(), text.end(),
-                       [](char c) { return Port::IsDigit(c) || c == '.'; });
+           hasPoint == isReal && std::all_of(text.begin(), text.end(), [](char c) {
+               return Port::IsDigit(c) || c == '.';
+           });
 }
 
 bool IsQuotedBy(string_view text, char quote) {
@@ -104,9 +121,8 @@ bool CanBeValueOf(string_view type, string_view text) {
         return text.size() == 3 && IsQuotedBy(text, '\'');
     }
     if (type == "string" || type == "bit_vector" || type == "std_logic_vector") {
-        return text.empty() ||
-               (IsQuotedBy(text, '"') &&
-                text.substr(1, text.size() - 2).find('"') == string_view::npos);
+        return text.empty() || (IsQuotedBy(text, '"') &&
+                                text.substr(1, text.size() - 2).find('"') == string_view::npos);
     }
     return !text.empty();
 }
@@ -190,10 +206,9 @@ private:
 
 AttributeWalk::AttributeWalk(Context& context)
     : context_(context), isTyped_(context.options.vhdl.useAttrType),
-      isInBlockComment_(context.options.verilog.synthesisType ==
-                            HdlOptions::VerilogOption::SYNPLICITY ||
-                        context.options.verilog.synthesisType ==
-                            HdlOptions::VerilogOption::SYNOPSYS) {}
+      isInBlockComment_(
+          context.options.verilog.synthesisType == HdlOptions::VerilogOption::SYNPLICITY ||
+          context.options.verilog.synthesisType == HdlOptions::VerilogOption::SYNOPSYS) {}
 
 Finding* AttributeWalk::Add(RuleId rule, const Verdicts& verdicts, const Holder& holder,
                             const Attribute& attribute) {
@@ -397,7 +412,8 @@ void AttributeWalk::NoteGeneric(const Holder& holder, const Attribute& attribute
     if (IsGeneric(attribute) && attribute.GetValueType() == Attribute::Float && !isOfModule) {
         if (Finding* finding = Add(RuleId::FloatGeneric, GetRule(RuleId::FloatGeneric).verdicts,
                                    holder, attribute)) {
-            finding->message = holder.Describe(attribute) + " is a number that Yosys takes for a text";
+            finding->message =
+                holder.Describe(attribute) + " is a number that Yosys takes for a text";
         }
     }
 }
@@ -415,16 +431,15 @@ void AttributeWalk::CheckGenericMap(const Instance& instance) {
             if (Finding* finding =
                     Add(RuleId::UndeclaredGeneric, GetRule(RuleId::UndeclaredGeneric).verdicts,
                         holder, *attribute)) {
-                finding->message =
-                    holder.Describe(*attribute) + " is a generic that the component " +
-                    Quoted(instance.GetComponentName().GetView()) + " has not";
+                finding->message = holder.Describe(*attribute) +
+                                   " is a generic that the component " +
+                                   Quoted(instance.GetComponentName().GetView()) + " has not";
             }
         } else if (TypeOf(*formal) != TypeOf(*attribute)) {
             if (Finding* finding = Add(RuleId::GenericType, GetRule(RuleId::GenericType).verdicts,
                                        holder, *attribute)) {
                 finding->message = holder.Describe(*attribute) + " has the type " +
-                                   TypeOf(*attribute) + ", the component's has " +
-                                   TypeOf(*formal);
+                                   TypeOf(*attribute) + ", the component's has " + TypeOf(*formal);
                 finding->other =
                     Named(Kind::ComponentAttribute, instance.GetComponentName().GetView(),
                           attribute->GetNameView());
@@ -440,8 +455,7 @@ void AttributeWalk::CheckAgainstPins(const Holder& holder, const Instance& insta
         if (Writers::GetBaseName(*pin) != attribute.GetNameView()) {
             continue;
         }
-        if (Finding* finding =
-                Add(RuleId::NameClash, Verdicts("rrr..rr"), holder, attribute)) {
+        if (Finding* finding = Add(RuleId::NameClash, Verdicts("rrr..rr"), holder, attribute)) {
             finding->message = holder.Describe(attribute) + " and the pin " +
                                Quoted(pin->GetNameView()) + " bear one name";
         }
@@ -471,9 +485,9 @@ void AttributeWalk::CheckNamesOf(const Holder& holder, const Attribute& attribut
     use.isHiddenFromYosys = isHidden;
     CheckName(context_, use);
     if (isSynthesis && IsOneOf(PredefinedAttributes, Lower(attribute.GetNameView()))) {
-        if (Finding* finding = Add(RuleId::PredefinedAttribute,
-                                   GetRule(RuleId::PredefinedAttribute).verdicts, holder,
-                                   attribute)) {
+        if (Finding* finding =
+                Add(RuleId::PredefinedAttribute, GetRule(RuleId::PredefinedAttribute).verdicts,
+                    holder, attribute)) {
             finding->message =
                 Quoted(attribute.GetNameView()) + " is a predefined attribute of VHDL";
         }
@@ -508,15 +522,14 @@ void AttributeWalk::CheckDeclared(const Holder& holder, const Attribute& attribu
     const auto found = declarations_.find(Lower(attribute.GetNameView()));
     if (found == declarations_.end() || !found->second.isDeclared) {
         const bool mayBeDeclared = context_.options.vhdl.useClauses.GetSize() > 0;
-        if (Finding* finding = Add(RuleId::UndeclaredAttribute,
-                                   Verdicts(mayBeDeclared ? "...ww...w" : "...rr...r"), holder,
-                                   attribute)) {
+        if (Finding* finding =
+                Add(RuleId::UndeclaredAttribute,
+                    Verdicts(mayBeDeclared ? "...ww...w" : "...rr...r"), holder, attribute)) {
             finding->message = holder.Describe(attribute) + " is not declared before its use";
         }
     } else if (isTyped_ && !FitsType(attribute, found->second.type)) {
-        if (Finding* finding =
-                Add(RuleId::AttributeTypes, GetRule(RuleId::AttributeTypes).verdicts, holder,
-                    attribute)) {
+        if (Finding* finding = Add(RuleId::AttributeTypes, GetRule(RuleId::AttributeTypes).verdicts,
+                                   holder, attribute)) {
             finding->message = holder.Describe(attribute) + " has the type " + TypeOf(attribute) +
                                ", but is declared with the type " + found->second.type;
             finding->other = found->second.cause;
@@ -581,23 +594,22 @@ void AttributeWalk::CheckText(const Holder& holder, const Attribute& attribute, 
         Verdicts verdicts(places.verilogNumber ? "rrr..rrr" : "");
         verdicts.Worsen(Verdicts(places.vhdl ? "...rr...r" : ""));
         if (Finding* finding = Add(RuleId::QuoteInValue, verdicts, holder, attribute)) {
-            finding->message = "the value of " + holder.Describe(attribute) +
-                               " holds a double quote";
+            finding->message =
+                "the value of " + holder.Describe(attribute) + " holds a double quote";
         }
     }
     const bool endsComment = text.find("*/") != string_view::npos ||
                              attribute.GetNameView().find("*/") != string_view::npos;
     if (places.verilogComment && endsComment) {
-        if (Finding* finding = Add(RuleId::CommentInValue,
-                                   GetRule(RuleId::CommentInValue).verdicts, holder, attribute)) {
+        if (Finding* finding = Add(RuleId::CommentInValue, GetRule(RuleId::CommentInValue).verdicts,
+                                   holder, attribute)) {
             finding->message = holder.Describe(attribute) + " holds */, which ends its comment";
         }
     }
     if (places.verilogNumber && text.find('\\') != string_view::npos) {
         const bool isLast = text.back() == '\\';
-        if (Finding* finding =
-                Add(RuleId::BackslashInValue, Verdicts(isLast ? "rrr..rrr" : "mmm..mmm"), holder,
-                    attribute)) {
+        if (Finding* finding = Add(RuleId::BackslashInValue,
+                                   Verdicts(isLast ? "rrr..rrr" : "mmm..mmm"), holder, attribute)) {
             finding->message = "the value of " + holder.Describe(attribute) +
                                (isLast ? " ends in a backslash, which hides the closing quote"
                                        : " holds a backslash");
@@ -606,8 +618,8 @@ void AttributeWalk::CheckText(const Holder& holder, const Attribute& attribute, 
     if (places.vhdl && std::any_of(text.begin(), text.end(), IsControl)) {
         if (Finding* finding = Add(RuleId::CharacterInValue,
                                    GetRule(RuleId::CharacterInValue).verdicts, holder, attribute)) {
-            finding->message = "the value of " + holder.Describe(attribute) +
-                               " holds a control character";
+            finding->message =
+                "the value of " + holder.Describe(attribute) + " holds a control character";
         }
     }
 }
@@ -629,8 +641,8 @@ void AttributeWalk::CheckDigits(const Holder& holder, const Attribute& attribute
     Verdicts verdicts;
     RuleId rule = RuleId::ConstantLength;
     if (digits.hasLength) {
-        const bool isCut = digits.length > 0 && digits.GetNeededBits() >
-                                                    static_cast<std::size_t>(digits.length);
+        const bool isCut =
+            digits.length > 0 && digits.GetNeededBits() > static_cast<std::size_t>(digits.length);
         verdicts = Verdicts(digits.length == 0  ? "rrr..r.r"
                             : digits.length < 0 ? "mmm..mmm"
                             : isCut             ? "mmm..mrm"
@@ -643,10 +655,9 @@ void AttributeWalk::CheckDigits(const Holder& holder, const Attribute& attribute
         verdicts = Verdicts(!differs ? "" : isLong ? "mmm..mrm" : "mmm..mmm");
     }
     if (Finding* finding = Add(rule, verdicts, holder, attribute)) {
-        finding->message = "the value " + Quoted(digits.digits) + " of " +
-                           holder.Describe(attribute) +
-                           (digits.hasLength ? " does not fit its length"
-                                             : " is a decimal number in Verilog");
+        finding->message =
+            "the value " + Quoted(digits.digits) + " of " + holder.Describe(attribute) +
+            (digits.hasLength ? " does not fit its length" : " is a decimal number in Verilog");
     }
 }
 
@@ -654,22 +665,21 @@ void AttributeWalk::CheckUser(const Holder& holder, const Attribute& attribute) 
     const std::string type = TypeOf(attribute);
     const bool isVisible = IsOneOf(VisibleTypes, type);
     if (type.empty() || !isVisible) {
-        const bool mayBeDeclared =
-            !type.empty() && context_.options.vhdl.useClauses.GetSize() > 0;
+        const bool mayBeDeclared = !type.empty() && context_.options.vhdl.useClauses.GetSize() > 0;
         if (Finding* finding =
                 Add(RuleId::UserType, Verdicts(mayBeDeclared ? "...ww...w" : "...rr...r"), holder,
                     attribute)) {
-            finding->message = holder.Describe(attribute) +
-                               (type.empty() ? " has no type's name"
-                                             : " has the type " + Quoted(type) +
-                                                   ", which nothing declares");
+            finding->message =
+                holder.Describe(attribute) +
+                (type.empty() ? " has no type's name"
+                              : " has the type " + Quoted(type) + ", which nothing declares");
         }
         return;
     }
     const Port::String value = attribute.GetValueString();
     if (!CanBeValueOf(type, value.GetView())) {
-        if (Finding* finding = Add(RuleId::UserValue, GetRule(RuleId::UserValue).verdicts, holder,
-                                   attribute)) {
+        if (Finding* finding =
+                Add(RuleId::UserValue, GetRule(RuleId::UserValue).verdicts, holder, attribute)) {
             finding->message = "the value " + Quoted(value.GetView()) + " of " +
                                holder.Describe(attribute) + " is none of the type " + type;
         }

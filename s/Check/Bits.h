@@ -37,7 +37,8 @@ bool GetRun(const Signal& signal, Run& run);
 /// Calls `visit(run)` for the parts of a signal, those of a compound from the left.
 template <class Visit> void ForEachRun(const Signal& signal, const Visit& visit) {
     if (signal.GetSignalType() == SignalTypeCompoundBus) {
-        for (const Signal* member : static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
+        for (const Signal* member :
+             static_cast<const CompoundBus&>(signal).GetBusMemberIterator()) {
             ForEachRun(*member, visit);
         }
         return;

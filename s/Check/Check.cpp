@@ -12,8 +12,9 @@ namespace Orn_Hdl {
 namespace {
 
 constexpr std::string_view TargetNames[Check::TargetCount] = {
-    "verilog-1995", "verilog-2005", "systemverilog-2017", "vhdl-93", "vhdl-2008",
-    "icarus",       "verilator",    "yosys",              "ghdl"};
+    "verilog-1995", "verilog-2005", "systemverilog-2017",
+    "vhdl-93",      "vhdl-2008",    "icarus",
+    "verilator",    "yosys",        "ghdl"};
 
 } // namespace
 

@@ -173,8 +173,9 @@ void Clauses::CheckIncludes() {
         const Verdicts verdicts(isBroken ? "rrr..rrr." : isNone ? "rrr..wrr." : "www..www.");
         if (Finding* finding =
                 context_.Add(RuleId::IncludeFile, verdicts, Named(Kind::Include, text))) {
-            finding->message = "the file " + Quoted(file.GetView()) +
-                               (isBroken ? " has a quote in its name" : " has to be found by the tool");
+            finding->message =
+                "the file " + Quoted(file.GetView()) +
+                (isBroken ? " has a quote in its name" : " has to be found by the tool");
         }
     }
 }

@@ -63,8 +63,7 @@ std::string NameOf(const Instance& instance, const Pin& pin) {
 /// One walk over all instances and their pins.
 class Walk {
 public:
-    explicit Walk(Context& context)
-        : context_(context), open_(context.netlist.GetSignal("open")) {}
+    explicit Walk(Context& context) : context_(context), open_(context.netlist.GetSignal("open")) {}
 
     void CheckAll();
 
@@ -142,9 +141,8 @@ void Walk::CheckLatePins(const Instance& instance, const Component& component) {
                 context_.Add(RuleId::LatePin, verdicts,
                              Named(Kind::Pin, component.GetNameView(), pin->GetNameView()))) {
             finding->objects = {&instance, pin};
-            finding->message = "the instance " + Quoted(instance.GetNameView()) +
-                               " has no pin " + Quoted(pin->GetNameView()) +
-                               ", which its component got later";
+            finding->message = "the instance " + Quoted(instance.GetNameView()) + " has no pin " +
+                               Quoted(pin->GetNameView()) + ", which its component got later";
             finding->other = Named(Kind::Instance, instance.GetNameView());
         }
     }
@@ -186,15 +184,15 @@ void Walk::CheckUnwired(const Instance& instance, const Pin& pin) {
     if (Finding* finding = context_.Add(RuleId::OpenInput, verdicts,
                                         Named(Kind::Instance, instance.GetNameView()))) {
         finding->objects = {&instance, &pin};
-        finding->message =
-            "nothing is wired to the input pin " + Quoted(NameOf(instance, pin));
+        finding->message = "nothing is wired to the input pin " + Quoted(NameOf(instance, pin));
     }
 }
 
 /// The pin is wired to the signal that stands for no signal.
 void Walk::CheckOpen(const Instance& instance, const Pin& pin) {
     if (pin.GetPinType() == PinTypeBus) {
-        if (Finding* finding = Add(RuleId::OpenBit, GetRule(RuleId::OpenBit).verdicts, instance, pin)) {
+        if (Finding* finding =
+                Add(RuleId::OpenBit, GetRule(RuleId::OpenBit).verdicts, instance, pin)) {
             finding->message =
                 "the bus pin " + Quoted(NameOf(instance, pin)) + " is wired to the signal open";
         }
@@ -220,7 +218,8 @@ void Walk::CheckWidth(const Instance& instance, const Pin& pin, const Signal& si
         finding->message = "the pin " + Quoted(NameOf(instance, pin)) + " has " + Bits(pinWidth) +
                            ", the signal " + Quoted(signal.GetNameView()) + " has " +
                            Bits(signalWidth);
-        finding->notes = {"Verilog pads or cuts the signal at the left; VHDL has no such connection"};
+        finding->notes = {
+            "Verilog pads or cuts the signal at the left; VHDL has no such connection"};
     }
 }
 
@@ -348,8 +347,7 @@ void StandIns::ForeseeOne(const Misused& misused, bool isOutput) {
         finding->message = "the pin " + Quoted(NameOf(*misused.instance, *misused.pin)) +
                            (isOutput ? " reads the output port " : " drives the input port ") +
                            Quoted(name) + ", which gets no stand-in";
-        finding->notes = {"the name " +
-                          Quoted(misused.port->GetDummySignalName().GetView()) +
+        finding->notes = {"the name " + Quoted(misused.port->GetDummySignalName().GetView()) +
                           ", or its base name, is taken"};
         finding->other = SignalCause(Names::BaseName(misused.port->GetDummySignalName().GetView()));
     }
@@ -372,8 +370,7 @@ void StandIns::ReportDrivenInput(const Misused& misused) {
     if (Finding* finding =
             context_.Add(RuleId::DrivenInput, ConnectionOf(*misused.instance, *misused.pin))) {
         finding->objects = {misused.port, misused.instance, misused.pin};
-        finding->message = "the output pin " +
-                           Quoted(NameOf(*misused.instance, *misused.pin)) +
+        finding->message = "the output pin " + Quoted(NameOf(*misused.instance, *misused.pin)) +
                            " drives the input port " + Quoted(misused.port->GetNameView());
         finding->other = SignalCause(Names::BaseName(misused.port->GetNameView()));
     }

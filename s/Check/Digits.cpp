@@ -38,8 +38,8 @@ bool IsDecimal(string_view text) {
 
 /// Single underscores between characters are allowed and say nothing.
 bool HasProperUnderscores(string_view text) {
-    return text.empty() || (text.front() != '_' && text.back() != '_' &&
-                            text.find("__") == string_view::npos);
+    return text.empty() ||
+           (text.front() != '_' && text.back() != '_' && text.find("__") == string_view::npos);
 }
 
 constexpr string_view StdLogic = "UX01ZWLH-";
@@ -95,8 +95,8 @@ bool Digits::IsVerilogNumber() const {
     if (!hasLength) {
         return IsDecimal(digits);
     }
-    const string_view text = string_view(digits).substr(std::min(digits.find_first_not_of(' '),
-                                                                 digits.size()));
+    const string_view text =
+        string_view(digits).substr(std::min(digits.find_first_not_of(' '), digits.size()));
     return !text.empty() && text.front() != '_' &&
            std::all_of(text.begin(), text.end(), [this](char c) {
                const char small = Port::ToLower(c);
@@ -106,9 +106,8 @@ bool Digits::IsVerilogNumber() const {
 
 bool Digits::IsVhdlString(bool is2008) const {
     if (!hasLength) {
-        return std::all_of(digits.begin(), digits.end(), [](char c) {
-            return StdLogic.find(c) != string_view::npos;
-        });
+        return std::all_of(digits.begin(), digits.end(),
+                           [](char c) { return StdLogic.find(c) != string_view::npos; });
     }
     return HasProperUnderscores(digits) &&
            std::all_of(digits.begin(), digits.end(), [this, is2008](char c) {
@@ -167,7 +166,8 @@ BitText Digits::ReadVerilog(std::size_t width) const {
         return std::nullopt;
     }
     if (hasLength) {
-        const std::size_t size = static_cast<std::size_t>(length < 0 ? -std::int64_t(length) : length);
+        const std::size_t size =
+            static_cast<std::size_t>(length < 0 ? -std::int64_t(length) : length);
         // Nothing is longer than what is compared with it.
         std::string bits = ExpandDigits();
         bits = Resize(bits, std::min(size, std::max(bits.size(), width)));

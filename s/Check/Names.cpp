@@ -1,10 +1,10 @@
 // The spelling of every name that is written.
 
+#include "HdlModel/Names/Names.h"
 #include "Check/Context.h"
 #include "Check/Identifier.h"
 #include "Check/NameCheck.h"
 #include "Check/ReservedWords.h"
-#include "HdlModel/Names/Names.h"
 #include "Writers/Text.h"
 
 #include <limits>
@@ -184,8 +184,8 @@ void NameWalk::CheckRange(const Signal& signal) {
     }
     if (Finding* finding = context_.Add(RuleId::WideBus, verdicts, SignalCause(range.base))) {
         finding->objects = {&signal};
-        finding->message = "the bus " + Quoted(signal.GetNameView()) + " has " +
-                           std::to_string(bits) + " bits";
+        finding->message =
+            "the bus " + Quoted(signal.GetNameView()) + " has " + std::to_string(bits) + " bits";
     }
 }
 

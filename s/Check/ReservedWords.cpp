@@ -18,8 +18,8 @@ struct Words {
     std::string_view words;
 };
 
-/// The words of IEEE 1364-1995, 1364-2005 and 1800-2017, and what of them each tool reserves when it
-/// reads a file as Verilog. Verilator warns of the words of C++.
+/// The words of IEEE 1364-1995, 1364-2005 and 1800-2017, and what of them each tool reserves when
+/// it reads a file as Verilog. Verilator warns of the words of C++.
 constexpr Words VerilogWords[] = {
     // Types of the package std, which cannot name an instance.
     {Verdicts("......w"), "mailbox process semaphore"},
@@ -35,8 +35,7 @@ constexpr Words VerilogWords[] = {
      "pulldown pullup rcmos realtime release rnmos rpmos rtran rtranif0 rtranif1 "
      "scalared small strong0 strong1 table time tran tranif0 tranif1 tri0 tri1 trireg "
      "vectored wait weak0 weak1"},
-    {Verdicts(".rr..rrr."),
-     "automatic endgenerate generate genvar localparam signed"},
+    {Verdicts(".rr..rrr."), "automatic endgenerate generate genvar localparam signed"},
     {Verdicts(".rr..rr.."),
      "cell config design endconfig incdir include instance liblist library "
      "noshowcancelled pulsestyle_ondetect pulsestyle_onevent showcancelled unsigned "
@@ -55,10 +54,8 @@ constexpr Words VerilogWords[] = {
      "string strong struct super sync_accept_on sync_reject_on tagged this throughout "
      "timeprecision timeunit type typedef union unique unique0 until until_with "
      "untyped var virtual void wait_order weak wildcard with within"},
-    {Verdicts("..r......"),
-     "global"},
-    {Verdicts("..r..rr.."),
-     "logic"},
+    {Verdicts("..r......"), "global"},
+    {Verdicts("..r..rr.."), "logic"},
     {Verdicts("......w.."),
      "alignas alignof and_eq asm atomic_cancel auto bitand bitor catch char char16_t "
      "char32_t compl concept const_cast constexpr decltype delete double dynamic_cast "
@@ -66,8 +63,7 @@ constexpr Words VerilogWords[] = {
      "nullptr operator or_eq override private public register requires short sizeof "
      "static_assert static_cast switch synchronized template thread_local throw true "
      "try typeid typename using volatile wchar_t xor_eq"},
-    {Verdicts(".....rw.."),
-     "bool"},
+    {Verdicts(".....rw.."), "bool"},
 };
 
 /// The words of IEEE 1076-1993 and 1076-2008.
@@ -84,8 +80,7 @@ constexpr Words VhdlWords[] = {
     {Verdicts("....r...r"),
      "assume context cover default force parameter property protected release restrict "
      "restrict_guarantee sequence vmode vprop vunit"},
-    {Verdicts("....r...."),
-     "assume_guarantee fairness strong"},
+    {Verdicts("....r...."), "assume_guarantee fairness strong"},
 };
 
 constexpr std::size_t LongestWord = 20;

@@ -17,12 +17,14 @@ using Verdicts = Check::Verdicts;
 /// verilator, yosys, ghdl.
 constexpr Check::Rule Rules[] = {
     {"reserved-word", Verdicts("rrrrrrrrr"), "a name that is a reserved word of the target",
-     "A reserved word is no identifier (IEEE 1364-2005, 3.7.4 and annex B; IEEE 1800-2017, annex B; "
+     "A reserved word is no identifier (IEEE 1364-2005, 3.7.4 and annex B; IEEE 1800-2017, annex "
+     "B; "
      "IEEE 1076-2008, 15.10).",
      "ADD PORT signal Input", "another name"},
     {"illegal-name", Verdicts("rrrrrrrrr"), "a name with characters that the target does not allow",
      "A Verilog identifier is a letter or _ followed by letters, digits, _ and $ (IEEE 1364-2005, "
-     "3.7); a VHDL identifier is a letter followed by letters, digits and _ (IEEE 1076-2008, 15.4).",
+     "3.7); a VHDL identifier is a letter followed by letters, digits and _ (IEEE 1076-2008, "
+     "15.4).",
      "ADD PORT A$1 Input", "letters, digits and single underscores, a letter first"},
     {"underscores", Verdicts("...rr...r"),
      "a name with an underscore at an end, or with two in a row",
@@ -64,10 +66,10 @@ constexpr Check::Rule Rules[] = {
      "ADD SIGNAL ATTRIBUTE A length 5\nSET SIGNAL ATTRIBUTE OPTION A length -SYNATTR=ASSIGN",
      "another name"},
     {"pin-width", Verdicts("...rrwwwr"), "a signal of another width than its pin",
-     "In VHDL formal and actual have the same number of elements (IEEE 1076-2008, 6.5.6.3); Verilog "
+     "In VHDL formal and actual have the same number of elements (IEEE 1076-2008, 6.5.6.3); "
+     "Verilog "
      "pads or cuts (IEEE 1364-2005, 12.3.9.2).",
-     "ADD PIN REG4 D(3:0) Input\nCONNECT SIGNAL A(7:0) U1.D(3:0)",
-     "a slice of the pin's width"},
+     "ADD PIN REG4 D(3:0) Input\nCONNECT SIGNAL A(7:0) U1.D(3:0)", "a slice of the pin's width"},
     {"slice-outside", Verdicts("wwwrrrwrr"), "a bit or slice beyond its bus",
      "VHDL rejects an index out of range (IEEE 1076-2008, 8.4 and 8.5); Verilog reads x and drops "
      "what is written (IEEE 1364-2005, 5.2.1).",
@@ -92,7 +94,8 @@ constexpr Check::Rule Rules[] = {
      "(IEEE 1076-2008, 15.7).",
      "ASSIGN CONSTANT D(3:0) 1010", "4:B:1010"},
     {"constant-width", Verdicts("...rr.w.r"), "a constant of another width than its signal",
-     "VHDL needs as many digits as the signal has bits (IEEE 1076-2008, 10.5); Verilog pads or cuts "
+     "VHDL needs as many digits as the signal has bits (IEEE 1076-2008, 10.5); Verilog pads or "
+     "cuts "
      "(IEEE 1364-2005, 5.5).",
      "ASSIGN CONSTANT D(3:0) 4:B:10", "as many binary digits as the signal has bits"},
     {"constant-length", Verdicts("wwwwwwrww"), "a constant whose digits do not fit its length",
@@ -137,8 +140,8 @@ constexpr Check::Rule Rules[] = {
      "inout (IEEE 1364-2005, 12.3.8).",
      "ADD PORT A Input\nASSIGN CONSTANT A 1", "another direction, or a signal of its own"},
     {"driven-input", Verdicts("......ww."), "an input port that an output pin drives",
-     "The port's value and the pin's meet on one net.",
-     "ADD PORT A Input\nCONNECT SIGNAL A U1.O", "an output or bidirectional port"},
+     "The port's value and the pin's meet on one net.", "ADD PORT A Input\nCONNECT SIGNAL A U1.O",
+     "an output or bidirectional port"},
     {"two-drivers", Verdicts("......ww."), "a net with two drivers",
      "Their values are resolved to x where they differ (IEEE 1364-2005, 4.6.1; IEEE 1164).",
      "CONNECT SIGNAL Y U1.O\nCONNECT SIGNAL Y U2.O", "one driver, unless they can be disabled"},
@@ -189,8 +192,7 @@ constexpr Check::Rule Rules[] = {
      "a bit-vector generic without length and base, whose digits Verilog reads as a decimal number",
      "Verilog reads 0110 as one hundred and ten (IEEE 1364-2005, 3.5.1), VHDL as four bits "
      "(IEEE 1076-2008, 15.7).",
-     "ADD COMPONENT ATTRIBUTE LUT4 -TYPE=BitVector INIT 0110100110010110",
-     "16:B:0110100110010110"},
+     "ADD COMPONENT ATTRIBUTE LUT4 -TYPE=BitVector INIT 0110100110010110", "16:B:0110100110010110"},
     {"hidden-generic", Verdicts(".......w."), "a generic that is kept from synthesis",
      "It stands between translate_off and translate_on, which Yosys obeys with a warning.",
      "SET MODULE ATTRIBUTE OPTION W -GENERIC=NOSYN", "-GENERIC=SYN"},
@@ -220,8 +222,7 @@ constexpr Check::Rule Rules[] = {
      "a configuration that names one of a component which WORK may not have",
      "The configuration of the design uses WORK.CFG_ with the component's name "
      "(IEEE 1076-2008, 7.3.2.2).",
-     "ADD COMPONENT INV",
-     "SUPPRESS CONFIGURATION, or the attribute LEVEL HALVEX on the component"},
+     "ADD COMPONENT INV", "SUPPRESS CONFIGURATION, or the attribute LEVEL HALVEX on the component"},
     {"undeclared-component", Verdicts("...rr...r"),
      "SUPPRESS COMPONENT without a package that could declare the components",
      "A component is declared before it is placed (IEEE 1076-2008, 11.7).",

@@ -36,13 +36,17 @@ struct Directive {
     string_view words;
     string_view verdicts;
 };
-constexpr Directive Directives[] = {
-    {"synopsys translate_off", "......wr."}, {"synthesis translate_off", "......wr."},
-    {"synopsys translate_on", ".......w"},   {"synthesis translate_on", ".......w"},
-    {"synopsys full_case", "......wr."},     {"synthesis full_case", "......wr."},
-    {"synopsys parallel_case", "......wr."}, {"synthesis parallel_case", "......wr."},
-    {"synopsys", "......ww"},                {"synthesis", "......ww"},
-    {"verilator", "......r"}};
+constexpr Directive Directives[] = {{"synopsys translate_off", "......wr."},
+                                    {"synthesis translate_off", "......wr."},
+                                    {"synopsys translate_on", ".......w"},
+                                    {"synthesis translate_on", ".......w"},
+                                    {"synopsys full_case", "......wr."},
+                                    {"synthesis full_case", "......wr."},
+                                    {"synopsys parallel_case", "......wr."},
+                                    {"synthesis parallel_case", "......wr."},
+                                    {"synopsys", "......ww"},
+                                    {"synthesis", "......ww"},
+                                    {"verilator", "......r"}};
 
 class Scopes {
 public:
@@ -91,6 +95,7 @@ Declared Scopes::DescribeSignal(const Signal& signal) const {
     declared.what = (signal.IsPort() ? "the port " : "the signal ") + Quoted(signal.GetNameView());
     declared.verilogName = Spell(base, options_.verilog.signalCase);
     declared.cause = SignalCause(base);
+    declared.cause.second = signal.GetSignalType() == SignalTypeBus ? "bus" : "scalar";
     return declared;
 }
 
@@ -163,8 +168,7 @@ void Scopes::CheckStandIns() {
         Declared standIn;
         standIn.what = "the stand-in " + Quoted(whole.GetView()) + " of the port " +
                        Quoted(port->GetNameView());
-        standIn.verilogName =
-            Spell(Names::BaseName(whole.GetView()), options_.verilog.signalCase);
+        standIn.verilogName = Spell(Names::BaseName(whole.GetView()), options_.verilog.signalCase);
         standIn.cause = SignalCause(Names::BaseName(port->GetNameView()));
         ForEachInScope(name, standIn, [&](const Declared& other) {
             ReportClash(standIn, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
@@ -197,10 +201,10 @@ void Scopes::CheckOpenPin(const Instance& instance, const Pin& pin) {
         if (Finding* finding =
                 context_.Add(RuleId::OpenSignalTaken, SignalCause(Names::BaseName(name)))) {
             finding->objects = {taken, &instance, &pin};
-            finding->message = "the open pin " + Quoted(std::string(instance.GetNameView()) + "." +
-                                                        std::string(pinName)) +
-                               " is wired to the signal " + Quoted(taken->GetNameView()) +
-                               " in VHDL";
+            finding->message =
+                "the open pin " +
+                Quoted(std::string(instance.GetNameView()) + "." + std::string(pinName)) +
+                " is wired to the signal " + Quoted(taken->GetNameView()) + " in VHDL";
         }
         return;
     }
@@ -250,9 +254,8 @@ void Scopes::CheckAttributeNames() {
         Declared attribute;
         attribute.what = "the attribute " + Quoted(cause.second);
         attribute.cause = cause;
-        ForEachInScope(name, attribute, [&](const Declared& other) {
-            ReportClash(attribute, other, "");
-        });
+        ForEachInScope(name, attribute,
+                       [&](const Declared& other) { ReportClash(attribute, other, ""); });
         const auto standIn = context_.standIns.find(name);
         if (standIn != context_.standIns.end()) {
             Declared other;
@@ -300,8 +303,7 @@ void Scopes::CheckComponents() {
                 other.what = "the pin " + Quoted(pin->GetNameView()) + " of " +
                              Quoted(component->GetNameView());
                 other.verilogName = std::string(base);
-                other.cause =
-                    Named(Kind::Pin, component->GetNameView(), pin->GetNameView());
+                other.cause = Named(Kind::Pin, component->GetNameView(), pin->GetNameView());
                 // The cell itself is no part of the netlist, but it cannot be written either.
                 ReportClash(generic, other, "rrr..rr");
             }
@@ -322,8 +324,8 @@ void Scopes::CheckHidden() {
         ForEachInScope(name, {}, [&](const Declared& declared) {
             const bool isLate = declared.isInstance;
             if (Finding* finding =
-                    context_.Add(RuleId::PredefinedName, Verdicts(isLate ? "...ww...w" : "...rr...r"),
-                                 declared.cause)) {
+                    context_.Add(RuleId::PredefinedName,
+                                 Verdicts(isLate ? "...ww...w" : "...rr...r"), declared.cause)) {
                 finding->message = declared.what + " hides what VHDL knows by that name";
             }
         });
@@ -345,8 +347,7 @@ void Scopes::CheckDesignName() {
         isLibrary = isLibrary || Port::EqualIgnoringCase(options_.vhdl.libraries.GetView(i), name);
     }
     if (isLibrary) {
-        if (Finding* finding =
-                context_.Add(RuleId::HiddenLibrary, Verdicts("...rr...r"), cause)) {
+        if (Finding* finding = context_.Add(RuleId::HiddenLibrary, Verdicts("...rr...r"), cause)) {
             finding->message = "the design bears the name of a library that it uses";
         }
     }
@@ -356,8 +357,8 @@ void Scopes::CheckDesignName() {
 void Scopes::CheckPredefined(string_view name) {
     const std::string small = Lower(name);
     const auto attribute = context_.declaredAttributes.find(small);
-    const bool isUsed = small == "std_logic" || small == "std_logic_vector" ||
-                        context_.usedTypes.count(small) != 0;
+    const bool isUsed =
+        small == "std_logic" || small == "std_logic_vector" || context_.usedTypes.count(small) != 0;
     if (!isUsed) {
         return;
     }
@@ -367,8 +368,8 @@ void Scopes::CheckPredefined(string_view name) {
     if (attribute == context_.declaredAttributes.end() && !isGeneric) {
         return;
     }
-    const Cause cause = isGeneric ? Named(Kind::ModuleAttribute, "", generic->GetNameView())
-                                  : attribute->second;
+    const Cause cause =
+        isGeneric ? Named(Kind::ModuleAttribute, "", generic->GetNameView()) : attribute->second;
     if (Finding* finding = context_.Add(RuleId::PredefinedName, cause)) {
         finding->message = "the attribute " + Quoted(name) + " hides what VHDL knows by that name";
     }
@@ -381,8 +382,8 @@ void Scopes::CheckHiddenBy(const Declared& declared) {
     if (Port::EqualIgnoringCase(name, netlist_.GetNameView())) {
         const bool isPort = IsPort(declared);
         const bool isSame = declared.verilogName == netlist_.GetNameView();
-        const bool isComponent = declared.object != nullptr &&
-                                 declared.object->GetObjectType() == ObjectTypeComponent;
+        const bool isComponent =
+            declared.object != nullptr && declared.object->GetObjectType() == ObjectTypeComponent;
         if (isComponent) {
             return;
         }
@@ -433,8 +434,8 @@ void Scopes::CheckComment(string_view comment) {
             if (Finding* finding =
                     context_.Add(RuleId::DirectiveComment, Verdicts(directive.verdicts),
                                  Named(Kind::Comment, line))) {
-                finding->message = "the comment " + Quoted(line.substr(0, 60)) +
-                                   " is a command to a tool";
+                finding->message =
+                    "the comment " + Quoted(line.substr(0, 60)) + " is a command to a tool";
             }
             break;
         }

@@ -12,8 +12,8 @@ constexpr std::size_t FirstSize = 64;
 
 std::size_t Hash(const Signal* signal) noexcept {
     // Objects lie at multiples of eight; the high half of the product is spread well.
-    const std::uint64_t mixed = (reinterpret_cast<std::uintptr_t>(signal) >> 3U) *
-                                std::uint64_t(0x9E3779B97F4A7C15U);
+    const std::uint64_t mixed =
+        (reinterpret_cast<std::uintptr_t>(signal) >> 3U) * std::uint64_t(0x9E3779B97F4A7C15U);
     return static_cast<std::size_t>(mixed >> 32U);
 }
 
@@ -84,8 +84,7 @@ template <class Test> bool Uses::Any(const Signal& declared, const Test& test) c
         return keys_[place] != nullptr && test(values_[place]);
     }
     const auto found = buses_.find(&declared);
-    return found != buses_.end() &&
-           std::any_of(found->second.begin(), found->second.end(), test);
+    return found != buses_.end() && std::any_of(found->second.begin(), found->second.end(), test);
 }
 
 bool Uses::IsDrivenTwice(const Signal& declared) const {

@@ -32,8 +32,8 @@ private:
     std::uint8_t bits_ = 0;
 };
 
-/// The uses of the bits of all declared signals. Millions of scalar signals are normal: theirs stand
-/// in an open table of nine bytes a place.
+/// The uses of the bits of all declared signals. Millions of scalar signals are normal: theirs
+/// stand in an open table of nine bytes a place.
 class Uses {
 public:
     /// Calls `note(use)` for each bit of a run.

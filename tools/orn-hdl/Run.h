@@ -37,8 +37,8 @@ struct RunOptions {
 
 Status Run(const RunOptions& options);
 
-/// The name of a command file's model: the one asked for, or else the file's name without folder and
-/// extension.
+/// The name of a command file's model: the one asked for, or else the file's name without folder
+/// and extension.
 std::string GetModelName(const std::string& file, const std::optional<std::string>& asked);
 
 /// What became of a replay.

@@ -145,10 +145,9 @@ private:
             ->type_name("")
             ->check(CheckFileName);
         command.add_option("--model", check_.model, "The name of the design")->type_name("NAME");
-        command.add_option("--target", check_.targets, "Whose rules count; without it, all")
-            ->allow_extra_args(false)
-            ->type_name("TARGET,...")
-            ->delimiter(',');
+        command
+            .add_option("--target", check_.targets, "Whose rules count, with commas between them")
+            ->type_name("TARGETS");
         command.add_option("--fail-on", check_.failOn, "What makes the exit status 1")
             ->check(CLI::IsMember({"error", "warning", "never"}));
         command.add_option("--format", check_.format, "How the findings are printed")

@@ -11,6 +11,7 @@
 #include <cstdint>
 #include <cstdio>
 #include <memory>
+#include <sstream>
 #include <string_view>
 #include <utility>
 
@@ -18,9 +19,9 @@ namespace Tool {
 
 namespace {
 
-using Orn_Hdl::Check;
 using Checking::Checker;
 using Checking::Located;
+using Orn_Hdl::Check;
 
 /// A command file that can be read twice: standard input is copied.
 class Source {
@@ -97,8 +98,8 @@ bool FileCheck::Execute(const Orn_Hdl::StringArray& words) {
         }
         return true;
     } catch (const Orn_Hdl::Exception& exception) {
-        PrintError(file_ + ":" + std::to_string(line_) + ": error: " +
-                   std::string(WithoutLineEnd(exception.getLocalized().GetView())));
+        PrintError(file_ + ":" + std::to_string(line_) +
+                   ": error: " + std::string(WithoutLineEnd(exception.getLocalized().GetView())));
         return false;
     }
 }
@@ -147,9 +148,10 @@ Status FileCheck::Run(std::vector<Located>& all) {
     return Status::Success;
 }
 
-bool ReadTargets(const std::vector<std::string>& names, Check::Targets& targets) {
+bool ReadTargets(const std::string& names, Check::Targets& targets) {
     targets = names.empty() ? Check::Targets::All() : Check::Targets();
-    for (const std::string& name : names) {
+    std::istringstream rest(names);
+    for (std::string name; std::getline(rest, name, ',');) {
         Check::Target target = {};
         if (!Check::FindTarget(name, target)) {
             std::string known;

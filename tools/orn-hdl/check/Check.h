@@ -17,8 +17,8 @@ struct CheckOptions {
     std::vector<std::string> files;
     /// The name of the model; without one, the file's name without folder and extension.
     std::optional<std::string> model;
-    /// The names of the targets; none for all.
-    std::vector<std::string> targets;
+    /// The names of the targets with commas between them; empty for all.
+    std::string targets;
     /// "error", "warning" or "never".
     std::string failOn = "error";
     CheckFormat format = CheckFormat::Text;

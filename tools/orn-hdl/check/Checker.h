@@ -16,8 +16,8 @@ class StringArray;
 
 namespace Tool::Checking {
 
-/// Stands in the place of a model's write commands: they are where the design is checked, and nothing
-/// is written. What a write changes in the design is done before the next command.
+/// Stands in the place of a model's write commands: they are where the design is checked, and
+/// nothing is written. What a write changes in the design is done before the next command.
 class Checker {
 public:
     Checker(Orn_Hdl::Model& model, Orn_Hdl::Check::Targets targets)

@@ -44,7 +44,7 @@ std::string KeyOf(const Cause& cause) {
     case Kind::DesignName:
         return Key(cause.kind, "");
     case Kind::Signal:
-        return Key(cause.kind, Base(cause.first));
+        return Key(cause.kind, Base(cause.first), cause.second);
     case Kind::Alias:
         return Key(cause.kind, Base(cause.first), Base(cause.second));
     case Kind::Comment:
@@ -146,8 +146,10 @@ void Search::TakeSignal(string_view name, std::uint64_t line) {
     const std::string normal = Normal(name);
     for (std::size_t start = 0; start < normal.size();) {
         const std::size_t end = std::min(normal.find_first_of(",\\", start), normal.size());
-        Found(Key(Kind::Signal, Base(string_view(normal).substr(start, end - start))), Kind::Signal,
-              line);
+        const std::string piece = normal.substr(start, end - start);
+        const std::string base = Base(piece);
+        Found(Key(Kind::Signal, base), Kind::Signal, line);
+        Found(Key(Kind::Signal, base, base == piece ? "scalar" : "bus"), Kind::Signal, line);
         start = end + 1;
     }
 }
@@ -189,10 +191,10 @@ void Search::TakeConstant(const StringArray& words, std::uint64_t line) {
 void Search::TakeAttribute(const StringArray& words, std::uint64_t line) {
     const bool isSet = IsWord(words, 0, "SET");
     const bool isModule = IsWord(words, 1, "MODULE");
-    const Kind kind = isModule                         ? Kind::ModuleAttribute
-                      : IsWord(words, 1, "COMPONENT")  ? Kind::ComponentAttribute
-                      : IsWord(words, 1, "INSTANCE")   ? Kind::InstanceAttribute
-                                                       : Kind::SignalAttribute;
+    const Kind kind = isModule                        ? Kind::ModuleAttribute
+                      : IsWord(words, 1, "COMPONENT") ? Kind::ComponentAttribute
+                      : IsWord(words, 1, "INSTANCE")  ? Kind::InstanceAttribute
+                                                      : Kind::SignalAttribute;
     int at = isSet ? 4 : 3;
     const std::string owner = isModule ? std::string() : Normal(words.GetView(at++));
     if (!isSet && Port::EqualIgnoringCase(words.GetView(at).substr(0, 6), "-TYPE=")) {

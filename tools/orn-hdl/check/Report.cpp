@@ -1,7 +1,7 @@
 #include "check/Report.h"
 
-#include "check/Json.h"
 #include "Port/Version.h"
+#include "check/Json.h"
 
 #include <algorithm>
 #include <map>

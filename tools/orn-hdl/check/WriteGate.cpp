@@ -20,9 +20,8 @@ bool WriteGate::Allows(const Orn_Hdl::StringArray& words, std::uint64_t line) {
 }
 
 bool WriteGate::Allows(Orn_Hdl::Language language, std::uint64_t line) {
-    const Check::Targets targets = language == Orn_Hdl::Language::Verilog
-                                       ? Check::Targets::Verilog()
-                                       : Check::Targets::Vhdl();
+    const Check::Targets targets =
+        language == Orn_Hdl::Language::Verilog ? Check::Targets::Verilog() : Check::Targets::Vhdl();
     std::vector<Located> findings;
     for (Check::Finding& finding :
          Check::Run(*model_.GetNetlist(), *model_.GetOptions(), targets)) {
