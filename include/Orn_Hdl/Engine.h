@@ -34,8 +34,9 @@ class Model;
 /// ignore letter case; a null text reads as "" everywhere. A model bears the name of its netlist,
 /// so SET NETLIST NAME renames it: keep the pointer, not the name, of a model whose commands do so.
 ///
-/// Engines are independent of one another; one engine and its models belong to one thread at a
-/// time.
+/// Engines are independent of one another. One engine and its models belong to one thread at a
+/// time; while nobody changes them, any number of threads may call their const operations, and
+/// those of all that they hold.
 class ORN_HDL_API Engine {
 public:
     Engine();
