@@ -34,8 +34,9 @@ class Model;
 /// models are case-insensitive; a null text is read as "" everywhere. The name of a model is that
 /// of its netlist, so SET NETLIST NAME renames it: keep the pointer of such a model, not its name.
 ///
-/// Engines are independent of one another; one engine and its models belong to one thread at a
-/// time.
+/// Engines are independent of one another. One engine and its models belong to one thread at a
+/// time; while nobody changes them, any number of threads may call their const operations, and
+/// those of all that they hold.
 class ORN_HDL_API Engine {
 public:
     /// An engine without models.

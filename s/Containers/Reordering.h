@@ -1,4 +1,4 @@
-// Puts the elements of an array into another order.
+// The way past an array's interface to the places of its elements.
 #pragma once
 
 #include "Orn_Hdl/Containers/PtrArray.h"
@@ -10,6 +10,13 @@ struct Reordering {
     /// places, which `SetAt` of an owner refuses.
     static void Place(PtrArrayBase& array, int index, void* element) noexcept {
         array.items_[index] = element;
+    }
+
+    /// Where the elements stand.
+    static void** GetPlaces(const PtrArrayBase& array) noexcept { return array.items_; }
+    /// Whether the elements stand in memory that somebody else owns.
+    static bool IsInBorrowedPlaces(const PtrArrayBase& array) noexcept {
+        return array.ownsItems_ == 0;
     }
 };
 
