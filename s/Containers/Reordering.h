@@ -1,4 +1,4 @@
-// The way past an array's interface to the places of its elements.
+// Gives access to the places of an array's elements, which its interface does not.
 #pragma once
 
 #include "Orn_Hdl/Containers/PtrArray.h"
@@ -6,8 +6,8 @@
 namespace Orn_Hdl {
 
 struct Reordering {
-    /// Stores at a place that the array has. Halfway through a new order an element stands at two
-    /// places, which `SetAt` of an owner refuses.
+    /// Stores a pointer at a valid index. During the reordering an element is stored twice, which
+    /// `SetAt` of an owning array rejects.
     static void Place(PtrArrayBase& array, int index, void* element) noexcept {
         array.items_[index] = element;
     }

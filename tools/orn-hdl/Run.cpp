@@ -14,21 +14,20 @@ namespace Tool {
 
 namespace {
 
-/// How many lines are replayed between two looks at the clock.
+/// The number of lines between two readings of the clock.
 constexpr std::uint64_t LinesPerUpdate = 4096;
 
-/// What the model is called when the commands come from standard input and name nothing.
+/// The name of the model if the commands come from standard input and do not name it.
 constexpr const char* NamelessModel = "HDL_NETLIST";
 
-/// The replay of one file: what is told of its lines, and what became of them.
+/// The replay of one file: its progress, messages and status.
 class Replayer {
 public:
     Replayer(Orn_Hdl::Model& model, const std::string& file, Progress& progress,
              Checking::WriteGate* gate)
         : model_(model), file_(file), progress_(progress), gate_(gate) {}
 
-    /// Carries out one line; `position` is where it ends in the file. \return whether all went
-    /// well.
+    /// Executes one line, which ends at `position` in the file. \return whether it succeeded.
     bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
         ++lines_;
         if (lines_ % LinesPerUpdate == 0) {
@@ -76,7 +75,7 @@ private:
         }
         Report(text);
         status_ = Status::File;
-        // Told once: the model remembers its last write until the next one.
+        // The model keeps the error of its last write. Clear it, so that it is reported once.
         model_.RecordWrite("", 0);
         return false;
     }
@@ -128,10 +127,10 @@ Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, 
 
 Status Run(const RunOptions& options) {
     Progress progress(options.quiet, options.file);
-    // The design stands until the process ends, which gives its memory back at once: object by
-    // object that takes a tenth of the time of the whole run.
+    // The design is not destroyed before the process ends: freeing it object by object would take a
+    // tenth of the time of the whole run.
     static Orn_Hdl::Engine* engine = nullptr;
-    delete std::exchange(engine, nullptr); // An earlier run's.
+    delete std::exchange(engine, nullptr); // From an earlier run.
     engine = new Orn_Hdl::Engine;
     const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());

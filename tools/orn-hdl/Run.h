@@ -1,4 +1,4 @@
-// `orn-hdl run`: replays a command file and writes the netlists asked for.
+// `orn-hdl run`: replays a command file and writes netlists.
 #pragma once
 
 #include "Output.h"
@@ -24,11 +24,11 @@ class WriteGate;
 struct RunOptions {
     /// The command file; "-" is standard input.
     std::string file;
-    /// The name of the model; without one, the file's name without folder and extension.
+    /// The name of the model; the default is the file's name without folder and extension.
     std::optional<std::string> model;
     Outputs outputs;
     WriteRules writeRules;
-    /// Go on behind a line that failed.
+    /// Continue after an error.
     bool keepGoing = false;
     bool quiet = false;
     /// Write nothing that has errors for its language.
@@ -41,7 +41,7 @@ Status Run(const RunOptions& options);
 /// and extension.
 std::string GetModelName(const std::string& file, const std::optional<std::string>& asked);
 
-/// What became of a replay.
+/// The result of a replay.
 struct Replayed {
     Status status = Status::Success;
     /// Whether the replay reached the end of the file.
@@ -51,7 +51,7 @@ struct Replayed {
 };
 
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
-/// not write, is reported with its place; unless told to keep going, the replay ends there.
+/// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
 /// \param gate decides which lines may write; null when all may.
 Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
                 const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr);

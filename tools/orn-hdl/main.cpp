@@ -106,7 +106,7 @@ private:
                                    GetCommandNames());
         }
         try {
-            // It takes the last word as the first.
+            // CLI11 expects the words in reverse order.
             app_.parse(std::vector<std::string>(words.rbegin(), words.rend()));
         } catch (const CLI::ParseError& error) {
             return Report(error, words);
@@ -133,7 +133,7 @@ private:
         return Status::Usage;
     }
 
-    /// Complains of a word that is none of the candidates, and suggests the one that is meant.
+    /// Prints a message about a word that is none of the candidates, with a suggestion.
     static Status ComplainUnknown(const std::string& complaint, const std::string& word,
                                   const std::vector<std::string>& candidates) {
         const std::string meant = Tool::GetNearest(word, candidates);
