@@ -8,6 +8,7 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -15,12 +16,13 @@
 namespace Orn_Hdl {
 
 class AttributeVisitor;
+struct AttributeTable;
 
 /// A bit-vector literal: its digits, and, when they were given, its base and its length in bits.
 class ORN_HDL_API BitVectorValue {
 public:
     BitVectorValue() = default;
-    /// As `SetValue`.
+    /// The literal that `SetValue` reads from a text.
     explicit BitVectorValue(const char* text) { SetValue(text); }
 
     /// Reads "LENGTH:BASE:DIGITS" with base B, O or H, such as "8:H:A5"; a text with fewer than
@@ -56,13 +58,15 @@ public:
     /// Values of the synthesis-attribute option.
     enum SynAttrOption { SynAttrNone = 0, SynAttrAssign = 1, SynAttrAssignNoDec = 2 };
 
-    /// \{
-    /// What an attribute has when nothing else is said.
+    /// The name of the type that an attribute gets when none is named.
     static constexpr const char* DEFAULT_ATTRTYPE = "String";
+    /// The generic option of a new attribute.
     static constexpr int DEFAULT_GENERIC = GenericNone;
+    /// The synthesis-attribute option of a new attribute.
     static constexpr int DEFAULT_SYNATTR = SynAttrNone;
-    /// \}
 
+    /// The holder drops the attribute, whoever destroys it.
+    ~Attribute() override;
     void AcceptObject(ObjectVisitor& visitor) override;
     /// Calls the visit operation of this attribute's type.
     virtual void AcceptAttribute(AttributeVisitor& visitor);
@@ -85,13 +89,19 @@ public:
     /// The generic option as a text.
     Port::StringBase<char> GetGeneric() const;
     /// The generic option.
-    GenericOption GetGenericOption() const noexcept { return static_cast<GenericOption>(generic_); }
-    /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", likewise.
+    GenericOption GetGenericOption() const noexcept {
+        return static_cast<GenericOption>(GetOption(GenericFlags));
+    }
+    /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", letter case
+    /// ignored.
+    /// \return false, the option unchanged, for any other text.
     bool SetSynAttr(const char* text) noexcept;
     /// The synthesis-attribute option as a text.
     Port::StringBase<char> GetSynAttr() const;
     /// The synthesis-attribute option.
-    SynAttrOption GetSynAttrOption() const noexcept { return static_cast<SynAttrOption>(synAttr_); }
+    SynAttrOption GetSynAttrOption() const noexcept {
+        return static_cast<SynAttrOption>(GetOption(SynAttrFlags));
+    }
 
     /// Whether name, comment, type and both options are equal, and the value texts ignoring case.
     bool operator==(const Attribute& other) const;
@@ -101,12 +111,25 @@ public:
 protected:
     /// An attribute with the default options.
     explicit Attribute(const char* name);
-    Attribute(const Attribute&) = default;
-    Attribute& operator=(const Attribute&) = default;
+    /// Copies name, comment and options; the copy has no holder.
+    Attribute(const Attribute& other);
+    /// Copies name, comment and options; the holder stays.
+    Attribute& operator=(const Attribute& other);
 
 private:
-    unsigned generic_ : 2;
-    unsigned synAttr_ : 2;
+    friend struct AttributeTable;
+
+    /// The options stand in flags of the object, two bits each.
+    static constexpr unsigned GenericFlags = 0x10;
+    static constexpr unsigned SynAttrFlags = 0x40;
+
+    int GetOption(unsigned flags) const noexcept {
+        return (HasFlag(flags) ? 1 : 0) + (HasFlag(flags * 2) ? 2 : 0);
+    }
+    void SetOption(unsigned flags, int option) noexcept;
+
+    /// The table that holds the attribute; null without a holder.
+    AttributeTable* table_ = nullptr;
 };
 
 /// A text.
@@ -114,7 +137,7 @@ class ORN_HDL_API AttributeString : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeString(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes a text attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -133,7 +156,7 @@ class ORN_HDL_API AttributeInteger : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeInteger(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes an integer attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -153,7 +176,7 @@ class ORN_HDL_API AttributeFloat : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeFloat(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes a floating-point attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -174,7 +197,7 @@ class ORN_HDL_API AttributeBoolean : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeBoolean(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes a truth-value attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -193,7 +216,7 @@ class ORN_HDL_API AttributeBit : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeBit(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes a bit attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -212,7 +235,7 @@ class ORN_HDL_API AttributeBitVector : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeBitVector(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes a bit-vector attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -234,7 +257,7 @@ class ORN_HDL_API AttributeUser : public Attribute {
 public:
     /// Null texts are read as "".
     AttributeUser(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// Makes an attribute of a user type on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -260,17 +283,22 @@ public:
     AttributeVisitor(const AttributeVisitor&) = default;
     AttributeVisitor& operator=(const AttributeVisitor&) = default;
     virtual ~AttributeVisitor();
-    /// \{
-    /// Called by an attribute's `AcceptAttribute`, by the type of its value.
+    /// Called for an attribute of a class that does not override `AcceptAttribute`.
     virtual void VisitAttribute(Attribute* attribute);
+    /// Called for a text.
     virtual void VisitAttributeString(AttributeString* attribute);
+    /// Called for an integer.
     virtual void VisitAttributeInteger(AttributeInteger* attribute);
+    /// Called for a floating-point number.
     virtual void VisitAttributeFloat(AttributeFloat* attribute);
+    /// Called for a bit.
     virtual void VisitAttributeBit(AttributeBit* attribute);
+    /// Called for a bit-vector literal.
     virtual void VisitAttributeBitVector(AttributeBitVector* attribute);
+    /// Called for a truth value.
     virtual void VisitAttributeBoolean(AttributeBoolean* attribute);
+    /// Called for a text of a type that the user names.
     virtual void VisitAttributeUser(AttributeUser* attribute);
-    /// \}
 };
 
 /// Owns attributes, in the order in which they were added. A holder without attributes owns no
@@ -280,13 +308,22 @@ public:
     AttributeHolder() noexcept;
     /// Clones every attribute.
     AttributeHolder(const AttributeHolder& other);
+    /// Destroys the attributes and clones those of another holder. If allocation fails, nothing
+    /// changes.
     AttributeHolder& operator=(const AttributeHolder& other);
+    /// Destroys the attributes.
     virtual ~AttributeHolder();
 
     /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is an
     /// attribute that has an owner. A second attribute of one name is held and iterated too, and
     /// `GetAttr` then finds the later one.
     virtual void AddAttr(Attribute* attribute);
+    /// Destroys an attribute of this holder, as `delete` does. Null, and an attribute that this
+    /// holder does not own, are ignored.
+    void RemoveAttr(Attribute* attribute) noexcept;
+    /// Takes an attribute out without destroying it.
+    /// \return the attribute, which the caller owns; null when this holder does not own it.
+    std::unique_ptr<Attribute> DetachAttr(Attribute* attribute) noexcept;
     /// The attribute of that name, normalised and letter case ignored; null when there is none.
     virtual Attribute* GetAttr(const char* name) const;
 
@@ -294,11 +331,28 @@ public:
     /// assigned while it walks. The holder must outlive it.
     Iterator<Attribute*> GetAttrIterator() const noexcept;
     /// Whether there are any.
-    bool HasAttrs() const noexcept { return table_ != nullptr; }
+    bool HasAttrs() const noexcept { return GetTable() != nullptr && HasAttrsInTable(); }
+
+protected:
+    /// Exchanges the attributes with those of another holder.
+    void SwapAttrs(AttributeHolder& other) noexcept;
 
 private:
-    struct Table;
-    std::unique_ptr<Table> table_;
+    friend class OwnerLink;
+
+    /// Whether `link_` leads to the owner of the holder, which is marked by an odd address.
+    bool IsLinkToOwner() const noexcept {
+        return (reinterpret_cast<std::uintptr_t>(link_) & 1) != 0;
+    }
+    AttributeTable* GetTable() const noexcept {
+        return IsLinkToOwner() ? nullptr : static_cast<AttributeTable*>(link_);
+    }
+    AttributeTable& MakeTable();
+    bool HasAttrsInTable() const noexcept;
+
+    /// The table of the attributes; without one, the owner of the holder, or null. Most objects
+    /// have no attributes, so that knowing its owner costs an object no memory.
+    void* link_ = nullptr;
 };
 
 /// Makes attributes by the name of their type.

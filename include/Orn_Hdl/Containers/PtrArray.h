@@ -99,6 +99,11 @@ protected:
         ownsItems_ = 0;
     }
 
+    /// Where the elements stand; for an array that has not grown since, what it borrowed.
+    void** GetItems() const noexcept { return items_; }
+    /// How many elements have room there.
+    int GetCapacity() const noexcept { return static_cast<int>(capacity_); }
+
 private:
     friend struct Reordering;
 

@@ -27,6 +27,8 @@ public:
 
     /// The first pin of that name, normalised and letter case ignored; null when there is none.
     Pin* GetPin(const char* name) const;
+    /// The first pin of that name, of known length, normalised and letter case ignored; null when
+    /// there is none.
     Pin* GetPin(std::string_view name) const;
     /// Sorts by polarity value, then by name in natural order, stably.
     void SortByPolarityAndName();
@@ -46,7 +48,8 @@ public:
     explicit Component(const char* name);
     Component(const Component&) = delete;
     Component& operator=(const Component&) = delete;
-    /// Instances of this component keep their pins and then have no component.
+    /// The netlist drops the component, whoever destroys it. Its instances keep their pins and then
+    /// have no component.
     ~Component() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
@@ -56,19 +59,25 @@ public:
     /// \param name null is read as "".
     /// \param defaultValue taken when its text is not empty.
     void AddPin(const char* name, const Polarity& polarity, const BitVectorValue& defaultValue);
+    /// Appends a pin whose default value is given as a bit-vector literal; null is read as "". A
+    /// name that is taken is not refused here. Instances made before do not get the pin.
+    /// \param name null is read as "".
     void AddPin(const char* name, const Polarity& polarity, const char* defaultValue);
     /// Appends a clone of a pin.
     void AddPin(const Pin& pin);
+    /// Destroys a pin of this component, as `delete` does. Instances keep their pins:
+    /// `Netlist::RemovePin` removes those too. Null, and a pin of another owner, are ignored.
+    void RemovePin(Pin* pin) noexcept;
     /// The pin of that name; null when there is none.
     Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
+    /// The pin of that name, of known length; null when there is none.
     Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
     /// The pins, in order.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
 
 private:
     friend class Instance;
-
-    void AddNewPin(std::unique_ptr<Pin> pin);
+    friend class PinBlock;
 
     PinList pins_;
     ComponentAnchor* anchor_;
@@ -81,6 +90,7 @@ public:
     Instance(const char* name, const Component* component);
     Instance(const Instance&) = delete;
     Instance& operator=(const Instance&) = delete;
+    /// The netlist drops the instance, whoever destroys it, and its pins leave all signals.
     ~Instance() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
@@ -94,9 +104,13 @@ public:
 
     /// The pin of that name; null when there is none.
     Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
+    /// The pin of that name, of known length; null when there is none.
     Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
     /// The pins, in order.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
+    /// Destroys a pin of this instance, as `delete` does. Its memory is freed with the instance.
+    /// Null, and a pin of another owner, are ignored.
+    void RemovePin(Pin* pin) noexcept;
     /// Sorts the pins by polarity value, then by name in natural order.
     void SortPinName() { pins_.SortByPolarityAndName(); }
 

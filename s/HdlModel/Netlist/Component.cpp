@@ -1,14 +1,14 @@
 #include "Orn_Hdl/Model/Component.h"
 
 #include "HdlModel/Names/NaturalSort.h"
+#include "HdlModel/Netlist/NetlistOwner.h"
+#include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/PinIndex.h"
 #include "HdlModel/Signals/SignalCast.h"
 #include "Port/Ascii.h"
-#include "Port/Pool.h"
 
-#include <algorithm>
-#include <functional>
 #include <unordered_set>
+#include <utility>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -63,20 +63,14 @@ Component::Component(const char* name) : Object(ObjectTypeComponent), anchor_(nu
 }
 
 Component::~Component() {
+    NetlistOwner::Leave(*this);
     anchor_->component = nullptr;
     anchor_->Leave();
-    for (int i = pins_.GetSize(); i > 0; --i) {
-        delete pins_.GetAt(i - 1);
-    }
+    PinBlock::DeleteAll(pins_);
 }
 
 void Component::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitComponent(this);
-}
-
-void Component::AddNewPin(std::unique_ptr<Pin> pin) {
-    pins_.Add(pin.get());
-    pin.release();
 }
 
 void Component::AddPin(const char* name, const Polarity& polarity,
@@ -85,7 +79,7 @@ void Component::AddPin(const char* name, const Polarity& polarity,
     if (!defaultValue.GetValue().IsEmpty()) {
         pin->SetDefaultValue(defaultValue);
     }
-    AddNewPin(std::move(pin));
+    PinBlock::Add(pins_, std::move(pin));
 }
 
 void Component::AddPin(const char* name, const Polarity& polarity, const char* defaultValue) {
@@ -93,59 +87,12 @@ void Component::AddPin(const char* name, const Polarity& polarity, const char* d
 }
 
 void Component::AddPin(const Pin& pin) {
-    AddNewPin(std::unique_ptr<Pin>(pin.ClonePin()));
+    PinBlock::Add(pins_, std::unique_ptr<Pin>(pin.ClonePin()));
 }
 
-/// The pins of an instance stand in one block of memory, in the order of the component's pins, and
-/// behind them the array of pointers to them.
-class PinBlock {
-public:
-    static void CloneAll(const PinList& from, PinList& to) {
-        const auto count = static_cast<std::size_t>(from.GetSize());
-        if (count == 0) {
-            return;
-        }
-        auto* const block = static_cast<char*>(Port::Pool::AllocatePacked(
-            count * (PlaceSize + sizeof(void*)), Port::Pool::DesignObjects));
-        void** const pointers = reinterpret_cast<void**>(block + count * PlaceSize);
-        std::size_t made = 0;
-        try {
-            for (; made < count; ++made) {
-                const Pin* const pin = from.GetAt(static_cast<int>(made));
-                pointers[made] = pin->CloneInto(block + made * PlaceSize);
-            }
-        } catch (...) {
-            to.Borrow(pointers, static_cast<int>(made), static_cast<int>(made));
-            Destroy(to, block);
-            throw;
-        }
-        to.Borrow(pointers, from.GetSize(), from.GetSize());
-    }
-
-    static void DestroyAll(PinList& pins) noexcept {
-        if (!pins.IsEmpty()) {
-            // The pins may have been sorted since: the block begins at the lowest of them.
-            Pin* first = pins.GetAt(0);
-            for (Pin* pin : Iterator<Pin*>(&pins)) {
-                first = std::min(first, pin, std::less<>());
-            }
-            Destroy(pins, first);
-        }
-    }
-
-private:
-    static constexpr std::size_t PlaceSize = sizeof(ScalarPin);
-    static_assert(sizeof(BusPin) == PlaceSize && sizeof(BusIndexPin) == PlaceSize);
-    static_assert(alignof(ScalarPin) <= 8);
-
-    static void Destroy(PinList& pins, void* block) noexcept {
-        for (int i = pins.GetSize(); i > 0; --i) {
-            pins.GetAt(i - 1)->~Pin();
-        }
-        pins.Empty();
-        Port::Pool::Free(block);
-    }
-};
+void Component::RemovePin(Pin* pin) noexcept {
+    PinBlock::Remove(pins_, pin);
+}
 
 Instance::Instance(const char* name, const Component* component)
     : Object(ObjectTypeInstance), anchor_(component == nullptr ? nullptr : component->anchor_) {
@@ -157,6 +104,7 @@ Instance::Instance(const char* name, const Component* component)
 }
 
 Instance::~Instance() {
+    NetlistOwner::Leave(*this);
     PinBlock::DestroyAll(pins_);
     if (anchor_ != nullptr) {
         anchor_->Leave();
@@ -165,6 +113,10 @@ Instance::~Instance() {
 
 void Instance::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitInstance(this);
+}
+
+void Instance::RemovePin(Pin* pin) noexcept {
+    PinBlock::Remove(pins_, pin);
 }
 
 Component* Instance::GetComponent() const noexcept {

@@ -96,6 +96,10 @@ void Object::CopyNameFrom(const Object& other) {
     Name() = other.Name();
 }
 
+void Object::SwapDetails(Object& other) noexcept {
+    Name().Swap(other.Name());
+}
+
 void Object::KeepKeyName(std::string_view newName) {
     if (!HasFlag(OwnedFlagBit) || Names::IsNamed(GetNameView(), newName)) {
         return;
@@ -110,6 +114,12 @@ std::string_view Object::GetKeyName() const noexcept {
     const ObjectDetails* const details = GetDetails();
     return details != nullptr && details->keyName != nullptr ? std::string_view(*details->keyName)
                                                              : GetNameView();
+}
+
+void Object::DropKeyName() noexcept {
+    if (ObjectDetails* const details = GetDetails()) {
+        details->keyName.reset();
+    }
 }
 
 bool Object::IsNamed(const char* name) const noexcept {

@@ -29,6 +29,8 @@ public:
         }
     }
 
+    /// Exchanges names and details.
+    void Swap(ObjectName& other) noexcept;
     /// Stores a text. When allocation fails the name stays as it was.
     void Assign(std::string_view text);
 

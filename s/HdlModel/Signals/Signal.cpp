@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Model/Signals/Signal.h"
 
+#include "HdlModel/Netlist/NetlistOwner.h"
 #include "HdlModel/Objects/ObjectDetails.h"
 #include "HdlModel/Signals/PinLinks.h"
 #include "HdlModel/Signals/References.h"
@@ -12,6 +13,7 @@ Signal::Signal(const char* name) : Object(ObjectTypeSignal) {
 }
 
 Signal::~Signal() {
+    NetlistOwner::Leave(*this);
     Signal::LeaveAll();
 }
 
@@ -83,7 +85,10 @@ void Signal::CloneConnection(Signal* other) {
 }
 
 Iterator<Signal*> Signal::GetSignalIterator() const noexcept {
-    return Iterator<Signal*>(References::GetAliases(*this));
+    // The list is made with the first link of the signal.
+    return Iterator<Signal*>(this, [](const void* signal) {
+        return References::GetAliases(*static_cast<const Signal*>(signal));
+    });
 }
 
 void Signal::AssignConstantValue(const BitVectorValue& value) {

@@ -31,8 +31,8 @@ class ORN_HDL_API Signal : public Object, public AttributeHolder {
 public:
     Signal(const Signal&) = delete;
     Signal& operator=(const Signal&) = delete;
-    /// Opens every pin that points at this signal, and takes the signal out of the aliases, slices
-    /// and members of all others.
+    /// The netlist drops the signal, whoever destroys it. Every pin that points at the signal
+    /// becomes open, and all other signals drop it from their aliases, slices and members.
     ~Signal() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
