@@ -29,6 +29,15 @@ public:
     explicit Netlist(const char* name = nullptr);
     Netlist(const Netlist&) = delete;
     Netlist& operator=(const Netlist&) = delete;
+    /// Takes over the name, comment, attributes and objects of another netlist, which is then an
+    /// empty one with the default name. Pointers to the objects stay valid.
+    /// \throws std::bad_alloc, nothing changed, when allocation fails.
+    Netlist(Netlist&& other); // NOLINT(performance-noexcept-move-constructor)
+    /// Destroys the objects of this netlist and takes over the name, comment, attributes and
+    /// objects of another one, which is then an empty one with the default name.
+    /// \throws std::bad_alloc, nothing changed, when allocation fails.
+    Netlist& operator=(Netlist&& other); // NOLINT(performance-noexcept-move-constructor)
+    /// Destroys everything that the netlist owns.
     ~Netlist() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
@@ -144,10 +153,18 @@ public:
 private:
     friend class Model;
     friend class NetlistOwner;
+    friend class Renaming;
     friend class ModelRegistry;
     friend class ReadAhead;
     struct Implementation;
 
+    /// Exchanges everything with another netlist but who is told of a new name.
+    void Swap(Netlist& other) noexcept;
+    /// Whether this netlist owns a component, an instance or a signal.
+    bool Holds(const AttributeHolder& object) const noexcept;
+    /// Gives a held object another name, under which it is found from then on. If allocation
+    /// fails, nothing changes.
+    void Rename(Object& object, ObjectName& name);
     /// Who is told of a new name; not owned, null for nobody.
     void SetNameListener(NameListener* listener) noexcept;
 

@@ -139,6 +139,7 @@ private:
     std::string_view GetKeyName() const noexcept;
     void KeepKeyName(std::string_view newName);
     void DropKeyName() noexcept;
+    void SwapName(ObjectName& name) noexcept;
 
     /// Holds an `ObjectName`, whose class is private to the library.
     alignas(8) unsigned char nameStorage_[15];

@@ -23,6 +23,7 @@
 #include <algorithm>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -91,6 +92,12 @@ struct Netlist::Implementation {
         }
     }
 
+    void TellName() const noexcept {
+        if (nameListener != nullptr) {
+            nameListener->NameChanged();
+        }
+    }
+
     /// Takes ownership of an object that has no owner, and of no other.
     template <class T> void Take(T* object, OwnPtrArray<T*>& objects) {
         if (object == nullptr || OwnedFlag::Get(*object)) {
@@ -102,6 +109,31 @@ struct Netlist::Implementation {
         objects.AddNew(object);
         OwnedFlag::Set(*taken.release());
         OwnerLink::Set(*object, this);
+        byName.Add(object, GroupOf(object));
+        Enter(object);
+    }
+
+    /// Whether an object is found by its key name, so that it has a place in the index.
+    bool IsFound(const Component* object) const noexcept {
+        return byName.Find(NameKey(ObjectKey::Get(*object), ComponentGroup)) == object;
+    }
+    bool IsFound(const Instance* object) const noexcept {
+        return byName.Find(NameKey(ObjectKey::Get(*object), InstanceGroup)) == object;
+    }
+    bool IsFound(const Signal* object) const noexcept {
+        const Bus* const bus = As<Bus>(object);
+        return byName.Find(NameKey(ObjectKey::Get(*object), SignalGroup)) == object &&
+               (bus == nullptr || busesByBaseName.Find(NameKey(KeyBaseName()(bus))) == bus);
+    }
+
+    /// Gives an object another name, under which it is found.
+    template <class T> void Rename(T* object, ObjectName& name) {
+        if (!IsFound(object)) {
+            MakeRoomFor(object);
+        }
+        ForgetBaseName(object);
+        byName.Remove(object, GroupOf(object));
+        ObjectKey::Replace(*object, name);
         byName.Add(object, GroupOf(object));
         Enter(object);
     }
@@ -180,7 +212,28 @@ Netlist::Netlist(const char* name)
     SetNameVerbatim(name == nullptr ? "hdlNetlist" : name);
 }
 
+// NOLINTNEXTLINE(performance-noexcept-move-constructor)
+Netlist::Netlist(Netlist&& other) : Netlist() {
+    Swap(other);
+}
+
+// NOLINTNEXTLINE(performance-noexcept-move-constructor)
+Netlist& Netlist::operator=(Netlist&& other) {
+    Netlist taken(std::move(other));
+    Swap(taken);
+    return *this;
+}
+
 Netlist::~Netlist() = default;
+
+void Netlist::Swap(Netlist& other) noexcept {
+    SwapDetails(other);
+    SwapAttrs(other);
+    std::swap(implementation_, other.implementation_);
+    std::swap(implementation_->nameListener, other.implementation_->nameListener);
+    implementation_->TellName();
+    other.implementation_->TellName();
+}
 
 void Netlist::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitNetlist(this);
@@ -188,9 +241,7 @@ void Netlist::AcceptObject(ObjectVisitor& visitor) {
 
 void Netlist::SetName(const char* name) {
     SetNameVerbatim(Port::ViewOf(name));
-    if (implementation_->nameListener != nullptr) {
-        implementation_->nameListener->NameChanged();
-    }
+    implementation_->TellName();
 }
 
 void Netlist::SetNameListener(NameListener* listener) noexcept {
@@ -239,6 +290,24 @@ std::unique_ptr<Instance> Netlist::DetachInstance(Instance* instance) noexcept {
 
 std::unique_ptr<Component> Netlist::DetachComponent(Component* component) noexcept {
     return implementation_->Detach(component, implementation_->components);
+}
+
+bool Netlist::Holds(const AttributeHolder& object) const noexcept {
+    return OwnerLink::Get<void>(object) == implementation_.get();
+}
+
+void Netlist::Rename(Object& object, ObjectName& name) {
+    switch (object.GetObjectType()) {
+    case ObjectTypeSignal:
+        implementation_->Rename(static_cast<Signal*>(&object), name);
+        break;
+    case ObjectTypeInstance:
+        implementation_->Rename(static_cast<Instance*>(&object), name);
+        break;
+    default:
+        implementation_->Rename(static_cast<Component*>(&object), name);
+        break;
+    }
 }
 
 void Netlist::RemovePin(Component* component, Pin* pin) noexcept {

@@ -122,6 +122,11 @@ void Object::DropKeyName() noexcept {
     }
 }
 
+void Object::SwapName(ObjectName& name) noexcept {
+    Name().SwapText(name);
+    DropKeyName();
+}
+
 bool Object::IsNamed(const char* name) const noexcept {
     return Names::IsNamed(GetNameView(), Port::ViewOf(name));
 }

@@ -21,6 +21,8 @@ struct ObjectKey {
     static std::string_view Get(const Object& object) noexcept { return object.GetKeyName(); }
     /// Makes the present name the key name, when the owner lets the object go.
     static void Drop(Object& object) noexcept { object.DropKeyName(); }
+    /// Exchanges the name for another one, which becomes the key name.
+    static void Replace(Object& object, ObjectName& name) noexcept { object.SwapName(name); }
 };
 
 } // namespace Orn_Hdl
