@@ -8,6 +8,7 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -15,12 +16,13 @@
 namespace Orn_Hdl {
 
 class AttributeVisitor;
+struct AttributeTable;
 
 /// A bit-vector literal: its digits, and, when they were given, its base and its length in bits.
 class ORN_HDL_API BitVectorValue {
 public:
     BitVectorValue() = default;
-    /// A literal read from a text, as `SetValue` reads it.
+    /// The literal that `SetValue` reads from a text.
     explicit BitVectorValue(const char* text) { SetValue(text); }
 
     /// Reads "LENGTH:BASE:DIGITS" with base B, O or H, such as "8:H:A5"; a text with fewer than
@@ -56,13 +58,15 @@ public:
     /// Values of the synthesis-attribute option.
     enum SynAttrOption { SynAttrNone = 0, SynAttrAssign = 1, SynAttrAssignNoDec = 2 };
 
-    /// The type of an attribute that is added without a type.
+    /// The name of the type that an attribute gets when none is named.
     static constexpr const char* DEFAULT_ATTRTYPE = "String";
     /// The generic option of a new attribute.
     static constexpr int DEFAULT_GENERIC = GenericNone;
     /// The synthesis-attribute option of a new attribute.
     static constexpr int DEFAULT_SYNATTR = SynAttrNone;
 
+    /// The holder drops the attribute, whoever destroys it.
+    ~Attribute() override;
     void AcceptObject(ObjectVisitor& visitor) override;
     /// Calls the visit operation of this attribute's type.
     virtual void AcceptAttribute(AttributeVisitor& visitor);
@@ -85,7 +89,9 @@ public:
     /// The generic option as a text.
     Port::StringBase<char> GetGeneric() const;
     /// The generic option.
-    GenericOption GetGenericOption() const noexcept { return static_cast<GenericOption>(generic_); }
+    GenericOption GetGenericOption() const noexcept {
+        return static_cast<GenericOption>(GetOption(GenericFlags));
+    }
     /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", letter case
     /// ignored.
     /// \return false, the option unchanged, for any other text.
@@ -93,7 +99,9 @@ public:
     /// The synthesis-attribute option as a text.
     Port::StringBase<char> GetSynAttr() const;
     /// The synthesis-attribute option.
-    SynAttrOption GetSynAttrOption() const noexcept { return static_cast<SynAttrOption>(synAttr_); }
+    SynAttrOption GetSynAttrOption() const noexcept {
+        return static_cast<SynAttrOption>(GetOption(SynAttrFlags));
+    }
 
     /// Whether name, comment, type and both options are equal, and the value texts ignoring case.
     bool operator==(const Attribute& other) const;
@@ -103,20 +111,33 @@ public:
 protected:
     /// An attribute with the default options.
     explicit Attribute(const char* name);
-    Attribute(const Attribute&) = default;
-    Attribute& operator=(const Attribute&) = default;
+    /// Copies name, comment and options; the copy has no holder.
+    Attribute(const Attribute& other);
+    /// Copies name, comment and options; the holder stays.
+    Attribute& operator=(const Attribute& other);
 
 private:
-    unsigned generic_ : 2;
-    unsigned synAttr_ : 2;
+    friend struct AttributeTable;
+
+    /// The options stand in flags of the object, two bits each.
+    static constexpr unsigned GenericFlags = 0x10;
+    static constexpr unsigned SynAttrFlags = 0x40;
+
+    int GetOption(unsigned flags) const noexcept {
+        return (HasFlag(flags) ? 1 : 0) + (HasFlag(flags * 2) ? 2 : 0);
+    }
+    void SetOption(unsigned flags, int option) noexcept;
+
+    /// The table that holds the attribute; null without a holder.
+    AttributeTable* table_ = nullptr;
 };
 
 /// A text.
 class ORN_HDL_API AttributeString : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeString(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes a text attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -133,9 +154,9 @@ private:
 /// A signed 32-bit integer, parsed by the rules of `atoi`, saturating.
 class ORN_HDL_API AttributeInteger : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeInteger(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes an integer attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -153,9 +174,9 @@ private:
 /// too small for a double is a zero of its sign; one that is not finite is 0.0.
 class ORN_HDL_API AttributeFloat : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeFloat(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes a floating-point attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -174,9 +195,9 @@ private:
 /// True exactly for the text "true" in any letter case.
 class ORN_HDL_API AttributeBoolean : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeBoolean(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes a truth-value attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -193,9 +214,9 @@ private:
 /// "1" for the text "1", else "0".
 class ORN_HDL_API AttributeBit : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeBit(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes a bit attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -212,9 +233,9 @@ private:
 /// A bit-vector literal.
 class ORN_HDL_API AttributeBitVector : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeBitVector(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes a bit-vector attribute on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -234,9 +255,9 @@ private:
 /// A text of a type that the user names.
 class ORN_HDL_API AttributeUser : public Attribute {
 public:
-    /// A new attribute; null texts are read as "".
+    /// Null texts are read as "".
     AttributeUser(const char* name, const char* value);
-    /// A new attribute that the caller owns; null texts are read as "".
+    /// Makes an attribute of a user type on the heap; the caller owns it.
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -262,51 +283,76 @@ public:
     AttributeVisitor(const AttributeVisitor&) = default;
     AttributeVisitor& operator=(const AttributeVisitor&) = default;
     virtual ~AttributeVisitor();
-    /// Visits an attribute of a class that is none of the library's.
+    /// Called for an attribute of a class that does not override `AcceptAttribute`.
     virtual void VisitAttribute(Attribute* attribute);
-    /// Visits an attribute whose value is a text.
+    /// Called for a text.
     virtual void VisitAttributeString(AttributeString* attribute);
-    /// Visits an attribute whose value is an integer.
+    /// Called for an integer.
     virtual void VisitAttributeInteger(AttributeInteger* attribute);
-    /// Visits an attribute whose value is a floating-point number.
+    /// Called for a floating-point number.
     virtual void VisitAttributeFloat(AttributeFloat* attribute);
-    /// Visits an attribute whose value is one bit.
+    /// Called for a bit.
     virtual void VisitAttributeBit(AttributeBit* attribute);
-    /// Visits an attribute whose value is a bit vector.
+    /// Called for a bit-vector literal.
     virtual void VisitAttributeBitVector(AttributeBitVector* attribute);
-    /// Visits an attribute whose value is true or false.
+    /// Called for a truth value.
     virtual void VisitAttributeBoolean(AttributeBoolean* attribute);
-    /// Visits an attribute of a type that the user names.
+    /// Called for a text of a type that the user names.
     virtual void VisitAttributeUser(AttributeUser* attribute);
 };
 
-/// Owns attributes, in the order in which they were added. A holder without attributes allocates
-/// nothing.
+/// Owns attributes, in the order in which they were added. A holder without attributes owns no
+/// table.
 class ORN_HDL_API AttributeHolder {
 public:
     AttributeHolder() noexcept;
-    /// Clones every attribute of the other holder.
+    /// Clones every attribute.
     AttributeHolder(const AttributeHolder& other);
-    /// Replaces the attributes by clones of those of the other holder.
+    /// Destroys the attributes and clones those of another holder. If allocation fails, nothing
+    /// changes.
     AttributeHolder& operator=(const AttributeHolder& other);
+    /// Destroys the attributes.
     virtual ~AttributeHolder();
 
-    /// Takes ownership, even if allocation fails. Null is ignored, and so is an attribute that has
-    /// an owner. A second attribute of the same name is held and iterated too; `GetAttr` then finds
-    /// the later one.
+    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is an
+    /// attribute that has an owner. A second attribute of one name is held and iterated too, and
+    /// `GetAttr` then finds the later one.
     virtual void AddAttr(Attribute* attribute);
-    /// The attribute of that name, normalised and letter case ignored; null if there is none.
+    /// Destroys an attribute of this holder, as `delete` does. Null, and an attribute that this
+    /// holder does not own, are ignored.
+    void RemoveAttr(Attribute* attribute) noexcept;
+    /// Takes an attribute out without destroying it.
+    /// \return the attribute, which the caller owns; null when this holder does not own it.
+    std::unique_ptr<Attribute> DetachAttr(Attribute* attribute) noexcept;
+    /// The attribute of that name, normalised and letter case ignored; null when there is none.
     virtual Attribute* GetAttr(const char* name) const;
 
-    /// The attributes, in the order in which they were added. Attributes that are added or assigned
-    /// during the walk are included. The holder must outlive the iterator.
+    /// The attributes, in the order in which they were added, those included that are added or
+    /// assigned while it walks. The holder must outlive it.
     Iterator<Attribute*> GetAttrIterator() const noexcept;
     /// Whether there are any.
-    bool HasAttrs() const noexcept { return table_ != nullptr; }
+    bool HasAttrs() const noexcept { return GetTable() != nullptr && HasAttrsInTable(); }
+
+protected:
+    /// Exchanges the attributes with those of another holder.
+    void SwapAttrs(AttributeHolder& other) noexcept;
 
 private:
-    struct Table;
-    std::unique_ptr<Table> table_;
+    friend class OwnerLink;
+
+    /// Whether `link_` leads to the owner of the holder, which is marked by an odd address.
+    bool IsLinkToOwner() const noexcept {
+        return (reinterpret_cast<std::uintptr_t>(link_) & 1) != 0;
+    }
+    AttributeTable* GetTable() const noexcept {
+        return IsLinkToOwner() ? nullptr : static_cast<AttributeTable*>(link_);
+    }
+    AttributeTable& MakeTable();
+    bool HasAttrsInTable() const noexcept;
+
+    /// The table of the attributes; without one, the owner of the holder, or null. Most objects
+    /// have no attributes, so that knowing its owner costs an object no memory.
+    void* link_ = nullptr;
 };
 
 /// Makes attributes by the name of their type.
@@ -315,7 +361,7 @@ public:
     /// Makes an attribute that the caller owns.
     using Creator = Attribute* (*)(const char* name, const char* value);
 
-    /// The table of the seven types, shared by the whole process and immutable once made.
+    /// The table of the seven types, shared by the whole process and never changed once made.
     static const IStringPtrMap<Creator>& GetCreators();
 };
 

@@ -43,6 +43,13 @@ public:
     Engine();
     Engine(const Engine&) = delete;
     Engine& operator=(const Engine&) = delete;
+    /// Takes over the models of another engine, which then has none. Pointers to the models stay
+    /// valid.
+    /// \throws std::bad_alloc, nothing changed, when allocation fails.
+    Engine(Engine&& other); // NOLINT(performance-noexcept-move-constructor)
+    /// Deletes the models of this engine and takes over those of another one, which then has none.
+    /// \throws std::bad_alloc, nothing changed, when allocation fails.
+    Engine& operator=(Engine&& other); // NOLINT(performance-noexcept-move-constructor)
     /// Deletes every model, the last one first. A command of a model may destroy the engine; see
     /// `Model::~Model`.
     ~Engine();

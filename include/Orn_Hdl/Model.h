@@ -5,6 +5,7 @@
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Orn_Hdl/Model/Component.h"
+#include "Orn_Hdl/Model/ConstVisitors.h"
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Model/Object.h"
 #include "Orn_Hdl/Model/Pins.h"
@@ -13,6 +14,7 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <memory>
 #include <string_view>
@@ -52,7 +54,8 @@ public:
 /// Every operation takes plain texts, looks the named objects up, checks them, and throws
 /// `Orn_Hdl::Exception` with a fixed message when a check fails; nothing that was done before is
 /// undone. A null name reads as "" in every look-up. Operations that change the design set the
-/// modified flag, but for `SetName` and `SetSourceFileName`.
+/// modified flag, but for `SetName` and `SetSourceFileName`. Where an operation returns a `bool`
+/// and nothing else is said, that is always true: what fails throws.
 ///
 /// Signals need not be declared: the first use of a name in a connection or constant declares it,
 /// and its form tells what it is: N a scalar signal, D(7:0) a bus or a slice of the bus D, D(2) a
@@ -141,38 +144,71 @@ public:
     Pin* GetPin(const char* name, const Component* component) const;
     /// The pin of that name, owned by the instance; null when there is none, or no instance.
     Pin* GetPin(const char* name, const Instance* instance) const;
+    /// Null, since there is no owner to look in.
+    Pin* GetPin(const char* /*name*/, std::nullptr_t) const noexcept { return nullptr; }
     /// The attribute of that name, owned by the holder; null when there is none, or no holder.
     Attribute* GetAttr(const char* name, const AttributeHolder* holder) const;
 
     /// Declares a component without pins. Components, instances and signals share one name space.
+    /// \return true.
     /// \throws Exception "Identifier ... already defined.\n" when the name is taken.
     bool AddComponent(const char* name);
     /// Appends a pin to a component; a default value that is not empty is taken. Instances that are
     /// there already do not get it.
+    /// \return true.
     /// \throws Exception "Component ... not found.\n", "Component ... already has pin ...\n".
     bool AddPin(const char* name, const Polarity& polarity, const char* component,
                 const char* defaultValue);
     /// Places a component: the instance gets its own copies of the component's pins, all open.
+    /// \return true.
     /// \throws Exception "Identifier ... already defined.\n", "Component ... not found.\n".
     bool AddInstance(const char* name, const char* component);
     /// Declares a signal, or a bus when the name has a range. It is no port until it is given a
     /// polarity.
+    /// \return true.
     /// \throws Exception "Identifier ... already defined.\n", or, for a bus whose base name another
     ///         bus has, "Signal ... already declared.\n".
     bool AddSignal(const char* name);
+    /// Renames a component, which is found by the new name from then on. The new name
+    /// may differ from the old one in letter case alone.
+    /// \return true.
+    /// \throws Exception "Invalid Name.\n" for a null new name, "Component ... not found.\n",
+    ///         "Identifier ... already defined.\n".
+    bool RenameComponent(const char* name, const char* newName);
+    /// Renames an instance, which is found by the new name from then on. The new name
+    /// may differ from the old one in letter case alone.
+    /// \return true.
+    /// \throws Exception "Invalid Name.\n" for a null new name, "... not found.\n", "Identifier ...
+    ///         already defined.\n".
+    bool RenameInstance(const char* name, const char* newName);
+    /// Renames a scalar signal or a bus, which is found by the new name from then on. The slices
+    /// and bits of a bus are renamed with it, and so is every compound whose name names one of
+    /// these. A bus keeps its range, and the new name has to have it too. The new name
+    /// may differ from the old one in letter case alone. If allocation fails, either everything or
+    /// nothing is renamed.
+    /// \return true.
+    /// \throws Exception "Invalid Name.\n" for a null new name, a new name of another form or
+    ///         range, and a slice, bit or compound; "Signal ... not found.\n"; "Identifier ...
+    ///         already defined.\n" for any of the new names; for a bus whose new base name another
+    ///         bus has, "Signal ... already declared.\n".
+    bool RenameSignal(const char* name, const char* newName);
     /// Connects a pin to a signal, which is declared on its first use.
+    /// \return true.
     /// \throws Exception "Signal ... not found.\n" for an instance that is not there, and for a bit
     ///         of a bus that is not there; "Pin ... not found.\n".
     bool ConnectSignalToPin(const char* signal, const char* instance, const char* pin);
     /// Makes the second signal an alias of the first; both are declared on their first use.
+    /// \return true.
     /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
     bool ConnectSignals(const char* first, const char* second);
     /// Ties a signal to a constant; the signal is declared on its first use.
     /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
+    /// \return true.
     /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
     bool AssignConstantToSignal(const char* signal, const char* value);
     /// Connects a pin to a signal of its own that carries the constant.
     /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
+    /// \return true.
     /// \throws Exception "Signal ... not found.\n" for an instance that is not there, "Pin ... not
     ///         found.\n".
     bool AssignConstantToPin(const char* instance, const char* pin, const char* value);
@@ -184,28 +220,34 @@ public:
     /// \throws Exception "Invalid attribute type.\n".
     bool AddAttr(AttributeHolder* holder, const char* name, const char* value, const char* type);
     /// Adds an attribute to the module, as `AddAttr` does.
+    /// \return true.
     /// \throws Exception "Invalid Name.\n" for a null name, "Invalid attribute type.\n".
     bool AddModuleAttr(const char* name, const char* value, const char* type);
     /// Adds an attribute to a component, as `AddAttr` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
     ///         type.\n".
     bool AddComponentAttr(const char* component, const char* name, const char* value,
                           const char* type);
     /// Adds an attribute to an instance, as `AddAttr` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
     ///         type.\n".
     bool AddInstanceAttr(const char* instance, const char* name, const char* value,
                          const char* type);
     /// Adds an attribute to a signal, as `AddAttr` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
     ///         type.\n".
     bool AddSignalAttr(const char* signal, const char* name, const char* value, const char* type);
     /// Adds an attribute to a pin of a component, as `AddAttr` does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Invalid Name.\n" for a null name, "Invalid
     ///         attribute type.\n".
     bool AddComponentPinAttr(const char* component, const char* pin, const char* name,
                              const char* value, const char* type);
     /// Adds an attribute to a pin of an instance, as `AddAttr` does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Invalid Name.\n" for a null name, "Invalid
     ///         attribute type.\n".
     bool AddInstancePinAttr(const char* instance, const char* pin, const char* name,
@@ -231,127 +273,157 @@ public:
     bool SetUserType(AttributeHolder* holder, const char* attribute, const char* type);
 
     /// Sets the value of an attribute of the module, as `SetAttrValue` does.
+    /// \return true.
     /// \throws Exception "Attribute ... not found.\n".
     bool SetModuleAttrValue(const char* attribute, const char* value);
     /// Sets the value of an attribute of a component, as `SetAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
     bool SetComponentAttrValue(const char* component, const char* attribute, const char* value);
     /// Sets the value of an attribute of an instance, or of its component, as `SetAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
     bool SetInstanceAttrValue(const char* instance, const char* attribute, const char* value);
     /// Sets the value of an attribute of a signal, as `SetAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
     bool SetSignalAttrValue(const char* signal, const char* attribute, const char* value);
     /// Sets the value of an attribute of a pin of a component, as `SetAttrValue` does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n".
     bool SetComponentPinAttrValue(const char* component, const char* pin, const char* attribute,
                                   const char* value);
     /// Sets the value of an attribute of a pin of an instance, as `SetAttrValue` does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n".
     bool SetInstancePinAttrValue(const char* instance, const char* pin, const char* attribute,
                                  const char* value);
 
     /// Sets the generic option of an attribute of the module, as `SetGenericAttrValue` does.
+    /// \return true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
     bool SetModuleGenericAttrValue(const char* attribute, const char* value);
     /// Sets the generic option of an attribute of a component, as `SetGenericAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetComponentGenericAttrValue(const char* component, const char* attribute,
                                       const char* value);
     /// Sets the generic option of an attribute of an instance, or of its component, as
     /// `SetGenericAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetInstanceGenericAttrValue(const char* instance, const char* attribute,
                                      const char* value);
     /// Sets the generic option of an attribute of a signal, as `SetGenericAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetSignalGenericAttrValue(const char* signal, const char* attribute, const char* value);
     /// Sets the generic option of an attribute of a pin of a component, as `SetGenericAttrValue`
     /// does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetComponentPinGenericAttrValue(const char* component, const char* pin,
                                          const char* attribute, const char* value);
     /// Sets the generic option of an attribute of a pin of an instance, as `SetGenericAttrValue`
     /// does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetInstancePinGenericAttrValue(const char* instance, const char* pin,
                                         const char* attribute, const char* value);
 
     /// Sets the synthesis option of an attribute of the module, as `SetSynAttrValue` does.
+    /// \return true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
     bool SetModuleSynAttrValue(const char* attribute, const char* value);
     /// Sets the synthesis option of an attribute of a component, as `SetSynAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetComponentSynAttrValue(const char* component, const char* attribute, const char* value);
     /// Sets the synthesis option of an attribute of an instance, or of its component, as
     /// `SetSynAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetInstanceSynAttrValue(const char* instance, const char* attribute, const char* value);
     /// Sets the synthesis option of an attribute of a signal, as `SetSynAttrValue` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetSignalSynAttrValue(const char* signal, const char* attribute, const char* value);
     /// Sets the synthesis option of an attribute of a pin of a component, as `SetSynAttrValue`
     /// does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetComponentPinSynAttrValue(const char* component, const char* pin, const char* attribute,
                                      const char* value);
     /// Sets the synthesis option of an attribute of a pin of an instance, as `SetSynAttrValue`
     /// does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
     bool SetInstancePinSynAttrValue(const char* instance, const char* pin, const char* attribute,
                                     const char* value);
 
     /// Names the type of an attribute of the module, as `SetUserType` does.
+    /// \return true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid attribute type.\n".
     bool SetModuleUserType(const char* attribute, const char* type);
     /// Names the type of an attribute of a component, as `SetUserType` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
     bool SetComponentUserType(const char* component, const char* attribute, const char* type);
     /// Names the type of an attribute of an instance, or of its component, as `SetUserType` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
     bool SetInstanceUserType(const char* instance, const char* attribute, const char* type);
     /// Names the type of an attribute of a signal, as `SetUserType` does.
+    /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
     bool SetSignalUserType(const char* signal, const char* attribute, const char* type);
     /// Names the type of an attribute of a pin of a component, as `SetUserType` does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
     bool SetComponentPinUserType(const char* component, const char* pin, const char* attribute,
                                  const char* type);
     /// Names the type of an attribute of a pin of an instance, as `SetUserType` does.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
     bool SetInstancePinUserType(const char* instance, const char* pin, const char* attribute,
                                 const char* type);
 
     /// Adds a line to the module's comment; null adds nothing.
+    /// \return true.
     bool AddNotes(const char* text);
     /// Adds a line to the comment of a component; null is read as "".
+    /// \return true.
     /// \throws Exception "... not found.\n".
     bool AddComponentComment(const char* component, const char* text);
     /// Adds a line to the comment of an instance; null is read as "".
+    /// \return true.
     /// \throws Exception "... not found.\n".
     bool AddInstanceComment(const char* instance, const char* text);
     /// Adds a line to the comment of a signal; null is read as "".
+    /// \return true.
     /// \throws Exception "... not found.\n".
     bool AddSignalComment(const char* signal, const char* text);
     /// Adds a line to the comment of a pin of a component; null adds nothing.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n".
     bool AddComponentPinComment(const char* component, const char* pin, const char* text);
     /// Adds a line to the comment of a pin of an instance; null adds nothing.
+    /// \return true.
     /// \throws Exception "Pin ... not found.\n".
     bool AddInstancePinComment(const char* instance, const char* pin, const char* text);
 

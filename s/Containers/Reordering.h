@@ -1,4 +1,4 @@
-// Gives access to the places of an array's elements, which its interface does not.
+// Reorders the elements of an array.
 #pragma once
 
 #include "Orn_Hdl/Containers/PtrArray.h"
@@ -10,13 +10,6 @@ struct Reordering {
     /// `SetAt` of an owning array rejects.
     static void Place(PtrArrayBase& array, int index, void* element) noexcept {
         array.items_[index] = element;
-    }
-
-    /// Where the elements stand.
-    static void** GetPlaces(const PtrArrayBase& array) noexcept { return array.items_; }
-    /// Whether the elements stand in memory that somebody else owns.
-    static bool IsInBorrowedPlaces(const PtrArrayBase& array) noexcept {
-        return array.ownsItems_ == 0;
     }
 };
 

@@ -32,6 +32,18 @@ struct Engine::Implementation {
 
 Engine::Engine() : implementation_(std::make_unique<Implementation>()) {}
 
+// NOLINTNEXTLINE(performance-noexcept-move-constructor)
+Engine::Engine(Engine&& other) : Engine() {
+    implementation_.swap(other.implementation_);
+}
+
+// NOLINTNEXTLINE(performance-noexcept-move-constructor)
+Engine& Engine::operator=(Engine&& other) {
+    Engine taken(std::move(other));
+    implementation_.swap(taken.implementation_);
+    return *this;
+}
+
 Engine::~Engine() = default;
 
 bool Engine::CreateAndAddModel(const char* name, const char* sourceFile) {

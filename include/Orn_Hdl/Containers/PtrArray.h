@@ -100,6 +100,13 @@ protected:
         ownsItems_ = 0;
     }
 
+    /// Where the elements stand; for an array that has not grown since, what it borrowed.
+    void** GetItems() const noexcept { return items_; }
+    /// Whether somebody else owns the memory that the array uses, if it uses any.
+    bool IsBorrowed() const noexcept { return ownsItems_ == 0; }
+    /// How many elements have room there.
+    int GetCapacity() const noexcept { return static_cast<int>(capacity_); }
+
 private:
     friend struct Reordering;
 

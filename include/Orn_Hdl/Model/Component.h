@@ -17,8 +17,7 @@ namespace Orn_Hdl {
 struct ComponentAnchor;
 class PinIndex;
 
-/// The pins of a component or an instance, in order. A long list of theirs is searched through an
-/// index, any other list pin by pin.
+/// The pins of a component or an instance, in order. Long lists are searched through an index.
 class ORN_HDL_API PinList : public PtrArray<Pin*> {
 public:
     PinList() noexcept;
@@ -28,12 +27,13 @@ public:
 
     /// The first pin of that name, normalised and letter case ignored; null when there is none.
     Pin* GetPin(const char* name) const;
+    /// The first pin of that name, of known length, normalised and letter case ignored; null when
+    /// there is none.
     Pin* GetPin(std::string_view name) const;
     /// Sorts by polarity value, then by name in natural order, stably.
     void SortByPolarityAndName();
 
 private:
-    friend class Component;
     friend class PinBlock;
     friend class PinIndex;
     friend class PinRenaming;
@@ -41,10 +41,13 @@ private:
     static constexpr int LongestUnindexed = 16;
 
     Pin* FindOneByOne(std::string_view name) const noexcept;
-    /// The pin that stood at a place when the list was made; null for a place that it has not.
+    /// The pin that was made at a place of the list; null for a place that the list does not have.
+    /// The pins of an instance keep their places when they are sorted or removed.
     Pin* GetAtPlace(std::uint32_t place) const noexcept;
     /// Enters the last pin into the index, which is made when the list gets long.
     void IndexLast() noexcept;
+    /// Makes the index anew if the list is long.
+    void IndexAll() noexcept;
     /// Enters the pin at a place into the index, if there is one.
     void Enter(std::uint32_t place) noexcept;
     /// Makes sure that no other list uses the index. \return whether there is an index.
@@ -52,7 +55,7 @@ private:
     /// Lets the list be searched pin by pin.
     void DropIndex() noexcept;
 
-    /// Null for a short list, and for one whose index found no memory.
+    /// Null for a short list, and for one whose index could not be allocated.
     PinIndex* index_ = nullptr;
 };
 
@@ -63,7 +66,8 @@ public:
     explicit Component(const char* name);
     Component(const Component&) = delete;
     Component& operator=(const Component&) = delete;
-    /// Instances of this component keep their pins and then have no component.
+    /// The netlist drops the component, whoever destroys it. Its instances keep their pins and then
+    /// have no component.
     ~Component() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
@@ -73,19 +77,25 @@ public:
     /// \param name null is read as "".
     /// \param defaultValue taken when its text is not empty.
     void AddPin(const char* name, const Polarity& polarity, const BitVectorValue& defaultValue);
+    /// Appends a pin whose default value is given as a bit-vector literal; null is read as "". A
+    /// name that is taken is not refused here. Instances made before do not get the pin.
+    /// \param name null is read as "".
     void AddPin(const char* name, const Polarity& polarity, const char* defaultValue);
     /// Appends a clone of a pin.
     void AddPin(const Pin& pin);
+    /// Destroys a pin of this component, as `delete` does. Instances keep their pins:
+    /// `Netlist::RemovePin` removes those too. Null, and a pin of another owner, are ignored.
+    void RemovePin(Pin* pin) noexcept;
     /// The pin of that name; null when there is none.
     Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
+    /// The pin of that name, of known length; null when there is none.
     Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
     /// The pins, in order.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
 
 private:
     friend class Instance;
-
-    void AddClone(const Pin& pin);
+    friend class PinBlock;
 
     PinList pins_;
     ComponentAnchor* anchor_;
@@ -98,6 +108,7 @@ public:
     Instance(const char* name, const Component* component);
     Instance(const Instance&) = delete;
     Instance& operator=(const Instance&) = delete;
+    /// The netlist drops the instance, whoever destroys it, and its pins leave all signals.
     ~Instance() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
@@ -111,9 +122,13 @@ public:
 
     /// The pin of that name; null when there is none.
     Pin* GetPin(const char* name) const { return pins_.GetPin(name); }
+    /// The pin of that name, of known length; null when there is none.
     Pin* GetPin(std::string_view name) const { return pins_.GetPin(name); }
     /// The pins, in order.
     Iterator<Pin*> GetPinIterator() const noexcept { return Iterator<Pin*>(&pins_); }
+    /// Destroys a pin of this instance, as `delete` does. Its memory is freed with the instance.
+    /// Null, and a pin of another owner, are ignored.
+    void RemovePin(Pin* pin) noexcept;
     /// Sorts the pins by polarity value, then by name in natural order.
     void SortPinName() { pins_.SortByPolarityAndName(); }
 

@@ -35,9 +35,10 @@ enum ObjectType {
 /// A named thing: the netlist, a component, instance, pin, signal or attribute. It has a name,
 /// stored normalised, and a comment of any number of lines.
 ///
-/// Whatever owns an object deletes it: the netlist its components, instances and signals, these
-/// their pins, an attribute holder its attributes. An object that is destroyed first takes itself
-/// out of every other object's lists, so no list ever names a dead object.
+/// The owner of an object destroys it: the netlist its components, instances and signals, a
+/// component or an instance its pins, an attribute holder its attributes. Anybody else may `delete`
+/// an object too: an object that is destroyed takes itself out of its owner and of every other
+/// object's lists, so no list ever names a destroyed object.
 class ORN_HDL_API Object : public Port::Pooled<Port::Pool::DesignObjects> {
 public:
     virtual ~Object();
@@ -45,7 +46,13 @@ public:
     virtual int GetObjectType() const;
     /// Calls the visit operation of this object's kind with this object.
     virtual void AcceptObject(ObjectVisitor& visitor) = 0;
-    /// Stores a name, normalised; null is read as "".
+    /// Stores a name, normalised; null is read as "". No name is refused.
+    ///
+    /// A netlist goes on finding a component, an instance or a signal by the name under which it
+    /// was added, and so does a holder an attribute. The name that the object had is therefore not
+    /// free for another one, and the new name is not taken: a second net of that name can be
+    /// declared. `Model::RenameComponent`, `RenameInstance` and `RenameSignal` check the new name,
+    /// and the object is found by it afterwards.
     virtual void SetName(const char* name);
 
     /// The name, as a copy.
@@ -79,6 +86,9 @@ public:
     static bool IsValidIntegerString(const Port::StringBase<char>& text) noexcept;
 
 protected:
+    /// A nameless object without a comment. Its type is `ObjectTypeAttribute` unless a derived
+    /// class overrides `GetObjectType`.
+    Object() noexcept : Object(ObjectTypeAttribute) {}
     /// A nameless object of a kind.
     explicit Object(ObjectType type) noexcept;
     /// Copies name, comment and type.
@@ -90,6 +100,8 @@ protected:
     void SetNameVerbatim(std::string_view name);
     /// Shares the name of another object.
     void CopyNameFrom(const Object& other);
+    /// Exchanges names and comments with another object, and everything else in the details.
+    void SwapDetails(Object& other) noexcept;
 
     /// The parts that few objects have, made when first asked for.
     ORN_HDL_LOCAL ObjectDetails& MakeDetails();
@@ -105,36 +117,31 @@ protected:
     /// Sets the direction.
     void SetDirection(int direction);
 
-    /// Whether a flag of the derived classes is set; their flags stand in a spare byte.
+    /// Whether a flag of the derived classes is set; their flags stand in a spare byte. Classes
+    /// without a direction have its bits too.
     bool HasFlag(unsigned flag) const noexcept { return (bits_ & flag) != 0; }
     /// Sets or clears a flag.
     void SetFlag(unsigned flag, bool on) noexcept;
-    /// Whether this is a pin that knows the list in which it stands.
-    bool HasHome() const noexcept { return (bits_ & TypeMask) == HousedPinType; }
-    /// Marks such a pin.
-    void MarkHome() noexcept {
-        bits_ = static_cast<std::uint8_t>((bits_ & ~TypeMask) | HousedPinType);
-    }
 
 private:
     friend class OwnedFlag;
     friend struct ObjectKey;
 
     static constexpr unsigned TypeMask = 0x07;
-    static constexpr unsigned PinTypeBits = ObjectTypePin - ObjectTypeAttribute;
-    static constexpr unsigned HousedPinType = 0x06;
     static constexpr unsigned OwnedFlagBit = 0x08;
-    // 0x10 is the derived classes'.
+    // 0x10 is the derived classes', and 0x20 to 0x80 are those of classes without a direction.
     static constexpr unsigned DirectionMask = 0x60;
     static constexpr unsigned OddDirectionBit = 0x80;
 
     /// The type, less `ObjectTypeAttribute`.
-    unsigned GetTypeBits() const noexcept { return HasHome() ? PinTypeBits : bits_ & TypeMask; }
+    unsigned GetTypeBits() const noexcept { return bits_ & TypeMask; }
     ObjectName& Name() noexcept;
     const ObjectName& Name() const noexcept;
     int GetOddDirection() const noexcept;
     std::string_view GetKeyName() const noexcept;
     void KeepKeyName(std::string_view newName);
+    void DropKeyName() noexcept;
+    void SwapName(ObjectName& name) noexcept;
 
     /// Holds an `ObjectName`, whose class is private to the library.
     alignas(8) unsigned char nameStorage_[15];
@@ -148,15 +155,18 @@ public:
     ObjectVisitor(const ObjectVisitor&) = default;
     ObjectVisitor& operator=(const ObjectVisitor&) = default;
     virtual ~ObjectVisitor();
-    /// \{
-    /// Called by an object's `AcceptObject`, by its kind.
+    /// Called for an attribute of any class.
     virtual void VisitAttribute(Attribute* attribute);
+    /// Called for a signal of any class.
     virtual void VisitSignal(Signal* signal);
+    /// Called for a component.
     virtual void VisitComponent(Component* component);
+    /// Called for a pin of any class.
     virtual void VisitPin(Pin* pin);
+    /// Called for an instance.
     virtual void VisitInstance(Instance* instance);
+    /// Called for a netlist.
     virtual void VisitNetlist(Netlist* netlist);
-    /// \}
 };
 
 } // namespace Orn_Hdl

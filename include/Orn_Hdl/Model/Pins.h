@@ -71,7 +71,7 @@ enum PinType { PinTypeScalar = 1, PinTypeBus = 2, PinTypeBusIndex = 3 };
 /// is wired; an open pin points at none.
 class ORN_HDL_API Pin : public Object, public AttributeHolder {
 public:
-    /// Takes the pin out of the list of every signal.
+    /// Takes the pin out of its component or instance, and out of the list of every signal.
     ~Pin() override;
     /// `ObjectTypePin`, whatever was copied into the pin.
     int GetObjectType() const override;
@@ -89,8 +89,8 @@ public:
     virtual Port::StringBase<char> GetBaseName() const = 0;
 
     /// Points the pin at a signal, or opens it when that is null. The signal's list of pins stays
-    /// as it is: `Signal::Connect` links both ways. If allocation fails, nothing changes. \param
-    /// signal not owned.
+    /// as it is: `Signal::Connect` links both ways. If allocation fails, nothing changes.
+    /// \param signal not owned.
     void Connect(Signal* signal);
     /// Opens the pin. A signal that lists it goes on doing so. If allocation fails, nothing
     /// changes.
@@ -125,9 +125,7 @@ protected:
     Pin& operator=(const Pin& other);
 
 private:
-    friend class Component;
     friend class PinBlock;
-    friend struct PinHome;
     friend class PinLinks;
 
     /// Makes a copy of this pin at `place`, which has room for any pin.
@@ -139,7 +137,7 @@ private:
 };
 
 /// A pin of one bit.
-class ORN_HDL_API ScalarPin final : public Pin {
+class ORN_HDL_API ScalarPin : public Pin {
 public:
     /// An open pin; a null name is read as "".
     ScalarPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
@@ -155,7 +153,7 @@ private:
 };
 
 /// A pin with a range, such as D(7:0).
-class ORN_HDL_API BusPin final : public Pin {
+class ORN_HDL_API BusPin : public Pin {
 public:
     /// An open pin; a null name is read as "".
     BusPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}
@@ -177,7 +175,7 @@ private:
 };
 
 /// A pin for one bit of a bus, such as D(3).
-class ORN_HDL_API BusIndexPin final : public Pin {
+class ORN_HDL_API BusIndexPin : public Pin {
 public:
     /// An open pin; a null name is read as "".
     BusIndexPin(const char* name, const Polarity& polarity) : Pin(name, polarity) {}

@@ -1,17 +1,15 @@
 #include "Orn_Hdl/Model/Component.h"
 
-#include "Containers/Reordering.h"
 #include "HdlModel/Names/NaturalSort.h"
+#include "HdlModel/Netlist/NetlistOwner.h"
+#include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/PinIndex.h"
 #include "HdlModel/Signals/SignalCast.h"
 #include "Port/Ascii.h"
-#include "Port/Pool.h"
 
-#include <algorithm>
-#include <functional>
-#include <memory>
 #include <new>
 #include <unordered_set>
+#include <utility>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -40,15 +38,26 @@ Pin* PinList::FindOneByOne(std::string_view name) const noexcept {
     return nullptr;
 }
 
+Pin* PinList::GetAtPlace(std::uint32_t place) const noexcept {
+    return IsBorrowed() ? PinBlock::GetAtPlace(*this, place) : GetAt(static_cast<int>(place));
+}
+
 void PinList::IndexLast() noexcept {
-    const int size = GetSize();
-    if (size == LongestUnindexed + 1) {
+    if (index_ == nullptr && GetSize() == LongestUnindexed + 1) {
+        IndexAll();
+    } else {
+        Enter(static_cast<std::uint32_t>(GetSize() - 1));
+    }
+}
+
+void PinList::IndexAll() noexcept {
+    DropIndex();
+    if (GetSize() > LongestUnindexed) {
         index_ = new (std::nothrow) PinIndex();
-        for (std::uint32_t i = 0; i < LongestUnindexed; ++i) {
-            Enter(i);
+        for (int i = 0; i < GetSize(); ++i) {
+            Enter(static_cast<std::uint32_t>(i));
         }
     }
-    Enter(static_cast<std::uint32_t>(size - 1));
 }
 
 void PinList::Enter(std::uint32_t place) noexcept {
@@ -106,33 +115,14 @@ Component::Component(const char* name) : Object(ObjectTypeComponent), anchor_(nu
 }
 
 Component::~Component() {
+    NetlistOwner::Leave(*this);
     anchor_->component = nullptr;
     anchor_->Leave();
-    for (int i = pins_.GetSize(); i > 0; --i) {
-        delete pins_.GetAt(i - 1);
-    }
+    PinBlock::DeleteAll(pins_);
 }
 
 void Component::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitComponent(this);
-}
-
-void Component::AddClone(const Pin& pin) {
-    void* const memory =
-        Port::Pool::Allocate(sizeof(Pin) + PinHome::Size, Port::Pool::DesignObjects);
-    Pin* clone = nullptr;
-    try {
-        clone = pin.CloneInto(memory);
-        pins_.Add(clone);
-    } catch (...) {
-        if (clone != nullptr) {
-            clone->~Pin();
-        }
-        Port::Pool::Free(memory);
-        throw;
-    }
-    PinHome::Set(*clone, &pins_);
-    pins_.IndexLast();
 }
 
 void Component::AddPin(const char* name, const Polarity& polarity,
@@ -141,7 +131,7 @@ void Component::AddPin(const char* name, const Polarity& polarity,
     if (!defaultValue.GetValue().IsEmpty()) {
         pin->SetDefaultValue(defaultValue);
     }
-    AddClone(*pin);
+    PinBlock::Add(pins_, std::move(pin));
 }
 
 void Component::AddPin(const char* name, const Polarity& polarity, const char* defaultValue) {
@@ -149,91 +139,11 @@ void Component::AddPin(const char* name, const Polarity& polarity, const char* d
 }
 
 void Component::AddPin(const Pin& pin) {
-    AddClone(pin);
+    PinBlock::Add(pins_, std::unique_ptr<Pin>(pin.ClonePin()));
 }
 
-/// The pins of an instance stand in one block of memory, in the order of the component's pins, and
-/// behind them the array of pointers to them. Behind each pin of a long list stands its home.
-class PinBlock {
-public:
-    static void CloneAll(const PinList& from, PinList& to) {
-        const auto count = static_cast<std::size_t>(from.GetSize());
-        if (count == 0) {
-            return;
-        }
-        const std::size_t placeSize = PlaceSizeFor(from.GetSize());
-        auto* const block = static_cast<char*>(Port::Pool::AllocatePacked(
-            count * (placeSize + sizeof(void*)), Port::Pool::DesignObjects));
-        void** const pointers = reinterpret_cast<void**>(block + count * placeSize);
-        std::size_t made = 0;
-        try {
-            for (; made < count; ++made) {
-                const Pin* const pin = from.GetAt(static_cast<int>(made));
-                pointers[made] = pin->CloneInto(block + made * placeSize);
-            }
-        } catch (...) {
-            to.Borrow(pointers, static_cast<int>(made), static_cast<int>(made));
-            Destroy(to, block);
-            throw;
-        }
-        to.Borrow(pointers, from.GetSize(), from.GetSize());
-        if (placeSize > sizeof(Pin)) {
-            SettleAll(to);
-            to.index_ = from.index_;
-            if (to.index_ != nullptr) {
-                to.index_->Join();
-            }
-        }
-    }
-
-    static void DestroyAll(PinList& pins) noexcept {
-        if (!pins.IsEmpty()) {
-            // The pins may have been sorted since: the block begins at the lowest of them.
-            Pin* first = pins.GetAt(0);
-            for (Pin* pin : Iterator<Pin*>(&pins)) {
-                first = std::min(first, pin, std::less<>());
-            }
-            Destroy(pins, first);
-        }
-    }
-
-    /// The pin that stood at a place of the list before it was sorted.
-    static Pin* GetAtPlace(const PinList& pins, std::uint32_t place) noexcept {
-        const auto count = static_cast<std::size_t>(pins.GetSize());
-        char* const end = reinterpret_cast<char*>(Reordering::GetPlaces(pins));
-        return reinterpret_cast<Pin*>(end - (count - place) * PlaceSizeFor(pins.GetSize()));
-    }
-
-private:
-    static_assert(sizeof(ScalarPin) == sizeof(Pin) && sizeof(BusPin) == sizeof(Pin) &&
-                  sizeof(BusIndexPin) == sizeof(Pin));
-    static_assert(alignof(Pin) <= 8);
-
-    static std::size_t PlaceSizeFor(int count) noexcept {
-        return sizeof(Pin) + (count > PinList::LongestUnindexed ? PinHome::Size : 0);
-    }
-
-    static void SettleAll(PinList& pins) noexcept {
-        for (Pin* pin : Iterator<Pin*>(&pins)) {
-            PinHome::Set(*pin, &pins);
-        }
-    }
-
-    static void Destroy(PinList& pins, void* block) noexcept {
-        for (int i = pins.GetSize(); i > 0; --i) {
-            pins.GetAt(i - 1)->~Pin();
-        }
-        pins.Empty();
-        Port::Pool::Free(block);
-    }
-};
-
-Pin* PinList::GetAtPlace(std::uint32_t place) const noexcept {
-    if (place >= static_cast<std::uint32_t>(GetSize())) {
-        return nullptr;
-    }
-    return Reordering::IsInBorrowedPlaces(*this) ? PinBlock::GetAtPlace(*this, place)
-                                                 : GetAt(static_cast<int>(place));
+void Component::RemovePin(Pin* pin) noexcept {
+    PinBlock::Remove(pins_, pin);
 }
 
 Instance::Instance(const char* name, const Component* component)
@@ -246,6 +156,7 @@ Instance::Instance(const char* name, const Component* component)
 }
 
 Instance::~Instance() {
+    NetlistOwner::Leave(*this);
     PinBlock::DestroyAll(pins_);
     if (anchor_ != nullptr) {
         anchor_->Leave();
@@ -254,6 +165,10 @@ Instance::~Instance() {
 
 void Instance::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitInstance(this);
+}
+
+void Instance::RemovePin(Pin* pin) noexcept {
+    PinBlock::Remove(pins_, pin);
 }
 
 Component* Instance::GetComponent() const noexcept {

@@ -7,10 +7,13 @@
 #include "HdlModel/Netlist/DummySignals.h"
 #include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/Foresight.h"
+#include "HdlModel/Netlist/NetlistOwner.h"
+#include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Netlist/ReadAhead.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Objects/OwnerLink.h"
 #include "HdlModel/Signals/BusParts.h"
 #include "HdlModel/Signals/PinLinks.h"
 #include "HdlModel/Signals/References.h"
@@ -20,6 +23,7 @@
 #include <algorithm>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -74,9 +78,24 @@ struct Netlist::Implementation {
         dummies.Clear();
         // Signals are destroyed first: an instance then has nothing to leave.
         References::LeaveTogether(signals);
-        signals.DeleteAll();
-        instances.DeleteAll();
-        components.DeleteAll();
+        DestroyAll(signals);
+        DestroyAll(instances);
+        DestroyAll(components);
+    }
+
+    /// Each object is owned until it is its turn, so that it leaves if another one destroys it.
+    template <class T> static void DestroyAll(OwnPtrArray<T*>& objects) noexcept {
+        while (T* const last = objects.GetTail()) {
+            objects.RemoveTail();
+            OwnedFlag::Clear(*last);
+            delete last;
+        }
+    }
+
+    void TellName() const noexcept {
+        if (nameListener != nullptr) {
+            nameListener->NameChanged();
+        }
     }
 
     /// Takes ownership of an object that has no owner, and of no other.
@@ -89,18 +108,56 @@ struct Netlist::Implementation {
         MakeRoomFor(object);
         objects.AddNew(object);
         OwnedFlag::Set(*taken.release());
+        OwnerLink::Set(*object, this);
         byName.Add(object, GroupOf(object));
         Enter(object);
     }
 
-    template <class T> void Remove(T* object, OwnPtrArray<T*>& objects) {
-        const int place = object == nullptr ? -1 : PlaceOf<T>(objects, object);
-        if (place >= 0) {
-            Forget(object);
-            byName.Remove(object, GroupOf(object));
-            objects.RemoveAt(place);
-            delete object;
+    /// Whether an object is found by its key name, so that it has a place in the index.
+    bool IsFound(const Component* object) const noexcept {
+        return byName.Find(NameKey(ObjectKey::Get(*object), ComponentGroup)) == object;
+    }
+    bool IsFound(const Instance* object) const noexcept {
+        return byName.Find(NameKey(ObjectKey::Get(*object), InstanceGroup)) == object;
+    }
+    bool IsFound(const Signal* object) const noexcept {
+        const Bus* const bus = As<Bus>(object);
+        return byName.Find(NameKey(ObjectKey::Get(*object), SignalGroup)) == object &&
+               (bus == nullptr || busesByBaseName.Find(NameKey(KeyBaseName()(bus))) == bus);
+    }
+
+    /// Gives an object another name, under which it is found.
+    template <class T> void Rename(T* object, ObjectName& name) {
+        if (!IsFound(object)) {
+            MakeRoomFor(object);
         }
+        ForgetBaseName(object);
+        byName.Remove(object, GroupOf(object));
+        ObjectKey::Replace(*object, name);
+        byName.Add(object, GroupOf(object));
+        Enter(object);
+    }
+
+    /// Takes an object out without destroying it.
+    /// \return the object; null when the netlist does not hold it.
+    template <class T> std::unique_ptr<T> Detach(T* object, OwnPtrArray<T*>& objects) noexcept {
+        const int place = object == nullptr ? -1 : PlaceOf<T>(objects, object);
+        if (place < 0) {
+            return nullptr;
+        }
+        ForgetBaseName(object);
+        LetGo(*object, objects, place);
+        return std::unique_ptr<T>(object);
+    }
+
+    /// Takes out the object at a place. The classes that are derived from `T` may be gone.
+    template <class T> void LetGo(T& object, OwnPtrArray<T*>& objects, int place) noexcept {
+        Forget(&object);
+        byName.Remove(&object, GroupOf(&object));
+        objects.RemoveAt(place);
+        OwnedFlag::Clear(object);
+        ObjectKey::Drop(object);
+        OwnerLink::Set(object, nullptr);
     }
 
     void MakeRoomFor(const Object* /*object*/) { byName.MakeRoom(); }
@@ -119,20 +176,64 @@ struct Netlist::Implementation {
     }
 
     void Forget(Object* /*object*/) noexcept {}
-    void Forget(Signal* signal) noexcept {
-        dummies.Forget(signal);
+    void Forget(Signal* signal) noexcept { dummies.Forget(signal); }
+
+    void ForgetBaseName(Object* /*object*/) noexcept {}
+    void ForgetBaseName(Signal* signal) noexcept {
         if (Bus* const bus = As<Bus>(signal)) {
             busesByBaseName.Remove(bus);
         }
     }
 };
 
+void NetlistOwner::LetGo(Component& component) noexcept {
+    auto& netlist = *OwnerLink::Get<Netlist::Implementation>(component);
+    netlist.LetGo(component, netlist.components,
+                  PlaceOf<Component>(netlist.components, &component));
+}
+
+void NetlistOwner::LetGo(Instance& instance) noexcept {
+    auto& netlist = *OwnerLink::Get<Netlist::Implementation>(instance);
+    netlist.LetGo(instance, netlist.instances, PlaceOf<Instance>(netlist.instances, &instance));
+}
+
+void NetlistOwner::LetGo(Signal& signal) noexcept {
+    auto& netlist = *OwnerLink::Get<Netlist::Implementation>(signal);
+    netlist.LetGo(signal, netlist.signals, PlaceOf<Signal>(netlist.signals, &signal));
+}
+
+void NetlistOwner::LetGo(Bus& bus) noexcept {
+    OwnerLink::Get<Netlist::Implementation>(bus)->busesByBaseName.Remove(&bus);
+    LetGo(static_cast<Signal&>(bus));
+}
+
 Netlist::Netlist(const char* name)
     : Object(ObjectTypeNetlist), implementation_(std::make_unique<Implementation>()) {
     SetNameVerbatim(name == nullptr ? "hdlNetlist" : name);
 }
 
+// NOLINTNEXTLINE(performance-noexcept-move-constructor)
+Netlist::Netlist(Netlist&& other) : Netlist() {
+    Swap(other);
+}
+
+// NOLINTNEXTLINE(performance-noexcept-move-constructor)
+Netlist& Netlist::operator=(Netlist&& other) {
+    Netlist taken(std::move(other));
+    Swap(taken);
+    return *this;
+}
+
 Netlist::~Netlist() = default;
+
+void Netlist::Swap(Netlist& other) noexcept {
+    SwapDetails(other);
+    SwapAttrs(other);
+    std::swap(implementation_, other.implementation_);
+    std::swap(implementation_->nameListener, other.implementation_->nameListener);
+    implementation_->TellName();
+    other.implementation_->TellName();
+}
 
 void Netlist::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitNetlist(this);
@@ -140,9 +241,7 @@ void Netlist::AcceptObject(ObjectVisitor& visitor) {
 
 void Netlist::SetName(const char* name) {
     SetNameVerbatim(Port::ViewOf(name));
-    if (implementation_->nameListener != nullptr) {
-        implementation_->nameListener->NameChanged();
-    }
+    implementation_->TellName();
 }
 
 void Netlist::SetNameListener(NameListener* listener) noexcept {
@@ -170,15 +269,58 @@ void Netlist::Add(Component* component) {
 }
 
 void Netlist::Remove(Signal* signal) {
-    implementation_->Remove(signal, implementation_->signals);
+    DetachSignal(signal).reset();
 }
 
 void Netlist::Remove(Instance* instance) {
-    implementation_->Remove(instance, implementation_->instances);
+    DetachInstance(instance).reset();
 }
 
 void Netlist::Remove(Component* component) {
-    implementation_->Remove(component, implementation_->components);
+    DetachComponent(component).reset();
+}
+
+std::unique_ptr<Signal> Netlist::DetachSignal(Signal* signal) noexcept {
+    return implementation_->Detach(signal, implementation_->signals);
+}
+
+std::unique_ptr<Instance> Netlist::DetachInstance(Instance* instance) noexcept {
+    return implementation_->Detach(instance, implementation_->instances);
+}
+
+std::unique_ptr<Component> Netlist::DetachComponent(Component* component) noexcept {
+    return implementation_->Detach(component, implementation_->components);
+}
+
+bool Netlist::Holds(const AttributeHolder& object) const noexcept {
+    return OwnerLink::Get<void>(object) == implementation_.get();
+}
+
+void Netlist::Rename(Object& object, ObjectName& name) {
+    switch (object.GetObjectType()) {
+    case ObjectTypeSignal:
+        implementation_->Rename(static_cast<Signal*>(&object), name);
+        break;
+    case ObjectTypeInstance:
+        implementation_->Rename(static_cast<Instance*>(&object), name);
+        break;
+    default:
+        implementation_->Rename(static_cast<Component*>(&object), name);
+        break;
+    }
+}
+
+void Netlist::RemovePin(Component* component, Pin* pin) noexcept {
+    if (component == nullptr || pin == nullptr || !PinBlock::Owns(*component, *pin)) {
+        return;
+    }
+    const std::string_view name = pin->GetNameView();
+    for (Instance* instance : GetInstanceIterator()) {
+        if (instance->GetComponent() == component) {
+            instance->RemovePin(instance->GetPin(name));
+        }
+    }
+    component->RemovePin(pin);
 }
 
 Signal* Netlist::GetSignal(std::string_view name) const noexcept {
@@ -339,7 +481,9 @@ void Netlist::ReplaceBus(Bus* narrower, std::unique_ptr<Bus> wider,
 int Netlist::GetLongestPinName(const Iterator<Pin*>& pins) {
     std::size_t longest = 0;
     for (const Pin* pin : pins) {
-        longest = std::max(longest, pin->GetNameView().size());
+        if (pin != nullptr) {
+            longest = std::max(longest, pin->GetNameView().size());
+        }
     }
     return ToLength(longest);
 }
@@ -347,7 +491,7 @@ int Netlist::GetLongestPinName(const Iterator<Pin*>& pins) {
 int Netlist::GetLongestPortName(const Iterator<Signal*>& signals) {
     std::size_t longest = 0;
     for (const Signal* signal : signals) {
-        if (signal->IsPort()) {
+        if (signal != nullptr && signal->IsPort()) {
             longest = std::max(longest, signal->GetNameView().size());
         }
     }
@@ -357,7 +501,7 @@ int Netlist::GetLongestPortName(const Iterator<Signal*>& signals) {
 int Netlist::GetLongestSignalName(const Iterator<Signal*>& signals) {
     std::size_t longest = 0;
     for (const Signal* signal : signals) {
-        if (signal->IsNeededToDeclared()) {
+        if (signal != nullptr && signal->IsNeededToDeclared()) {
             longest = std::max(longest, signal->GetNameView().size());
         }
     }

@@ -1,24 +1,10 @@
 #include "HdlModel/Netlist/PinIndex.h"
 
-#include <cstring>
-#include <memory>
+#include "HdlModel/Objects/OwnerLink.h"
+
 #include <new>
 
 namespace Orn_Hdl {
-
-PinList* PinHome::Get(const Pin& pin) noexcept {
-    if (!pin.HasHome()) {
-        return nullptr;
-    }
-    PinList* list = nullptr;
-    std::memcpy(&list, reinterpret_cast<const char*>(&pin) + sizeof(Pin), sizeof list);
-    return list;
-}
-
-void PinHome::Set(Pin& pin, PinList* list) noexcept {
-    std::memcpy(reinterpret_cast<char*>(&pin) + sizeof(Pin), &list, sizeof list);
-    pin.MarkHome();
-}
 
 /// The value of the slot of a name's pin; zero when there is none.
 std::uint32_t PinIndex::FindValue(const PinList& pins, const NameKey& key) const noexcept {
@@ -75,7 +61,7 @@ std::uint32_t PinIndex::TakeOut(const PinList& pins, const Pin& pin) noexcept {
     return value - 1;
 }
 
-PinRenaming::PinRenaming(const Pin& pin) noexcept : list_(PinHome::Get(pin)) {
+PinRenaming::PinRenaming(const Pin& pin) noexcept : list_(OwnerLink::Get<PinList>(pin)) {
     if (list_ != nullptr && list_->MakeOwnIndex()) {
         place_ = list_->index_->TakeOut(*list_, pin);
     } else {

@@ -15,18 +15,6 @@
 
 namespace Orn_Hdl {
 
-/// Leads from a pin to the list of its component or instance, so that the list's index learns of a
-/// new name. The pins of components and those of long lists have such a home: it stands behind the
-/// pin in memory, and a spare value of the pin's type bits tells that it is there.
-struct PinHome {
-    static constexpr std::size_t Size = sizeof(PinList*);
-
-    /// The list; null when the pin has no home.
-    static PinList* Get(const Pin& pin) noexcept;
-    /// Gives a home to a pin that has room for it behind it.
-    static void Set(Pin& pin, PinList* list) noexcept;
-};
-
 /// The places of the pins by name. A component shares its index with its instances, whose pins have
 /// the same names, until either has a pin renamed. It holds no names: it asks the pins of the list
 /// that it is called for.

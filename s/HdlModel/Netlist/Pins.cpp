@@ -1,8 +1,10 @@
 #include "Orn_Hdl/Model/Pins.h"
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/PinIndex.h"
 #include "HdlModel/Objects/ObjectDetails.h"
+#include "HdlModel/Objects/OwnerLink.h"
 #include "HdlModel/Signals/PinLinks.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"
@@ -12,6 +14,15 @@ namespace Orn_Hdl {
 namespace {
 
 constexpr const char* PolarityNames[] = {"Input", "Output", "BiDirectional"};
+
+/// A pin in the block of an instance. Whoever deletes it, its memory stays a part of the block.
+template <class T> class Placed final : public T {
+public:
+    explicit Placed(const T& other) : T(other) { static_assert(sizeof(Placed) == sizeof(T)); }
+
+    static void operator delete(void* /*memory*/) noexcept {}
+    static void operator delete(void* /*memory*/, void* /*place*/) noexcept {}
+};
 
 } // namespace
 
@@ -60,6 +71,9 @@ Pin& Pin::operator=(const Pin& other) {
 }
 
 Pin::~Pin() {
+    if (PinList* const list = OwnerLink::Get<PinList>(*this)) {
+        PinBlock::LetGo(*list, *this);
+    }
     PinLinks::Leave(*this);
 }
 
@@ -111,7 +125,7 @@ Pin* ScalarPin::ClonePin() const {
 }
 
 Pin* ScalarPin::CloneInto(void* place) const {
-    return ::new (place) ScalarPin(*this);
+    return ::new (place) Placed<ScalarPin>(*this);
 }
 
 void ScalarPin::AcceptPin(PinVisitor& visitor) {
@@ -123,7 +137,7 @@ Pin* BusPin::ClonePin() const {
 }
 
 Pin* BusPin::CloneInto(void* place) const {
-    return ::new (place) BusPin(*this);
+    return ::new (place) Placed<BusPin>(*this);
 }
 
 void BusPin::AcceptPin(PinVisitor& visitor) {
@@ -151,7 +165,7 @@ Pin* BusIndexPin::ClonePin() const {
 }
 
 Pin* BusIndexPin::CloneInto(void* place) const {
-    return ::new (place) BusIndexPin(*this);
+    return ::new (place) Placed<BusIndexPin>(*this);
 }
 
 void BusIndexPin::AcceptPin(PinVisitor& visitor) {

@@ -1,7 +1,6 @@
 #include "Orn_Hdl/Attributes.h"
 
-#include "HdlModel/Names/Names.h"
-#include "HdlModel/Objects/ObjectKey.h"
+#include "HdlModel/Objects/AttributeTable.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/Ascii.h"
 #include "Port/Text.h"
@@ -9,7 +8,7 @@
 #include <algorithm>
 #include <charconv>
 #include <iterator>
-#include <utility>
+#include <string>
 
 namespace Orn_Hdl {
 
@@ -32,9 +31,31 @@ int FindOption(const char* const (&names)[3], const char* text) noexcept {
 
 } // namespace
 
-Attribute::Attribute(const char* name)
-    : Object(ObjectTypeAttribute), generic_(DEFAULT_GENERIC), synAttr_(DEFAULT_SYNATTR) {
+Attribute::Attribute(const char* name) : Object(ObjectTypeAttribute) {
     Object::SetName(name);
+}
+
+Attribute::Attribute(const Attribute& other) : Object(other) {
+    SetOption(GenericFlags, other.GetGenericOption());
+    SetOption(SynAttrFlags, other.GetSynAttrOption());
+}
+
+Attribute& Attribute::operator=(const Attribute& other) {
+    if (this != &other) {
+        Object::operator=(other);
+        SetOption(GenericFlags, other.GetGenericOption());
+        SetOption(SynAttrFlags, other.GetSynAttrOption());
+    }
+    return *this;
+}
+
+void Attribute::SetOption(unsigned flags, int option) noexcept {
+    SetFlag(flags * 3, false);
+    SetFlag(flags * static_cast<unsigned>(option), true);
+}
+
+Attribute::~Attribute() {
+    AttributeTable::Leave(*this);
 }
 
 void Attribute::AcceptObject(ObjectVisitor& visitor) {
@@ -53,29 +74,30 @@ Port::StringBase<char> Attribute::GetValueTypeName() const {
 bool Attribute::SetGeneric(const char* text) noexcept {
     const int option = FindOption(GenericNames, text);
     if (option >= 0) {
-        generic_ = static_cast<unsigned>(option) & 3U;
+        SetOption(GenericFlags, option);
     }
     return option >= 0;
 }
 
 Port::StringBase<char> Attribute::GetGeneric() const {
-    return GenericNames[generic_];
+    return GenericNames[GetGenericOption()];
 }
 
 bool Attribute::SetSynAttr(const char* text) noexcept {
     const int option = FindOption(SynAttrNames, text);
     if (option >= 0) {
-        synAttr_ = static_cast<unsigned>(option) & 3U;
+        SetOption(SynAttrFlags, option);
     }
     return option >= 0;
 }
 
 Port::StringBase<char> Attribute::GetSynAttr() const {
-    return SynAttrNames[synAttr_];
+    return SynAttrNames[GetSynAttrOption()];
 }
 
 bool Attribute::operator==(const Attribute& other) const {
-    return Object::operator==(other) && generic_ == other.generic_ && synAttr_ == other.synAttr_ &&
+    return Object::operator==(other) && GetGenericOption() == other.GetGenericOption() &&
+           GetSynAttrOption() == other.GetSynAttrOption() &&
            Port::EqualIgnoringCase(GetValueString(), other.GetValueString());
 }
 
@@ -270,56 +292,6 @@ void AttributeVisitor::VisitAttributeBit(AttributeBit* /*attribute*/) {}
 void AttributeVisitor::VisitAttributeBitVector(AttributeBitVector* /*attribute*/) {}
 void AttributeVisitor::VisitAttributeBoolean(AttributeBoolean* /*attribute*/) {}
 void AttributeVisitor::VisitAttributeUser(AttributeUser* /*attribute*/) {}
-
-struct AttributeHolder::Table {
-    OwnPtrArray<Attribute*> attributes;
-    IStringPtrMap<Attribute*> byName;
-};
-
-AttributeHolder::AttributeHolder() noexcept = default;
-
-AttributeHolder::AttributeHolder(const AttributeHolder& other) {
-    for (const Attribute* attribute : other.GetAttrIterator()) {
-        AttributeHolder::AddAttr(attribute->CloneAttribute());
-    }
-}
-
-AttributeHolder& AttributeHolder::operator=(const AttributeHolder& other) {
-    if (this != &other) {
-        AttributeHolder copy(other);
-        std::swap(table_, copy.table_);
-    }
-    return *this;
-}
-
-AttributeHolder::~AttributeHolder() = default;
-
-void AttributeHolder::AddAttr(Attribute* attribute) {
-    if (attribute == nullptr || OwnedFlag::Get(*attribute)) {
-        return;
-    }
-    std::unique_ptr<Attribute> taken(attribute);
-    if (table_ == nullptr) {
-        table_ = std::make_unique<Table>();
-    }
-    table_->attributes.AddNew(attribute);
-    OwnedFlag::Set(*taken.release());
-    table_->byName.Add(attribute->GetNameView(), attribute);
-}
-
-Attribute* AttributeHolder::GetAttr(const char* name) const {
-    return table_ == nullptr
-               ? nullptr
-               : table_->byName.Get(Names::NormalizedText(Port::ViewOf(name)).GetView());
-}
-
-Iterator<Attribute*> AttributeHolder::GetAttrIterator() const noexcept {
-    // The table is made with the first attribute, and made anew by an assignment.
-    return Iterator<Attribute*>(this, [](const void* holder) -> const PtrArray<Attribute*>* {
-        const Table* const table = static_cast<const AttributeHolder*>(holder)->table_.get();
-        return table == nullptr ? nullptr : &table->attributes;
-    });
-}
 
 const IStringPtrMap<AttributeFactory::Creator>& AttributeFactory::GetCreators() {
     static const IStringPtrMap<Creator> creators = [] {

@@ -35,10 +35,8 @@ Object::Object(const Object& other)
 Object& Object::operator=(const Object& other) {
     if (this != &other) {
         CopyNameFrom(other);
-        if (!HasHome()) {
-            SetFlag(TypeMask, false);
-            SetFlag(other.GetTypeBits(), true);
-        }
+        SetFlag(TypeMask, false);
+        SetFlag(other.GetTypeBits(), true);
         if (GetDetails() != nullptr || !other.GetCommentView().empty()) {
             MakeDetails().comment = other.GetCommentView();
         }
@@ -98,6 +96,10 @@ void Object::CopyNameFrom(const Object& other) {
     Name() = other.Name();
 }
 
+void Object::SwapDetails(Object& other) noexcept {
+    Name().Swap(other.Name());
+}
+
 void Object::KeepKeyName(std::string_view newName) {
     if (!HasFlag(OwnedFlagBit) || Names::IsNamed(GetNameView(), newName)) {
         return;
@@ -112,6 +114,17 @@ std::string_view Object::GetKeyName() const noexcept {
     const ObjectDetails* const details = GetDetails();
     return details != nullptr && details->keyName != nullptr ? std::string_view(*details->keyName)
                                                              : GetNameView();
+}
+
+void Object::DropKeyName() noexcept {
+    if (ObjectDetails* const details = GetDetails()) {
+        details->keyName.reset();
+    }
+}
+
+void Object::SwapName(ObjectName& name) noexcept {
+    Name().SwapText(name);
+    DropKeyName();
 }
 
 bool Object::IsNamed(const char* name) const noexcept {

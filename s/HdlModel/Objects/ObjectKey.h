@@ -8,16 +8,21 @@
 
 namespace Orn_Hdl {
 
-/// Whether an object has an owner, which deletes it. An object never gets a second one.
+/// Whether an object has an owner that finds it by name. An object never gets a second one.
 class OwnedFlag {
 public:
     static bool Get(const Object& object) noexcept { return object.HasFlag(Object::OwnedFlagBit); }
     static void Set(Object& object) noexcept { object.SetFlag(Object::OwnedFlagBit, true); }
+    static void Clear(Object& object) noexcept { object.SetFlag(Object::OwnedFlagBit, false); }
 };
 
 /// The name that an object had when its owner took it.
 struct ObjectKey {
     static std::string_view Get(const Object& object) noexcept { return object.GetKeyName(); }
+    /// Makes the present name the key name, when the owner lets the object go.
+    static void Drop(Object& object) noexcept { object.DropKeyName(); }
+    /// Exchanges the name for another one, which becomes the key name.
+    static void Replace(Object& object, ObjectName& name) noexcept { object.SwapName(name); }
 };
 
 } // namespace Orn_Hdl

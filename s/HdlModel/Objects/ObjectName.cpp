@@ -6,6 +6,7 @@
 #include <cstring>
 #include <memory>
 #include <new>
+#include <utility>
 
 namespace Orn_Hdl {
 
@@ -81,6 +82,11 @@ ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
         to.length_ = from.length_;
     }
     return *this;
+}
+
+void ObjectName::Swap(ObjectName& other) noexcept {
+    std::swap(bytes_, other.bytes_);
+    std::swap(length_, other.length_);
 }
 
 void ObjectName::Assign(std::string_view text) {

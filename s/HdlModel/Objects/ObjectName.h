@@ -29,6 +29,10 @@ public:
         }
     }
 
+    /// Exchanges names and details.
+    void Swap(ObjectName& other) noexcept;
+    /// Exchanges the names alone.
+    void SwapText(ObjectName& other) noexcept { GetPlain().Swap(other.GetPlain()); }
     /// Stores a text. When allocation fails the name stays as it was.
     void Assign(std::string_view text);
 

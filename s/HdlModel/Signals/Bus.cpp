@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Model/Signals/Bus.h"
 
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Netlist/NetlistOwner.h"
 #include "HdlModel/Signals/BusParts.h"
 #include "HdlModel/Signals/SignalBits.h"
 #include "Orn_Hdl/Model/Signals/SignalVisitor.h"
@@ -12,6 +13,7 @@ namespace Orn_Hdl {
 Bus::Bus(const char* name) : Signal(name), parts_(std::make_unique<BusParts>(*this)) {}
 
 Bus::~Bus() {
+    NetlistOwner::Leave(*this);
     Bus::LeaveAll();
 }
 

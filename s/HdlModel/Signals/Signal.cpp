@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Model/Signals/Signal.h"
 
+#include "HdlModel/Netlist/NetlistOwner.h"
 #include "HdlModel/Objects/ObjectDetails.h"
 #include "HdlModel/Signals/PinLinks.h"
 #include "HdlModel/Signals/References.h"
@@ -12,6 +13,7 @@ Signal::Signal(const char* name) : Object(ObjectTypeSignal) {
 }
 
 Signal::~Signal() {
+    NetlistOwner::Leave(*this);
     Signal::LeaveAll();
 }
 

@@ -10,6 +10,7 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
+#include <cstddef>
 #include <memory>
 
 namespace Orn_Hdl {
@@ -31,8 +32,8 @@ class ORN_HDL_API Signal : public Object, public AttributeHolder {
 public:
     Signal(const Signal&) = delete;
     Signal& operator=(const Signal&) = delete;
-    /// Opens every pin that points at this signal, and takes the signal out of the aliases, slices
-    /// and members of all others.
+    /// The netlist drops the signal, whoever destroys it. Every pin that points at the signal
+    /// becomes open, and all other signals drop it from their aliases, slices and members.
     ~Signal() override;
 
     void AcceptObject(ObjectVisitor& visitor) override;
@@ -63,11 +64,15 @@ public:
     /// and this signal itself are ignored. If allocation fails, nothing changes.
     /// \param other not owned.
     void Connect(Signal* other);
+    /// Connects nothing.
+    void Connect(std::nullptr_t) noexcept {}
     /// Takes a pin out of the list; a pin that points at this signal becomes open. Null, and a pin
     /// that is neither listed nor points here, are ignored.
     void Disconnect(Pin* pin);
     /// Takes another signal out of the aliases. Null and a signal that is no alias are ignored.
     void Disconnect(Signal* other);
+    /// Disconnects nothing.
+    void Disconnect(std::nullptr_t) noexcept {}
     /// Opens every pin that points here, and empties the lists of pins and aliases.
     void DisconnectAll();
     /// Connects to this signal the listed pins of another one that still point at that one, and
