@@ -23,7 +23,7 @@ struct Kind {
     const char* name;
     /// Carried out once.
     std::vector<const char*> design;
-    /// Carried out for every number before the counted command; may be empty.
+    /// Executed for every number before the counted command; may be empty.
     const char* object;
     const char* command;
     /// Blocks that one command takes of the heap at most.
