@@ -21,7 +21,7 @@ constexpr std::size_t Growth = 100;
 /// Lines in which "#" stands for the number of the command.
 struct Kind {
     const char* name;
-    /// Carried out once.
+    /// Executed once.
     std::vector<const char*> design;
     /// Executed for every number before the counted command; may be empty.
     const char* object;
