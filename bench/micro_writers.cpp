@@ -18,7 +18,7 @@ using namespace Orn_Hdl;
 
 constexpr int Gates = 20'000;
 
-/// A netlist that has been written once in both languages: a writer sorts it and makes its stand-in
+/// A netlist that has been written once in both languages: a writer sorts it and makes its dummy
 /// signals the first time, and finds both done from then on.
 class WrittenDesign {
 public:

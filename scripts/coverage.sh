@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# Prints which part of the library's lines and branches the unit tests and the fuzz corpora reach, file
-# by file, and ends with an error below 95 percent of the lines or 90 percent of the branches. Branches
-# that only an exception takes, and those that the compiler alone knows, do not count.
+# Prints the coverage of the library's lines and branches by the unit tests and the fuzz corpora for each
+# file, and fails below 95 percent of the lines or 90 percent of the branches. Branches that only an
+# exception takes, and those that the compiler generates, do not count.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 

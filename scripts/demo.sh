@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Sets everything up, builds the tool, and shows the netlists of an example.
+# Installs the needed packages, builds the tool, and shows the netlists of an example.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 

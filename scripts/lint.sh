@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# What clang-format, cppcheck and clang-tidy have to say of the sources: nothing.
+# Checks the sources with clang-format, cppcheck and clang-tidy, which must report nothing.
 #
 #   scripts/lint.sh [--quick]
 #
@@ -18,13 +18,13 @@ echo "== clang-format, ${#all[@]} files"
 clang-format --dry-run --Werror "${all[@]}"
 
 echo "== cppcheck"
-# What is kept off stands in .cppcheck, with its reason.
+# .cppcheck lists the suppressed checks with their reasons.
 cppcheck --quiet --std=c++20 --language=c++ --enable=warning,performance,portability \
     --inline-suppr --error-exitcode=1 --suppressions-list=.cppcheck -j "$jobs" -I include -I s \
     s tools/orn-hdl
 
 echo "== clang-tidy, ${#sources[@]} sources"
-# The sources are not compiled; the preset says how they would be.
+# The sources are not compiled; the preset provides the compiler's options.
 cmake --preset tidy >/dev/null
 printf '%s\n' "${sources[@]}" |
     xargs -P "$jobs" -n 1 clang-tidy --quiet --warnings-as-errors='*' "${checks[@]}" -p build/tidy 2>/dev/null

@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Installs what the project needs from Debian's packages; needs root or sudo only when something is
+# Installs the Debian packages that the project needs; needs root or sudo only if something is
 # missing. Usage: setup.sh build | test
 set -euo pipefail
 

@@ -1,13 +1,13 @@
 #!/usr/bin/env bash
-# Sets everything up and passes the tests: static checks, the optimised build with every test, the real
-# tools included, the unit tests and the random scripts again under the sanitizers, and the fuzzer.
+# Installs the needed packages and runs all tests: static checks, the optimised build with every test,
+# including the real tools, the unit tests and the random scripts again with sanitizers, and the fuzzer.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
 scripts/setup.sh test
 jobs=$(nproc)
 export CMAKE_CXX_COMPILER_LAUNCHER=ccache
-# Paths below this folder do not count, so that another clone finds what this one has compiled.
+# Paths below this folder are ignored, so that another clone can use the same compiler cache.
 export CCACHE_BASEDIR="$PWD" CCACHE_NOHASHDIR=1
 
 step() {

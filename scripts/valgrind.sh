@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# Runs unit tests under valgrind, which also sees what no sanitizer was compiled in for: the use of
-# values that were never set. By hand, since it takes minutes; without arguments all programs of
-# the library but Robustness, whose designs are too large for it, and Threads.
+# Runs unit tests under valgrind, which also detects the use of uninitialised values. It is run by hand,
+# because it takes minutes. Without arguments it runs all programs of the library except Robustness, whose
+# designs are too large for it, and Threads.
 #
 #   scripts/valgrind.sh [PROGRAM...]
 #

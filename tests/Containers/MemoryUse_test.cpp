@@ -1,4 +1,4 @@
-// Designs hold hundreds of thousands of containers that stay empty: these must take no memory.
+// Designs have hundreds of thousands of empty containers, which must not allocate memory.
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Containers.h"
 #include "Support/CountedAllocations.h"

@@ -219,7 +219,7 @@ TEST_P(EveryPhrase, NeedsAModel) {
 
 INSTANTIATE_TEST_SUITE_P(Catalogue, EveryPhrase, testing::ValuesIn(Phrases()));
 
-// Lines of enough words that are refused all the same
+// Lines with enough words that are rejected nevertheless
 
 TEST(CommandArguments, OfTheWrongKindAreRefused) {
     const struct {

@@ -276,7 +276,7 @@ INSTANTIATE_TEST_SUITE_P(
                     FailingLine{"\"\" NOOP", "Command not find.\n", "../s/HdlCmd"},
                     FailingLine{"%s%n%d", "Command not find.\n", "../s/HdlCmd"}));
 
-// Whatever a user names is shown as it stands, never formatted
+// A user's text is shown unchanged, never used as a format
 
 INSTANTIATE_TEST_SUITE_P(
     UserTexts, ModelFailures,

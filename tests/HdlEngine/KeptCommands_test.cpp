@@ -21,9 +21,9 @@ constexpr std::size_t Growth = 100;
 /// Lines in which "#" stands for the number of the command.
 struct Kind {
     const char* name;
-    /// Carried out once.
+    /// Executed once.
     std::vector<const char*> design;
-    /// Carried out for every number before the counted command; may be empty.
+    /// Executed for every number before the counted command; may be empty.
     const char* object;
     const char* command;
     /// Blocks that one command takes of the heap at most.

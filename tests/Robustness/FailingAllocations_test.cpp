@@ -27,7 +27,7 @@ std::atomic<long> allowed{-1};
 /// Blocks taken and not given back yet.
 std::atomic<long> alive{0};
 
-/// Whether the allocation in hand is the one that fails. There is only one.
+/// Whether the present allocation is the one that fails. Only one fails.
 bool Fails() noexcept {
     return allowed.load() >= 0 && allowed.fetch_sub(1) == 0;
 }

@@ -12,7 +12,7 @@ class FailingSystem : public Port::System {
 public:
     enum Extent { Once, FromThenOn };
 
-    /// \param failing which call is the first one to fail, counted from 1; 0 lets none fail.
+    /// \param failing the number, from 1, of the first call that fails; with 0 none fails.
     FailingSystem(int failing, int error, Extent extent = Once)
         : failing_(failing), error_(error), extent_(extent) {
         System::Replace(this);

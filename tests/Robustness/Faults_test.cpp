@@ -1,5 +1,5 @@
-// Whichever file call of a whole run fails: nothing is thrown, the failure is told, files are
-// whole.
+// For every file call that can fail in a run: nothing is thrown, the failure is reported, and no
+// file is incomplete.
 #include "Port/File.h"
 #include "Robustness/FailingSystem.h"
 #include "Robustness/MidSizedDesign.h"

@@ -1,6 +1,5 @@
-// Texts that try to leave the comment or literal in which they stand by a line end. Whatever lines
-// they hold, what a tool sees of a netlist beside its comments and the contents of its literals
-// stays the same.
+// Texts with line ends that try to break out of their comment or literal. Whatever lines they
+// contain, a netlist without its comments and the contents of its literals must stay the same.
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Support/EngineScript.h"
 #include "Support/ShortTexts.h"

@@ -1,5 +1,5 @@
-"""Writing on a file system that is full: it is told, former files stay as they were, and nothing is left
-behind. The file system is one of 64 KiB in memory, mounted for the test alone, which needs root.
+"""Writing to a full file system: the failure is reported, former files are unchanged, and nothing is left
+behind. The file system has 64 KiB in memory and is mounted for this test, which needs root.
 
 Environment: ORN_HDL_TOOL names the tool.
 """

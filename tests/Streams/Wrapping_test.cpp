@@ -75,8 +75,8 @@ private:
         line_ += text;
     }
 
-    /// Whether the place lies between quotes, be those counted that stand behind a backslash, or
-    /// not.
+    /// Whether the position is between quotes, either with or without counting quotes behind a
+    /// backslash.
     bool IsInsideLiteral(std::size_t place) const {
         int all = 0;
         int plain = 0;

@@ -22,7 +22,7 @@ std::string BuildAndWrite(const std::string& file) {
         Support::EngineScript script(Robustness::MidSizedDesign());
         text.clear();
         for (const char* language : {"VERILOG ", "VHDL "}) {
-            // The banner, which tells the file's name, is written and not compared.
+            // The banner contains the file's name, so it is written but not compared.
             script.Run("WRITE " + std::string(language) + file);
             script.Run("WRITE " + std::string(language) + "-NOHEADER " + file);
             text += Support::ReadWholeFile(file);

@@ -13,7 +13,7 @@ LISTED = re.compile(r"^\| `([^`]*\.)` \|", re.M)
 
 
 def shape(message: str) -> str:
-    """The message with "%s" for every text that is put in."""
+    """The message with "%s" for every inserted text."""
     return re.sub(r"[A-Z]{3,}", "%s", message.replace('\\"', '"'))
 
 

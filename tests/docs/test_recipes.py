@@ -18,7 +18,7 @@ sys.path.insert(0, str(PROJECT / "tests" / "reference"))
 from orn_reference.commands import phrases as reference_phrases  # noqa: E402
 
 REFERENCE = "tests/reference/orn_reference/commands.py"
-# These hold nothing that can be told from the phrases alone.
+# The contents of these files do not depend on the phrases alone.
 WITHOUT_PHRASES = {"CHANGELOG.md", "share/man/man1/orn-hdl.1",
                    "share/vim/vimfiles/ftdetect/orn-hdl.vim", "tests/docs/test_recipes.py"}
 

@@ -20,7 +20,8 @@ NAMES = ["A", "B2", "b10", "B09", "Clk", "CLK_1", "reset", "D", "D_1", "data", "
          "Q_DUMMY_x", "OPEN_x", "opening", "x", "X_1", "z9", "Z10", "n1", "N01", "n1_0", "sum",
          "CONST_SIGNAL_a", "u", "U_I0", "Carry", "a1b2c3", "A_1_0", "addr", "Bus_a", "dummy",
          "Top_x", "e", "E1", "net", "NET_1", "i", "O", "k" * 40, "L" * 70 + "_1", "y", "Y2"]
-# Words of Verilog in capitals, which it tells apart and VHDL does not know.
+# Verilog's reserved words in capitals: they are no reserved words in Verilog, which is case-sensitive, nor
+# in VHDL.
 VERILOG_WORDS = ["WIRE", "Module", "REG", "Assign", "INITIAL", "Endmodule", "Defparam"]
 
 
@@ -208,7 +209,7 @@ class RandomDesign:
         return self._names.pop() if self._names else f"s{len(self.signals)}_{len(self.instances)}"
 
     def _spell(self, name: str) -> str:
-        """A name in perhaps other letters: letter case does not tell names apart."""
+        """A name in perhaps other letters: names are case-insensitive."""
         return name.swapcase() if self._chance(0.1) else name
 
     def _make(self, leaves: list[Leaf]) -> None:

@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Random designs, written and read back by real tools: everything must be wired as it was told.
+"""Random designs, written and read back by real tools: every connection must be the one that was made.
 
 Yosys reads the Verilog; GHDL reads the VHDL and makes Verilog of it, which Yosys reads. Each bit of
 each port and pin must be on the same net as in the generator's own account, or be the same

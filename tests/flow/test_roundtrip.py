@@ -1,4 +1,4 @@
-"""The comparison of random designs tells a netlist that is right from one that is wrong."""
+"""The comparison of random designs accepts correct netlists and rejects wrong ones."""
 
 from __future__ import annotations
 

@@ -1,4 +1,4 @@
-"""The same vectors tell a netlist that is right from one that is wrong, in either language."""
+"""The same vectors accept a correct netlist and reject a wrong one, in either language."""
 
 from __future__ import annotations
 

@@ -3,7 +3,7 @@
 A netlist is a module of Yosys' JSON. Its cells may bear other names than those of the netlist it
 is compared with; they are recognised by what they are wired to, from the ports inwards: cells and
 nets get colours, and each round gives the same new colour to what has equally coloured neighbours
-on both sides, until the colours tell all cells apart.
+on both sides, until every cell has a colour of its own.
 """
 
 from __future__ import annotations
@@ -107,7 +107,7 @@ class _Colours:
             distinct = len(palette)
 
     def first_alike(self) -> tuple[str, str] | None:
-        """A pair of one colour that others share; None when all cells are told apart."""
+        """A pair of one colour that others share; None if every cell has a colour of its own."""
         counts = Counter(self.cells[0].values())
         for cell, colour in self.cells[0].items():
             if counts[colour] > 1:

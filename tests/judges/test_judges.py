@@ -257,8 +257,8 @@ class Equivalence(JudgeTest):
         with self.rejects("ports differ"):
             self.prove_renamed(("input C, R", "inout C, R"))
 
-    def test_twin_cells_are_told_apart(self) -> None:
-        """Two cells on the same nets cannot be told apart, and need not be."""
+    def test_twin_cells_are_not_distinguished(self) -> None:
+        """Two cells on the same nets cannot be distinguished, and need not be."""
         twins = "module top(input A, B, output [1:0] Y);\n" \
                 "   wire n, m;\n" \
                 "   AND2 {} (.I0(A), .I1(B), .O(n));\n   AND2 {} (.I0(A), .I1(B), .O(m));\n" \

@@ -21,7 +21,7 @@ protected:
         Support::WriteWholeFile(file_, std::string(1000, 'x'));
     }
 
-    /// \param file what is read; the file of 1000 bytes unless told.
+    /// \param file the file that is read; by default the file of 1000 bytes.
     Progress Make(const std::string& file) {
         return Progress(terminal_.get(), file, [this] { return now_; });
     }

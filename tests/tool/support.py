@@ -1,4 +1,4 @@
-"""What the tests of the tool share: running it, and folders that vanish behind a test."""
+"""Helpers for the tests of the tool: they run it in a temporary folder."""
 
 from __future__ import annotations
 
@@ -29,7 +29,7 @@ CONNECT SIGNAL Y U1.O
 
 @dataclass
 class Outcome:
-    """What a run of the tool ended with and printed."""
+    """The exit status and the output of a run."""
 
     status: int
     out: str
@@ -61,7 +61,7 @@ class ToolTest(unittest.TestCase):
         return (self.folder / name).read_bytes().decode("latin-1")
 
     def expect(self, outcome: Outcome, status: int, err: str = "", out: str = "") -> None:
-        """Compares all that a run gave; the messages first, they tell most."""
+        """Compares the results of a run; the messages first, which explain most."""
         self.assertEqual(outcome.err, err)
         self.assertEqual(outcome.status, status)
         self.assertEqual(outcome.out, out)

@@ -382,7 +382,7 @@ class Cells(ImportTest):
         done = self.import_design(design({}, {"u": cell("LEAF", "")}))
         self.assertEqual(done.lines("ADD INSTANCE"), ["LEAF u"])
 
-    def test_memories_are_told_of(self) -> None:
+    def test_memories_give_a_warning(self) -> None:
         contents = design({"a": port("input", 2)})
         contents["modules"]["top"]["memories"] = {"m": {"width": 8, "size": 4}}
         done = self.import_design(contents)

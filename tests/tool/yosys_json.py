@@ -1,4 +1,4 @@
-"""Small designs in the JSON form that Yosys writes, and what real tools think of their imports."""
+"""Small designs as Yosys writes them in JSON, whose imports are checked by real tools."""
 
 from __future__ import annotations
 
@@ -54,7 +54,7 @@ def design(ports: Json, cells: Json | None = None, nets: Json | None = None, nam
 
 @dataclass
 class Imported:
-    """What an import gave."""
+    """The results of an import."""
 
     commands: list[str]
     verilog: str
@@ -63,7 +63,7 @@ class Imported:
     names: dict[tuple[str, str], str]
 
     def lines(self, start: str) -> list[str]:
-        """The commands that begin so, without that."""
+        """The commands that begin with `start`, without it."""
         return [line[len(start) + 1:] for line in self.commands if line.startswith(start + " ")]
 
 

@@ -247,7 +247,8 @@ public:
             bytes_[used_++] = static_cast<unsigned char>(byte);
         }
     }
-    /// \return false if the rest must not be added, because the key ends at an ambiguous character.
+    /// \return false if the rank is out of the range that is encoded exactly; the key must end
+    /// then.
     bool AppendRank(int rank) noexcept {
         constexpr int FirstPlain = -1;
         constexpr int LastPlain = FirstPlain + 253;

@@ -36,8 +36,8 @@ bool IsRun(const std::string& piece) {
     return piece[0] >= '0' && piece[0] <= '9';
 }
 
-/// Natural order again, piece by piece: a digit run stands above every other character, a longer
-/// run above a shorter one; the end of a name stands below everything.
+/// Natural order, computed piece by piece: a digit run sorts after every other character, a longer
+/// run after a shorter one, and the end of a name before everything.
 bool IsLessSlowly(const std::string& nameA, const std::string& nameB) {
     const std::vector<std::string> a = Cut(nameA);
     const std::vector<std::string> b = Cut(nameB);

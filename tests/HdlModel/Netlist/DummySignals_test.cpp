@@ -248,7 +248,7 @@ TEST_F(DummySignals, OfAnInputBusAreConnectedTheOtherWay) {
     EXPECT_EQ(NamesOf(bus->GetSignalIterator()), Names());
 }
 
-TEST_F(DummySignals, StandInForTheirSignalsInEveryCompound) {
+TEST_F(DummySignals, ReplaceTheirSignalsInEveryCompound) {
     ScalarSignal* port = AddFeedback("Y", Out);
     ScalarSignal* other = AddScalar("N");
     Bus* bus = AddBus("D(3:0)", Out);
@@ -338,7 +338,7 @@ TEST_F(DummySignals, OfABusComeLaterForSlicesAndBitsThatComeLater) {
               Names{"D_DUMMY(2)"});
 }
 
-TEST_F(DummySignals, StandInNextTimeForTheirSignalsInCompoundsMadeLater) {
+TEST_F(DummySignals, ReplaceTheirSignalsInLaterCompoundsAtTheNextWrite) {
     ScalarSignal* port = AddFeedback("Y", Out);
     netlist_.CreateVhdlDummySignals();
     CompoundBus* compound = AddCompound("Y,N", {port, AddScalar("N")});

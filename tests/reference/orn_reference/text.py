@@ -53,7 +53,7 @@ def atof(text: bytes) -> float:
 
 
 def remove_quotes(text: bytes) -> bytes:
-    """Double quotes off both ends if they stand at both; else single quotes likewise."""
+    """Double quotes off both ends if they stand at both; otherwise single quotes, if they do."""
     for quote in (b'"', b"'"):
         if text.startswith(quote) and text.endswith(quote):
             return text.strip(quote)

@@ -18,7 +18,7 @@ def split_quoted(text: bytes, separators: bytes, quotes: bytes) -> list[bytes]:
     closers = {quotes[i]: quotes[i + 1] for i in range(0, len(quotes) - 1, 2)}
     pieces: list[bytes] = []
     piece = bytearray()
-    closer = None  # the character that ends the quoted part in hand
+    closer = None  # the character that ends the present quoted part
     just_closed = False
     position = 0
     if text and text[0] in closers:

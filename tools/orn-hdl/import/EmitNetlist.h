@@ -6,7 +6,7 @@
 
 namespace Tool::Import {
 
-/// Calls the same sequence of operations for every sink.
+/// Calls the operations of a sink, for every sink in the same order.
 void EmitNetlist(const ImportedNetlist& netlist, Sink& sink);
 
 } // namespace Tool::Import
