@@ -95,8 +95,8 @@ void PinList::SortByPolarityAndName() {
     SortNaturally(*this, [](const Pin* pin) { return pin->GetPolarity().GetValue(); });
 }
 
-/// What the instances of a component hold in place of a pointer to it, so that the component can
-/// end before them.
+/// Instances refer to their component through this anchor, so that the component can be destroyed
+/// before them.
 struct ComponentAnchor {
     const Component* component;
     std::size_t users;

@@ -20,8 +20,8 @@ bool IsInLooseCompound(const Signal& signal) {
     });
 }
 
-/// Whether any signal tells of such a use. Most designs use no port against its direction, and the
-/// ports tell that faster than all pins do.
+/// Whether a port may be used against its direction. Most designs have no such port, and looking at
+/// the ports is faster than looking at all pins.
 bool MayHaveAny(const Netlist& netlist, bool outputPorts) {
     const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
     const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;

@@ -57,22 +57,6 @@ void AttributeTable::LetGo(Attribute& attribute) noexcept {
     ObjectKey::Drop(attribute);
 }
 
-void* OwnerLink::Get(const AttributeHolder& object) noexcept {
-    if (object.IsLinkToOwner()) {
-        return static_cast<char*>(object.link_) - 1;
-    }
-    const AttributeTable* const table = object.GetTable();
-    return table == nullptr ? nullptr : table->owner;
-}
-
-void OwnerLink::Set(AttributeHolder& object, void* owner) noexcept {
-    if (AttributeTable* const table = object.GetTable()) {
-        table->owner = owner;
-    } else {
-        object.link_ = owner == nullptr ? nullptr : static_cast<char*>(owner) + 1;
-    }
-}
-
 AttributeHolder::AttributeHolder() noexcept = default;
 
 AttributeHolder::AttributeHolder(const AttributeHolder& other) {

@@ -1,4 +1,4 @@
-// Who wants to know that a netlist has another name.
+// Listeners to the renaming of a netlist.
 #pragma once
 
 namespace Orn_Hdl {
@@ -8,7 +8,7 @@ public:
     NameListener() = default;
     NameListener(const NameListener&) = delete;
     NameListener& operator=(const NameListener&) = delete;
-    /// The netlist bears its new name when this is called.
+    /// Called after the netlist has got its new name.
     virtual void NameChanged() noexcept = 0;
 
 protected:

@@ -14,8 +14,8 @@ struct ObjectDetails;
 /// name stands in a block that copies share, so that the pins of a thousand instances hold a long
 /// pin name once.
 ///
-/// It also leads to the parts of the owner that few objects have, so that the millions without them
-/// pay nothing: an object that has details keeps its name there.
+/// An object with details keeps its name there, and a pointer to the details in these 15 bytes. So
+/// an object without details takes no memory for them.
 class ObjectName {
 public:
     ObjectName() noexcept : bytes_(), length_(0) {}
