@@ -3,10 +3,11 @@
 #include "Check.h"
 #include "Port/Ascii.h"
 
+#include <algorithm>
 #include <cstddef>
 #include <set>
-#include <string>
-#include <unordered_set>
+#include <string_view>
+#include <vector>
 
 namespace Fuzz {
 
@@ -14,16 +15,36 @@ namespace {
 
 using namespace Orn_Hdl;
 
-template <class T> using Alive = std::unordered_set<const T*>;
+/// The objects of one class that exist. Filled first, then sorted, then asked.
+template <class T> class Alive {
+public:
+    void Add(const T* object) { objects_.push_back(object); }
+    void Sort() { std::sort(objects_.begin(), objects_.end()); }
+    bool Contains(const T* object) const {
+        return std::binary_search(objects_.begin(), objects_.end(), object);
+    }
+    bool HasNoneTwice() const {
+        return std::adjacent_find(objects_.begin(), objects_.end()) == objects_.end();
+    }
+    const std::vector<const T*>& GetAll() const noexcept { return objects_; }
+
+private:
+    std::vector<const T*> objects_;
+};
+
+enum class Repetition { Forbidden, Allowed };
 
 template <class T>
-void CheckList(const Iterator<T*>& list, const Alive<T>& alive, bool unique, const char* what) {
+void CheckList(const Iterator<T*>& list, const Alive<T>& alive, Repetition repetition,
+               const char* what) {
     Alive<T> met;
     for (const T* element : list) {
-        Check(element != nullptr, std::string(what) + ": no null");
-        Check(alive.count(element) == 1, std::string(what) + ": alive");
-        Check(met.insert(element).second || !unique, std::string(what) + ": once");
+        Check(element != nullptr, "no null", what);
+        Check(alive.Contains(element), "alive", what);
+        met.Add(element);
     }
+    met.Sort();
+    Check(repetition == Repetition::Allowed || met.HasNoneTwice(), "once", what);
 }
 
 template <class T> bool Contains(const Iterator<T*>& list, const T* wanted) {
@@ -39,32 +60,38 @@ class Checker {
 public:
     Checker(const Netlist& netlist, const std::vector<Signal*>& loose) : netlist_(netlist) {
         for (Signal* signal : netlist.GetSignalIterator()) {
-            signals_.insert(signal);
+            signals_.Add(signal);
         }
-        signals_.insert(loose.begin(), loose.end());
+        for (Signal* signal : loose) {
+            signals_.Add(signal);
+        }
         for (const Component* component : netlist.GetComponentIterator()) {
-            components_.insert(component);
+            components_.Add(component);
             AddPins(component->GetPinIterator());
         }
         for (const Instance* instance : netlist.GetInstanceIterator()) {
             AddPins(instance->GetPinIterator());
         }
+        signals_.Sort();
+        components_.Sort();
+        pins_.Sort();
     }
 
     void Run() {
-        for (const Component* component : components_) {
+        Check(pins_.HasNoneTwice(), "a pin has one owner");
+        for (const Component* component : components_.GetAll()) {
             CheckPins(component->GetPinIterator());
         }
         for (const Instance* instance : netlist_.GetInstanceIterator()) {
             const Component* const component = instance->GetComponent();
-            Check(component == nullptr || components_.count(component) == 1,
+            Check(component == nullptr || components_.Contains(component),
                   "an instance's component: alive");
             Check((component == nullptr) == instance->GetComponentName().IsEmpty() ||
                       (component != nullptr && component->GetNameView().empty()),
                   "an instance without a component has no component name");
             CheckPins(instance->GetPinIterator());
         }
-        for (const Signal* signal : signals_) {
+        for (const Signal* signal : signals_.GetAll()) {
             CheckSignal(*signal);
         }
     }
@@ -72,13 +99,13 @@ public:
 private:
     void AddPins(const Iterator<Pin*>& pins) {
         for (const Pin* pin : pins) {
-            Check(pins_.insert(pin).second, "a pin has one owner");
+            pins_.Add(pin);
         }
     }
 
     void CheckPins(const Iterator<Pin*>& pins) const {
         for (const Pin* pin : pins) {
-            Check(pin->GetSignal() == nullptr || signals_.count(pin->GetSignal()) == 1,
+            Check(pin->GetSignal() == nullptr || signals_.Contains(pin->GetSignal()),
                   "a pin's signal: alive");
             pin->GetBaseName();
             pin->GetPolarityName();
@@ -86,8 +113,9 @@ private:
     }
 
     void CheckSignal(const Signal& signal) {
-        CheckList(signal.GetPinIterator(), pins_, true, "a signal's pins");
-        CheckList(signal.GetSignalIterator(), signals_, true, "a signal's aliases");
+        CheckList(signal.GetPinIterator(), pins_, Repetition::Forbidden, "a signal's pins");
+        CheckList(signal.GetSignalIterator(), signals_, Repetition::Forbidden,
+                  "a signal's aliases");
         Check(!Contains(signal.GetSignalIterator(), &signal), "a signal is no alias of itself");
         Check(signal.GetWidth() >= 0, "a width is not negative");
         signal.GetPortPolarity();
@@ -109,7 +137,7 @@ private:
     }
 
     void CheckBus(const Bus& bus) const {
-        CheckList(bus.GetBusSliceIterator(), signals_, true, "a bus's parts");
+        CheckList(bus.GetBusSliceIterator(), signals_, Repetition::Forbidden, "a bus's parts");
         for (const Signal* part : bus.GetBusSliceIterator()) {
             if (part->GetSignalType() == SignalTypeBusSlice) {
                 Check(static_cast<const BusSlice*>(part)->GetParentBus() == &bus,
@@ -123,14 +151,15 @@ private:
 
     void CheckParent(const Signal& part, const Bus* parent) const {
         if (parent != nullptr) {
-            Check(signals_.count(parent) == 1, "a parent bus: alive");
+            Check(signals_.Contains(parent), "a parent bus: alive");
             Check(Contains(parent->GetBusSliceIterator(), &part), "a parent bus lists its part");
         }
     }
 
     void CheckCompound(const CompoundBus& compound) const {
-        CheckList(compound.GetBusMemberIterator(), signals_, false, "a compound's members");
-        // Down through the members, each compound once: the way never leads back.
+        CheckList(compound.GetBusMemberIterator(), signals_, Repetition::Allowed,
+                  "a compound's members");
+        // The members, their members, and so on; each compound is entered once.
         std::vector<const CompoundBus*> rest{&compound};
         std::set<const CompoundBus*> met;
         while (!rest.empty()) {

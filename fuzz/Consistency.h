@@ -1,4 +1,4 @@
-// Whether everything that a netlist links is alive, and linked as it has to be.
+// Checks that everything that a netlist links to exists and is linked correctly.
 #pragma once
 
 #include "Orn_Hdl/Model.h"
@@ -8,11 +8,11 @@
 namespace Fuzz {
 
 /// Checks every object of a netlist and of `loose`, signals that no netlist holds: lists and pins
-/// name live objects only, parents and parts know each other, no list names a thing twice, no
-/// compound contains itself, and every question about an object has an answer.
+/// refer to objects that exist, a bus and its parts refer to each other, no list but a compound's
+/// holds an object twice, no compound contains itself, and every getter can be called.
 void CheckNetlist(const Orn_Hdl::Netlist& netlist, const std::vector<Orn_Hdl::Signal*>& loose = {});
 
-/// Checks that everything the netlist holds is found by its name.
+/// Checks that every object of the netlist is found by its name.
 void CheckNames(const Orn_Hdl::Netlist& netlist);
 
 } // namespace Fuzz

@@ -1,5 +1,8 @@
 #include "MemoryFiles.h"
 
+#include "Check.h"
+
+#include <algorithm>
 #include <cerrno>
 #include <fcntl.h>
 
@@ -14,20 +17,57 @@ int FailWith(int error) {
 
 } // namespace
 
+const std::string* MemoryFiles::Find(std::string_view name) const noexcept {
+    const std::size_t place = PlaceOf(name);
+    return place == None ? nullptr : &files_[place].text;
+}
+
+std::size_t MemoryFiles::CountNames() const noexcept {
+    return static_cast<std::size_t>(std::count_if(files_.begin(), files_.end(),
+                                                  [](const File& file) { return file.isLinked; }));
+}
+
+void MemoryFiles::Put(std::string_view name, std::string_view text) {
+    const std::size_t place = PlaceOf(name);
+    files_[place == None ? Create(name) : place].text = text;
+}
+
+std::size_t MemoryFiles::PlaceOf(std::string_view name) const noexcept {
+    for (std::size_t place = 0; place < files_.size(); ++place) {
+        if (files_[place].isLinked && files_[place].name == name) {
+            return place;
+        }
+    }
+    return None;
+}
+
+std::size_t MemoryFiles::Create(std::string_view name) {
+    files_.push_back({std::string(name), std::string(), true});
+    return files_.size() - 1;
+}
+
+std::size_t& MemoryFiles::GetOpen(int descriptor) {
+    const auto index = static_cast<std::size_t>(descriptor) - 1;
+    Check(index < descriptors_.size() && descriptors_[index] != None,
+          "a descriptor that is used is open");
+    return descriptors_[index];
+}
+
 int MemoryFiles::Open(const char* name, int flags, unsigned /*mode*/) {
-    const bool exists = files_.count(name) != 0;
-    if (exists && (flags & O_EXCL) != 0) {
+    std::size_t place = PlaceOf(name);
+    if (place != None && (flags & O_EXCL) != 0) {
         return FailWith(EEXIST);
     }
-    if (*name == '\0' || (!exists && (flags & O_CREAT) == 0)) {
+    if (*name == '\0' || (place == None && (flags & O_CREAT) == 0)) {
         return FailWith(ENOENT);
     }
-    std::string& text = files_[name];
+    place = place == None ? Create(name) : place;
     if ((flags & O_TRUNC) != 0) {
-        text.clear();
+        files_[place].text.clear();
     }
-    open_[++last_] = name;
-    return last_;
+    descriptors_.push_back(place);
+    ++openCount_;
+    return static_cast<int>(descriptors_.size());
 }
 
 ssize_t MemoryFiles::Read(int /*descriptor*/, void* /*buffer*/, std::size_t /*size*/) {
@@ -35,21 +75,24 @@ ssize_t MemoryFiles::Read(int /*descriptor*/, void* /*buffer*/, std::size_t /*si
 }
 
 ssize_t MemoryFiles::Write(int descriptor, const void* data, std::size_t size) {
-    files_[open_.at(descriptor)].append(static_cast<const char*>(data), size);
+    files_[GetOpen(descriptor)].text.append(static_cast<const char*>(data), size);
     return static_cast<ssize_t>(size);
 }
 
 int MemoryFiles::Close(int descriptor) {
-    return open_.erase(descriptor) == 1 ? 0 : FailWith(EBADF);
+    GetOpen(descriptor) = None;
+    --openCount_;
+    return 0;
 }
 
-int MemoryFiles::GetStatus(int /*descriptor*/, struct stat* status) {
+int MemoryFiles::GetStatus(int descriptor, struct stat* status) {
     status->st_mode = S_IFREG | 0644;
+    status->st_size = static_cast<off_t>(files_[GetOpen(descriptor)].text.size());
     return 0;
 }
 
 int MemoryFiles::Truncate(int descriptor, off_t size) {
-    files_[open_.at(descriptor)].resize(static_cast<std::size_t>(size));
+    files_[GetOpen(descriptor)].text.resize(static_cast<std::size_t>(size));
     return 0;
 }
 
@@ -58,22 +101,30 @@ int MemoryFiles::ChangeMode(int /*descriptor*/, unsigned /*mode*/) {
 }
 
 ssize_t MemoryFiles::ReadLink(const char* name, char* /*target*/, std::size_t /*size*/) {
-    return FailWith(files_.count(name) != 0 ? EINVAL : ENOENT);
+    return FailWith(PlaceOf(name) != None ? EINVAL : ENOENT);
 }
 
 int MemoryFiles::Rename(const char* from, const char* to) {
-    if (*to == '\0' || files_.count(from) == 0) {
+    const std::size_t place = PlaceOf(from);
+    if (*to == '\0' || place == None) {
         return FailWith(ENOENT);
     }
-    auto file = files_.extract(from);
-    file.key() = to;
-    files_.erase(to);
-    files_.insert(std::move(file));
+    const std::size_t replaced = PlaceOf(to);
+    if (replaced != None) {
+        files_[replaced].isLinked = false;
+    }
+    files_[place].name = to;
+    files_[place].isLinked = true;
     return 0;
 }
 
 int MemoryFiles::Unlink(const char* name) {
-    return files_.erase(name) == 1 ? 0 : FailWith(ENOENT);
+    const std::size_t place = PlaceOf(name);
+    if (place == None) {
+        return FailWith(ENOENT);
+    }
+    files_[place].isLinked = false;
+    return 0;
 }
 
 } // namespace Fuzz

@@ -1,8 +1,9 @@
-// Command scripts: made from bytes by the grammar of the command language, and run with everything
-// checked.
+// Command scripts: they are made from bytes by the grammar of the command language, and run with
+// checks.
 #pragma once
 
 #include "Bytes.h"
+#include "Sampling.h"
 
 #include <string>
 #include <string_view>
@@ -14,12 +15,17 @@ using Script = std::vector<std::string>;
 
 /// The lines of a text.
 Script SplitScript(std::string_view text);
-/// A script of commands from the catalogue, their arguments filled in by kind, mostly with names
-/// that meet again.
+/// A script of commands from the catalogue. Their arguments are filled in by kind, mostly from a
+/// few names, so that commands meet the objects of earlier ones.
 Script MakeScript(Bytes& bytes);
 
-/// Runs a script in two engines, writes both netlists again and again, and checks that all is
-/// consistent and that both engines did and wrote the same.
-void CheckScript(const Script& script);
+/// One script in so many is run with all checks.
+constexpr std::size_t ScriptsPerFullCheck = 16;
+
+/// With all checks, runs a script in two engines, writes both netlists three times, does all that
+/// once more, checks the netlist every few lines and after each write, and checks that both engines
+/// did and wrote the same. With few, runs it in one engine, writes the netlist once, and checks the
+/// netlist after the last line and after each write.
+void CheckScript(const Script& script, Checks checks);
 
 } // namespace Fuzz

@@ -6,6 +6,7 @@
 #include "Consistency.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
+#include "Sampling.h"
 #include "Writes.h"
 
 #include <memory>
@@ -13,13 +14,15 @@
 
 namespace {
 
-using Fuzz::Check;
+using Fuzz::Checks;
 using namespace Orn_Hdl;
 
 constexpr int MostCalls = 300;
 constexpr int MostWrites = 2;
-/// How many calls are made between two looks at the whole design.
+/// How many calls are made between two checks of the whole design.
 constexpr int CallsPerCheck = 8;
+/// One input in so many is run with all checks.
+constexpr std::size_t InputsPerFullCheck = 16;
 
 constexpr const char* Names[] = {"A",
                                  "B",
@@ -60,7 +63,7 @@ template <class T> T* At(const Iterator<T*>& list, int index) {
 
 class Player {
 public:
-    explicit Player(Fuzz::Bytes& bytes) : bytes_(bytes) {}
+    Player(Fuzz::Bytes bytes, Checks checks) : bytes_(bytes), checks_(checks) {}
 
     void Play() {
         for (int i = 0; i < MostCalls && !bytes_.IsAtEnd(); ++i) {
@@ -69,12 +72,12 @@ public:
             } catch (const Orn_Hdl::Exception&) {
                 // An operation by name refuses what does not fit.
             }
-            if (i % CallsPerCheck == 0) {
+            if (checks_ == Checks::All && i % CallsPerCheck == 0) {
                 Fuzz::CheckNetlist(GetNetlist(), GetLoose());
             }
         }
         Write();
-        // Loose signals end before the design or after it.
+        // Loose signals are destroyed before the design or after it.
         if (bytes_.Choose(2) == 0) {
             loose_.clear();
         }
@@ -361,7 +364,7 @@ private:
         case 3: {
             const std::unique_ptr<Pin> clone(pin->ClonePin());
             if (Signal* signal = PickSignal()) {
-                // A pin that ends leaves every list.
+                // The pin is destroyed here, which must take it off the signal's list.
                 signal->Connect(clone.get());
             }
             return;
@@ -512,20 +515,33 @@ private:
         }
     }
 
-    void Write() { Fuzz::WriteWithChecks(GetNetlist(), *model_.GetOptions(), GetLoose()); }
+    void Write() {
+        if (checks_ == Checks::All) {
+            Fuzz::WriteWithChecks(GetNetlist(), *model_.GetOptions(), GetLoose());
+        } else {
+            Fuzz::WriteOnceWithChecks(GetNetlist(), *model_.GetOptions(), GetLoose());
+        }
+    }
 
-    Fuzz::Bytes& bytes_;
-    CommandFactory factory_;
-    // Declared before the design, and so ended after it.
+    /// No call registers a phrase, so all inputs can share a factory.
+    static CommandFactory& GetFactory() {
+        static CommandFactory factory;
+        return factory;
+    }
+
+    Fuzz::Bytes bytes_;
+    Checks checks_;
+    // Declared before the design, and so destroyed after it.
     std::vector<std::unique_ptr<Signal>> loose_;
-    Model model_{&factory_};
+    Model model_{&GetFactory()};
     int writes_ = 0;
 };
 
 } // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-    Fuzz::Bytes bytes(data, size);
-    Player(bytes).Play();
+    for (const Checks checks : Fuzz::ChooseChecks(data, size, InputsPerFullCheck)) {
+        Player(Fuzz::Bytes(data, size), checks).Play();
+    }
     return 0;
 }

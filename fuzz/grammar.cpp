@@ -4,6 +4,9 @@
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     Fuzz::Bytes bytes(data, size);
-    Fuzz::CheckScript(Fuzz::MakeScript(bytes));
+    const Fuzz::Script script = Fuzz::MakeScript(bytes);
+    for (const Fuzz::Checks checks : Fuzz::ChooseChecks(data, size, Fuzz::ScriptsPerFullCheck)) {
+        Fuzz::CheckScript(script, checks);
+    }
     return 0;
 }

@@ -43,7 +43,9 @@ std::string WriteCommands(const Import::ImportedNetlist& netlist) {
     Import::CommandSink sink(stream);
     Import::EmitNetlist(netlist, sink);
     Check(stream.flush() && file.close(), "the command file is written");
-    return files.GetFiles().at("commands");
+    const std::string* const text = files.Find("commands");
+    Check(text != nullptr, "the command file exists");
+    return *text;
 }
 
 void Replay(Model& model, std::string_view commands) {

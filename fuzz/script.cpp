@@ -4,6 +4,9 @@
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     const Fuzz::Bytes bytes(data, size);
-    Fuzz::CheckScript(Fuzz::SplitScript(bytes.Rest()));
+    const Fuzz::Script script = Fuzz::SplitScript(bytes.Rest());
+    for (const Fuzz::Checks checks : Fuzz::ChooseChecks(data, size, Fuzz::ScriptsPerFullCheck)) {
+        Fuzz::CheckScript(script, checks);
+    }
     return 0;
 }

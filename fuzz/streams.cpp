@@ -60,8 +60,12 @@ void Step(Fuzz::Bytes& bytes, OutStream& file, OutStream& memory) {
     }
 }
 
-const std::string& TextOf(const Fuzz::MemoryFiles& files, const char* name) {
-    return files.GetFiles().at(name);
+constexpr std::string_view Former = "former\n";
+
+const std::string& TextOf(const Fuzz::MemoryFiles& files) {
+    const std::string* const text = files.Find("file");
+    Check(text != nullptr, "the file exists");
+    return *text;
 }
 
 } // namespace
@@ -69,7 +73,7 @@ const std::string& TextOf(const Fuzz::MemoryFiles& files, const char* name) {
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     Fuzz::Bytes bytes(data, size);
     Fuzz::MemoryFiles files;
-    TextFileOutStream("file", false) << "former";
+    files.Put("file", Former);
     const auto mode = static_cast<TextFileOutStream::Mode>(bytes.Choose(3));
     const bool isClosed = bytes.Choose(4) != 0;
     TextMemOutStream memory(mode == TextFileOutStream::Append ? "former\n" : "");
@@ -79,7 +83,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         while (!bytes.IsAtEnd()) {
             Step(bytes, file, memory);
             if (mode == TextFileOutStream::Replace) {
-                Check(TextOf(files, "file") == "former\n", "the former file stands");
+                Check(TextOf(files) == Former, "the former file is unchanged");
             }
         }
         if (isClosed) {
@@ -87,12 +91,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         }
         Check(file.GetError() == 0, "nothing failed");
     }
-    Check(!files.HasOpenFiles() && files.GetFiles().size() == 1, "no file stays behind");
+    Check(!files.HasOpenFiles() && files.CountNames() == 1, "no other file is left");
     if (mode == TextFileOutStream::Replace && !isClosed) {
-        Check(TextOf(files, "file") == "former\n", "a stream that is not closed replaces nothing");
+        Check(TextOf(files) == Former, "a stream that is not closed replaces nothing");
     } else {
-        Fuzz::CheckSameButForBreaks(TextOf(files, "file"),
-                                    std::string(memory.GetValue().GetView()));
+        Fuzz::CheckSameButForBreaks(TextOf(files), memory.GetValue().GetView());
     }
     return 0;
 }

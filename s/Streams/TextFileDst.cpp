@@ -13,7 +13,12 @@ namespace {
 
 constexpr std::string_view IndentStep = "   ";
 constexpr int ContinuationLevels = 2;
+#if defined(FUZZING_BUILD_MODE_UNSAFE_FOR_PRODUCTION)
+// The short texts of a fuzz target fill this buffer too.
+constexpr std::size_t BufferSize = std::size_t(1) << 10;
+#else
 constexpr std::size_t BufferSize = std::size_t(1) << 18;
+#endif
 
 Port::File::Mode FileMode(TextFileOutStream::Mode mode) noexcept {
     switch (mode) {
