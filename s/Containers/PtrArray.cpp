@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Containers/PtrArray.h"
 
+#include "Containers/Reordering.h"
 #include "Containers/StableSort.h"
 
 #include <algorithm>
@@ -9,6 +10,54 @@
 #include <vector>
 
 namespace Orn_Hdl {
+
+namespace {
+
+/// A large array may begin behind the start of its memory, so that elements can be removed from and
+/// put to its front without moving all the others. It has one place more than it needs, before the
+/// first element, which holds the start of the memory.
+constexpr std::size_t LeastLarge = 512;
+
+bool IsLarge(std::size_t capacity) noexcept {
+    return capacity >= LeastLarge;
+}
+
+void** StartOf(void** items) noexcept {
+    return static_cast<void**>(items[-1]);
+}
+
+/// How many places are free before the elements of a large array.
+std::size_t RoomBefore(void** items) noexcept {
+    return static_cast<std::size_t>(items - StartOf(items)) - 1;
+}
+
+/// Memory that holds the first elements of what was there, which is given back.
+void** MoveTo(void** items, std::size_t size, bool wasLarge, std::size_t capacity) {
+    if (!IsLarge(capacity)) {
+        // What is small was never large.
+        return static_cast<void**>(std::realloc(items, capacity * sizeof(void*)));
+    }
+    void** start = wasLarge ? StartOf(items) : nullptr;
+    if (wasLarge && RoomBefore(items) == 0) {
+        start = static_cast<void**>(std::realloc(start, (capacity + 1) * sizeof(void*)));
+    } else {
+        void** const former = wasLarge ? start : items;
+        start = static_cast<void**>(std::malloc((capacity + 1) * sizeof(void*)));
+        if (start != nullptr) {
+            if (size > 0) {
+                std::memcpy(start + 1, items, size * sizeof(void*));
+            }
+            std::free(former);
+        }
+    }
+    if (start == nullptr) {
+        return nullptr;
+    }
+    *start = start;
+    return start + 1;
+}
+
+} // namespace
 
 PtrArrayBase::PtrArrayBase(const PtrArrayBase& other) : PtrArrayBase() {
     *this = other;
@@ -55,15 +104,17 @@ void PtrArrayBase::Reallocate(std::size_t capacity) {
     // Indices are of type int, which limits the size.
     const bool isBorrowed = ownsItems_ == 0;
     void** const own = isBorrowed ? nullptr : items_;
-    void* const items =
-        capacity > MostElements ? nullptr : std::realloc(own, capacity * sizeof(void*));
+    void** const items =
+        capacity > MostElements
+            ? nullptr
+            : MoveTo(own, isBorrowed ? 0 : size_, !isBorrowed && IsLarge(capacity_), capacity);
     if (items == nullptr) {
         throw std::bad_alloc();
     }
     if (isBorrowed && size_ > 0) {
         std::memcpy(items, items_, size_ * sizeof(void*));
     }
-    items_ = static_cast<void**>(items);
+    items_ = items;
     capacity_ = static_cast<std::uint32_t>(capacity) & MostElements;
     ownsItems_ = 1;
 }
@@ -82,7 +133,7 @@ void PtrArrayBase::Reserve(int capacity) {
 
 void PtrArrayBase::Empty() noexcept {
     if (ownsItems_ != 0) {
-        std::free(items_);
+        std::free(IsLarge(capacity_) ? StartOf(items_) : items_);
     }
     items_ = nullptr;
     size_ = 0;
@@ -126,10 +177,42 @@ void PtrArrayBase::InsertAt(int i, void* p) {
     if (i < 0 || i > GetSize() || !Takes(p)) {
         return;
     }
-    Append(p);
     const auto index = static_cast<std::uint32_t>(i);
-    std::memmove(items_ + index + 1, items_ + index, (size_ - index - 1) * sizeof(void*));
+    if (index < size_ / 2 && Reordering::MakeRoomBefore(*this)) {
+        void** const start = StartOf(items_);
+        --items_;
+        std::memmove(items_, items_ + 1, index * sizeof(void*));
+        items_[-1] = start;
+        size_ = (size_ + 1) & MostElements;
+        capacity_ = (capacity_ + 1) & MostElements;
+    } else {
+        Append(p);
+        std::memmove(items_ + index + 1, items_ + index, (size_ - index - 1) * sizeof(void*));
+    }
     items_[index] = p;
+}
+
+bool Reordering::MakeRoomBefore(PtrArrayBase& array) {
+    if (array.ownsItems_ == 0 || !IsLarge(array.capacity_)) {
+        return false;
+    }
+    if (RoomBefore(array.items_) > 0) {
+        return true;
+    }
+    // Half of what is free behind the elements goes before them.
+    if (array.capacity_ - array.size_ < array.size_ / 2) {
+        array.Reallocate(std::size_t(array.size_) * 2);
+    }
+    const std::uint32_t room = (array.capacity_ - array.size_) / 2;
+    if (room == 0 || !IsLarge(array.capacity_ - room)) {
+        return false;
+    }
+    void** const start = StartOf(array.items_);
+    std::memmove(array.items_ + room, array.items_, array.size_ * sizeof(void*));
+    array.items_ += room;
+    array.items_[-1] = start;
+    array.capacity_ = (array.capacity_ - room) & PtrArrayBase::MostElements;
+    return true;
 }
 
 bool PtrArrayBase::Remove(const void* p) noexcept {
@@ -141,7 +224,15 @@ bool PtrArrayBase::Remove(const void* p) noexcept {
 void PtrArrayBase::RemoveAt(int i) noexcept {
     if (i >= 0 && i < GetSize()) {
         const auto index = static_cast<std::uint32_t>(i);
-        std::memmove(items_ + index, items_ + index + 1, (size_ - index - 1) * sizeof(void*));
+        if (index < size_ / 2 && ownsItems_ != 0 && IsLarge(capacity_ - 1)) {
+            void** const start = StartOf(items_);
+            std::memmove(items_ + 1, items_, index * sizeof(void*));
+            ++items_;
+            items_[-1] = start;
+            capacity_ = (capacity_ - 1) & MostElements;
+        } else {
+            std::memmove(items_ + index, items_ + index + 1, (size_ - index - 1) * sizeof(void*));
+        }
         RemoveTail();
     }
 }

@@ -11,6 +11,10 @@ struct Reordering {
     static void Place(PtrArrayBase& array, int index, void* element) noexcept {
         array.items_[index] = element;
     }
+
+    /// Makes sure that an element can be put to the front of a large array without moving others.
+    /// \return false when the array is too small to be worth it.
+    static bool MakeRoomBefore(PtrArrayBase& array);
 };
 
 } // namespace Orn_Hdl

@@ -715,54 +715,42 @@ TEST(Iterator, CopiesGoOnFromWhereTheyAre) {
     EXPECT_EQ(copy.GetCurrent(), &b) << "a loop over it does not move it";
 }
 
-} // namespace
-
-TEST(SmallPtrArray, KeepsItsElementsWhenItGrowsBeyondItsRoom) {
-    int values[10];
-    Orn_Hdl::SmallPtrArray<int*, 3> array;
-    for (int size = 0; size < 10; ++size) {
-        EXPECT_EQ(array.GetSize(), size);
-        EXPECT_EQ(array.Add(&values[size]), size);
-        for (int i = 0; i <= size; ++i) {
-            EXPECT_EQ(array.GetAt(i), &values[i]);
+/// Elements are put to and taken from any place of a large array, mostly its ends.
+RC_GTEST_PROP(PtrArray, LargeArraysKeepTheirOrder, ()) {
+    int things[4];
+    std::vector<int*> expected;
+    PtrArray<int*> array;
+    const int start = *rc::gen::inRange(0, 1300);
+    for (int i = 0; i < start; ++i) {
+        array.Add(&things[i % 4]);
+        expected.push_back(&things[i % 4]);
+    }
+    const int rounds = *rc::gen::inRange(1, 30);
+    for (int round = 0; round < rounds; ++round) {
+        const int operation = *rc::gen::inRange(0, 4);
+        const int place = *rc::gen::inRange(0, 4) == 0 ? *rc::gen::inRange(0, 1500) : 0;
+        const int times = *rc::gen::inRange(1, 300);
+        for (int i = 0; i < times; ++i) {
+            int* const thing = &things[(round + i) % 4];
+            const int size = array.GetSize();
+            if (operation == 0) {
+                array.Add(thing);
+                expected.push_back(thing);
+            } else if (operation == 1 && place < size) {
+                array.RemoveAt(place);
+                expected.erase(expected.begin() + place);
+            } else if (operation == 2 && place <= size) {
+                array.InsertAt(place, thing);
+                expected.insert(expected.begin() + place, thing);
+            } else if (operation == 3 && i == 0) {
+                array.Reserve(size + place);
+            }
         }
     }
-    array.RemoveAt(0);
-    EXPECT_EQ(array.GetAt(0), &values[1]);
-    array.Empty();
-    EXPECT_TRUE(array.IsEmpty());
-    EXPECT_EQ(array.Add(&values[5]), 0);
-    EXPECT_EQ(array.GetTail(), &values[5]);
-}
-
-TEST(SmallPtrArray, CopiesIntoAnArrayOfAnySize) {
-    int values[4];
-    Orn_Hdl::SmallPtrArray<int*, 3> array;
-    array.Add(&values[0]);
-    array.Add(&values[1]);
-    Orn_Hdl::PtrArray<int*> copy = array;
-    array.SetAt(0, nullptr);
-    EXPECT_EQ(copy.GetSize(), 2);
-    EXPECT_EQ(copy.GetAt(0), &values[0]);
-    copy.Add(&values[2]);
-    copy.Add(&values[3]);
-    static_cast<Orn_Hdl::PtrArray<int*>&>(array) = copy;
-    EXPECT_EQ(array.GetSize(), 4);
-    EXPECT_EQ(array.GetAt(3), &values[3]);
-}
-
-TEST(PtrArray, InsertsBeforeAnElementOrBehindTheLast) {
-    int values[4];
-    Array array;
-    array.InsertAt(1, &values[0]);
-    array.InsertAt(-1, &values[0]);
-    EXPECT_TRUE(array.IsEmpty());
-    array.InsertAt(0, &values[2]);
-    array.InsertAt(0, &values[0]);
-    array.InsertAt(1, &values[1]);
-    array.InsertAt(3, &values[3]);
-    ASSERT_EQ(array.GetSize(), 4);
-    for (int i = 0; i < 4; ++i) {
-        EXPECT_EQ(array.GetAt(i), &values[i]);
+    RC_ASSERT(array.GetSize() == static_cast<int>(expected.size()));
+    for (int i = 0; i < array.GetSize(); ++i) {
+        RC_ASSERT(array.GetAt(i) == expected[static_cast<std::size_t>(i)]);
     }
 }
+
+} // namespace
