@@ -1,9 +1,9 @@
 #include "HdlModel/Netlist/DummySignals.h"
 
+#include "Containers/HashByEights.h"
 #include "HdlModel/Signals/References.h"
 #include "HdlModel/Signals/SignalCast.h"
 
-#include <algorithm>
 #include <memory>
 #include <string>
 #include <unordered_set>
@@ -16,15 +16,30 @@ bool IsNameTaken(const Netlist& netlist, const Signal& signal) {
     return netlist.GetSignal(signal.GetDummySignalName().GetView()) != nullptr;
 }
 
+std::uint32_t HashAddress(const Signal* signal) noexcept {
+    constexpr std::uint64_t Factor = 0x9E3779B97F4A7C15U;
+    return static_cast<std::uint32_t>(
+        MultiplyAndFold(reinterpret_cast<std::uintptr_t>(signal), Factor) >> 32U);
+}
+
 int WantedPolarity(bool forOutputs) noexcept {
     return forOutputs ? Polarity::Output : Polarity::Input;
 }
 
 } // namespace
 
+const DummySignals::Entry* DummySignals::FindBy(const Places& places, Signal* Entry::*side,
+                                                const Signal* signal) const noexcept {
+    const std::uint32_t hash = HashAddress(signal);
+    const std::uint32_t place = places.Find(hash, [&](std::uint32_t other, std::uint32_t value) {
+        return other == hash && entries_[value - 1].*side == signal;
+    });
+    return place == 0 ? nullptr : &entries_[place - 1];
+}
+
 Signal* DummySignals::Find(const Signal* original) const noexcept {
-    const auto found = dummyOf_.find(original);
-    return found == dummyOf_.end() ? nullptr : found->second;
+    const Entry* const entry = FindBy(byOriginal_, &Entry::original, original);
+    return entry == nullptr ? nullptr : entry->dummy;
 }
 
 /// Whether the signal has a dummy already, here or in another netlist.
@@ -37,25 +52,54 @@ void DummySignals::Forget(const Signal* signal) noexcept {
     if (References::GetKeeper(*signal) != this) {
         return;
     }
-    const auto end = std::remove_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
-        if (entry.original != signal && entry.dummy != signal) {
-            return false;
+    if (const Entry* const entry = FindBy(byOriginal_, &Entry::original, signal)) {
+        Drop(*entry);
+    }
+    if (const Entry* const entry = FindBy(byDummy_, &Entry::dummy, signal)) {
+        Drop(*entry);
+    }
+    if (emptyPlaces_ > entries_.size() / 2) {
+        DropEmptyPlaces();
+    }
+}
+
+void DummySignals::Drop(const Entry& entry) noexcept {
+    const auto index = static_cast<std::size_t>(&entry - entries_.data());
+    const auto place = static_cast<std::uint32_t>(index + 1);
+    byOriginal_.Remove(HashAddress(entry.original), place);
+    byDummy_.Remove(HashAddress(entry.dummy), place);
+    References::Release(*entry.original);
+    References::Release(*entry.dummy);
+    entries_[index] = {nullptr, nullptr, false};
+    ++emptyPlaces_;
+}
+
+void DummySignals::DropEmptyPlaces() noexcept {
+    std::uint32_t place = 0;
+    for (std::uint32_t former = 0; former < entries_.size(); ++former) {
+        const Entry entry = entries_[former];
+        if (entry.original != nullptr) {
+            byOriginal_.Replace(HashAddress(entry.original), former + 1, place + 1);
+            byDummy_.Replace(HashAddress(entry.dummy), former + 1, place + 1);
+            entries_[place] = entry;
+            ++place;
         }
-        dummyOf_.erase(entry.original);
-        References::Release(*entry.original);
-        References::Release(*entry.dummy);
-        return true;
-    });
-    entries_.erase(end, entries_.end());
+    }
+    entries_.resize(place);
+    emptyPlaces_ = 0;
 }
 
 void DummySignals::Clear() noexcept {
     for (const Entry& entry : entries_) {
-        References::Release(*entry.original);
-        References::Release(*entry.dummy);
+        if (entry.original != nullptr) {
+            References::Release(*entry.original);
+            References::Release(*entry.dummy);
+        }
     }
     entries_.clear();
-    dummyOf_.clear();
+    emptyPlaces_ = 0;
+    byOriginal_.Clear();
+    byDummy_.Clear();
 }
 
 /// The dummy takes over the pins that still point at its signal. The dummy of an output port takes
@@ -85,6 +129,9 @@ void DummySignals::Link(const Entry& entry) {
 void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
     std::unordered_set<const Signal*> met;
     for (std::size_t i = firstEntry; i < entries_.size(); ++i) {
+        if (entries_[i].original == nullptr) {
+            continue;
+        }
         const std::vector<Signal*> referrers = References::GetReferrers(*entries_[i].original);
         // The last first: that is where the original, which drops each note, looks first.
         for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
@@ -113,10 +160,14 @@ void DummySignals::Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool
     // Room comes first: an entry whose signals are kept is dropped when either is destroyed.
     References::PrepareToKeep(original);
     References::PrepareToKeep(*dummy);
+    byOriginal_.MakeRoom();
+    byDummy_.MakeRoom();
     entries_.push_back({&original, dummy, forOutputs});
     References::Keep(original, *this);
     References::Keep(*dummy, *this);
-    dummyOf_.emplace(&original, dummy);
+    const auto place = static_cast<std::uint32_t>(entries_.size());
+    byOriginal_.Add(HashAddress(&original), place);
+    byDummy_.Add(HashAddress(dummy), place);
     TakeOver(entries_.back());
 }
 
@@ -192,6 +243,9 @@ void DummySignals::Refresh(Netlist& netlist) {
     // By index: dummies of new slices and bits join the list on the way.
     for (std::size_t i = 0; i < entries_.size(); ++i) {
         const Entry entry = entries_[i];
+        if (entry.original == nullptr) {
+            continue;
+        }
         TakeOver(entry);
         if (Bus* const bus = As<Bus>(entry.original)) {
             MakeForParts(netlist, *bus, *As<Bus>(entry.dummy), entry.forOutputs);

@@ -2,11 +2,12 @@
 // ports that are read inside or have several drivers, and input ports that are driven inside.
 #pragma once
 
+#include "Containers/HashSlots.h"
 #include "Orn_Hdl/Model/Netlist.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -53,9 +54,19 @@ private:
     void ReplaceInCompounds(std::size_t firstEntry, Members which);
     void ReplaceMembers(CompoundBus& compound, Members which);
 
-    /// In the order in which the dummies were made.
+    /// Where an entry stands, plus one, by a signal that it names.
+    using Places = HashSlots<std::uint32_t>;
+
+    const Entry* FindBy(const Places& places, Signal* Entry::*side,
+                        const Signal* signal) const noexcept;
+    void Drop(const Entry& entry) noexcept;
+    void DropEmptyPlaces() noexcept;
+
+    /// In the order in which the dummies were made. Dropped entries leave places without signals.
     std::vector<Entry> entries_;
-    std::unordered_map<const Signal*, Signal*> dummyOf_;
+    std::size_t emptyPlaces_ = 0;
+    Places byOriginal_;
+    Places byDummy_;
 };
 
 } // namespace Orn_Hdl
