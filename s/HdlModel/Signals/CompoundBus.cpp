@@ -131,14 +131,25 @@ void CompoundBus::SetAt(int index, Signal* member) {
 
 void CompoundBus::Forget(Signal* signal) noexcept {
     Signal::Forget(signal);
-    members_.Remove(signal);
+    int kept = 0;
+    for (Signal* member : GetBusMemberIterator()) {
+        if (member != signal) {
+            members_.SetAt(kept, member);
+            ++kept;
+        }
+    }
+    while (members_.GetSize() > kept) {
+        members_.RemoveTail();
+    }
 }
 
 void CompoundBus::ReplaceReference(Signal* from, Signal* to) {
     Signal::ReplaceReference(from, to);
-    const int index = members_.GetIndex(from);
-    if (index >= 0) {
-        SetAt(index, to);
+    // From the end: that is where the notes of the members are looked for first.
+    for (int i = members_.GetSize() - 1; i >= 0; --i) {
+        if (members_.GetAt(i) == from) {
+            SetAt(i, to);
+        }
     }
 }
 

@@ -4,6 +4,8 @@
 #include "HdlModel/Signals/SignalLinks.h"
 
 #include <algorithm>
+#include <functional>
+#include <unordered_set>
 
 namespace Orn_Hdl {
 
@@ -33,10 +35,14 @@ const std::vector<Signal*>& References::GetReferrers(const Signal& signal) noexc
 }
 
 void References::ReplaceEverywhere(Signal& from, Signal& to) {
-    // The last first: that is where `from`, which drops each note, looks first.
+    // The last first: that is where `from`, which drops each note, looks first. A compound may have
+    // noted itself many times.
     const std::vector<Signal*> referrers = GetReferrers(from);
+    std::unordered_set<const Signal*> met;
     for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
-        (*referrer)->ReplaceReference(&from, &to);
+        if (met.insert(*referrer).second) {
+            (*referrer)->ReplaceReference(&from, &to);
+        }
     }
 }
 
@@ -130,10 +136,15 @@ void References::Leave(Signal& signal) noexcept {
         keeper->Forget(&signal);
     }
     RemoveAliases(signal);
-    for (Signal* referrer : GetReferrers(signal)) {
-        if (!AreDestroyedTogether(signal, *referrer)) {
+    // Each is told once, however often it noted itself. The order of the notes does not matter.
+    std::vector<Signal*>& referrers = signal.links_->referrers;
+    std::sort(referrers.begin(), referrers.end(), std::less<>());
+    const Signal* told = nullptr;
+    for (Signal* referrer : referrers) {
+        if (referrer != told && !AreDestroyedTogether(signal, *referrer)) {
             referrer->Forget(&signal);
         }
+        told = referrer;
     }
     signal.links_.reset();
 }
