@@ -96,6 +96,45 @@ void WriteWiden(Output& out, std::size_t size) {
     }
 }
 
+/// `size` buses that are each widened once.
+void WriteWidenMany(Output& out, std::size_t size) {
+    out << "ADD COMPONENT LOAD\nADD PIN LOAD A(7:0) INPUT\nADD INSTANCE LOAD u\n";
+    for (std::size_t k = 0; k < size; ++k) {
+        out << "ADD SIGNAL b" << k << "(3:0)\n";
+    }
+    for (std::size_t k = 0; k < size; ++k) {
+        out << "CONNECT SIGNAL b" << k << "(7:0) u.A(7:0)\n";
+    }
+}
+
+/// One bus that is widened `size` times, each time between two of its bits.
+void WriteWidenBits(Output& out, std::size_t size) {
+    out << "ADD COMPONENT LOAD\nADD PIN LOAD A INPUT\nADD PIN LOAD B INPUT\n";
+    for (std::size_t k = 0; k < size; ++k) {
+        out << "ADD INSTANCE LOAD u" << k << "\nCONNECT SIGNAL d(" << k << ":0) u" << k
+            << ".A\nCONNECT SIGNAL d(" << k << ") u" << k << ".B\n";
+    }
+}
+
+/// One compound that has a bus as each of its `size` members, which is widened then.
+void WriteRepeatedMember(Output& out, std::size_t size) {
+    out << "ADD COMPONENT LOAD\nADD PIN LOAD A INPUT\nADD INSTANCE LOAD u\nADD SIGNAL d(1:0)\n"
+           "CONNECT SIGNAL d(1:0)";
+    for (std::size_t k = 1; k < size; ++k) {
+        out << ",d(1:0)";
+    }
+    out << " u.A\nCONNECT SIGNAL d(2:0) u.A\n";
+}
+
+/// `size` compounds, each of which has a bus as a member that the next one widens.
+void WriteWidenMembers(Output& out, std::size_t size) {
+    out << "ADD COMPONENT LOAD\nADD PIN LOAD A INPUT\nADD SIGNAL x\n";
+    for (std::size_t k = 0; k < size; ++k) {
+        out << "ADD INSTANCE LOAD u" << k << "\nCONNECT SIGNAL d(" << k + 1 << ":0),x u" << k
+            << ".A\n";
+    }
+}
+
 /// `size` components with one instance each, in a row.
 void WriteComponents(Output& out, std::size_t size) {
     for (std::size_t k = 0; k < size; ++k) {
@@ -130,7 +169,7 @@ void WriteComment(Output& out, std::size_t size) {
     }
 }
 
-constexpr std::array<Shape, 10> Shapes = {{
+constexpr std::array<Shape, 14> Shapes = {{
     {"clock", "one net with N loads", WriteClock},
     {"alias-chain", "N signals aliased in four chains", WriteAliasChain},
     {"readback", "N output ports that are read inside", WriteReadback},
@@ -138,6 +177,10 @@ constexpr std::array<Shape, 10> Shapes = {{
     {"wide-component", "one component with N pins", WriteWideComponent},
     {"slices", "N slices and bits of one bus", WriteSlices},
     {"widen", "one bus widened N times", WriteWiden},
+    {"widen-many", "N buses, each widened once", WriteWidenMany},
+    {"widen-bits", "one bus widened N times between its bits", WriteWidenBits},
+    {"widen-members", "N compounds, whose members are widened", WriteWidenMembers},
+    {"repeated-member", "one compound that repeats a bus N times", WriteRepeatedMember},
     {"components", "N components, one instance each", WriteComponents},
     {"attributes", "N attributes on the module", WriteAttributes},
     {"comment", "a comment of N bytes", WriteComment},
