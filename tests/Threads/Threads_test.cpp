@@ -68,18 +68,14 @@ TEST(Threads, AnEngineMayMoveToAnotherThread) {
 
 /// A design with what is looked up in different ways: a wide component, buses and their parts, a
 /// compound, attributes, comments, constants.
-std::vector<std::string> DesignToRead() {
-    std::vector<std::string> lines{"ADD COMPONENT WIDE", "ADD PORT q(7:0) OUTPUT"};
+std::string DesignToRead() {
+    std::string lines = "ADD COMPONENT WIDE\nADD PORT q(7:0) OUTPUT\n";
     for (int i = 0; i < 100; ++i) {
-        lines.push_back("ADD PIN WIDE p" + std::to_string(i) + " INPUT");
+        lines += "ADD PIN WIDE p" + std::to_string(i) + " INPUT\n";
     }
-    for (const char* line :
-         {"ADD INSTANCE WIDE u0", "ADD INSTANCE WIDE u1", "CONNECT SIGNAL q(3) u0.p7",
-          "CONNECT SIGNAL q(2:1) u1.p8", "CONNECT SIGNAL q(0),q(1) u1.p9",
-          "ASSIGN CONSTANT k 1:B:1", "ADD MODULE ATTRIBUTE a b", "ADD NOTES text"}) {
-        lines.emplace_back(line);
-    }
-    return lines;
+    return lines + "ADD INSTANCE WIDE u0\nADD INSTANCE WIDE u1\nCONNECT SIGNAL q(3) u0.p7\n"
+                   "CONNECT SIGNAL q(2:1) u1.p8\nCONNECT SIGNAL q(0),q(1) u1.p9\n"
+                   "ASSIGN CONSTANT k 1:B:1\nADD MODULE ATTRIBUTE a b\nADD NOTES text\n";
 }
 
 /// Calls what a caller who only reads can call. \return a number that depends on all answers.
