@@ -1,4 +1,4 @@
-// Reorders the elements of an array.
+// What the library does to arrays beyond their interface: reordering, and room before the front.
 #pragma once
 
 #include "Orn_Hdl/Containers/PtrArray.h"
