@@ -96,8 +96,8 @@ public:
     OutStream& operator<<(Integer number) {
         return *this << std::string_view(std::to_string(number));
     }
-    /// A character or a number with a fraction would be written as an integer: `';'` as 59. Write
-    /// the text that is meant, such as `";"`.
+    /// A character or a number with a fraction would be written as an integer, a semicolon as 59.
+    /// Write the text that is meant.
     template <class Other,
               std::enable_if_t<std::is_arithmetic_v<Other> && !IsOtherInteger<Other>, int> = 0>
     OutStream& operator<<(Other) = delete;

@@ -32,29 +32,43 @@ constexpr auto JoinedTexts = [] {
 }();
 
 /// A kind of object that has attributes: how the arguments of a command name the object, what its
-/// help calls it, and how its name is read.
-template <FixedText Argument, FixedText Noun, AttributeOwner Owner> struct AttributeOwnerTraits {
+/// help calls it, how its name is read, and what the help adds to the commands for values and
+/// types, and to the command for options.
+template <FixedText Argument, FixedText Noun, AttributeOwner Owner, FixedText Remark,
+          FixedText OptionRemark>
+struct AttributeOwnerTraits {
     static constexpr auto argument = Argument;
     static constexpr auto noun = Noun;
     static constexpr AttributeOwner owner = Owner;
+    static constexpr auto remark = Remark;
+    static constexpr auto optionRemark = OptionRemark;
 };
 
-using OfModule = AttributeOwnerTraits<"", "the module", AttributeOwner::Module>;
-using OfComponent = AttributeOwnerTraits<"<component> ", "a component", AttributeOwner::Object>;
-using OfInstance = AttributeOwnerTraits<"<instance> ", "an instance", AttributeOwner::Object>;
-using OfSignal = AttributeOwnerTraits<"<signal> ", "a signal", AttributeOwner::Object>;
-using OfComponentPin =
-    AttributeOwnerTraits<"<component.pin> ", "a pin of a component", AttributeOwner::Pin>;
-using OfInstancePin =
-    AttributeOwnerTraits<"<instance.pin> ", "a pin of an instance", AttributeOwner::Pin>;
+/// What the help says where a command has no effect on the output.
+constexpr FixedText NoEffect = " It has no effect on the output.";
 
+using OfModule = AttributeOwnerTraits<"", "the module", AttributeOwner::Module, "",
+                                      " -SYNATTR=... has no effect on the output.">;
+using OfComponent =
+    AttributeOwnerTraits<"<component> ", "a component", AttributeOwner::Object, "", "">;
+using OfInstance =
+    AttributeOwnerTraits<"<instance> ", "an instance", AttributeOwner::Object, "", "">;
+using OfSignal = AttributeOwnerTraits<"<signal> ", "a signal", AttributeOwner::Object, "",
+                                      " -GENERIC=... has no effect on the output.">;
+using OfComponentPin = AttributeOwnerTraits<"<component.pin> ", "a pin of a component",
+                                            AttributeOwner::Pin, NoEffect, NoEffect>;
+using OfInstancePin = AttributeOwnerTraits<"<instance.pin> ", "a pin of an instance",
+                                           AttributeOwner::Pin, NoEffect, NoEffect>;
+
+/// The entry of a command that adds an attribute or sets its value.
 template <class Owner, auto Operation> constexpr CommandEntry AddAttribute(const char* phrase) {
     return {{phrase,
              JoinedTexts<Owner::argument, "[-TYPE=<type>] <attribute> [value]">.data(),
              JoinedTexts<"Adds an attribute to ",
                          Owner::noun,
-                         ", or sets its value; the type is String, Integer, Float, Boolean, Bit, "
-                         "BitVector or User.">.data()},
+                         ", or sets its value. The type is String, Integer, Float, Boolean, Bit, "
+                         "BitVector or User.",
+                         Owner::remark>.data()},
             ParseAddAttribute<Owner::owner>,
             Apply<Operation>};
 }
@@ -62,10 +76,11 @@ template <class Owner, auto Operation> constexpr CommandEntry AddAttribute(const
 /// The entry of a command that sets the value of an attribute.
 template <class Owner, auto Operation>
 constexpr CommandEntry SetAttributeValue(const char* phrase) {
-    return {{phrase, JoinedTexts<Owner::argument, "<attribute> <value>">.data(),
-             JoinedTexts<"Sets the value of an attribute of ", Owner::noun, ".">.data()},
-            ParseAttributeText<Owner::owner>,
-            Apply<Operation>};
+    return {
+        {phrase, JoinedTexts<Owner::argument, "<attribute> <value>">.data(),
+         JoinedTexts<"Sets the value of an attribute of ", Owner::noun, ".", Owner::remark>.data()},
+        ParseAttributeText<Owner::owner>,
+        Apply<Operation>};
 }
 
 /// The entry of a command that names the type of an attribute of type User.
@@ -73,7 +88,8 @@ template <class Owner, auto Operation>
 constexpr CommandEntry SetAttributeUserType(const char* phrase) {
     return {
         {phrase, JoinedTexts<Owner::argument, "<attribute> <type>">.data(),
-         JoinedTexts<"Names the type of an attribute of type User of ", Owner::noun, ".">.data()},
+         JoinedTexts<"Names the type of an attribute of type User of ", Owner::noun, ".",
+                     Owner::remark>.data()},
         ParseAttributeText<Owner::owner>,
         Apply<Operation>};
 }
@@ -86,7 +102,8 @@ constexpr CommandEntry SetAttributeOption(const char* phrase) {
              JoinedTexts<"Sets how an attribute of ",
                          Owner::noun,
                          " is written: -GENERIC=NONE|SYN|NOSYN, "
-                         "-SYNATTR=NONE|ASSIGN|ASSIGNNODEC.">.data()},
+                         "-SYNATTR=NONE|ASSIGN|ASSIGNNODEC.",
+                         Owner::optionRemark>.data()},
             ParseAttributeOptions<Owner::owner>,
             ApplyOptions<SetGeneric, SetSynAttr>};
 }

@@ -33,7 +33,7 @@ constexpr std::array<std::string_view, 9> Emblem = {
     R"(    |_____.')",      //
     R"(   O r n _ H d l)",  //
 };
-/// The line of the emblem, counted from 0, that bears the first label.
+/// The line of the emblem, counted from 0, beside which the first label is written.
 constexpr std::size_t FirstLabelLine = 2;
 
 } // namespace
@@ -75,7 +75,7 @@ void NetlistHeader::WriteDivider() {
 }
 
 void NetlistHeader::WriteCopyright() {
-    PutLine(out_, prefix_, " ", "Copyright (c) 2026 the Orn_Hdl authors. All rights reserved.");
+    PutLine(out_, prefix_, " ", "Copyright (c) 2026 the Orn_Hdl authors.");
 }
 
 void NetlistHeader::WriteLogo() {

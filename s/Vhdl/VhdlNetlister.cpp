@@ -49,9 +49,9 @@ bool IsAliasedByBits(const Signal& signal) {
     return (!SignalBits::IsSingle(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
 }
 
-/// Whether the signal is a slice of one bit of a bus that counts upwards. Its range reads as one
-/// that counts downwards, which VHDL does not let stand for a part of such a bus.
-bool IsBitOfUpwardBus(const Signal& signal) {
+/// Whether the signal is a slice of one bit of a bus whose range ascends. VHDL reads the slice's
+/// range as a descending one, which cannot stand for a part of such a bus.
+bool IsOneBitOfAscendingBus(const Signal& signal) {
     if (signal.GetSignalType() != SignalTypeBusSlice || signal.GetWidth() != 1) {
         return false;
     }
@@ -365,12 +365,8 @@ void VhdlNetlister::Writer::WriteInstanceAttrAssignment(const Instance& instance
 }
 
 void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
-    if (IsCompoundOrAgainst(signal)) {
+    if (IsCompoundOrAgainst(signal) || IsOneBitOfAscendingBus(signal)) {
         WriteConstantBits(signal);
-    } else if (IsBitOfUpwardBus(signal)) {
-        SignalBits::ForEach(signal, 1, [this, &signal](string_view bit) {
-            statements_.WriteConstantSignalAssignment(bit, true, signal.GetConstantValue());
-        });
     } else {
         statements_.WriteConstantSignalAssignment(
             signal.GetNameView(), SignalBits::IsSingle(signal), signal.GetConstantValue());

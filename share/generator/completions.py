@@ -66,7 +66,11 @@ _orn_hdl() {{
     local options
     COMPREPLY=()
     if ((COMP_CWORD == 1)); then
-        mapfile -t COMPREPLY < <(compgen -W '{names} --help --version' -- "$word")
+        mapfile -t COMPREPLY < <(compgen -W '{names} help --help --version' -- "$word")
+        return
+    fi
+    if [[ ${{COMP_WORDS[1]}} == help ]]; then
+        mapfile -t COMPREPLY < <(compgen -W '{names}' -- "$word")
         return
     fi
     case $previous in
@@ -145,13 +149,15 @@ _orn_hdl() {{
     local -a commands
     commands=(
 {described}
+        'help:Print the help of a command'
     )
-    _arguments -C '(-h --help)'{{-h,--help}}'[Print help]' '--version[Print the version]' \\
+    _arguments -C '(-h --help)'{{-h,--help}}'[Print help]' '--version[Print the version and exit]' \\
         '1: :->command' '*:: :->arguments' && return
     case $state in
         command) _describe command commands ;;
         arguments)
             case $words[1] in
+                help) _describe command commands ;;
 """
     for subcommand in language.subcommands:
         options = [text for option in subcommand.options for text in _zsh_option(option)]

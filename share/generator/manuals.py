@@ -65,6 +65,7 @@ def tool_page(language: Language, date: str) -> str:
     text += ".SH NAME\norn\\-hdl \\- write Verilog and VHDL netlists from command files\n"
     text += ".SH SYNOPSIS\n"
     text += ".br\n".join(_synopsis_line(subcommand) for subcommand in language.subcommands)
+    text += ".br\n.B orn\\-hdl help\n[COMMAND]\n"
     text += ".br\n.B orn\\-hdl \\-\\-version\n"
     text += f".SH DESCRIPTION\n{_escape(language.description)}\n"
     text += "The commands are described in\n.BR orn\\-hdl (5).\n.SH COMMANDS\n"
@@ -73,11 +74,11 @@ def tool_page(language: Language, date: str) -> str:
 .SH EXIT STATUS
 .TP
 .B 0
-All went well.
+Success.
 .TP
 .B 1
-A command failed, or a file does not hold what it has to. A line that fails is reported on standard
-error as FILE:LINE: error: TEXT.
+A command failed, or the contents of a file are invalid. A line that fails is reported on standard error
+as FILE:LINE: error: TEXT.
 .TP
 .B 2
 The command line is wrong.
@@ -87,7 +88,7 @@ A file could not be read or written.
 .SH ENVIRONMENT
 .TP
 .B SOURCE_DATE_EPOCH
-The time that headers show, in seconds since 1970, in place of the present time.
+The time to write in headers, in seconds since 1970, instead of the current time.
 .SH EXAMPLE
 .EX
 orn\\-hdl run \\-\\-verilog top.v \\-\\-vhdl top.vhd top.cmd

@@ -329,9 +329,16 @@ TEST(VhdlAssignments, OfConstantsThatCannotBeWrittenBitByBit) {
 TEST(VhdlAssignments, OfConstantsOnSlicesOfOneBit) {
     EngineScript script(
         "ADD SIGNAL D(7:0)\nADD SIGNAL E(0:7)\nADD SIGNAL F(3:3)\nASSIGN CONSTANT D(5:5) 1:B:1\n"
-        "ASSIGN CONSTANT E(5:5) 1:B:0\nASSIGN CONSTANT E(6:6) 1:H:1\nASSIGN CONSTANT F(3:3) 1:B:1");
+        "ASSIGN CONSTANT E(5:5) 1:B:0\nASSIGN CONSTANT E(6:6) 1\nASSIGN CONSTANT F(3:3) 1:B:1");
     EXPECT_EQ(Assigns(script.Vhdl()), (Lines{"D(5 downto 5) <= b\"1\";", "E(5) <= '0';",
                                              "E(6) <= '1';", "F(3 downto 3) <= b\"1\";"}));
+}
+
+TEST(VhdlAssignments, OfConstantsThatAreNotTheOneBitOfAnAscendingBus) {
+    for (const char* value : {"1:H:1", "4:H:A", "1:O:0", "2:B:01", "01", "x"}) {
+        EngineScript script("ADD SIGNAL E(0:7)\nASSIGN CONSTANT E(5:5) " + std::string(value));
+        EXPECT_TRUE(Assigns(script.Vhdl()).empty()) << value;
+    }
 }
 
 TEST(VhdlAssignments, OfAliases) {

@@ -160,6 +160,7 @@ class Bash(unittest.TestCase):
         self.assertEqual(self.complete("run", "--model", ""), [])
         self.assertEqual(self.complete("import", "--x-as", ""), ["0", "1"])
         self.assertEqual(self.complete("unknown", ""), [])
+        self.assertEqual(self.complete("help", "dr"), ["draw"])
 
     def test_every_option_of_every_command(self) -> None:
         for command in ("run", "import", "check", "draw", "commands"):

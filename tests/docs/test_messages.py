@@ -19,7 +19,7 @@ def shape(message: str) -> str:
 
 class Messages(unittest.TestCase):
     def test_the_page_lists_them(self) -> None:
-        sources = "".join(path.read_text() for path in sorted((PROJECT / "s").rglob("*.cpp")))
+        sources = "".join(path.read_text() for path in sorted((PROJECT / "s").rglob("*.*")))
         thrown = {shape(message) for message in THROWN.findall(sources)}
         page = (PROJECT / "docs" / "interface.md").read_text()
         self.assertGreater(len(thrown), 10)

@@ -28,7 +28,7 @@ IMPORTED = ["analog/and", "analog/common_emitter_full", "analog/mcu", "analog/re
             "digital/generics", "digital/ports_splitjoin", "digital/up3down5"]
 REFUSED = {
     # A comma too many, which only relatives of JSON allow.
-    "analog/vcc_and_gnd": "modules.test.cells.vcc.attributes: no valid JSON: The JSON document has "
+    "analog/vcc_and_gnd": "modules.test.cells.vcc.attributes: invalid JSON: The JSON document has "
                           "an improper structure: missing or superfluous commas, braces, missing "
                           "keys, etc.",
     "digital/hyperedges": "modules.hyperedges.ports.i1.bits[0]: two input ports share this bit",

@@ -315,7 +315,7 @@ class Cells(ImportTest):
         done = self.import_design(design({}, {"u": cell("LEAF", "oo", O=["x"], Q=["1"])}))
         self.assertEqual(done.lines("CONNECT SIGNAL"), [])
         self.assertEqual(done.warnings, ["d.json: warning: modules.top.cells.u.connections.Q[0]: "
-                                         "an output pin stands at a constant; left open"])
+                                         "an output pin is tied to a constant; left open"])
 
     def test_inout_pins(self) -> None:
         done = self.import_design(design(
@@ -330,8 +330,8 @@ class Cells(ImportTest):
         done = self.import_design(contents)
         self.assertEqual(done.lines("ADD PIN"), ["LEAF P BiDirectional"])
         self.assertEqual(done.warnings, [
-            "d.json: warning: modules.top.cells.u.port_directions: nothing tells the direction of "
-            'pin "P"; taken for inout'])
+            "d.json: warning: modules.top.cells.u.port_directions: the direction of pin "
+            '"P" is unknown; taken as inout'])
 
     def test_ranges_come_from_the_black_box(self) -> None:
         done = self.import_design(design(
@@ -347,8 +347,8 @@ class Cells(ImportTest):
         self.assertEqual(done.lines("ADD PIN"), ["LEAF P(1:0) Input", "LEAF_1 P Input"])
         self.assertEqual(done.lines("ADD INSTANCE"), ["LEAF u", "LEAF_1 v", "LEAF_1 w"])
         self.assertEqual(done.warnings, [
-            "d.json: warning: modules.top.cells.v.type: other cells of the type have pins of other "
-            "widths, or parameters whose default is not told; this component is called LEAF_1"])
+            "d.json: warning: modules.top.cells.v.type: other cells of the type have other pin "
+            "widths, or parameters without a known default; this component is named LEAF_1"])
 
     def test_pin_that_the_black_box_does_not_have(self) -> None:
         self.refuse(design({}, {"u": cell("LEAF", "i", Q=[2])}, LEAF=black_box({"P": port("input", 2)})),
@@ -372,7 +372,7 @@ class Cells(ImportTest):
         self.assertIn("ADD INSTANCE LEAF_299 twin", lines)
         self.assertIn("CONNECT SIGNAL a same.P7", lines)
         self.assertIn("modules.top.cells.u7.type: the cells of the type have few pins in common; "
-                      "this component is called LEAF_7\n", outcome.err)
+                      "this component is named LEAF_7\n", outcome.err)
 
     def test_scope_information_is_no_cell(self) -> None:
         done = self.import_design(design({}, {"s": cell("$scopeinfo", "")}))
@@ -429,17 +429,17 @@ class Parameters(ImportTest):
                 "d.json: warning: modules.top.cells.u.parameters.P: a text with quotes, "
                 "backslashes or special characters becomes a bit vector"
                 # The component's default is the same value.
-                " (and 1 more places)"])
+                " (and 1 more place)"])
 
-    def test_what_the_file_does_not_tell(self) -> None:
+    def test_values_of_ambiguous_type(self) -> None:
         self.assertEqual(self.one("0" * 32), f"-TYPE=BitVector P 32:B:{'0' * 32}")
         self.assertEqual(self.warnings, [
-            "d.json: warning: modules.top.cells.u.parameters: the file does not tell integers from "
-            "vectors of 32 bits; written as bit vectors: P"])
+            "d.json: warning: modules.top.cells.u.parameters: the JSON does not distinguish integers "
+            "from 32-bit vectors; written as bit vectors: P"])
         self.assertEqual(self.one("1.5"), "-TYPE=String P 1.5")
         self.assertEqual(self.warnings, [
-            "d.json: warning: modules.top.cells.u.parameters: the file does not tell real numbers "
-            "from texts; written as texts: P"])
+            "d.json: warning: modules.top.cells.u.parameters: the JSON does not distinguish real "
+            "numbers from strings; written as strings: P"])
 
     def test_default_of_the_black_box(self) -> None:
         done = self.import_design(design(
@@ -477,7 +477,7 @@ class Parameters(ImportTest):
         self.refuse(design({}, cells), "modules.top.cells.u.parameters.P: an integer is expected")
         cells["u"]["parameters"]["P"] = 2**31
         self.refuse(design({}, cells),
-                    "modules.top.cells.u.parameters.P: the number does not fit 32 bits")
+                    "modules.top.cells.u.parameters.P: the number does not fit in 32 bits")
         cells["u"]["parameters"]["P"] = None
         self.refuse(design({}, cells), "modules.top.cells.u.parameters.P: a text is expected")
 
@@ -585,6 +585,14 @@ class Files(ImportTest):
         self.write("d.json", json.dumps(design({"a": port("input", 2)})))
         self.expect(self.run_tool("import", "d.json", "--verilog", "x.v"), SUCCESS)
         self.assertIn("Design Name: top", self.read("x.v"))
+
+    def test_standard_output(self) -> None:
+        self.write("d.json", json.dumps(design({"a": port("input", 2)},
+                                               {"u": cell("$inv", "i", I=[2])})))
+        files = self.run_tool("import", "d.json", "--verilog", "x.v", "--vhdl", "x.vhd", "--no-header")
+        self.assertIn("warning: ", files.err)
+        self.expect(self.run_tool("import", "d.json", "--verilog", "-", "--vhdl", "-", "--no-header"),
+                    SUCCESS, files.err, self.read("x.v") + self.read("x.vhd"))
 
     @unittest.skipIf(shutil.which("yosys") is None, "Yosys is not installed")
     def test_what_yosys_writes(self) -> None:

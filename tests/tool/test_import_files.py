@@ -8,7 +8,7 @@ import unittest
 from support import FAILED, SUCCESS
 from yosys_json import MARK, ImportTest, Json, black_box, cell, design, net, port
 
-STRUCTURE = ("no valid JSON: The JSON document has an improper structure: missing or superfluous "
+STRUCTURE = ("invalid JSON: The JSON document has an improper structure: missing or superfluous "
              "commas, braces, missing keys, etc.")
 
 
@@ -24,7 +24,7 @@ class Malformed(ImportTest):
                 path = self.write("d.json", text)
                 outcome = self.run_tool("import", path, "-o", "x.cmd")
                 self.assertEqual((outcome.status, outcome.out), (FAILED, ""))
-                self.assertIn("no valid JSON: ", outcome.err)
+                self.assertIn("invalid JSON: ", outcome.err)
                 self.assertEqual(outcome.err.count("\n"), 1)
                 self.assertFalse((self.folder / "x.cmd").exists())
 
@@ -53,7 +53,7 @@ class Malformed(ImportTest):
                 path = self.write("d.json", '{"creator": %s, "modules": {"top": {}}}' % wrong)
                 outcome = self.run_tool("import", path)
                 self.assertEqual(outcome.status, FAILED)
-                self.assertIn("no valid JSON: ", outcome.err)
+                self.assertIn("invalid JSON: ", outcome.err)
 
     def test_what_is_not_needed_may_be_anything(self) -> None:
         contents = design({"a": port("input", 2)})
@@ -65,11 +65,11 @@ class Malformed(ImportTest):
 
     def test_bytes_that_are_no_utf_8(self) -> None:
         self.refuse(b'{"modules": {"\xff": {}}}',
-                    "no valid JSON: The input is not valid UTF-8")
+                    "invalid JSON: The input is not valid UTF-8")
 
     def test_other_json(self) -> None:
         self.refuse("[]", "an object is expected")
-        self.refuse("{}", 'no netlist: "modules" is missing')
+        self.refuse("{}", 'not a netlist: "modules" is missing')
         self.refuse('{"modules": []}', "modules: an object is expected")
         self.refuse('{"modules": {}}', "modules: there is no module with contents")
         self.refuse('{"modules": {"top": 1}}', "modules.top: an object is expected")

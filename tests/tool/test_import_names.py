@@ -157,7 +157,19 @@ class Names(ImportTest):
             f"u{i}": cell(name, "i", I=["0"]) for i, name in enumerate(ODD_NAMES) if name}))
         self.assertEqual(len({name.lower() for name in done.lines("ADD COMPONENT")}),
                          len(ODD_NAMES) - 1)
-        self.assertIn("no name in both languages", done.warnings[0])
+        self.assertIn("is not a legal name in Verilog and VHDL; renamed to ", done.warnings[0])
+
+    def test_messages_about_names(self) -> None:
+        done = self.import_design(design({}, {
+            "u": cell("$a\nb", "ii", parameters={"p": "1"}, P=["0"], **{"q[0]": ["0"]})}, name="t-op"))
+        place = 'd.json: warning: modules["t-op"]'
+        self.assertEqual(done.warnings, [
+            f'{place}.cells.u.connections["q[0]"]: "q[0]" is not a legal name in Verilog and VHDL; '
+            'renamed to q_0 in component "$a?b"',
+            f'{place}.cells.u.parameters.p: another pin or parameter has the name "p"; '
+            'renamed to p_1 in component "$a?b"',
+            f'{place}.cells.u.type: "$a?b" is not a legal name in Verilog and VHDL; renamed to a_b',
+            f'{place}: "t-op" is not a legal name in Verilog and VHDL; the netlist is renamed to t_op'])
 
     def test_odd_names_of_pins_and_parameters(self) -> None:
         done = self.import_design(design({}, {

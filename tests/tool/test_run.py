@@ -4,6 +4,7 @@ from __future__ import annotations
 
 import os
 import pty
+import socket
 import subprocess
 import threading
 import unittest
@@ -178,7 +179,7 @@ class Outputs(ToolTest):
         self.expect(self.run_tool("run", "w.cmd"), FILE,
                     "w.cmd:9: error: cannot write /dev/full: No space left on device\n")
 
-    def test_a_write_failure_is_told_once_and_outweighs_a_failed_command(self) -> None:
+    def test_a_write_failure_is_reported_once_and_outweighs_a_failed_command(self) -> None:
         self.write("w.cmd", "WRITE VERILOG /dev/full\nNOOP\nADD\nWRITE VERILOG fine.v\n")
         self.expect(self.run_tool("run", "w.cmd", "--keep-going"), FILE,
                     "w.cmd:1: error: cannot write /dev/full: No space left on device\n"
@@ -189,6 +190,50 @@ class Outputs(ToolTest):
         outcome = self.run_tool("run", "d.cmd", "--verilog", "/dev/stdout", "--no-header")
         self.assertEqual(outcome.status, SUCCESS)
         self.assertIn("module d(A", outcome.out)
+
+    def test_a_dash_is_standard_output(self) -> None:
+        for language in ("verilog", "vhdl"):
+            with self.subTest(language):
+                self.expect(self.run_tool("run", "d.cmd", f"--{language}", "o", "--no-header"), SUCCESS)
+                self.expect(self.run_tool("run", "d.cmd", f"--{language}", "-", "--no-header"), SUCCESS,
+                            out=self.read("o"))
+        self.assertEqual(sorted(os.listdir(self.folder)), ["d.cmd", "o"])
+
+    def test_both_languages_on_standard_output(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "o.v", "--vhdl", "o.vhd", "--no-header"),
+                    SUCCESS)
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "-", "--vhdl", "-", "--no-header"),
+                    SUCCESS, out=self.read("o.v") + self.read("o.vhd"))
+
+    def test_header_on_standard_output_names_no_file(self) -> None:
+        outcome = self.run_tool("run", "d.cmd", "--verilog", "-")
+        self.assertTrue(outcome.out.startswith("////"))
+        self.assertRegex(outcome.out, r"Filename : \n")
+
+    def test_standard_output_is_continued(self) -> None:
+        # What the caller wrote before stays, and what it writes after follows the netlist.
+        with open(self.folder / "out", "wb") as out:
+            for text in (b"before\n", b"after\n"):
+                out.write(text)
+                out.flush()
+                subprocess.run([TOOL, "run", "d.cmd", "--verilog", "-", "--no-header"],
+                               cwd=self.folder, stdout=out, check=True)
+        self.assertRegex(self.read("out"),
+                         r"(?s)\Abefore\n`timescale.*endmodule\nafter\n`timescale.*endmodule\n\Z")
+
+    def test_standard_output_may_be_a_socket(self) -> None:
+        ours, theirs = socket.socketpair()
+        with ours, theirs:
+            subprocess.run([TOOL, "run", "d.cmd", "--vhdl", "-"], cwd=self.folder, stdout=theirs,
+                           check=True)
+            self.assertIn(b"entity d is", ours.recv(65536))
+
+    def test_messages_stay_off_standard_output(self) -> None:
+        self.write("w.cmd", "ADD\n" + INVERTER)
+        outcome = self.run_tool("run", "w.cmd", "--keep-going", "--verilog", "-", "--no-header")
+        self.assertEqual((outcome.status, outcome.err), (FAILED, "w.cmd:1: error: Command not find.\n"))
+        self.assertTrue(outcome.out.startswith("`timescale"))
+        self.assertTrue(outcome.out.endswith("endmodule\n"))
 
 
 # Runs of a test in which another thread changes the folder. A check of the name alone lets about one run
@@ -275,7 +320,7 @@ class WriteRules(ToolTest):
 
     def test_what_is_no_file(self) -> None:
         os.mkfifo(self.folder / "out" / "pipe")
-        self.refuse("pipe", "it is no regular file")
+        self.refuse("pipe", "it is not a regular file")
         self.assertEqual(self.replay("WRITE VERILOG sub", "WRITE VERILOG no/a.v"), (FILE, []))
         self.assertEqual(self.errors, ["cannot write sub: Is a directory",
                                        "cannot write no/a.v: No such file or directory"])
@@ -371,19 +416,37 @@ class WriteRules(ToolTest):
 
 class Usage(ToolTest):
     def expect_usage(self, message: str, *arguments: str) -> None:
-        self.expect(self.run_tool(*arguments), USAGE, f"orn-hdl: {message}; --help tells more\n")
+        self.expect(self.run_tool(*arguments), USAGE, f"orn-hdl: {message}; see --help\n")
 
     def test_usage_errors(self) -> None:
         self.expect_usage("A subcommand is required")
         self.expect_usage("FILE is required", "run")
         self.expect_usage("The following argument was not expected: b", "run", "a", "b")
-        self.expect_usage("The following argument was not expected: --nothing", "run", "a",
-                          "--nothing")
-        self.expect(self.run_tool("replay", "x"), USAGE,
-                    "orn-hdl: there is no command replay; --help lists them\n")
+        self.expect_usage("unknown option --nothing", "run", "a", "--nothing")
+        self.expect_usage("unknown option --nothing", "run", "a", "--nothing=1")
+        self.expect_usage("The following argument was not expected: --verlog", "run", "a", "--",
+                          "--verlog")
+        self.expect_usage("there is no command replay", "replay", "x")
+        self.expect_usage("there is no command replay", "help", "replay")
         self.expect_usage("--verilog: a file name is needed", "run", "a", "--verilog", "")
         self.expect_usage("FILE: a file name is needed", "run", "")
         self.expect_usage("--verilog: 1 required FILE missing", "run", "a", "--verilog")
+
+    def test_suggestions(self) -> None:
+        for meant, *arguments in (
+                ("--verilog", "run", "a", "--verlog", "o.v"), ("--vhdl", "run", "--vdhl=o.vhd", "a"),
+                ("--verilog", "run", "--VERILOG", "o.v"), ("--keep-going", "run", "--keepgoing", "a"),
+                ("--top", "import", "--tpo", "t", "a"), ("--around", "draw", "--aroud", "U1", "a"),
+                ("--version", "--verson")):
+            with self.subTest(arguments):
+                word = next(word for word in arguments if word.startswith("--")).partition("=")[0]
+                self.expect(self.run_tool(*arguments), USAGE,
+                            f"orn-hdl: unknown option {word}; did you mean {meant}?\n")
+        for meant, word in (("run", "rnu"), ("run", "RUN"), ("import", "imprt"), ("draw", "darw"),
+                            ("commands", "command"), ("help", "hlep")):
+            with self.subTest(word):
+                self.expect(self.run_tool(word, "x"), USAGE,
+                            f"orn-hdl: there is no command {word}; did you mean {meant}?\n")
 
     def test_a_usage_error_does_nothing(self) -> None:
         self.write("w.cmd", "WRITE VERILOG o.v\n")
@@ -397,13 +460,21 @@ class Usage(ToolTest):
             self.assertEqual((outcome.status, outcome.err), (SUCCESS, ""))
             self.assertIn("Usage: orn-hdl", outcome.out)
 
+    def test_help_command(self) -> None:
+        self.expect(self.run_tool("help"), SUCCESS, out=self.run_tool("--help").out)
+        for command in ("run", "import", "draw", "commands"):
+            self.expect(self.run_tool("help", command), SUCCESS,
+                        out=self.run_tool(command, "--help").out)
+
     def test_version(self) -> None:
         outcome = self.run_tool("--version")
         self.assertEqual((outcome.status, outcome.err), (SUCCESS, ""))
         self.assertRegex(outcome.out, r"^orn-hdl \d+\.\d+\.\d+\n$")
 
     def test_standard_output_that_is_full(self) -> None:
-        for arguments in (["--version"], ["--help"], ["commands"]):
+        self.write("d.cmd", INVERTER)
+        for arguments in (["--version"], ["--help"], ["commands"],
+                          ["run", self.folder / "d.cmd", "--vhdl", "-"]):
             with open("/dev/full", "w", encoding="ascii") as full:
                 done = subprocess.run([TOOL, *arguments], stdout=full, stderr=subprocess.PIPE,
                                       check=False)

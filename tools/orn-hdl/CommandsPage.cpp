@@ -66,7 +66,7 @@ std::string FormatInFull(const CommandInfo& command) {
     return text.append("\n\n").append(command.help).append("\n");
 }
 
-/// A text for a cell of a table: "|" is escaped, since it would end the cell even within code.
+/// A text for a cell of a table: "|" is escaped, because it would end the cell even within code.
 std::string FormatCell(std::string_view text) {
     std::string cell;
     for (const char c : text) {
@@ -104,16 +104,13 @@ Status PrintCommandsPage() {
     std::string text(
         "# The command language\n"
         "\n"
-        "One command a line. The words of a line are separated by blanks; a word that\n"
-        "begins with a double or a single quote reaches to the same quote before a blank\n"
-        "or the line's end, and may hold blanks; a backslash makes such a quote a part of\n"
-        "the word. Letter case does not matter in the words of a command, nor does it\n"
-        "tell names apart. Empty lines do nothing, nor does a line that begins with `NOOP`,\n"
-        "whatever follows: it can hold a note. A line that fails ends the replay, and what\n"
-        "the lines before it did stays done.\n"
+        "One command a line. Arguments are separated by spaces. Quote an argument that\n"
+        "contains spaces, with `'...'` or `\"...\"`; a backslash before a quote makes the\n"
+        "quote part of the argument. Commands and names are case-insensitive. Empty lines\n"
+        "are ignored. A line that begins with `NOOP` does nothing and can hold a comment. A\n"
+        "line that fails ends the replay; earlier lines keep their effect.\n"
         "\n"
-        "`<argument>` is needed, `[argument]` may be left out, `...` stands for several\n"
-        "words.\n"
+        "`<argument>` is required, `[argument]` is optional, `...` stands for several words.\n"
         "\n"
         "| Command | Arguments | What it does |\n"
         "| --- | --- | --- |\n");

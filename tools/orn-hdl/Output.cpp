@@ -4,15 +4,68 @@
 #include "Progress.h"
 
 #include <algorithm>
+#include <array>
+#include <cerrno>
+#include <cstdio>
+#include <memory>
+#include <string_view>
 
 namespace Tool {
 
 namespace {
 
+void WriteNetlist(Orn_Hdl::Model& model, Orn_Hdl::Language language, Orn_Hdl::OutStream& out) {
+    switch (language) {
+    case Orn_Hdl::Language::Verilog:
+        Orn_Hdl::VerilogNetlister(out).WriteNetlist(model.GetNetlist(), *model.GetOptions());
+        break;
+    case Orn_Hdl::Language::Vhdl:
+        Orn_Hdl::VhdlNetlister(out).WriteNetlist(model.GetNetlist(), model.GetOptions());
+        break;
+    }
+}
+
+/// Copies a file from its start to standard output.
+Status PrintFile(std::FILE* file) {
+    std::rewind(file);
+    std::array<char, 65536> piece;
+    while (const std::size_t count = std::fread(piece.data(), 1, piece.size(), file)) {
+        if (const Status status = Print(std::string_view(piece.data(), count));
+            status != Status::Success) {
+            return status;
+        }
+    }
+    return std::ferror(file) == 0 ? Status::Success : ComplainUnreadable("a temporary file", errno);
+}
+
+/// Writes a netlist to standard output, by way of a temporary file: only a file that is opened by
+/// its name gets indentation, and standard output may be a socket, which cannot be opened.
+Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, bool noHeader,
+                   Progress& progress) {
+    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::tmpfile(), &std::fclose);
+    if (file == nullptr) {
+        return ComplainUnwritable("a temporary file", errno);
+    }
+    progress.Writing("standard output");
+    model.GetOptions()->writeHeader = !noHeader;
+    Orn_Hdl::TextFileOutStream out;
+    const std::string name = "/dev/fd/" + std::to_string(fileno(file.get()));
+    if (out.Open(name.c_str(), Orn_Hdl::TextFileOutStream::Overwrite)) {
+        WriteNetlist(model, language, out);
+        out.Close();
+    }
+    progress.Erase();
+    return out.GetError() == 0 ? PrintFile(file.get())
+                               : ComplainUnwritable("a temporary file", out.GetError());
+}
+
 Status WriteOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, const std::string& file,
                    bool noHeader, Progress& progress) {
     if (file.empty()) {
         return Status::Success;
+    }
+    if (file == "-") {
+        return PrintOutput(model, language, noHeader, progress);
     }
     progress.Writing(file);
     Orn_Hdl::StringArray words;

@@ -92,7 +92,7 @@ Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
                    : Outside;
     }
     default:
-        return "it is no regular file";
+        return "it is not a regular file";
     }
 }
 

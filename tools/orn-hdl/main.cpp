@@ -1,8 +1,9 @@
-// The orn-hdl tool: reads the command line and hands over to the command that it names.
+// The orn-hdl tool: reads the command line and runs the command that it names.
 
 #include "CommandsPage.h"
 #include "Draw.h"
 #include "Import.h"
+#include "Nearest.h"
 #include "Run.h"
 #include "Tool.h"
 #include "check/Check.h"
@@ -13,6 +14,7 @@
 
 #include <CLI/CLI.hpp>
 
+#include <algorithm>
 #include <exception>
 #include <functional>
 #include <map>
@@ -25,7 +27,7 @@ namespace {
 
 using Tool::Status;
 
-/// Refuses the empty text, which is no file's name.
+/// Rejects the empty text, which is not a file name.
 std::string CheckFileName(const std::string& name) {
     return name.empty() ? "a file name is needed" : "";
 }
@@ -46,54 +48,41 @@ void AddOutputs(CLI::App& command, Tool::Outputs& outputs) {
         const std::string name = Orn_Hdl::GetLanguageName(language);
         Port::String option(("--" + name).c_str());
         option.MakeLower();
-        AddFile(command, option.CStr(), outputs.files[language], "Write the design as " + name);
+        AddFile(command, option.CStr(), outputs.files[language],
+                "Write the design as " + name + "; - is standard output");
     }
-    command.add_flag("--no-header", outputs.noHeader, "Write these netlists without the header");
+    command.add_flag("--no-header", outputs.noHeader, "Omit the header from these netlists");
 }
 
 void AddWriteRules(CLI::App& command, Tool::WriteRules& rules) {
     CLI::Option* folder =
         command
             .add_option("--output-dir", rules.folder,
-                        "Let WRITE lines write below this folder only, where their names begin")
+                        "Confine WRITE commands to DIR; file names are relative to it")
             ->type_name("DIR")
             ->check(CheckFileName);
-    command.add_flag("--no-write", rules.noWrite, "Let no WRITE line write anything")
+    command.add_flag("--no-write", rules.noWrite, "Make every WRITE command fail")
         ->excludes(folder);
 }
 
-/// The command line: its options, and what to do when they have been read.
+/// The command line: its options, and the command to run.
 class CommandLine {
 public:
     CommandLine() {
         app_.require_subcommand(1);
         app_.set_version_flag(
             "--version", "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
-            "Print the version and leave");
+            "Print the version and exit");
         AddRun();
         AddImport();
         AddCheck();
         AddDraw();
         AddCommands();
+        app_.footer("\"orn-hdl help COMMAND\" prints the help of a command.");
     }
 
     Status Execute(int argc, const char* const* argv) {
-        if (argc > 1 && *argv[1] != '-' && !HasCommand(argv[1])) {
-            Tool::Complain(std::string("there is no command ") + argv[1] + "; --help lists them");
-            return Status::Usage;
-        }
-        try {
-            app_.parse(argc, argv);
-        } catch (const CLI::ParseError& error) {
-            std::ostringstream help;
-            std::ostringstream complaint;
-            if (app_.exit(error, help, complaint) == 0) {
-                return Tool::Print(help.str());
-            }
-            Tool::Complain(std::string(error.what()) + "; --help tells more");
-            return Status::Usage;
-        }
-        return action_();
+        return Execute(std::vector<std::string>(argv + std::min(argc, 1), argv + argc));
     }
 
 private:
@@ -104,9 +93,95 @@ private:
         return command;
     }
 
-    bool HasCommand(const std::string& name) {
-        const auto isNamed = [&](CLI::App* command) { return command->get_name() == name; };
-        return !app_.get_subcommands(isNamed).empty();
+    /// \param words the command line without the name of the program.
+    Status Execute(std::vector<std::string> words) {
+        if (!words.empty() && words.front() == Help) {
+            // "help" and "help run" are other ways to say "--help" and "run --help".
+            words.erase(words.begin());
+            words.emplace_back("--help");
+        }
+        if (!words.empty() && words.front().rfind('-', 0) != 0 &&
+            FindCommand(words.front()) == nullptr) {
+            return ComplainUnknown("there is no command " + words.front(), words.front(),
+                                   GetCommandNames());
+        }
+        try {
+            // It takes the last word as the first.
+            app_.parse(std::vector<std::string>(words.rbegin(), words.rend()));
+        } catch (const CLI::ParseError& error) {
+            return Report(error, words);
+        }
+        return action_();
+    }
+
+    /// Prints the help or the version that was asked for, or explains what is wrong.
+    Status Report(const CLI::ParseError& error, const std::vector<std::string>& words) {
+        std::ostringstream help;
+        std::ostringstream complaint;
+        if (app_.exit(error, help, complaint) == 0) {
+            return Tool::Print(help.str());
+        }
+        if (dynamic_cast<const CLI::ExtrasError*>(&error) != nullptr ||
+            dynamic_cast<const CLI::RequiredError*>(&error) != nullptr) {
+            const std::vector<std::string> options = GetOptions(words);
+            const std::string unknown = FindUnknownOption(words, options);
+            if (!unknown.empty()) {
+                return ComplainUnknown("unknown option " + unknown, unknown, options);
+            }
+        }
+        Tool::Complain(std::string(error.what()) + "; see --help");
+        return Status::Usage;
+    }
+
+    /// Complains of a word that is none of the candidates, and suggests the one that is meant.
+    static Status ComplainUnknown(const std::string& complaint, const std::string& word,
+                                  const std::vector<std::string>& candidates) {
+        const std::string meant = Tool::GetNearest(word, candidates);
+        Tool::Complain(complaint +
+                       (meant.empty() ? "; see --help" : "; did you mean " + meant + "?"));
+        return Status::Usage;
+    }
+
+    std::vector<std::string> GetCommandNames() const {
+        std::vector<std::string> names = {Help};
+        for (const CLI::App* command : app_.get_subcommands([](const CLI::App*) { return true; })) {
+            names.push_back(command->get_name());
+        }
+        return names;
+    }
+
+    /// The command of that name, or null.
+    const CLI::App* FindCommand(const std::string& name) const {
+        const auto isNamed = [&](const CLI::App* command) { return command->get_name() == name; };
+        const std::vector<const CLI::App*> found = app_.get_subcommands(isNamed);
+        return found.empty() ? nullptr : found.front();
+    }
+
+    /// The long options that the command line may have: those of its command, if it names one.
+    std::vector<std::string> GetOptions(const std::vector<std::string>& words) const {
+        const CLI::App* command = words.empty() ? nullptr : FindCommand(words.front());
+        std::vector<std::string> names;
+        for (const CLI::Option* option : (command != nullptr ? *command : app_).get_options()) {
+            for (const std::string& name : option->get_lnames()) {
+                names.push_back("--" + name);
+            }
+        }
+        return names;
+    }
+
+    /// The first long option on the command line that is none of those given, without its value;
+    /// the empty text if there is none.
+    static std::string FindUnknownOption(const std::vector<std::string>& words,
+                                         const std::vector<std::string>& options) {
+        const auto end = std::find(words.begin(), words.end(), "--");
+        for (auto word = words.begin(); word != end; ++word) {
+            const std::string name = word->substr(0, word->find('='));
+            if (name.rfind("--", 0) == 0 &&
+                std::find(options.begin(), options.end(), name) == options.end()) {
+                return name;
+            }
+        }
+        return "";
     }
 
     void AddRun() {
@@ -116,9 +191,9 @@ private:
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
         AddWriteRules(command, run_.writeRules);
-        command.add_flag("--keep-going", run_.keepGoing, "Go on behind a line that failed");
+        command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
         command.add_flag("--check", run_.check, "Write nothing that has errors for its language");
-        command.add_flag("--quiet", run_.quiet, "Show no progress");
+        command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
 
     void AddImport() {
@@ -128,13 +203,13 @@ private:
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
-        command.add_option("--x-as", import_.unknownAs, "What the values x and z become")
+        command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")
             ->check(CheckDigit);
         command.add_flag("--attributes", import_.attributes,
-                         "Take over the attributes of cells and nets");
-        AddFile(command, "--name-map", import_.nameMap, "Write a table of the old and new names");
-        command.footer("Without an output the file is only checked.");
+                         "Import the attributes of cells and nets");
+        AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
+        command.footer("If no output is given, the file is only checked.");
     }
 
     void AddCheck() {
@@ -168,9 +243,11 @@ private:
         AddFile(command, "-o", draw_.output, "The SVG file to write")->required();
         CLI::Option* around = command
                                   .add_option("--around", draw_.around,
-                                              "Draw only what lies around an instance or signal")
+                                              "Draw only the surroundings of an instance or signal")
                                   ->type_name("NAME");
-        command.add_option("--depth", draw_.depth, "How many instances away")
+        command
+            .add_option("--depth", draw_.depth,
+                        "Draw instances up to N steps away; the default is 1")
             ->type_name("N")
             ->check(CLI::Range(0, 1000))
             ->needs(around);
@@ -181,10 +258,12 @@ private:
             return markdown_ ? Tool::PrintCommandsPage() : Tool::PrintCommands(words_);
         });
         CLI::Option* words =
-            command.add_option("WORDS", words_, "Only commands that begin with these words");
-        command.add_flag("--markdown", markdown_, "Print the page of the documentation")
+            command.add_option("WORDS", words_, "Print only commands that begin with these words");
+        command.add_flag("--markdown", markdown_, "Print the page for the documentation")
             ->excludes(words);
     }
+
+    static constexpr const char* Help = "help";
 
     CLI::App app_{"Builds designs from text commands and writes them as Verilog and VHDL netlists.",
                   "orn-hdl"};

@@ -11,6 +11,8 @@
 
 namespace Orn_Hdl {
 
+struct Reordering;
+
 /// An ordered sequence of untyped pointers. It never deletes what they point at; nulls may be
 /// stored. Made small, since every signal and every instance holds one: an empty array owns no
 /// memory, and growth from empty begins with three places, what most nets need.
@@ -98,6 +100,8 @@ protected:
     }
 
 private:
+    friend struct Reordering;
+
     static constexpr std::uint32_t MostElements = INT32_MAX;
 
     void TakeOver(const PtrArrayBase& other);

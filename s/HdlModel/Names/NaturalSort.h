@@ -1,6 +1,7 @@
 // Sorting objects by a rank, then by name in natural order.
 #pragma once
 
+#include "Containers/Reordering.h"
 #include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Containers/PtrArray.h"
 
@@ -115,7 +116,7 @@ template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankO
     const PtrArray<T*> unsorted = objects;
     const NaturalKeySort byKeys(unsorted, rankOf, compare);
     for (int i = 0; i < size; ++i) {
-        objects.SetAt(i, byKeys.GetAt(i));
+        Reordering::Place(objects, i, byKeys.GetAt(i));
     }
 }
 

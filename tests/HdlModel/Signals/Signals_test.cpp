@@ -63,6 +63,19 @@ TEST(Signal, ConnectOfNullDoesNothing) {
     EXPECT_TRUE(signal.GetSignalIterator().IsAtEnd());
 }
 
+TEST(Signal, AnIteratorSeesAliasesThatAreConnectedLater) {
+    ScalarSignal a("A");
+    ScalarSignal b("B");
+    auto at = a.GetSignalIterator();
+    const auto start = at;
+    EXPECT_TRUE(at.IsAtEnd());
+    a.Connect(&b);
+    EXPECT_EQ(at.GetCurrent(), &b);
+    EXPECT_EQ(NamesOf(start), Names{"B"});
+    a.Disconnect(&b);
+    EXPECT_TRUE(at.IsAtEnd());
+}
+
 TEST(Signal, APinThatMovesOnStaysListedByTheFormerSignal) {
     ScalarSignal first("N1");
     ScalarSignal second("N2");

@@ -212,8 +212,8 @@ class BusSlice(_BusPart):
     def runs_against_parent(self) -> bool:
         return self.width() != 1 and not self.has_parents_direction()
 
-    def is_bit_of_upward_bus(self) -> bool:
-        """Its range reads downwards, which VHDL does not let stand for a part of its bus."""
+    def is_bit_of_ascending_bus(self) -> bool:
+        """Its range reads as a descending one, which cannot stand for a part of its bus in VHDL."""
         return (self.width() == 1 and self.parent is not None and self.parent.width() > 1
                 and not _is_down_to(self.parent.name))
 

@@ -353,10 +353,8 @@ class VhdlNetlister:
     def _write_constants(self, netlist: Netlist) -> None:
         for signal in netlist.signals:
             if signal.constant.digits and not _is_nameless(signal.name):
-                if isinstance(signal, CompoundBus) or _runs_against_parent(signal):
+                if _takes_constants_by_bits(signal):
                     self._write_constant_bits(signal)
-                elif isinstance(signal, BusSlice) and signal.is_bit_of_upward_bus():
-                    self._write_bit_constant(single_bit(signal.name), signal.constant.digits)
                 else:
                     self._write_constant(signal)
 
@@ -560,6 +558,11 @@ def _is_declared(signal: Signal) -> bool:
 
 def _inner_signals(netlist: Netlist) -> Iterable[Signal]:
     return [s for s in netlist.signals if _is_declared(s) and not s.is_port()]
+
+
+def _takes_constants_by_bits(signal: Signal) -> bool:
+    return (isinstance(signal, CompoundBus) or _runs_against_parent(signal)
+            or isinstance(signal, BusSlice) and signal.is_bit_of_ascending_bus())
 
 
 def _runs_against_parent(signal: Signal) -> bool:

@@ -9,7 +9,7 @@ namespace Tool::Import {
 void AppendWord(std::string& line, std::string_view word) {
     // A line ends at a line feed or NUL, and loses a carriage return before its end.
     if (word.find_first_of(std::string_view("\n\r\0", 3)) != std::string_view::npos) {
-        throw Error("a text with a line end or a NUL cannot stand in a command file");
+        throw Error("a text with a line end or a NUL cannot be written to a command file");
     }
     const bool plain = !word.empty() && word.find(' ') == std::string_view::npos &&
                        word.front() != '"' && word.front() != '\'';
@@ -20,7 +20,7 @@ void AppendWord(std::string& line, std::string_view word) {
     // A backslash before the closing quote would keep the quote open.
     if (!word.empty() && word.back() == '\\') {
         throw Error(
-            "a text that ends in a backslash and needs quotes cannot stand in a command file");
+            "a text that ends in a backslash and needs quotes cannot be written to a command file");
     }
     line += '"';
     for (const char c : word) {

@@ -54,7 +54,7 @@ void DesignReader::ReadFile(JsonValue& root) {
         }
     });
     if (!hasModules) {
-        walker_.Fail("no netlist: \"modules\" is missing");
+        walker_.Fail("not a netlist: \"modules\" is missing");
     }
 }
 

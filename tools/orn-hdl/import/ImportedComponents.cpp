@@ -143,8 +143,7 @@ void ComponentFinder::AddPin(ImportedComponent& component, const std::vector<Typ
     pin.width = width;
     if (pin.direction == Direction::Unspecified) {
         warnings_.Add(top_.GetPath("cells", component.firstCell->name).AddKey("port_directions"),
-                      "nothing tells the direction of pin \"" + std::string(pin.oldName) +
-                          "\"; taken for inout");
+                      "the direction of pin " + Quote(pin.oldName) + " is unknown; taken as inout");
         pin.direction = Direction::InOut;
     }
 }
@@ -207,27 +206,30 @@ void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& typ
     }
 }
 
-/// Gives a pin or generic that could not keep its name another one.
+/// Renames a pin or generic that could not keep its name.
 void ComponentFinder::ClaimSimilar(UniqueNames& scope, const ImportedComponent& component,
                                    std::string_view part, std::string_view oldName,
                                    std::string& name) {
     if (name.empty()) {
         name = scope.ClaimSimilar(oldName, 'p');
         warnings_.Add(top_.GetPlace(*component.firstCell, part, oldName).ToPath(),
-                      "no name in both languages; of component \"" +
-                          std::string(component.oldName) + "\" called " + name);
+                      (IsLegalName(oldName)
+                           ? "another pin or parameter has the name " + Quote(oldName)
+                           : Quote(oldName) + NotLegal) +
+                          "; renamed to " + name + " in component " + Quote(component.oldName));
     }
 }
 
-/// Why a component could not keep the name of its type.
-const char* GetReason(const ImportedComponent& component) {
+/// The warning for a component that could not keep the name of its type.
+std::string MakeWarning(const ImportedComponent& component) {
     if (!IsLegalName(component.oldName)) {
-        return "no name in both languages";
+        return Quote(component.oldName) + NotLegal + "; renamed to " + component.name;
     }
-    return component.splitByPins
-               ? "the cells of the type have few pins in common"
-               : "other cells of the type have pins of other widths, or parameters whose default "
-                 "is not told";
+    const std::string reason = component.splitByPins
+                                   ? "the cells of the type have few pins in common"
+                                   : "other cells of the type have other pin widths, or parameters "
+                                     "without a known default";
+    return reason + "; this component is named " + component.name;
 }
 
 void NameComponents(std::vector<ImportedComponent>& components, const Module& top,
@@ -241,8 +243,7 @@ void NameComponents(std::vector<ImportedComponent>& components, const Module& to
         if (component.name.empty()) {
             component.name = names.ClaimSimilar(component.oldName, 'c');
             warnings.Add(top.GetPath("cells", component.firstCell->name).AddKey("type"),
-                         std::string(GetReason(component)) + "; this component is called " +
-                             component.name);
+                         MakeWarning(component));
         }
     }
 }

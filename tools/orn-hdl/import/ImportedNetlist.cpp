@@ -29,7 +29,7 @@ void OpenConstants(Module& top, const Cell& cell, const ImportedPin& pin, const 
         }
         if (bit < Unknown) {
             warnings.Add(top.GetPinPath(cell, pin.oldName).AddIndex(i),
-                         "an output pin stands at a constant; left open");
+                         "an output pin is tied to a constant; left open");
         }
         bit = top.netBits++;
     }

@@ -20,15 +20,7 @@ JsonPath& JsonPath::AddKey(std::string_view key) {
         text_.append(text_.empty() ? "" : ".").append(key);
         return *this;
     }
-    text_ += "[\"";
-    for (const char c : key) {
-        if (c == '"' || c == '\\') {
-            text_ += '\\';
-        }
-        // The path is part of a message of one line.
-        text_ += static_cast<unsigned char>(c) < ' ' ? '?' : c;
-    }
-    text_ += "\"]";
+    text_.append("[").append(Quote(key)).append("]");
     return *this;
 }
 
@@ -45,6 +37,17 @@ JsonPath Place::ToPath() const {
         }
     }
     return path;
+}
+
+std::string Quote(std::string_view name) {
+    std::string quoted("\"");
+    for (const char c : name) {
+        if (c == '"' || c == '\\') {
+            quoted += '\\';
+        }
+        quoted += static_cast<unsigned char>(c) < ' ' ? '?' : c;
+    }
+    return quoted += '"';
 }
 
 void Fail(const JsonPath& path, std::string_view text) {

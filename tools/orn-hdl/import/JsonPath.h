@@ -39,6 +39,9 @@ struct Place {
     JsonPath ToPath() const;
 };
 
+/// A name for a message: between double quotes, on one line.
+std::string Quote(std::string_view name);
+
 /// Ends the import with the message "PATH: TEXT".
 [[noreturn]] void Fail(const JsonPath& path, std::string_view text);
 

@@ -55,7 +55,7 @@ void JsonWalker::Skip(JsonValue& value) {
         break;
     case json_type::null:
         if (!value.is_null()) {
-            Fail("no valid JSON");
+            Fail("invalid JSON");
         }
         break;
     }

@@ -31,7 +31,7 @@ public:
                 Fail("nothing may follow the netlist");
             }
         } catch (const simdjson::simdjson_error& error) {
-            Fail(std::string("no valid JSON: ") + simdjson::error_message(error.error()));
+            Fail(std::string("invalid JSON: ") + simdjson::error_message(error.error()));
         }
     }
 

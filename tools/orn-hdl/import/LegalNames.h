@@ -1,4 +1,4 @@
-// Names that both netlist languages can hold.
+// Names that are legal in both netlist languages.
 #pragma once
 
 #include <string>
@@ -6,14 +6,17 @@
 
 namespace Tool::Import {
 
-/// Whether a name can stand unchanged in both languages: a VHDL basic identifier that is no
-/// reserved word of either language, no type that written VHDL mentions, and has no suffix of the
-/// names that the library generates.
+/// Whether a name can be used unchanged in both languages. It must be a VHDL basic identifier, but
+/// neither a reserved word of either language nor a type that written VHDL mentions, and it must
+/// not end in a suffix of the names that the library generates.
 bool IsLegalName(std::string_view name);
 
+/// The end of a message about a name for which `IsLegalName` is false.
+constexpr const char* NotLegal = " is not a legal name in Verilog and VHDL";
+
 /// A basic identifier that resembles `name`: other characters become "_", never two in a row nor
-/// one at either end. Of a name that a program made up, only the parts that mean something are
-/// kept. \param initial the letter put before a name that would begin with a digit or be empty.
+/// one at either end. A name that a program generated is reduced to its meaningful parts.
+/// \param initial the letter put before a name that would begin with a digit or be empty.
 std::string MakeLegalName(std::string_view name, char initial);
 
 } // namespace Tool::Import

@@ -51,7 +51,9 @@ void NameDesign(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings
     } else {
         netlist.name = units.ClaimSimilar(top.name, 'm');
         warnings.Add(JsonPath("modules").AddKey(top.name),
-                     "no name in both languages; the netlist is called " + netlist.name);
+                     (IsLegalName(top.name) ? "a component has the name " + Quote(top.name)
+                                            : Quote(top.name) + NotLegal) +
+                         "; the netlist is renamed to " + netlist.name);
     }
     // A signal may hide its entity, but tools warn of it; a port keeps its name all the same.
     if (std::none_of(top.ports.begin(), top.ports.end(), [&](const ModulePort& port) {

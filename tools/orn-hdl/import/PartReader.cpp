@@ -59,7 +59,7 @@ Value PartReader::ReadValue(JsonValue& value) {
         result.kind = Value::Integer;
         result.integer = static_cast<std::int32_t>(number);
         if (result.integer != number) {
-            walker_.Fail("the number does not fit 32 bits");
+            walker_.Fail("the number does not fit in 32 bits");
         }
         return result;
     }

@@ -165,13 +165,14 @@ void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& war
     }
     const JsonPath path = top.GetPath("cells", type.firstCell->name).AddKey("parameters");
     if (!integers.empty()) {
-        warnings.Add(path, "the file does not tell integers from vectors of 32 bits; written as "
-                           "bit vectors: " +
+        warnings.Add(path, "the JSON does not distinguish integers from 32-bit vectors; written "
+                           "as bit vectors: " +
                                integers);
     }
     if (!reals.empty()) {
-        warnings.Add(path,
-                     "the file does not tell real numbers from texts; written as texts: " + reals);
+        warnings.Add(path, "the JSON does not distinguish real numbers from strings; written as "
+                           "strings: " +
+                               reals);
     }
     if (!mixed.empty()) {
         warnings.Add(path, "other cells of the type have values of another kind, which VHDL does "

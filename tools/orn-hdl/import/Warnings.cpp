@@ -16,7 +16,8 @@ std::vector<std::string> Warnings::GetLines() const {
         std::string& line = lines.emplace_back(warning.path);
         line.append(": ").append(warning.text);
         if (warning.count > 1) {
-            line.append(" (and ").append(std::to_string(warning.count - 1)).append(" more places)");
+            line.append(" (and ").append(std::to_string(warning.count - 1));
+            line.append(warning.count == 2 ? " more place)" : " more places)");
         }
     }
     return lines;
