@@ -1,6 +1,5 @@
 /// \file
-/// `Check`, which tells of a design what standards and tools make of the netlists that the writers
-/// would write.
+/// `Check`: what standards and tools make of the netlists that the writers would write.
 #pragma once
 
 #include "Port/Export.h"
@@ -54,12 +53,12 @@ public:
     public:
         /// No target.
         constexpr Targets() noexcept = default;
-        /// \{
-        /// Every target; those that read Verilog; those that read VHDL.
+        /// Every target.
         static constexpr Targets All() noexcept { return Targets(0x1FFU); }
+        /// The targets that read Verilog.
         static constexpr Targets Verilog() noexcept { return Targets(0x0E7U); }
+        /// The targets that read VHDL.
         static constexpr Targets Vhdl() noexcept { return Targets(0x118U); }
-        /// \}
         /// Adds a target.
         constexpr void Add(Target target) noexcept { bits_ |= Bit(target); }
         /// Whether the target is in the set.
@@ -124,6 +123,7 @@ public:
 
     /// A rule. Its name is stable, and its texts are those of the documentation.
     struct Rule {
+        /// The name, such as "constant-digits".
         std::string_view name;
         /// What targets make of it in general; a finding says it exactly.
         Verdicts verdicts;
@@ -160,14 +160,14 @@ public:
             Alias,
             /// Tied the signal `first` to a constant.
             Constant,
-            /// \{
-            /// Gave the attribute `second`, or its value, type or option, to the module or to the
-            /// component, instance or signal `first`.
+            /// Gave the attribute `second`, or its value, type or option, to the module.
             ModuleAttribute,
+            /// Gave the attribute `second`, or its value, type or option, to the component `first`.
             ComponentAttribute,
+            /// Gave the attribute `second`, or its value, type or option, to the instance `first`.
             InstanceAttribute,
+            /// Gave the attribute `second`, or its value, type or option, to the signal `first`.
             SignalAttribute,
-            /// \}
             /// Added the text `first` as a comment, or to the notes.
             Comment,
             /// Added the library `first`.
@@ -179,13 +179,17 @@ public:
             /// Set the option of the phrase `first`.
             Option
         };
+        /// What the command did.
         Kind kind = Kind::Design;
+        /// The first name, as `Kind` says; empty for none.
         std::string first;
+        /// The second name, as `Kind` says; empty for none.
         std::string second;
     };
 
     /// Something found.
     struct ORN_HDL_API Finding {
+        /// The rule that is broken; never null in a result of `Run`.
         const Rule* rule = nullptr;
         /// What the targets asked about make of it.
         Verdicts verdicts;

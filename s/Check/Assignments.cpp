@@ -45,6 +45,11 @@ bool IsBitOfUpwardBus(const Signal& signal) {
     return parent != nullptr && parent->GetWidth() > 1 && !parent->IsDownTo();
 }
 
+/// Whether VHDL gets a constant of the signal bit by bit, if at all.
+bool IsTiedByBits(const Signal& signal) {
+    return IsCompoundOrAgainst(signal) || IsBitOfUpwardBus(signal);
+}
+
 /// Whether VHDL gets the constant of what is written bit by bit.
 bool IsWrittenByBits(const Signal& signal, const Digits& digits) {
     const auto width = static_cast<std::size_t>(std::max(signal.GetWidth(), 0));
@@ -115,7 +120,7 @@ void Assignments::CheckSignal(const Signal& signal) {
     if (hasConstant) {
         const Digits digits(signal.GetConstantValue());
         CheckTarget(signal, ConstantCause(signal), "a constant",
-                    !IsCompoundOrAgainst(signal) || IsWrittenByBits(signal, digits));
+                    !IsTiedByBits(signal) || IsWrittenByBits(signal, digits));
         CheckConstant(signal);
     }
     for (const Signal* alias : aliases) {
@@ -248,7 +253,7 @@ void Assignments::CheckDigits(const Signal& signal, const Digits& digits) {
     if (digits.HasHighImpedance()) {
         verdicts.Worsen(Verdicts(".......w"));
     }
-    if (!IsCompoundOrAgainst(signal) && !IsBitOfUpwardBus(signal)) {
+    if (!IsTiedByBits(signal)) {
         if (!digits.IsVhdlString(false)) {
             verdicts.Worsen(Verdicts("...r....r"));
         }
@@ -297,10 +302,7 @@ void Assignments::CheckLength(const Signal& signal, const Digits& digits) {
 
 void Assignments::CheckVhdlConstant(const Signal& signal, const Digits& digits) {
     const std::size_t width = static_cast<std::size_t>(std::max(signal.GetWidth(), 0));
-    if (IsBitOfUpwardBus(signal)) {
-        return;
-    }
-    if (IsCompoundOrAgainst(signal)) {
+    if (IsTiedByBits(signal)) {
         if (!IsWrittenByBits(signal, digits)) {
             if (Finding* finding = AddForConstant(
                     RuleId::ConstantLeftOut, GetRule(RuleId::ConstantLeftOut).verdicts, signal)) {
@@ -331,10 +333,7 @@ void Assignments::CheckMeaning(const Signal& signal, const Digits& digits) {
     if (!verilog) {
         return;
     }
-    std::string vhdl = digits.ReadVhdl().value_or("");
-    if (IsBitOfUpwardBus(signal)) {
-        vhdl = digits.digits.back() == '0' ? "0" : "1";
-    }
+    const std::string vhdl = digits.ReadVhdl().value_or("");
     const bool differs = *verilog != vhdl;
     const RuleId rule = digits.hasLength ? RuleId::ConstantLength : RuleId::ConstantDigits;
     Verdicts verdicts;

@@ -150,7 +150,9 @@ void Scopes::CheckBuses() {
             continue;
         }
         const string_view base = Names::BaseName(signal->GetNameView());
-        if (!netlist_.IsNameUsed(base)) {
+        // A signal that a write made for an open pin can bear the base name of another bus.
+        if (!netlist_.IsNameUsed(base) &&
+            netlist_.GetParentBus(std::string(base).c_str()) == signal) {
             continue;
         }
         const Declared bus = DescribeSignal(*signal);

@@ -29,7 +29,10 @@ public:
     /// The first value from the home slot of a hash on for which `matches(hash, value)` is true;
     /// `Value()` if there is none.
     template <class Matches> Value Find(std::uint32_t hash, Matches matches) const noexcept {
-        return slots_.empty() ? Value() : slots_[Probe(hash, matches)].Get();
+        if (slots_.empty()) {
+            return Value();
+        }
+        return slots_[Probe(hash, matches)].Get();
     }
 
     /// Makes room for one more value, so that adding it allocates nothing. At most three quarters
