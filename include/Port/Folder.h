@@ -10,7 +10,9 @@ namespace Port {
 /// One open folder, or none. Closed by its destructor.
 class ORN_HDL_API Folder {
 public:
+    /// No folder is open.
     Folder() noexcept = default;
+    /// Closes the folder.
     ~Folder();
     Folder(const Folder&) = delete;
     Folder& operator=(const Folder&) = delete;
@@ -26,8 +28,10 @@ public:
     /// \return 0, or the system's error number: ENOTDIR for a step that is a link or no folder,
     ///         EXDEV for "..", EISDIR for a path that does not end in a name.
     int OpenParent(const char* path, Folder& parent, const char*& name) const;
+    /// Closes the folder; without one nothing happens.
     void Close() noexcept;
 
+    /// Whether a folder is open.
     bool IsOpen() const noexcept { return descriptor_ >= 0; }
     /// The system's descriptor, -1 when no folder is open.
     int GetDescriptor() const noexcept { return descriptor_; }
