@@ -1,10 +1,12 @@
-# What is exported from the library, what `cmake --install` puts down, and the packages made of it.
-# Everything that is installed finds its parts relative to itself, so that a prefix can be moved.
+# The exported names of the library, the files that `cmake --install` installs, and the packages.
+# Installed files find each other by relative paths, so that a prefix can be moved.
 
 option(ORN_HDL_INSTALL "Install the library and the tool" ${PROJECT_IS_TOP_LEVEL})
 set(ORN_HDL_ZSH_DIR ${CMAKE_INSTALL_DATADIR}/zsh/site-functions CACHE STRING
     "Where the completion for zsh is installed")
-mark_as_advanced(ORN_HDL_ZSH_DIR)
+set(ORN_HDL_TOOL_DOCDIR ${CMAKE_INSTALL_DOCDIR} CACHE STRING
+    "Where the pages for users of the tool are installed")
+mark_as_advanced(ORN_HDL_ZSH_DIR ORN_HDL_TOOL_DOCDIR)
 
 if(BUILD_SHARED_LIBS AND UNIX AND NOT APPLE)
   set(orn_hdl_exports ${CMAKE_CURRENT_LIST_DIR}/exports.map)
@@ -16,7 +18,7 @@ if(NOT ORN_HDL_INSTALL)
   return()
 endif()
 
-# The library for those who run programs, and for those who build them.
+# The library, for running programs and for building them.
 set(orn_hdl_cmake_dir ${CMAKE_INSTALL_LIBDIR}/cmake/Orn_Hdl)
 install(TARGETS Orn_Hdl EXPORT Orn_HdlTargets
   LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT Library NAMELINK_COMPONENT Development
@@ -50,8 +52,10 @@ install(FILES ${PROJECT_BINARY_DIR}/orn_hdl.pc DESTINATION ${CMAKE_INSTALL_LIBDI
 
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/examples DESTINATION ${CMAKE_INSTALL_DOCDIR}
   COMPONENT Development PATTERN "__pycache__" EXCLUDE)
+install(FILES ${PROJECT_SOURCE_DIR}/docs/interface.md DESTINATION ${CMAKE_INSTALL_DOCDIR}
+  COMPONENT Development)
 
-# The tool and what belongs to it.
+# The tool, its manual pages, its pages for users, and support for shells and editors.
 if(TARGET orn-hdl)
   file(RELATIVE_PATH orn_hdl_libraries ${CMAKE_INSTALL_FULL_BINDIR} ${CMAKE_INSTALL_FULL_LIBDIR})
   if(BUILD_SHARED_LIBS)
@@ -59,10 +63,13 @@ if(TARGET orn-hdl)
   endif()
   install(TARGETS orn-hdl RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT Tool)
   set(orn_hdl_share ${PROJECT_SOURCE_DIR}/share)
+  set(orn_hdl_pages tutorial.md commands.md formats.md import.md limits.md cookbook.md)
   install(DIRECTORY ${orn_hdl_share}/man/ DESTINATION ${CMAKE_INSTALL_MANDIR} COMPONENT Tool)
   install(DIRECTORY ${orn_hdl_share}/bash-completion ${orn_hdl_share}/vim ${orn_hdl_share}/orn-hdl
     DESTINATION ${CMAKE_INSTALL_DATADIR} COMPONENT Tool)
   install(FILES ${orn_hdl_share}/zsh/_orn-hdl DESTINATION ${ORN_HDL_ZSH_DIR} COMPONENT Tool)
+  list(TRANSFORM orn_hdl_pages PREPEND ${PROJECT_SOURCE_DIR}/docs/)
+  install(FILES ${orn_hdl_pages} DESTINATION ${ORN_HDL_TOOL_DOCDIR} COMPONENT Tool)
 endif()
 
 if(PROJECT_IS_TOP_LEVEL)

@@ -24,7 +24,7 @@ set(CPACK_COMPONENT_TOOL_DEPENDS Library)
 
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_NAME liborn-hdl${PROJECT_VERSION_MAJOR})
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_SECTION libs)
-# What packages of programs that link the library depend on, and that ldconfig is to run.
+# The dependency for packages of programs that link the library, and the trigger for ldconfig.
 set(orn_hdl_shlibs ${PROJECT_BINARY_DIR}/debian-control/shlibs)
 set(orn_hdl_triggers ${PROJECT_BINARY_DIR}/debian-control/triggers)
 file(WRITE ${orn_hdl_shlibs} "libOrn_Hdl ${PROJECT_VERSION_MAJOR} "
@@ -46,6 +46,8 @@ VHDL.")
 
 set(CPACK_DEBIAN_TOOL_PACKAGE_NAME orn-hdl)
 set(CPACK_DEBIAN_TOOL_PACKAGE_SECTION electronics)
+# "orn-hdl draw" runs dot.
+set(CPACK_DEBIAN_TOOL_PACKAGE_RECOMMENDS graphviz)
 set(CPACK_COMPONENT_TOOL_DESCRIPTION
 "writes structural netlists from command files
 Replays files of commands that describe a flat hardware design and writes

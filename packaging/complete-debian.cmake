@@ -1,5 +1,5 @@
-# Run by CPack over each staged package: puts the files down that Debian wants in every package and
-# packs its manual pages.
+# Run by CPack for each staged package: adds the files that Debian requires in every package, and
+# compresses its manual pages.
 
 if(NOT CPACK_GENERATOR STREQUAL "DEB")
   return()

@@ -20,7 +20,7 @@ class AttributeVisitor;
 class ORN_HDL_API BitVectorValue {
 public:
     BitVectorValue() = default;
-    /// As `SetValue`.
+    /// A literal read from a text, as `SetValue` reads it.
     explicit BitVectorValue(const char* text) { SetValue(text); }
 
     /// Reads "LENGTH:BASE:DIGITS" with base B, O or H, such as "8:H:A5"; a text with fewer than
@@ -56,12 +56,12 @@ public:
     /// Values of the synthesis-attribute option.
     enum SynAttrOption { SynAttrNone = 0, SynAttrAssign = 1, SynAttrAssignNoDec = 2 };
 
-    /// \{
-    /// What an attribute has when nothing else is said.
+    /// The type of an attribute that is added without a type.
     static constexpr const char* DEFAULT_ATTRTYPE = "String";
+    /// The generic option of a new attribute.
     static constexpr int DEFAULT_GENERIC = GenericNone;
+    /// The synthesis-attribute option of a new attribute.
     static constexpr int DEFAULT_SYNATTR = SynAttrNone;
-    /// \}
 
     void AcceptObject(ObjectVisitor& visitor) override;
     /// Calls the visit operation of this attribute's type.
@@ -86,7 +86,9 @@ public:
     Port::StringBase<char> GetGeneric() const;
     /// The generic option.
     GenericOption GetGenericOption() const noexcept { return static_cast<GenericOption>(generic_); }
-    /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", likewise.
+    /// Sets the synthesis-attribute option from "NONE", "ASSIGN" or "ASSIGNNODEC", letter case
+    /// ignored.
+    /// \return false, the option unchanged, for any other text.
     bool SetSynAttr(const char* text) noexcept;
     /// The synthesis-attribute option as a text.
     Port::StringBase<char> GetSynAttr() const;
@@ -112,9 +114,9 @@ private:
 /// A text.
 class ORN_HDL_API AttributeString : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeString(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -131,9 +133,9 @@ private:
 /// A signed 32-bit integer, parsed by the rules of `atoi`, saturating.
 class ORN_HDL_API AttributeInteger : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeInteger(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -151,9 +153,9 @@ private:
 /// too small for a double is a zero of its sign; one that is not finite is 0.0.
 class ORN_HDL_API AttributeFloat : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeFloat(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -172,9 +174,9 @@ private:
 /// True exactly for the text "true" in any letter case.
 class ORN_HDL_API AttributeBoolean : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeBoolean(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -191,9 +193,9 @@ private:
 /// "1" for the text "1", else "0".
 class ORN_HDL_API AttributeBit : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeBit(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -210,9 +212,9 @@ private:
 /// A bit-vector literal.
 class ORN_HDL_API AttributeBitVector : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeBitVector(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -232,9 +234,9 @@ private:
 /// A text of a type that the user names.
 class ORN_HDL_API AttributeUser : public Attribute {
 public:
-    /// Null texts are read as "".
+    /// A new attribute; null texts are read as "".
     AttributeUser(const char* name, const char* value);
-    /// The same on the heap; the caller owns it.
+    /// A new attribute that the caller owns; null texts are read as "".
     static Attribute* CreateAttribute(const char* name, const char* value);
     void AcceptAttribute(AttributeVisitor& visitor) override;
     Attribute* CloneAttribute() const override;
@@ -260,38 +262,44 @@ public:
     AttributeVisitor(const AttributeVisitor&) = default;
     AttributeVisitor& operator=(const AttributeVisitor&) = default;
     virtual ~AttributeVisitor();
-    /// \{
-    /// Called by an attribute's `AcceptAttribute`, by the type of its value.
+    /// Visits an attribute of a class that is none of the library's.
     virtual void VisitAttribute(Attribute* attribute);
+    /// Visits an attribute whose value is a text.
     virtual void VisitAttributeString(AttributeString* attribute);
+    /// Visits an attribute whose value is an integer.
     virtual void VisitAttributeInteger(AttributeInteger* attribute);
+    /// Visits an attribute whose value is a floating-point number.
     virtual void VisitAttributeFloat(AttributeFloat* attribute);
+    /// Visits an attribute whose value is one bit.
     virtual void VisitAttributeBit(AttributeBit* attribute);
+    /// Visits an attribute whose value is a bit vector.
     virtual void VisitAttributeBitVector(AttributeBitVector* attribute);
+    /// Visits an attribute whose value is true or false.
     virtual void VisitAttributeBoolean(AttributeBoolean* attribute);
+    /// Visits an attribute of a type that the user names.
     virtual void VisitAttributeUser(AttributeUser* attribute);
-    /// \}
 };
 
-/// Owns attributes, in the order in which they were added. A holder without attributes owns no
-/// table.
+/// Owns attributes, in the order in which they were added. A holder without attributes allocates
+/// nothing.
 class ORN_HDL_API AttributeHolder {
 public:
     AttributeHolder() noexcept;
-    /// Clones every attribute.
+    /// Clones every attribute of the other holder.
     AttributeHolder(const AttributeHolder& other);
+    /// Replaces the attributes by clones of those of the other holder.
     AttributeHolder& operator=(const AttributeHolder& other);
     virtual ~AttributeHolder();
 
-    /// Takes ownership, also when it throws for want of memory. Null is ignored, and so is an
-    /// attribute that has an owner. A second attribute of one name is held and iterated too, and
-    /// `GetAttr` then finds the later one.
+    /// Takes ownership, even if allocation fails. Null is ignored, and so is an attribute that has
+    /// an owner. A second attribute of the same name is held and iterated too; `GetAttr` then finds
+    /// the later one.
     virtual void AddAttr(Attribute* attribute);
-    /// The attribute of that name, normalised and letter case ignored; null when there is none.
+    /// The attribute of that name, normalised and letter case ignored; null if there is none.
     virtual Attribute* GetAttr(const char* name) const;
 
-    /// The attributes, in the order in which they were added, those included that are added or
-    /// assigned while it walks. The holder must outlive it.
+    /// The attributes, in the order in which they were added. Attributes that are added or assigned
+    /// during the walk are included. The holder must outlive the iterator.
     Iterator<Attribute*> GetAttrIterator() const noexcept;
     /// Whether there are any.
     bool HasAttrs() const noexcept { return table_ != nullptr; }
@@ -307,7 +315,7 @@ public:
     /// Makes an attribute that the caller owns.
     using Creator = Attribute* (*)(const char* name, const char* value);
 
-    /// The table of the seven types, shared by the whole process and never changed once made.
+    /// The table of the seven types, shared by the whole process and immutable once made.
     static const IStringPtrMap<Creator>& GetCreators();
 };
 

@@ -30,14 +30,16 @@ namespace Orn_Hdl {
 
 class Model;
 
-/// Holds named designs (models) and runs text commands and command files on them. Names of models
-/// ignore letter case; a null text reads as "" everywhere. A model bears the name of its netlist,
-/// so SET NETLIST NAME renames it: keep the pointer, not the name, of a model whose commands do so.
+/// Holds named designs (models) and runs text commands and command files on them. The names of
+/// models are case-insensitive; a null text is read as "" everywhere. The name of a model is that
+/// of its netlist, so SET NETLIST NAME renames it: keep the pointer of such a model, not its name.
 ///
-/// Engines are independent of one another; one engine and its models belong to one thread at a
-/// time.
+/// Engines are independent of one another. One engine and its models belong to one thread at a
+/// time; while nobody changes them, any number of threads may call their const operations, and
+/// those of all that they hold.
 class ORN_HDL_API Engine {
 public:
+    /// An engine without models.
     Engine();
     Engine(const Engine&) = delete;
     Engine& operator=(const Engine&) = delete;
@@ -45,30 +47,31 @@ public:
     /// `Model::~Model`.
     ~Engine();
 
-    /// Makes a model; it does not become the current one.
-    /// \param sourceFile remembered with the model.
-    /// \return false, nothing changed, when a model of that name exists.
+    /// Makes a model, which does not become the current one.
+    /// \param sourceFile the source file to record in the model.
+    /// \return false, without a change, if a model of that name exists.
     bool CreateAndAddModel(const char* name, const char* sourceFile);
-    /// Makes a model the current one. \return false when there is none of that name.
+    /// Makes a model the current one. \return false if there is none of that name.
     bool UseModel(const char* name);
-    /// Deletes a model. One that is carrying out a command, which may be the caller, is no longer
-    /// the engine's from here on, and ends when the outermost line or file that it carries out is
-    /// through.
-    /// \return false when there is none of that name.
+    /// Deletes a model. If the model is executing a command, which may be the caller, the engine
+    /// gives it up at once, and the model is destroyed when its outermost line or file is done.
+    /// \return false if there is none of that name.
     bool RemoveModel(const char* name);
-    /// The model of that name, null when there is none. The engine owns it.
+    /// The model of that name, owned by the engine; null if there is none.
     Model* GetModel(const char* name) const;
 
-    /// Runs one command line on the current model, or on a named one.
-    /// \throws Exception when the line fails; "Missing Model.\n" when there is no such model.
+    /// Runs one command line on the current model.
+    /// \throws Exception if the line fails; "Missing Model.\n" if there is no current model.
     void Execute(const char* text);
+    /// Runs one command line on a named model.
+    /// \throws Exception if the line fails; "Missing Model.\n" if there is no such model.
     void Execute(const char* modelName, const char* text);
-    /// Replays a command file on a named model, which is made when it does not exist.
-    /// \return false when the file cannot be opened.
-    /// \throws Exception when a line fails; the lines before it stay done.
+    /// Replays a command file on a named model, which is created if it does not exist.
+    /// \return false if the file cannot be opened.
+    /// \throws Exception if a line fails; earlier lines keep their effect.
     bool ReadCommandFile(const char* modelName, const char* fileName);
     /// Clears the model's modified flag. No file is written.
-    /// \return false when there is no model of that name.
+    /// \return false if there is no model of that name.
     bool WriteCommandFile(const char* modelName, const char* fileName);
 
     /// Whether a word is reserved in VHDL (IEEE 1076-1993, 13.9), in any letter case.
@@ -76,9 +79,9 @@ public:
     /// Whether a word is reserved in Verilog (IEEE 1364-1995, annex B; without "force"), in this
     /// letter case.
     static bool IsVerilogKeyword(const char* word);
-    /// Writes a file that holds only the header banner. Null texts are read as "". Nothing tells
-    /// whether the file could be written: `NetlistHeader` on a stream of one's own does.
-    /// \param vhdlComments true for VHDL comments, false for Verilog's.
+    /// Writes a file that holds only the header banner. Null texts are read as "". A failure to
+    /// write the file is not reported: to detect it, write a `NetlistHeader` to a stream of your
+    /// own. \param vhdlComments true for VHDL comments, false for Verilog's.
     static void WriteHalvexHeader(const char* application, const char* command,
                                   const char* designName, const char* device, const char* purpose,
                                   const char* reference, bool vhdlComments, const char* fileName);

@@ -1,6 +1,6 @@
 /// \file
-/// `HdlOptions`, what a model's option commands set and the writers read, and `HdlUtilities`, the
-/// helpers that both writers share.
+/// `HdlOptions`, the output options of a model, and `HdlUtilities`, the helpers that both writers
+/// share.
 #pragma once
 
 #include "Orn_Hdl/Containers/StringArray.h"
@@ -15,29 +15,29 @@ class OutStream;
 
 /// The output options of one model.
 struct ORN_HDL_API HdlOptions {
-    /// What the VHDL writer reads.
+    /// The options of the VHDL writer.
     struct ORN_HDL_API VhdlOption {
-        /// Leaves the configuration out.
+        /// Omits the configuration.
         bool suppressConfiguration = false;
-        /// What the command FLATTEN BUS sets; it has no effect on what is written.
+        /// Set by the command FLATTEN BUS; it has no effect on the output.
         bool flattenBus = false;
-        /// Writes the IEEE and KESTRA clauses.
+        /// Writes the library and use clauses for IEEE and KESTRA.
         bool useDefaultLibrary = true;
-        /// Library clauses to be added.
+        /// Libraries that get a library clause.
         StringArray libraries;
-        /// Use clauses to be added.
+        /// Names that get a use clause.
         StringArray useClauses;
-        /// Gives attributes their own types in place of string.
+        /// Gives attributes their own types instead of string.
         bool useAttrType = false;
-        /// Leaves open input pins open; otherwise they are tied to signals of their own.
+        /// Leaves open input pins open; otherwise each is connected to a signal of its own.
         bool openPin = true;
-        /// Leaves the component declarations out.
+        /// Omits the component declarations.
         bool suppressComponent = false;
     };
 
-    /// What the Verilog writer reads.
+    /// The options of the Verilog writer.
     struct ORN_HDL_API VerilogOption {
-        /// The tools whose syntax synthesis attributes can have.
+        /// The tools in whose syntax synthesis attributes can be written.
         enum SynthesisType {
             QSN = 0,
             EXEMPLAR = 1,
@@ -46,7 +46,7 @@ struct ORN_HDL_API HdlOptions {
             VERILOG2001 = 4,
             PRECISION = 5
         };
-        /// How names are written. `DEFSULT` keeps them as they are; the spelling is the option's.
+        /// How names are written. `DEFSULT`, which is spelt so, keeps them unchanged.
         enum CaseType { DEFSULT = 10, UPPERCASE = 11, LOWERCASE = 12 };
 
         /// The chosen tool, a `SynthesisType`.
@@ -57,20 +57,20 @@ struct ORN_HDL_API HdlOptions {
         CaseType instanceCase = DEFSULT;
         /// How the names of components are written.
         CaseType componentCase = DEFSULT;
-        /// Files to be included.
+        /// Files to include.
         StringArray includePaths;
 
-        /// Selects the synthesis tool by name, letter case ignored; an unknown name selects QSN.
+        /// Selects the synthesis tool by its case-insensitive name; an unknown name selects QSN.
         void SetSynthesisType(const char* text);
-        /// Whether a statement's semicolon stands before its synthesis attributes.
+        /// Whether the semicolon of a statement precedes its synthesis attributes.
         bool IsSemiColonWrittenBeforeAttr() const noexcept;
-        /// The case of a name, letter case ignored; an unknown name gives `DEFSULT`.
+        /// The case type of a case-insensitive name; `DEFSULT` for an unknown name.
         static CaseType GetCaseType(const char* text);
     };
 
-    /// What the VHDL writer reads.
+    /// The options of the VHDL writer.
     VhdlOption vhdl;
-    /// What the Verilog writer reads.
+    /// The options of the Verilog writer.
     VerilogOption verilog;
     /// Whether files begin with the header.
     bool writeHeader = true;
@@ -80,14 +80,14 @@ struct ORN_HDL_API HdlOptions {
     Port::StringBase<char> command;
     /// The device that the header names.
     Port::StringBase<char> device;
-    /// The purpose that the header gives, in lines of words.
+    /// The purpose that the header shows, as lines of words.
     Port::StringBase<char> purpose;
-    /// The reference that the header gives, in lines of words.
+    /// The reference that the header shows, as lines of words.
     Port::StringBase<char> reference;
-    /// Whether each port and each pin connection stands on a line of its own.
+    /// Whether each port and each pin connection is written on a line of its own.
     bool onePortPerLine = true;
-    /// Whether the last Verilog write gave instances the module's own INIT parameter in place of
-    /// values of their own. A write with options that it may change sets it; no write reads it.
+    /// Whether the last Verilog write passed the module's INIT parameter to instances instead of
+    /// their own values. It is set by a write whose options are not constant, and never read.
     bool hierarchicalInit = false;
 };
 
@@ -104,22 +104,22 @@ public:
     /// The base letter of a Verilog sized constant (IEEE 1364, 2.5.1): "b" for 2, "o" for 8,
     /// else "h".
     static const Port::StringBase<char> ConvertVerilogBase(int base);
-    /// Puts "_DUMMY" behind a name, or before its range: D(7:0) gives D_DUMMY(7:0).
+    /// Adds "_DUMMY" to a name, before its range if it has one: D(7:0) becomes D_DUMMY(7:0).
     static const Port::StringBase<char> AddDummySuffix(const char* name);
     /// Whether a name, range aside, has the form of the names that the library gives to dummy
     /// signals, to the signals of constants at pins, and to the signals at open pins. A design with
     /// such names of its own may get two signals of one name. Null is read as "".
     static bool IsGeneratedName(const char* name);
-    /// Takes the quotes off a text that is wholly enclosed in double or in single quotes; null is
-    /// read as "".
+    /// Removes the quotes of a text that is entirely enclosed in double or in single quotes; null
+    /// is read as "".
     static const Port::StringBase<char> RemoveQuotes(const char* text);
-    /// The names of an instance's attributes, then those of its component's that it does not have.
-    /// A null instance gives an empty list.
+    /// The names of the attributes of an instance, then of those attributes of its component that
+    /// the instance does not have. The list is empty if the instance is null.
     static const StringArray GetAttrNames(const Instance* instance);
     /// Writes the header banner in comments of a language.
     static void WriteHeader(const Port::StringBase<char>& designName, Language language,
                             const HdlOptions& options, OutStream& out);
-    /// Writes the header banner in the comments that a flag chooses.
+    /// Writes the header banner in VHDL or Verilog comments.
     /// \param vhdlComments true for VHDL comments, false for Verilog's.
     static void WriteHeader(const Port::StringBase<char>& designName, bool vhdlComments,
                             const HdlOptions& options, OutStream& out);

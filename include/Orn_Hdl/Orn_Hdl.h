@@ -3,6 +3,7 @@
 #pragma once
 
 #include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Check.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Containers.h"
 #include "Orn_Hdl/Engine.h"

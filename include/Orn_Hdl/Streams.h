@@ -25,9 +25,9 @@ class ORN_HDL_API StreamDst {
 public:
     /// A destination at indent level 0.
     StreamDst() noexcept = default;
-    /// A file destination writes what it holds back and closes its file.
+    /// A file destination writes its buffered text and closes its file.
     virtual ~StreamDst();
-    /// Ends the line in hand and passes on all that is held back; does nothing in the base.
+    /// Ends the current line and writes the buffered text; does nothing in the base.
     virtual void Flush();
     /// Writes "\n".
     virtual void WriteNewLine();
@@ -37,7 +37,7 @@ public:
     virtual void Write(int number) = 0;
     /// Writes a text of known length; in the base through `Write(const char*)`.
     virtual void WriteView(std::string_view text);
-    /// Writes some texts one after the other; in the base through `WriteView`.
+    /// Writes texts one after the other; in the base through `WriteView`.
     virtual void WritePieces(const std::string_view* pieces, std::size_t count);
 
     /// Goes one indent level deeper.
@@ -52,9 +52,9 @@ public:
     int GetIndentLevel() const noexcept { return indentLevel_; }
 
 protected:
-    /// A copy has the same indent level and nothing else.
+    /// Copies the indent level only.
     StreamDst(const StreamDst&) noexcept = default;
-    /// Takes over the indent level and nothing else.
+    /// Assigns the indent level only.
     StreamDst& operator=(const StreamDst&) noexcept = default;
 
 private:
@@ -71,7 +71,7 @@ class ORN_HDL_API OutStream {
          std::is_same_v<Number, long> || std::is_same_v<Number, unsigned long>);
 
 public:
-    /// What is written besides texts and numbers: a line end, or all that is held back.
+    /// What is written besides texts and numbers: a line end, or the buffered text.
     enum Operand { NewLine = 0, Flush = 1 };
 
     /// Takes ownership of the destination; null makes a stream that drops everything.
@@ -96,21 +96,21 @@ public:
     OutStream& operator<<(Integer number) {
         return *this << std::string_view(std::to_string(number));
     }
-    /// A character or a number with a fraction would be written as an integer, a semicolon as 59.
-    /// Write the text that is meant.
+    /// A character or a floating-point number would be written as an integer, a semicolon as 59:
+    /// write a text instead.
     template <class Other,
               std::enable_if_t<std::is_arithmetic_v<Other> && !IsOtherInteger<Other>, int> = 0>
     OutStream& operator<<(Other) = delete;
-    /// Writes a line end or all that is held back; any other operand does nothing.
+    /// Writes a line end or the buffered text; any other operand does nothing.
     OutStream& operator<<(Operand operand);
-    /// Writes texts, each as if by itself: a file's lines are broken between them.
+    /// Writes texts as separate pieces: a line of a file may be broken between them.
     OutStream& WritePieces(std::initializer_list<std::string_view> pieces);
 
     /// Goes one indent level deeper.
     void Indent() noexcept;
     /// Goes one indent level back, never below level 0.
     void Unindent() noexcept;
-    /// Writes a line end with the indent level at 0, so that the empty line holds no blanks.
+    /// Writes a line end without indentation, so that the empty line contains no blanks.
     void WriteEmptyLine();
 
 protected:
@@ -128,83 +128,82 @@ class TextMemDst;
 /// a blank or a comma allows it. A comment line and a line that ends within one text are never
 /// broken.
 ///
-/// Nothing is thrown for a file that cannot be opened or written: what is written is dropped, and
-/// `GetError` tells the system's reason.
+/// No exception is thrown if a file cannot be opened or written: the text is dropped, and
+/// `GetError` returns the system's error number.
 class ORN_HDL_API TextFileOutStream : public OutStream {
 public:
-    /// What becomes of the file that is there already. `Replace` is `Overwrite` that happens as a
-    /// whole: the former file stands as it was until `Close` puts the new one in its place, which
-    /// it does only when everything was written. `Port::File::Mode` tells which files are written
-    /// directly all the same.
+    /// How an existing file is treated. `Replace` overwrites it as a whole: the former file stays
+    /// unchanged until `Close` replaces it, and only if everything was written. `Port::File::Mode`
+    /// lists the files that are written directly nevertheless.
     ///
-    /// A stream that is destroyed while its file is open writes the rest and closes the file, but
-    /// for one that is to replace a file: that one drops its text, and the former file stands. Its
-    /// destructor runs as well when an exception ends the writing half-way, and the half of a text
-    /// must not take the place of a whole one.
+    /// A stream that is destroyed while its file is open writes the rest and closes the file. With
+    /// `Replace`, it drops its text instead, and the former file stays: the destructor also runs
+    /// if an exception interrupts the writing, and an incomplete text must not replace a complete
+    /// one.
     enum Mode { Overwrite, Append, Replace };
 
     /// A stream without a file.
     TextFileOutStream();
-    /// Opens a file; `IsOpen` tells whether it is open, `GetError` why it is not.
+    /// Opens a file; `IsOpen` returns whether it is open, `GetError` the reason if it is not.
     /// \param fileName the file to open; null opens none.
-    /// \param append whether the text goes behind what the file holds or replaces it.
+    /// \param append whether the text is appended to the contents of the file or replaces them.
     TextFileOutStream(const char* fileName, bool append);
-    /// Opens a file; `IsOpen` tells whether it is open, `GetError` why it is not.
-    /// \param append whether the text goes behind what the file holds or replaces it.
+    /// Opens a file; `IsOpen` returns whether it is open, `GetError` the reason if it is not.
+    /// \param append whether the text is appended to the contents of the file or replaces them.
     TextFileOutStream(const Port::StringBase<char>& fileName, bool append);
-    /// Opens a file; `IsOpen` tells whether it is open, `GetError` why it is not.
+    /// Opens a file; `IsOpen` returns whether it is open, `GetError` the reason if it is not.
     /// \param fileName the file to open; null opens none.
-    /// \param mode what becomes of a file that is there.
+    /// \param mode how an existing file is treated.
     TextFileOutStream(const char* fileName, Mode mode);
     /// Opens a file below a folder without following a link (`Port::File::OpenBelow`).
     /// \param path the file's path below the folder.
     /// \param fileName the name to remember.
     TextFileOutStream(const Port::Folder& folder, const char* path, const char* fileName,
                       Mode mode);
-    /// Opens a file; `IsOpen` tells whether it is open, `GetError` why it is not.
-    /// \param mode what becomes of a file that is there.
+    /// Opens a file; `IsOpen` returns whether it is open, `GetError` the reason if it is not.
+    /// \param mode how an existing file is treated.
     TextFileOutStream(const Port::StringBase<char>& fileName, Mode mode);
-    /// Only a `bool` and a `Mode` say what becomes of the file.
+    /// Rejects any other type than `bool` and `Mode`.
     template <class Other> TextFileOutStream(const char* fileName, Other) = delete;
-    /// Only a `bool` and a `Mode` say what becomes of the file.
+    /// Rejects any other type than `bool` and `Mode`.
     template <class Other>
     TextFileOutStream(const Port::StringBase<char>& fileName, Other) = delete;
-    /// Closes the file, if one is open, as it says at `Mode`.
+    /// Closes the file, if one is open; `Mode` describes how.
     ~TextFileOutStream() override;
 
     /// Closes the file that is open and opens another. The remembered name does not change.
-    /// \param fileName the file to open; null is the name of no file.
-    /// \param append whether the text goes behind what the file holds or replaces it.
+    /// \param fileName the file to open; null opens none.
+    /// \param append whether the text is appended to the contents of the file or replaces them.
     /// \return whether a file is open now.
     bool Open(const char* fileName, bool append);
     /// Closes the file that is open and opens another. The remembered name does not change.
-    /// \param append whether the text goes behind what the file holds or replaces it.
+    /// \param append whether the text is appended to the contents of the file or replaces them.
     /// \return whether a file is open now.
     bool Open(const Port::StringBase<char>& fileName, bool append);
     /// Closes the file that is open and opens another. The remembered name does not change.
-    /// \param fileName the file to open; null is the name of no file.
-    /// \param mode what becomes of a file that is there.
+    /// \param fileName the file to open; null opens none.
+    /// \param mode how an existing file is treated.
     /// \return whether a file is open now.
     bool Open(const char* fileName, Mode mode);
     /// Closes the file that is open and opens another. The remembered name does not change.
-    /// \param mode what becomes of a file that is there.
+    /// \param mode how an existing file is treated.
     /// \return whether a file is open now.
     bool Open(const Port::StringBase<char>& fileName, Mode mode);
-    /// Only a `bool` and a `Mode` say what becomes of the file.
+    /// Rejects any other type than `bool` and `Mode`.
     template <class Other> bool Open(const char* fileName, Other) = delete;
-    /// Only a `bool` and a `Mode` say what becomes of the file.
+    /// Rejects any other type than `bool` and `Mode`.
     template <class Other> bool Open(const Port::StringBase<char>& fileName, Other) = delete;
     /// Whether a file is open.
     bool IsOpen() const noexcept;
-    /// Writes what is held back and closes the file; `GetError` then tells whether all is written.
+    /// Writes the buffered text and closes the file; `GetError` then returns whether that failed.
     void Close();
-    /// The name that the constructor was given; empty when there was none.
+    /// The name given to the constructor; empty if there was none.
     Port::StringBase<char> GetFileName() const;
-    /// The system's error number of the first failure since the last opening, closing included; 0
-    /// when everything went well.
+    /// The system's error number of the first failure since the last opening, including the
+    /// closing; 0 if there was none.
     int GetError() const noexcept;
-    /// How many bytes of this stream stand at the end of a file all the same, when appending to it
-    /// has failed and they could not be taken back; 0 when the file ends as it began.
+    /// The number of bytes that this stream has left at the end of a file, if appending failed and
+    /// they could not be removed; 0 if the file has its former length.
     std::uint64_t GetLeftoverSize() const noexcept;
 
 private:
@@ -218,7 +217,7 @@ public:
     explicit TextMemOutStream(const char* initial = nullptr);
     /// A stream whose text starts as `initial`.
     explicit TextMemOutStream(std::string_view initial);
-    /// The text ends with the stream.
+    /// Destroys the text.
     ~TextMemOutStream() override;
 
     /// A copy of the text so far.

@@ -20,12 +20,12 @@ constexpr bool IsLetter(char c) noexcept {
     return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z');
 }
 
-/// The letter in upper case, any other character as it is.
+/// The letter in upper case; any other character unchanged.
 constexpr char ToUpper(char c) noexcept {
     return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c;
 }
 
-/// The letter in lower case, any other character as it is.
+/// The letter in lower case; any other character unchanged.
 constexpr char ToLower(char c) noexcept {
     return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
 }

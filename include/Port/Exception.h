@@ -14,14 +14,14 @@ class ORN_HDL_API Exception : public std::exception {
 public:
     /// An exception without a description. The texts are copied; null is read as "".
     Exception(const char* module, const char* sourceUnit, const char* revision, int line);
-    /// A copy that stands alone.
+    /// An independent copy.
     Exception(const Exception&);
-    /// Takes over place and description.
+    /// Copies place and description.
     Exception& operator=(const Exception&);
-    /// Ends the texts that the exception gave without a copy.
+    /// Invalidates the texts that were returned without a copy.
     ~Exception() override;
 
-    /// Sets what happened. The text is copied; null is read as "".
+    /// Sets the description. The text is copied; null is read as "".
     void setDescription(const char* description);
     /// The description alone, as it was set, valid as long as the exception is.
     const String& getLocalized() const noexcept { return description_; }

@@ -8,9 +8,9 @@
 #endif
 
 /// \def ORN_HDL_API
-/// Stands in the declaration of everything that is exported.
+/// Marks the declaration of an exported name.
 /// \def ORN_HDL_LOCAL
-/// Stands in the declaration of what an exported class keeps to itself.
+/// Marks a member of an exported class that is not exported.
 #if defined(ORN_HDL_STATIC)
 #define ORN_HDL_API
 #define ORN_HDL_LOCAL

@@ -1,7 +1,7 @@
 /// \file
-/// Files: `Port::File` reads and writes one, `Port::Stream` gathers text for one in a large buffer,
-/// `Port::FileName` takes file names apart. Nothing here throws for an input or output failure; the
-/// first failure's system error number is kept and can be asked for.
+/// Files: `Port::File` reads and writes one, `Port::Stream` buffers text for one, `Port::FileName`
+/// splits file names. A failure of input or output throws nothing; the system's error number of the
+/// first failure is kept.
 #pragma once
 
 #include "Port/Export.h"
@@ -20,48 +20,47 @@ namespace Port {
 /// One open file, or none. Closed by its destructor.
 class ORN_HDL_API File {
 public:
-    /// `Replace` is `Overwrite` that takes effect as a whole: what is written goes into a temporary
-    /// file in the same folder, which `close` puts in the place of the named one when nothing has
-    /// failed. Until then, and after any failure, the former file stands as it was; its permission
-    /// bits are kept, and a symbolic link stays one; the file's other names, hard links, go on
-    /// leading to the former file. Written directly, as by `Overwrite`, are devices, pipes and
-    /// other files that are not regular, and a file that may be written in a folder that takes no
-    /// new file.
+    /// `Replace` overwrites a file as a whole: the text is written to a temporary file in the same
+    /// folder, which replaces the named file in `close` if nothing has failed. Until then, and
+    /// after any failure, the former file is unchanged. Permission bits are kept, and a symbolic
+    /// link stays one; other hard links keep the former file. Devices, pipes and other files that
+    /// are not regular are written directly, as by `Overwrite`, and so is a writable file in a
+    /// folder in which no file can be created.
     ///
-    /// `Append` to a regular file ends as it began when anything fails: `close` and `Discard` then
-    /// give the file its former length back. A file that was made to be appended to stays, empty.
+    /// `Append` to a regular file has no effect if anything fails: `close` and `Discard` then
+    /// restore its former length. A file that was created for appending stays, empty.
     enum Mode { Read = 1, Overwrite = 2, Append = 6, Replace = 10 };
 
     /// No file is open.
     File() noexcept = default;
-    /// Closes the file as `Discard` does.
+    /// Closes the file like `Discard`.
     ~File();
     File(const File&) = delete;
     File& operator=(const File&) = delete;
 
     /// Opens a file, closing the one that was open.
-    /// \param name the file's name; null is read as "", the name of no file.
-    /// \param fromStart for `Overwrite`: whether what the file holds is dropped first, or written
-    ///        over from its first byte on. Of no meaning for the other modes.
-    /// \return false when the file cannot be opened; a directory never can.
+    /// \param name the file's name; null is read as "", which opens none.
+    /// \param fromStart for `Overwrite`: whether the contents are dropped first or overwritten from
+    ///        the first byte on. It has no meaning for other modes.
+    /// \return false if the file cannot be opened; a directory never can.
     bool open(const char* name, Mode mode, bool fromStart);
-    /// Opens a file below a folder, closing the one that was open. No link is followed, neither on
-    /// the way to the file nor by its own name, and nothing but a regular file is opened: no other
-    /// process can make this write outside of the folder.
-    /// \param folder only needed during the call.
+    /// Opens a file below a folder, closing the one that was open. No link is followed, and only a
+    /// regular file is opened, so no other process can make this write outside the folder.
+    /// \param folder needed only during the call.
     /// \param path the file's path below the folder, without "..".
     bool OpenBelow(const Folder& folder, const char* path, Mode mode, bool fromStart);
-    /// Opens a file, as the overload with a `Mode` does.
-    /// \param mode the value of a `Mode`: 1, 2, 6 or 10. With any other number no file is opened,
+    /// Opens a file like the overload with a `Mode`.
+    /// \param mode the value of a `Mode`: 1, 2, 6 or 10. For any other number no file is opened,
     ///        and the error is EINVAL.
     bool open(const char* name, int mode, bool fromStart);
-    /// The modes of another class mean something else here.
+    /// Rejects the modes of other classes, whose values differ.
     template <class Other, std::enable_if_t<std::is_enum_v<Other>, int> = 0>
     bool open(const char* name, Other mode, bool fromStart) = delete;
-    /// \return false when anything has failed since `open`: what was written may be lost.
+    /// Closes the file.
+    /// \return false if anything has failed since `open`: written text may be lost.
     bool close();
-    /// Closes the file. What was written to replace a file is dropped, and so is what was appended
-    /// when anything has failed since `open`; anything else stays.
+    /// Closes the file. Text written to replace a file is dropped, and so is appended text if
+    /// anything has failed since `open`; any other text stays.
     void Discard() noexcept;
     /// Whether a file is open.
     bool IsOpen() const noexcept { return descriptor_ >= 0; }
@@ -74,16 +73,16 @@ public:
     bool write(const char* data, std::size_t size);
 
     /// Reads the next line.
-    /// \param line receives it without its line end, valid until the next call.
+    /// \param line receives the line without its line end, valid until the next call.
     /// \return false at the end of the file or on a failure.
     bool NextLine(std::string_view& line);
-    /// How many bytes the last line given takes in the file, its line end included.
+    /// The number of bytes of the last line in the file, including its line end.
     std::size_t GetLineSize() const noexcept { return lineSize_; }
 
-    /// The system's error number of the first failure since `open`; 0 when there was none.
+    /// The system's error number of the first failure since `open`; 0 if there was none.
     int GetError() const noexcept { return error_; }
-    /// How many bytes were appended to the file that was closed last and stand there although
-    /// appending has failed, since the file did not take its former length back; 0 otherwise.
+    /// The number of bytes left at the end of the file that was closed last, if appending failed
+    /// and its former length could not be restored; 0 otherwise.
     std::uint64_t GetLeftoverSize() const noexcept { return leftover_; }
 
 private:
@@ -102,28 +101,28 @@ private:
     bool CutAppended() noexcept;
     void CloseAppended() noexcept;
     bool FillLineBuffer();
-    /// What was read behind the last line.
+    /// The text behind the last line that was read from the file already.
     std::string_view GetUnread() const noexcept {
         return std::string_view(lineBuffer_.get() + lineStart_, lineEnd_ - lineStart_);
     }
     std::string_view TakeLine(std::size_t length) noexcept;
 
     int descriptor_ = -1;
-    /// Where names begin; closed for the current folder.
+    /// The folder to which names are relative; closed for the current folder.
     Folder folder_;
     int error_ = 0;
-    /// The file that is being written to replace another; empty when there is none.
+    /// The file that is being written to replace another; empty if there is none.
     std::string temporary_;
-    /// What it is to replace, or the file that is being appended to.
+    /// The file to replace, or to append to.
     std::string target_;
-    /// Whether a regular file is being appended to; which one, and how long it was.
+    /// Whether a regular file is being appended to; its identity and former length.
     bool appends_ = false;
     std::uint64_t device_ = 0;
     std::uint64_t inode_ = 0;
     std::uint64_t formerSize_ = 0;
     std::uint64_t written_ = 0;
     std::uint64_t leftover_ = 0;
-    /// What was read and not given yet stands from `lineStart_` to `lineEnd_`.
+    /// Text that was read but not returned yet is between `lineStart_` and `lineEnd_`.
     std::unique_ptr<char[]> lineBuffer_;
     std::size_t lineCapacity_ = 0;
     std::size_t lineStart_ = 0;
@@ -132,21 +131,21 @@ private:
     bool atEnd_ = false;
 };
 
-/// Collects text for a file and hands it over in large pieces.
+/// Buffers text for a file.
 class ORN_HDL_API Stream {
 public:
-    /// A stream with nothing in it yet. The buffer is taken here, not at each text.
+    /// An empty stream, which allocates its buffer at once.
     /// \param file an open file, not owned; it must outlive the stream.
     explicit Stream(File& file);
-    /// Does not flush: who writes must `flush` and look at the result.
+    /// Does not flush: call `flush` and check its result.
     ~Stream();
     Stream(const Stream&) = delete;
     Stream& operator=(const Stream&) = delete;
 
     /// Adds a text; null adds nothing.
     Stream& operator<<(TextView text);
-    /// Hands everything over to the file.
-    /// \return false when something could not be written, now or before.
+    /// Writes the buffered text to the file.
+    /// \return false if this or an earlier write failed.
     bool flush();
 
 private:
@@ -163,9 +162,10 @@ class ORN_HDL_API FileName {
 public:
     /// The parts of a copy of `name`; null is read as "".
     explicit FileName(TextView name) : name_(name.GetView()) {}
-    /// What follows the last "/".
+    /// The part behind the last "/".
     String GetTail() const;
-    /// The tail without its extension (the last "." and what follows, unless the "." comes first).
+    /// The tail without its extension, which begins at the last "." unless that is the first
+    /// character.
     String GetStem() const;
 
 private:

@@ -1,5 +1,5 @@
 /// \file
-/// `Port_Range`, a piece of a text, and `Port_Regexp`, a small pattern to look for in one.
+/// `Port_Range`, a piece of a text, and `Port_Regexp`, a small pattern to search a text for.
 #pragma once
 
 #include "Port/Export.h"
@@ -14,14 +14,14 @@ namespace Port {
 template <class Char> class StringBase;
 } // namespace Port
 
-/// A piece of a text: its first character's index (from 0) and its length. A range that was given
-/// neither, and the range of length 0 at index 1, stand before the text for a search of tokens,
-/// unless that search has set them.
+/// A piece of a text: the index of its first character (from 0) and its length. For a search of
+/// tokens, a default range and the range of length 0 at index 1 mean the start of the text, unless
+/// that search has set them.
 class Port_Range {
 public:
-    /// The range before every text, from which a search of tokens starts. It holds nothing.
+    /// An empty range, from which a search of tokens starts.
     constexpr Port_Range() noexcept = default;
-    /// A piece of that place and length. A text need not reach that far.
+    /// A piece of that index and length, which may exceed the text.
     constexpr Port_Range(std::size_t start, std::size_t length) noexcept
         : start_(start), length_(length) {}
 
@@ -29,17 +29,17 @@ public:
     constexpr std::size_t GetStart() const noexcept { return start_; }
     /// The number of characters.
     constexpr std::size_t GetLength() const noexcept { return length_; }
-    /// The index behind the last character; the largest index where the sum is beyond it.
+    /// The index behind the last character, saturated at the largest index.
     constexpr std::size_t GetEnd() const noexcept {
         constexpr auto Largest = static_cast<std::size_t>(-1);
         return length_ > Largest - start_ ? Largest : start_ + length_;
     }
 
-    /// Whether two ranges have the same place and length.
+    /// Whether two ranges have the same index and length.
     friend constexpr bool operator==(const Port_Range& a, const Port_Range& b) noexcept {
         return a.start_ == b.start_ && a.length_ == b.length_;
     }
-    /// Whether two ranges differ in place or length.
+    /// Whether two ranges differ in index or length.
     friend constexpr bool operator!=(const Port_Range& a, const Port_Range& b) noexcept {
         return !(a == b);
     }
@@ -58,7 +58,7 @@ private:
 
     std::size_t start_ = static_cast<std::size_t>(-1);
     std::size_t length_ = 0;
-    /// An empty token may stand at index 1, where a search would otherwise start anew.
+    /// Distinguishes an empty token at index 1 from the start of a search.
     bool isToken_ = false;
 };
 
@@ -69,11 +69,11 @@ class ORN_HDL_API Port_Regexp {
 public:
     /// Reads a pattern, which need not outlive the constructor.
     /// \param pattern the pattern; null is the empty pattern, which matches the empty text. A class
-    ///        without its "]" reaches to the end of the pattern.
+    ///        without a "]" extends to the end of the pattern.
     explicit Port_Regexp(Port::TextView pattern);
 
-    /// Looks for the leftmost match in `text` and, there, for the longest; null is read as "".
-    /// \param range receives the place of the match; untouched when there is none.
+    /// Searches for the longest of the leftmost matches in `text`; null is read as "".
+    /// \param range receives the range of the match; unchanged if there is none.
     /// \return whether there is a match.
     bool Search(Port::TextView text, Port_Range& range) const;
 

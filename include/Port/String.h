@@ -24,21 +24,21 @@ class File;
 template <class Char> class ORN_HDL_API StringBase {
     template <class Text>
     static constexpr bool IsText = std::is_convertible_v<const Text&, BasicTextView<Char>>;
-    /// What may stand before a string as well as behind it.
+    /// The types that can be joined to a string on either side.
     template <class Text>
     static constexpr bool IsOtherText = IsText<Text> && !std::is_same_v<Text, StringBase>;
 
 public:
-    /// A piece of such a text that someone else owns.
+    /// A view of such a text.
     using View = std::basic_string_view<Char>;
     /// A parameter that takes any kind of text; null is read as "".
     using TextView = BasicTextView<Char>;
 
-    /// How letters compare.
+    /// Whether letter case matters in a comparison.
     enum CompareType { CompareExact, CompareIgnoringCase };
-    /// Which ends are trimmed.
+    /// The ends to trim.
     enum TrimType { TrimLeft, TrimRight, TrimBoth };
-    /// What becomes of empty tokens.
+    /// Whether empty tokens are kept or skipped.
     enum ParseType { KeepEmptyTokens = 0, SkipEmptyTokens = 1 };
 
     /// The empty text.
@@ -47,7 +47,7 @@ public:
     StringBase(const Char* text) : text_(TextView(text).GetView()) {}
     /// A copy of a text.
     StringBase(View text) : text_(text) {}
-    /// Takes over a text.
+    /// Takes over the buffer of a text.
     StringBase(std::basic_string<Char> text) : text_(std::move(text)) {}
 
     /// Appends a text, which may be this one or a piece of it; null appends nothing.
@@ -60,15 +60,15 @@ public:
         text_ += c;
         return *this;
     }
-    /// A number is no text: `+= 65` would append "A".
+    /// A number is not a text: `+= 65` would append "A".
     template <class Number, std::enable_if_t<std::is_arithmetic_v<Number>, int> = 0>
     StringBase& operator+=(Number) = delete;
 
-    /// The text without a copy, valid until the string changes or ends.
+    /// The text without a copy, valid until the string changes or is destroyed.
     View GetView() const noexcept { return text_; }
-    /// The text without a copy, valid until the string changes or ends.
+    /// The text without a copy, valid until the string changes or is destroyed.
     operator View() const noexcept { return text_; }
-    /// The text with a closing NUL, valid until the string changes or ends.
+    /// The text with a closing NUL, valid until the string changes or is destroyed.
     const Char* CStr() const noexcept { return text_.c_str(); }
     /// The number of characters.
     std::size_t GetLength() const noexcept { return text_.size(); }
@@ -92,44 +92,44 @@ public:
     /// null is read, occurs at index 0.
     int GetIndexOfString(TextView text) const noexcept;
 
-    /// The piece that `range` names, cut to what the text has.
+    /// The piece of the text in `range`, as far as the text reaches.
     StringBase Extract(const Port_Range& range) const;
-    /// Takes the piece that `range` names, cut to what the text has, out of the text.
+    /// Removes the piece in `range`, as far as the text reaches.
     void Remove(const Port_Range& range);
 
-    /// Turns the letters of ASCII into upper case.
+    /// Turns ASCII letters into upper case.
     void MakeUpper() noexcept;
-    /// Turns the letters of ASCII into lower case.
+    /// Turns ASCII letters into lower case.
     void MakeLower() noexcept;
-    /// Takes every `c` off the chosen ends.
+    /// Removes every `c` at the chosen ends.
     void Trim(Char c, TrimType type = TrimBoth);
     /// Replaces each character that occurs in `from` by `to`; null is read as "".
     void ReplaceChars(TextView from, Char to) noexcept;
 
     /// Steps to the next token.
     /// \param range the present token, `Port_Range()` or `Port_Range(1, 0)` before the first one;
-    ///        receives the next one, and is untouched when there is none.
+    ///        receives the next one, and is unchanged if there is none.
     /// \param separators the single characters that separate tokens; null for none.
     /// \return false when there is no further token.
     bool NextTokenRange(Port_Range& range, TextView separators, ParseType type) const;
-    /// Steps to the next token, as the overload with a `ParseType` does.
-    /// \param type 0 keeps empty tokens, 1 skips them; with any other number there is no token.
+    /// Steps to the next token like the overload with a `ParseType`.
+    /// \param type 0 keeps empty tokens, 1 skips them; any other number finds no token.
     bool NextTokenRange(Port_Range& range, TextView separators, int type) const;
-    /// An enumerator of another enumeration says nothing of empty tokens.
+    /// Rejects enumerators of other enumerations.
     template <class Other, std::enable_if_t<std::is_enum_v<Other>, int> = 0>
     bool NextTokenRange(Port_Range& range, TextView separators, Other type) const = delete;
 
     /// Finds the leftmost, longest match of `pattern`.
-    /// \param range receives the place of the match; untouched when there is none.
+    /// \param range receives the range of the match; unchanged if there is none.
     /// \return whether there is a match.
     bool GetRangeOfMatch(const Port_Regexp& pattern, Port_Range& range) const;
 
     /// Replaces the text by the file's next line without its line feed and without one carriage
     /// return before it.
-    /// \return false at the end of the file or when it cannot be read (`File::GetError` tells).
+    /// \return false at the end of the file or on an error (see `File::GetError`).
     bool ReadLine(File& file);
 
-    /// The text that printf would write in the "C" locale, whatever locale is in use.
+    /// The text that printf writes in the "C" locale, whatever locale is in use.
     /// \param format the caller's own text, never a user's; null is read as "".
 #if defined(__GNUC__)
     __attribute__((format(printf, 1, 2)))
@@ -168,26 +168,26 @@ public:
         return TextView(a).GetView() < b.GetView();
     }
 
-    /// A string with a text behind it; null adds nothing.
+    /// A string followed by a text; null adds nothing.
     template <class Text, std::enable_if_t<IsText<Text>, int> = 0>
     friend StringBase operator+(StringBase a, const Text& b) {
         a += TextView(b);
         return a;
     }
-    /// A string with a text before it; null adds nothing.
+    /// A text followed by a string; null adds nothing.
     template <class Text, std::enable_if_t<IsOtherText<Text>, int> = 0>
     friend StringBase operator+(const Text& a, const StringBase& b) {
         StringBase joined(TextView(a).GetView());
         joined += b;
         return joined;
     }
-    /// A string with a character behind it.
+    /// A string followed by a character.
     template <class One, std::enable_if_t<std::is_same_v<One, Char>, int> = 0>
     friend StringBase operator+(StringBase a, One b) {
         a += b;
         return a;
     }
-    /// A string with a character before it.
+    /// A character followed by a string.
     template <class One, std::enable_if_t<std::is_same_v<One, Char>, int> = 0>
     friend StringBase operator+(One a, const StringBase& b) {
         StringBase joined;
@@ -202,7 +202,7 @@ private:
 
 extern template class StringBase<char>;
 
-/// The string type that the library's interfaces speak.
+/// The string type of the library's interfaces.
 using String = StringBase<char>;
 
 } // namespace Port

@@ -9,8 +9,8 @@
 
 namespace Port {
 
-/// Converts a text that is, as a whole, one decimal integer with an optional sign.
-/// \param value receives the number; untouched when the result is false.
+/// Converts a text that consists of one decimal integer with an optional sign.
+/// \param value receives the number; unchanged if the result is false.
 /// \return false for any other text and for a number that does not fit.
 ORN_HDL_API bool strtol(TextView text, long& value) noexcept;
 
@@ -30,11 +30,11 @@ ORN_HDL_API int stricmp(TextView a, TextView b) noexcept;
 /// \return a number below, at or above zero as `a` sorts before, with or after `b`.
 ORN_HDL_API int strnicmp(TextView a, TextView b, std::size_t count) noexcept;
 
-/// Whether the whole text matches a pattern in which "*" stands for any characters, none included.
+/// Whether the whole text matches a pattern in which "*" matches any characters, including none.
 ORN_HDL_API bool strmatch(TextView text, TextView pattern) noexcept;
 
-/// Whether the whole text matches a pattern in which "*" stands for any characters, none included,
-/// the case of ASCII letters ignored.
+/// Whether the whole text matches a pattern in which "*" matches any characters, including none,
+/// ignoring the case of ASCII letters.
 ORN_HDL_API bool strimatch(TextView text, TextView pattern) noexcept;
 
 } // namespace Port

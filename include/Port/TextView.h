@@ -10,13 +10,13 @@
 
 namespace Port {
 
-/// A text that an operation reads and does not keep. It is made from whatever the caller has: a
+/// A text that an operation reads and does not keep. It is made from any kind of text: a
 /// literal or another pointer to a text that ends in NUL, a `std::string`, a `std::string_view`, a
-/// `StringBase`. A null pointer, the literal `nullptr` included, reads as the empty text; a
+/// `StringBase`. A null pointer, the literal `nullptr` included, is read as the empty text; a
 /// `std::string_view` cannot be made from one.
 template <class Char> class BasicTextView {
 public:
-    /// What the text is handed on as.
+    /// The view of the standard library.
     using View = std::basic_string_view<Char>;
 
     /// The empty text.
@@ -32,7 +32,7 @@ public:
 
     /// The text for the standard library, which may hold any characters, NUL included.
     constexpr operator View() const noexcept { return view_; }
-    /// The text for the standard library, where a conversion has to be spelt out.
+    /// The text for the standard library, where an explicit conversion is needed.
     constexpr View GetView() const noexcept { return view_; }
 
 private:
@@ -42,7 +42,7 @@ private:
 /// The parameter type for texts of `char`.
 using TextView = BasicTextView<char>;
 
-/// The text of a pointer that may be null, which reads as the empty text.
+/// The text of a pointer that may be null, which is read as the empty text.
 constexpr std::string_view ViewOf(const char* text) noexcept {
     return TextView(text);
 }

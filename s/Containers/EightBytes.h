@@ -1,4 +1,4 @@
-// Text taken eight characters at a time, in a number.
+// Eight characters of a text, processed as one number.
 #pragma once
 
 #include <bit>
@@ -22,14 +22,14 @@ constexpr std::uint64_t MarkRange(std::uint64_t text, char first, char last) noe
     return from & ~behind & ~text & High;
 }
 
-/// Which byte in memory, counted from 0, is the first that is marked; one is.
+/// The index in memory, counted from 0, of the first marked byte. At least one must be marked.
 constexpr std::size_t FirstMarked(std::uint64_t marks) noexcept {
     static_assert(std::endian::native == std::endian::little,
                   "the first byte in memory is the lowest of a number");
     return static_cast<std::size_t>(std::countr_zero(marks)) / 8;
 }
 
-/// Letters in upper case.
+/// The characters with letters in upper case.
 constexpr std::uint64_t ToUpper(std::uint64_t text) noexcept {
     return text - (MarkRange(text, 'a', 'z') >> 2U);
 }
@@ -40,7 +40,7 @@ inline std::uint64_t Load(const char* text) noexcept {
     return word;
 }
 
-/// Fewer than eight characters; each of them counts, some of them twice.
+/// Fewer than eight characters as a number, which may contain some of them twice.
 inline std::uint64_t LoadShort(const char* text, std::size_t size) noexcept {
     std::uint32_t first = 0;
     std::uint32_t last = 0;

@@ -1,6 +1,6 @@
-// The hash that the walk order of `NameTable` is made of: h = h * 33 + byte from 5381, bytes taken
-// as signed, in 32 bits. Look-ups whose order does not show use `HashByEights`, which is faster and
-// seeded.
+// The hash that determines the order of `NameTable`: h = h * 33 + byte, starting from 5381, with
+// signed bytes, in 32 bits. Look-ups without a visible order use `HashByEights`, which is faster
+// and seeded.
 #pragma once
 
 #include "Port/Ascii.h"

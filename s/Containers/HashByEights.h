@@ -1,5 +1,4 @@
-// The hash of names and words that are looked up without regard to letter case, where its order
-// does not show.
+// The hash for case-insensitive look-ups of names and words whose order is not visible.
 #pragma once
 
 #include "Containers/EightBytes.h"
@@ -10,15 +9,15 @@
 
 namespace Orn_Hdl {
 
-/// Differs from process to process where the system places programs at random: a command file
-/// cannot be made whose names all fall together. Nothing else may depend on it.
+/// The seed differs between processes on systems that randomise addresses, so that nobody can write
+/// a command file whose names all collide. Nothing else may depend on it.
 inline std::uint64_t HashSeed() noexcept {
     static const char place = 0;
     return reinterpret_cast<std::uintptr_t>(&place);
 }
 
-/// Both halves of a product in one: every bit of it depends on the seed that went into a factor, so
-/// that names which collide with one seed do not with another.
+/// Combines both halves of a product. Every bit depends on the seed in one of the factors, so names
+/// that collide with one seed do not collide with another.
 inline std::uint64_t MultiplyAndFold(std::uint64_t a, std::uint64_t b) noexcept {
 #if defined(__SIZEOF_INT128__)
     __extension__ typedef unsigned __int128 Wide; // NOLINT(modernize-use-using)
@@ -29,10 +28,9 @@ inline std::uint64_t MultiplyAndFold(std::uint64_t a, std::uint64_t b) noexcept 
 #endif
 }
 
-/// Takes eight characters a step, since every look-up hashes a name; what is left over at the end
-/// is taken together with characters before it.
-/// \param fold gives what to hash in the place of eight characters; characters that are equal to a
-///        look-up have to become the same, each in its place.
+/// Processes eight characters a step, because every look-up hashes a name; the last step overlaps
+/// with the one before it.
+/// \param fold returns eight characters with equivalent ones unified, each at its position.
 template <class Fold> inline std::uint32_t HashByEights(std::string_view name, Fold fold) noexcept {
     using namespace EightBytes;
     constexpr std::size_t Step = sizeof(std::uint64_t);
@@ -51,7 +49,7 @@ template <class Fold> inline std::uint32_t HashByEights(std::string_view name, F
     return static_cast<std::uint32_t>(hash >> 32U);
 }
 
-/// Letter case ignored.
+/// The hash of a text, letter case ignored.
 inline std::uint32_t HashUpperByEights(std::string_view name) noexcept {
     return HashByEights(name, [](std::uint64_t text) { return EightBytes::ToUpper(text); });
 }

@@ -1,5 +1,5 @@
-// The hash table of every look-up whose order does not show. `NameTable` is the other one: the
-// order of its walk is part of the behaviour of `StringSet`.
+// The hash table for look-ups whose order is not visible. The other hash table is `NameTable`,
+// whose order is part of the behaviour of `StringSet`.
 #pragma once
 
 #include "Port/Prefetch.h"
@@ -13,27 +13,27 @@
 
 namespace Orn_Hdl {
 
-/// Finds values by hash: open addressing with linear probing. It keeps no keys; the caller says
-/// which of the values near the place of a hash is the wanted one. A value that is equal to
-/// `Value()` marks a free slot and cannot be entered.
+/// Finds values by hash: open addressing with linear probing. It stores no keys; the caller decides
+/// which of the values that may have a hash is the wanted one. A value that is equal to `Value()`
+/// marks a free slot and cannot be added.
 template <class Value, template <class> class Allocator = std::allocator> class HashSlots {
 public:
     static_assert(std::is_trivially_copyable_v<Value>);
 
-    /// The two lowest bits of a hash say little. They do not move a value, so that a caller can
-    /// tell kinds of values apart by them and still find those of all kinds.
+    /// The two lowest bits of a hash do not affect the slot of a value, so that a caller can
+    /// distinguish kinds of values by them and still find values of all kinds.
     static constexpr std::uint32_t PlaceBits = ~std::uint32_t(3);
 
     std::size_t GetSize() const noexcept { return count_; }
 
-    /// The first value near the place of a hash for which `matches(hash, value)` holds; `Value()`
-    /// when there is none.
+    /// The first value from the home slot of a hash on for which `matches(hash, value)` is true;
+    /// `Value()` if there is none.
     template <class Matches> Value Find(std::uint32_t hash, Matches matches) const noexcept {
         return slots_.empty() ? Value() : slots_[Probe(hash, matches)].Get();
     }
 
-    /// Makes room for one more value, so that entering it allocates nothing. At most three quarters
-    /// of the slots are taken.
+    /// Makes room for one more value, so that adding it allocates nothing. At most three quarters
+    /// of the slots are used.
     void MakeRoom() {
         if ((count_ + 1) * 4 <= slots_.size() * 3) {
             return;
@@ -47,14 +47,14 @@ public:
         }
     }
 
-    /// Enters a value beside those that are there.
+    /// Adds a value.
     void Add(std::uint32_t hash, Value value) {
         MakeRoom();
         slots_[FreePlace(hash)].Set(hash, value);
         ++count_;
     }
 
-    /// Enters a value in the place of the first one for which `matches(hash, value)` holds.
+    /// Adds a value, or replaces the first one for which `matches(hash, value)` is true.
     template <class Matches> void AddOrReplace(std::uint32_t hash, Value value, Matches matches) {
         MakeRoom();
         Slot& slot = slots_[Probe(hash, matches)];
@@ -62,12 +62,12 @@ public:
         slot.Set(hash, value);
     }
 
-    /// Gives a value that was entered with this hash another value's slot.
+    /// Replaces a value that was added with this hash by another one.
     void Replace(std::uint32_t hash, Value former, Value value) noexcept {
         slots_[PlaceOf(hash, former)].Set(hash, value);
     }
 
-    /// Takes out a value that was entered with this hash; nothing happens when it is not there.
+    /// Removes a value that was added with this hash, if it is present.
     void Remove(std::uint32_t hash, Value value) noexcept {
         if (slots_.empty()) {
             return;
@@ -76,7 +76,7 @@ public:
         if (slots_[hole].IsFree()) {
             return;
         }
-        // A value that was entered behind the hole may have to be looked for in it: it moves up.
+        // A value behind the hole whose search would stop at the hole moves into it.
         for (std::size_t i = Next(hole); !slots_[i].IsFree(); i = Next(i)) {
             if (Distance(Home(slots_[i].hash), i) >= Distance(hole, i)) {
                 slots_[hole] = slots_[i];
@@ -92,12 +92,12 @@ public:
         count_ = 0;
     }
 
-    /// Hints that a hash is about to be looked for. There has to be at least one value.
+    /// Prefetches the slots of a hash. The table must not be empty.
     void PrefetchPlace(std::uint32_t hash) const noexcept { Port::Prefetch(&slots_[Home(hash)]); }
 
 private:
-    /// Without padding, so that a look-up mostly touches one cache line and a million names cost
-    /// little.
+    /// Without padding, so that most look-ups read one cache line and a million names need little
+    /// memory.
     struct Slot {
         std::uint32_t hash = 0;
         unsigned char bytes[sizeof(Value)] = {};
@@ -116,7 +116,7 @@ private:
 
     using Slots = std::vector<Slot, Allocator<Slot>>;
 
-    /// The slot of the wanted value, or the free one behind all that it could be.
+    /// The slot of the wanted value, or the free slot that ends the search.
     template <class Matches> std::size_t Probe(std::uint32_t hash, Matches matches) const noexcept {
         std::size_t i = Home(hash);
         while (!slots_[i].IsFree() && !matches(slots_[i].hash, slots_[i].Get())) {

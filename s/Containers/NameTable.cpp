@@ -11,7 +11,7 @@ namespace Orn_Hdl {
 namespace {
 
 constexpr std::size_t FirstRequest = 100;
-/// How many buckets are looked at in the time of one step along the list.
+/// The number of buckets that can be read in the time of one step along the list.
 constexpr std::size_t BucketsAStep = 8;
 
 constexpr std::uint32_t BucketCounts[] = {
@@ -28,7 +28,7 @@ std::size_t BucketCountFor(std::size_t least) noexcept {
 
 } // namespace
 
-// Copies into a table that is whole, so that what was copied ends when the rest finds no memory.
+// Copies into a complete table, whose destructor destroys the copies if allocation fails.
 NameTable::NameTable(const NameTable& other) : NameTable(other.ignoringCase_) {
     buckets_.resize(other.buckets_.size());
     Node** tail = &head_;
@@ -87,8 +87,8 @@ bool NameTable::Insert(std::string_view name) {
 }
 
 NameTable::Node** NameTable::LinkInto(std::size_t bucket) noexcept {
-    // Mostly the bucket before it is near. In a table that once held many more names the list is
-    // shorter than the way there.
+    // The previous non-empty bucket is usually near. In a table that once held many more names, a
+    // walk along the list is shorter.
     const std::size_t least = bucket - std::min(bucket, BucketsAStep * count_);
     std::size_t lower = bucket;
     while (lower > least && buckets_[lower - 1] == nullptr) {
@@ -122,7 +122,7 @@ void NameTable::Link(Node* node) noexcept {
 }
 
 void NameTable::Grow(std::size_t least) {
-    // Each bucket's chain is gathered by itself, then the chains are joined in bucket order.
+    // The chain of each bucket is built separately; then the chains are joined in bucket order.
     buckets_.assign(BucketCountFor(least), nullptr);
     for (Node* node = head_; node != nullptr;) {
         Node* const next = node->next;

@@ -1,9 +1,9 @@
 // A chained hash table of names whose walk order is exactly defined.
 //
-// All names stand on one singly linked list, ordered by bucket. A name whose bucket is empty is
-// linked in where that order wants it; a name whose bucket is not empty goes directly behind the
-// bucket's first name. Growing takes the list apart from its head and puts each name at the front
-// of its new bucket.
+// All names are in one singly linked list, ordered by bucket. A name whose bucket is empty is
+// linked at its position in that order; a name whose bucket is not empty follows the first name of
+// the bucket. Growth processes the list from its head and puts each name at the front of its new
+// bucket.
 #pragma once
 
 #include <cstddef>
@@ -28,11 +28,11 @@ public:
     NameTable& operator=(const NameTable&) = delete;
     ~NameTable();
 
-    /// \return false when the name is there already.
+    /// \return false if the name is present already.
     bool Insert(std::string_view name);
     bool Contains(std::string_view name) const noexcept { return Find(name) != nullptr; }
     void Remove(std::string_view name) noexcept;
-    /// Drops all names; the number of buckets stays.
+    /// Removes all names; the number of buckets does not change.
     void Empty() noexcept;
     bool IsEmpty() const noexcept { return count_ == 0; }
     const Node* GetFirst() const noexcept { return head_; }
@@ -42,7 +42,7 @@ private:
     bool Equal(const Node& node, std::uint32_t hash, std::string_view name) const noexcept;
     const Node* Find(std::string_view name) const noexcept;
     std::size_t BucketOf(std::uint32_t hash) const noexcept { return hash % buckets_.size(); }
-    /// The link that leads to a bucket's first name, or would.
+    /// The link to the first name of a bucket, or where it would be inserted.
     Node** LinkInto(std::size_t bucket) noexcept;
     void Link(Node* node) noexcept;
     void Grow(std::size_t least);

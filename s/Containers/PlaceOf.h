@@ -1,13 +1,13 @@
-// Where a list that is not in order has something.
+// A search of an unsorted list.
 #pragma once
 
 #include "Orn_Hdl/Containers/PtrArray.h"
 
 namespace Orn_Hdl {
 
-/// The place of the element, of the last or the first that are equal; below zero when there is
-/// none. What is removed was mostly added last, or is removed in the order in which it was added:
-/// both ends are searched at once.
+/// The index of an equal element, either the first or the last one; negative if there is none. Most
+/// elements are removed either soon after they were added or in the order in which they were added,
+/// so both ends are searched at once.
 template <class T> int PlaceOf(const PtrArray<T*>& list, const T* element) noexcept {
     int first = 0;
     int last = list.GetSize() - 1;

@@ -30,7 +30,7 @@ PtrArrayBase& PtrArrayBase::operator=(const PtrArrayBase& other) {
     return *this;
 }
 
-/// What an owner is assigned may hold a pointer twice, and must not have an owner.
+/// The other array may contain a pointer twice. It must not be an owning array.
 void PtrArrayBase::TakeOver(const PtrArrayBase& other) {
     if (other.isOwner_ != 0) {
         return;
@@ -52,7 +52,7 @@ PtrArrayBase::~PtrArrayBase() {
 }
 
 void PtrArrayBase::Reallocate(std::size_t capacity) {
-    // Indices are signed ints, and so is the largest size.
+    // Indices are of type int, which limits the size.
     const bool isBorrowed = ownsItems_ == 0;
     void** const own = isBorrowed ? nullptr : items_;
     void* const items =
@@ -69,7 +69,7 @@ void PtrArrayBase::Reallocate(std::size_t capacity) {
 }
 
 void PtrArrayBase::Grow() {
-    // 3, 5, 9, 17, ...: with the allocator's own word these sizes leave nothing unused.
+    // 3, 5, 9, 17, ...: together with the allocator's own word, these sizes leave no memory unused.
     Reallocate(size_ < 3 ? 3 : std::size_t(size_) * 2 - 1);
 }
 
@@ -112,7 +112,7 @@ void PtrArrayBase::SetAt(int i, void* p) {
     const auto index = static_cast<std::uint32_t>(i);
     if (index >= size_) {
         if (index == MostElements) {
-            // The size that this asks for is no int.
+            // The new size would not fit in an int.
             throw std::bad_alloc();
         }
         Reserve(i + 1);
@@ -150,8 +150,8 @@ void PtrArrayBase::Sort(Less less, void* context) {
     if (less == nullptr) {
         return;
     }
-    // The predicate is the caller's and may do anything to the array, which is not touched before
-    // all is settled.
+    // The caller's predicate may modify the array, so the array is not changed before the order is
+    // final.
     const std::vector<void*> before(items_, items_ + size_);
     std::vector<void*> sorted = before;
     StableSort(sorted, [less, context](void* a, void* b) { return less(a, b, context); });

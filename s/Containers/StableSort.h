@@ -1,4 +1,4 @@
-// A stable sort that stays within its bounds whatever the predicate answers.
+// A stable sort that stays within its bounds for any predicate.
 #pragma once
 
 #include <algorithm>
@@ -7,9 +7,9 @@
 
 namespace Orn_Hdl {
 
-/// Sorts stably. `std::stable_sort` may run over its first element when the answers contradict each
-/// other; merges compare only what both halves still hold. When the predicate throws, `items` hold
-/// anything.
+/// Sorts stably. `std::stable_sort` may read before its first element if the predicate is
+/// inconsistent; merging compares only the remaining elements of both halves. If the predicate
+/// throws, the contents of `items` are unspecified.
 template <class T, class Less> void StableSort(std::vector<T>& items, const Less& less) {
     std::vector<T> merged(items.size());
     for (std::size_t width = 1; width < items.size(); width *= 2) {

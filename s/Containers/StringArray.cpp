@@ -97,7 +97,7 @@ void StringArray::ClosePiece(std::size_t start) {
     slots_.push_back({start, text_.size() - start});
 }
 
-/// Whether a text stands in the list's own buffer, which moves when it grows.
+/// Whether a text is in the list's own buffer, which moves when it grows.
 bool StringArray::IsOwn(string_view text) const noexcept {
     const std::less_equal<const char*> isNotAfter;
     return isNotAfter(text_.data(), text.data()) &&
@@ -112,16 +112,16 @@ int StringArray::AddView(string_view text) {
 }
 
 void StringArray::Add(const StringArray& other) {
-    // By index and with the size read once: the list may be added to itself.
+    // By index, with the size read once: the list may be added to itself.
     const int count = other.GetSize();
     for (int i = 0; i < count; ++i) {
         Add(other.GetAt(i));
     }
 }
 
-/// Lets the buffer take so many characters more. Where it would grow for that, the texts move to a
-/// new one instead and what none of them uses stays behind. The new one is large enough that the
-/// texts set until the next move pay for it.
+/// Makes room for `length` more characters. If the buffer would have to grow, the texts move to a
+/// new one, without the unused parts of the old one. The new buffer is large enough that moving
+/// takes constant amortised time.
 void StringArray::MakeRoom(std::size_t length) {
     if (length <= text_.capacity() - text_.size()) {
         return;
@@ -180,8 +180,8 @@ void StringArray::Sort(bool (*less)(const Port::StringBase<char>&, const Port::S
     if (less == nullptr) {
         return;
     }
-    // The predicate is the caller's and may do anything to the list, which is not touched before
-    // all is settled.
+    // The caller's predicate may modify the list, so the list is not changed before the order is
+    // final.
     const StringArray before(*this);
     std::vector<Port::StringBase<char>> texts;
     texts.reserve(slots_.size());
@@ -219,9 +219,9 @@ int StringArray::ParseCommandLine(Port::TextView commandLine) {
         return ParseCommandLine(std::string(commandLine.GetView()));
     }
     const string_view line = commandLine;
-    // Without quotes the words stand in the line as they are: it is copied as a whole, and looked
-    // through eight characters at a time. A blank behind it ends its last word; what follows fills
-    // the last eight.
+    // Without quotes, the words are parts of the line: it is copied as a whole and scanned eight
+    // characters at a time. A blank behind the line ends its last word, and padding fills the last
+    // eight characters.
     constexpr std::size_t Step = sizeof(std::uint64_t);
     constexpr string_view Filling(" \0\0\0\0\0\0\0", Step);
     const int before = GetSize();
@@ -229,7 +229,7 @@ int StringArray::ParseCommandLine(Port::TextView commandLine) {
     text_.append(line).append(Filling);
     std::size_t start = offset;
     for (std::size_t i = offset; i <= offset + line.size(); i += Step) {
-        // Blanks and quotes, and some characters between them that mean nothing.
+        // Blanks and quotes, and some characters between them that need no attention.
         std::uint64_t marks = EightBytes::MarkRange(EightBytes::Load(text_.data() + i), ' ', '\'');
         for (; marks != 0; marks &= marks - 1) {
             const std::size_t end = i + EightBytes::FirstMarked(marks);
@@ -252,7 +252,7 @@ int StringArray::ParseCommandLine(Port::TextView commandLine) {
 
 namespace {
 
-/// The closing character of the pair that `c` opens, or NUL when it opens none.
+/// The closing character of the pair that `c` opens, or NUL if it opens none.
 char ClosingOf(char c, string_view quotes) noexcept {
     for (std::size_t i = 0; i + 1 < quotes.size(); i += 2) {
         if (quotes[i] == c) {
@@ -273,8 +273,7 @@ int StringArray::Split(string_view text, string_view separators, bool skipEmpty,
         return (c == separator && separator != '\0') ||
                (!others.empty() && others.find(c) != string_view::npos);
     };
-    // Pieces are shorter than the text and as many as its separators at most; the buffer grows
-    // once.
+    // The pieces are not longer than the text, so the buffer grows at most once.
     text_.reserve(text_.size() + text.size());
     std::size_t start = text_.size();
     char closing = '\0';

@@ -12,8 +12,8 @@
 
 namespace Orn_Hdl {
 
-/// The entries stand in a plain list. Up to a few they are compared one by one; beyond that a hash
-/// table of their indices finds them.
+/// The entries are in a list. A few entries are compared one by one; more are found by a hash table
+/// of their indices.
 struct IStringPtrMapBase::Table {
     struct Entry {
         std::string name;
@@ -23,14 +23,14 @@ struct IStringPtrMapBase::Table {
     static constexpr std::size_t MostUnindexed = 8;
 
     std::vector<Entry> entries;
-    /// The index of each entry plus 1; empty as long as there are few entries.
+    /// The index plus 1 of each entry; empty as long as there are few entries.
     HashSlots<std::uint32_t> places;
 
     static std::uint32_t PlaceValue(std::size_t entry) noexcept {
         return static_cast<std::uint32_t>(entry + 1);
     }
 
-    /// The entry of a name; null when there is none.
+    /// The entry of a name; null if there is none.
     Entry* Find(std::string_view name) noexcept {
         const auto isNamed = [name](const Entry& entry) {
             return Port::EqualIgnoringCase(entry.name, name);
@@ -48,7 +48,7 @@ struct IStringPtrMapBase::Table {
     }
 
     void Insert(std::string_view name, void* pointer) {
-        // What can fail comes first, so that no entry is without its place.
+        // Allocation comes first, so that no entry lacks its slot if it fails.
         if (places.GetSize() == 0 && entries.size() >= MostUnindexed) {
             HashSlots<std::uint32_t> all;
             for (std::size_t i = 0; i < entries.size(); ++i) {

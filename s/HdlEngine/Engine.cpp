@@ -15,7 +15,7 @@
 namespace Orn_Hdl {
 
 struct Engine::Implementation {
-    // The models end before the factory that they use.
+    // The models are destroyed before the factory that they use.
     CommandFactory factory;
     ModelRegistry models;
     Model* current = nullptr;

@@ -21,7 +21,7 @@ ModelRegistry::Entry::Entry(ModelRegistry& owner, Number ownNumber,
     : registry(owner), number(ownNumber), model(std::move(ownModel)), hash(HashOfName(*model)) {}
 
 void ModelRegistry::Entry::NameChanged() noexcept {
-    // What was taken out leaves room, so nothing is allocated.
+    // The removed model leaves room, so nothing is allocated.
     registry.byName_.Remove(hash, this);
     hash = HashOfName(*model);
     registry.byName_.Add(hash, this);
@@ -45,7 +45,7 @@ void ModelRegistry::Add(std::unique_ptr<Model> model) {
 ModelRegistry::Entry* ModelRegistry::FindEntry(std::string_view name) const {
     const std::uint32_t hash = HashUpperByEights(name);
     Entry* first = nullptr;
-    // Nothing matches, so that all of one name are looked at.
+    // The predicate rejects every model, so that it is called for all models of the name.
     byName_.Find(hash, [hash, name, &first](std::uint32_t other, Entry* entry) {
         if (other == hash && (first == nullptr || entry->number < first->number) &&
             Port::EqualIgnoringCase(entry->model->GetNetlist()->GetNameView(), name)) {

@@ -1,4 +1,4 @@
-// The models of an engine, found by name without asking each of them.
+// The models of an engine, with a look-up by name that does not visit each of them.
 #pragma once
 
 #include "Containers/HashSlots.h"
@@ -12,8 +12,8 @@
 
 namespace Orn_Hdl {
 
-/// Owns models, in the order in which they were added. Several may bear the same name, since a
-/// model can be renamed at any time; a look-up gives the first of them.
+/// Owns models, in the order in which they were added. Several may have the same name, because a
+/// model can be renamed at any time; a look-up returns the first of them.
 class ModelRegistry {
 public:
     ModelRegistry() = default;
@@ -23,16 +23,16 @@ public:
     ~ModelRegistry();
 
     void Add(std::unique_ptr<Model> model);
-    /// The first model of that name, letter case ignored; null when there is none.
+    /// The first model of that name, letter case ignored; null if there is none.
     Model* Find(std::string_view name) const;
-    /// Takes the first model of that name out; null when there is none.
+    /// Removes and returns the first model of that name; null if there is none.
     std::unique_ptr<Model> Remove(std::string_view name);
 
 private:
-    /// Models are numbered as they come.
+    /// Models are numbered in the order in which they are added.
     using Number = std::uint64_t;
 
-    /// A model, which tells its registry when it is renamed.
+    /// A model, which notifies its registry when it is renamed.
     struct Entry final : NameListener {
         Entry(ModelRegistry& owner, Number ownNumber, std::unique_ptr<Model> ownModel) noexcept;
         void NameChanged() noexcept override;
@@ -40,7 +40,7 @@ private:
         ModelRegistry& registry;
         Number number;
         std::unique_ptr<Model> model;
-        /// Of the name under which the model is listed.
+        /// The hash of the name under which the model is listed.
         std::uint32_t hash;
     };
 

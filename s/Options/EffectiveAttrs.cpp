@@ -8,7 +8,8 @@ int GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes
     attributes.Empty();
     const Component* const component = instance.GetComponent();
     const bool canHide = component != nullptr && component->HasAttrs();
-    // By their present names: the instance goes on finding a renamed attribute by its former one.
+    // Compares present names: a look-up in the instance finds a renamed attribute by its former
+    // name.
     IStringPtrMap<const Attribute*> hiding;
     for (Attribute* attribute : instance.GetAttrIterator()) {
         attributes.Add(attribute);

@@ -7,9 +7,9 @@
 
 namespace Orn_Hdl {
 
-/// Replaces the list by the instance's attributes and those of its component that it does not hide
-/// by one of the same name.
-/// \return how many of them, from the first on, are the instance's own.
+/// Replaces the list by the attributes of the instance, followed by those of its component, except
+/// those that have the name of an attribute of the instance.
+/// \return the number of the instance's own attributes.
 int GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes);
 
 } // namespace Orn_Hdl

@@ -4,7 +4,7 @@
 
 namespace Orn_Hdl {
 
-// What depends on the table of dialects stands beside it, in Verilog/Dialects.cpp.
+// The functions that depend on the table of dialects are in Verilog/Dialects.cpp.
 
 HdlOptions::VerilogOption::CaseType HdlOptions::VerilogOption::GetCaseType(const char* text) {
     const std::string_view name = Port::ViewOf(text);

@@ -72,7 +72,7 @@ const StringArray HdlUtilities::GetAttrNames(const Instance* instance) {
     }
     PtrArray<Attribute*> attributes;
     const int own = GetEffectiveAttrs(*instance, attributes);
-    // Of several attributes of one name that the component has, the first counts.
+    // If the component has several attributes of one name, the first one is used.
     IStringPtrMap<const Attribute*> known;
     for (int i = 0; i < attributes.GetSize(); ++i) {
         const Attribute* const attribute = attributes.GetAt(i);

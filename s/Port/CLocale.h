@@ -1,4 +1,4 @@
-// What the C library formats and parses shall not depend on the locale that the program has set.
+// Formatting and parsing by the C library that do not depend on the program's locale.
 #pragma once
 
 #include <clocale>
@@ -9,7 +9,7 @@
 
 namespace Port {
 
-/// Puts the "C" locale in use for this thread as long as it lives.
+/// Sets the "C" locale for this thread during its lifetime.
 class CLocale {
 public:
     CLocale() noexcept : former_(uselocale(Get())) {}
@@ -18,7 +18,7 @@ public:
     ~CLocale() { uselocale(former_); }
 
 private:
-    /// Null, which leaves the locale in use as it is, where the system cannot make one.
+    /// Null if the system cannot create the locale; the present one stays in use then.
     static locale_t Get() noexcept {
         static const locale_t locale = newlocale(LC_ALL_MASK, "C", static_cast<locale_t>(nullptr));
         return locale;

@@ -39,8 +39,8 @@ std::string FolderOf(const std::string& name) {
     return name.substr(0, name.rfind('/') + 1);
 }
 
-/// Whether the system serves the name itself. Such names lead to open files and devices by ways
-/// that are no folders, so nothing can be put in their place.
+/// Whether a name is in one of the system's own file systems. Such names refer to open files and
+/// devices, which cannot be replaced.
 bool IsServedBySystem(std::string_view name) noexcept {
     constexpr std::string_view Devices = "/dev/";
     constexpr std::string_view Processes = "/proc/";
@@ -48,14 +48,14 @@ bool IsServedBySystem(std::string_view name) noexcept {
            name.substr(0, Processes.size()) == Processes;
 }
 
-/// Replaces a name by the file that its chain of symbolic links leads to, whether it exists or not.
-/// \return false, errno set, when a link cannot be read.
+/// Replaces a name by the target of its chain of symbolic links, which need not exist.
+/// \return false, with errno set, if a link cannot be read.
 bool FollowLinks(std::string& name) {
     char link[PATH_MAX];
     for (int i = 0; i < MostLinks && !IsServedBySystem(name); ++i) {
         const ssize_t length = System::Get().ReadLink(name.c_str(), link, sizeof link);
         if (length < 0) {
-            // No link, or nothing at all.
+            // The name is not a link, or does not exist.
             return errno == EINVAL || errno == ENOENT;
         }
         const std::string_view next(link, static_cast<std::size_t>(length));
@@ -64,13 +64,14 @@ bool FollowLinks(std::string& name) {
     return true;
 }
 
-/// Whether an error tells that a folder takes no new file, however a file in it may be written.
+/// Whether an error means that no file can be created in a folder, although files in it may be
+/// writable.
 bool IsRefusal(int error) noexcept {
     return error == EACCES || error == EPERM || error == EROFS;
 }
 
-/// A name that no other file of this process has; short, since the target's may be as long as a
-/// name can be.
+/// A name that no other file of this process has. It is short, because the name of the target may
+/// have the maximum length.
 std::string TemporaryName(const std::string& folder) {
     static std::atomic<unsigned> count{0};
     return folder + ".orn_hdl_" + std::to_string(getpid()) + "_" + std::to_string(++count);
@@ -100,7 +101,7 @@ bool File::OpenDescriptor(const char* name, int flags, unsigned mode) {
 void File::CloseDescriptor() noexcept {
     const int result = System::Get().Close(descriptor_);
     descriptor_ = -1;
-    // An interrupted close has closed the file all the same.
+    // An interrupted close has closed the file nevertheless.
     if (result != 0 && errno != EINTR) {
         Fail(errno);
     }
@@ -127,12 +128,12 @@ bool File::OpenBelow(const Folder& folder, const char* path, Mode mode, bool fro
     return true;
 }
 
-/// Opens a name in the folder that is open. \return the descriptor, or -1, errno set.
+/// Opens a name in the open folder. \return the descriptor, or -1 with errno set.
 int File::OpenInFolder(const char* name, int flags, unsigned mode) const {
-    // Without O_NONBLOCK, opening a pipe would wait for its other end.
+    // Without O_NONBLOCK, opening a pipe would block until its other end is opened.
     const int opened =
         System::Get().OpenAt(folder_.GetDescriptor(), name, flags | O_NOFOLLOW | O_NONBLOCK, mode);
-    // A file that the call has made is a regular one.
+    // A file that the call has created is a regular one.
     if (opened < 0 || (flags & O_EXCL) != 0) {
         return opened;
     }
@@ -189,7 +190,7 @@ bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
         return false;
     }
     if (mode == Append && (!isKnown || S_ISREG(status.st_mode))) {
-        // What is not known stays zero, which is no file's inode.
+        // If the status is unknown, the inode is zero, which no file has.
         appends_ = true;
         device_ = static_cast<std::uint64_t>(status.st_dev);
         inode_ = static_cast<std::uint64_t>(status.st_ino);
@@ -198,7 +199,7 @@ bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
     return true;
 }
 
-/// Gives the file its former length back, unless somebody else has appended to it as well.
+/// Restores the former length of the file, unless another process has appended to it, too.
 bool File::CutAppended() noexcept {
     struct stat status {};
     if (System::Get().GetStatus(descriptor_, &status) != 0 || device_ != status.st_dev ||
@@ -216,8 +217,8 @@ void File::CloseAppended() noexcept {
     bool endsAsItBegan = !hasFailed || written_ == 0 || CutAppended();
     CloseDescriptor();
     if (!hasFailed && error_ != 0 && written_ > 0) {
-        // Only the closing told of the failure. Another file that bears the name by now must not
-        // make the opening wait.
+        // Closing has reported the failure, so the file is opened again, without blocking if the
+        // name now refers to a pipe.
         endsAsItBegan = OpenDescriptor(target_.c_str(), O_WRONLY | O_NONBLOCK, 0) && CutAppended();
         if (IsOpen()) {
             CloseDescriptor();
@@ -249,7 +250,7 @@ bool File::OpenToReplace(const char* name) {
     if (IsServedBySystem(target)) {
         return open(name, Overwrite, true);
     }
-    // Opened, but not touched: it tells whether the file may be written at all, and what it is.
+    // Opened without a change, to find out whether the file can be written and what kind it is.
     if (!OpenDescriptor(target.c_str(), O_WRONLY, 0)) {
         if (errno != ENOENT || target.empty()) {
             return Fail(errno);
@@ -281,7 +282,7 @@ bool File::OpenToReplace(const char* name) {
     return true;
 }
 
-/// \return the system's error number when the file cannot be made, else 0.
+/// \return 0, or the system's error number if the file cannot be created.
 int File::OpenTemporary(unsigned mode) {
     const std::string folder = FolderOf(target_);
     std::string name;
@@ -370,7 +371,7 @@ bool File::FillLineBuffer() {
     if (atEnd_) {
         return false;
     }
-    // The rest of a line that the last piece cut moves to the front.
+    // The beginning of an incomplete line moves to the front.
     const std::string_view rest = GetUnread();
     if (rest.size() + ReadSize > lineCapacity_) {
         const std::size_t capacity = rest.size() + std::max(ReadSize, rest.size());
@@ -437,8 +438,7 @@ Stream& Stream::operator<<(TextView added) {
 }
 
 bool Stream::flush() {
-    // After a failure nothing more is sent: a file with a hole in it would be worse than a short
-    // one.
+    // After a failure nothing more is written: a file with a gap would be worse than a short one.
     good_ = good_ && (used_ == 0 || file_.write(buffer_.get(), used_));
     used_ = 0;
     return good_;

@@ -1,4 +1,4 @@
-// Lines of a file that need no reading.
+// Lines of a file that are in its buffer.
 #pragma once
 
 #include "Port/File.h"
@@ -7,11 +7,11 @@
 
 namespace Port {
 
-/// The way past the public interface of `File` to what it has read and not given yet.
+/// Private access to the lines that a `File` has read but not returned yet.
 class LinesAtHand {
 public:
-    /// As `File::NextLine`, without reading: false also when the rest of the line has yet to be
-    /// read.
+    /// The next line, like `File::NextLine`, but only from the buffer.
+    /// \return false if the buffer does not contain the whole line.
     static bool Next(File& file, std::string_view& line) {
         const std::size_t length = file.GetUnread().find('\n');
         if (length == std::string_view::npos) {

@@ -17,7 +17,7 @@ namespace Port::Pool {
 
 #if defined(PORT_POOL_IS_HEAP)
 
-// The sanitizers see misuse only of memory that comes from the heap object by object.
+// Sanitizers only detect misuse of objects that are allocated separately on the heap.
 void* Allocate(std::size_t size, Kind /*kind*/) {
     return ::operator new(size);
 }
@@ -34,28 +34,29 @@ void Free(void* memory) noexcept {
 
 namespace {
 
-/// Pages are as large as the system's huge pages and aligned to them. A netlist is walked in no
-/// order of addresses; with huge pages that costs far fewer address translations, and far fewer
-/// faults when the memory is first used.
+/// Pages have the size and alignment of the system's huge pages. The addresses of a walk over a
+/// netlist are in random order; huge pages need far fewer address translations, and cause far fewer
+/// page faults when the memory is first used.
 constexpr std::size_t PageSize = std::size_t(2) << 20;
 
-/// Stands at the start of every page. Pages are aligned to their size, so the page of an object is
-/// found from the object's address.
+/// The header at the start of every page. Pages are aligned to their size, so the address of an
+/// object determines its page.
 struct Page {
-    /// The objects in the page; while a thread still fills it, `Filling` less those that have
-    /// ended.
+    /// The number of objects in the page; while a thread fills the page, `Filling` minus the number
+    /// of objects that have been destroyed.
     std::atomic<std::size_t> users;
-    /// Of the whole mapping.
+    /// The size of the whole mapping.
     std::size_t size;
 };
 
-/// More than the objects of any page. The thread that fills a page counts its objects by itself.
+/// More than the number of objects in any page. The thread that fills a page counts its objects
+/// separately.
 constexpr std::size_t Filling = SIZE_MAX / 2;
 
 constexpr std::size_t HeaderSize = sizeof(Page);
 static_assert(HeaderSize % 16 == 0);
 
-/// Maps memory aligned to `PageSize`: more than is needed, of which the ends are given back.
+/// Maps memory aligned to `PageSize`: maps more than is needed and unmaps both ends.
 Page* NewPage(std::size_t least, bool isHuge, std::size_t users) {
     const std::size_t size = (least + 4095) / 4096 * 4096;
     if (size < least || size + PageSize < size) {
@@ -85,7 +86,7 @@ void Leave(Page* page, std::size_t users) noexcept {
     }
 }
 
-/// The page that a thread fills at present with objects of one kind.
+/// The page that a thread is filling with objects of one kind.
 class Filler {
 public:
     ~Filler() { Close(); }
@@ -93,7 +94,7 @@ public:
     /// \param size a multiple of eight.
     void* AllocatePacked(std::size_t size) {
         if (size > left_) {
-            // The first page stays small in memory until it is filled: most processes need no more.
+            // The first page does not use huge pages: most processes need only a part of it.
             Page* const fresh = NewPage(PageSize, page_ != nullptr, Filling);
             Close();
             page_ = fresh;
@@ -106,7 +107,7 @@ public:
     }
 
     void* Allocate(std::size_t size) {
-        // What is left is a multiple of eight, and of sixteen in a fresh page.
+        // The rest of the page is a multiple of eight, and of sixteen in a new page.
         if (size % 16 == 0 && left_ % 16 != 0) {
             left_ -= 8;
         }
@@ -128,13 +129,13 @@ private:
     std::size_t left_ = 0;
 };
 
-// Looked up at every allocation: the general way of a shared library would be a call.
+// Read at every allocation: the default thread-local model of a shared library would need a call.
 #if defined(__GNUC__)
 [[gnu::tls_model("initial-exec")]]
 #endif
 thread_local Filler fillers[2];
 
-/// What is larger has pages to itself.
+/// Larger objects have pages of their own.
 constexpr std::size_t MostInFiller = PageSize / 8;
 
 std::size_t RoundUp(std::size_t size) {

@@ -1,6 +1,6 @@
-// Pages for the millions of small objects of a design. An object costs its own size, rounded up to
-// eight bytes, and what alignment takes, and nothing else; a page returns to the system when its
-// last object is destroyed, so a design that is destroyed as a whole gives its memory back.
+// Pages for the millions of small objects of a design. An object takes its own size, rounded up to
+// eight bytes and to its alignment. A page is returned to the system when its last object is
+// destroyed, so destroying a design frees its memory.
 #pragma once
 
 #include "Port/Pooled.h"
@@ -11,10 +11,11 @@
 
 namespace Port::Pool {
 
-/// Memory for what need not be aligned to more than eight bytes.
+/// Memory for an object whose alignment is at most eight bytes.
 void* AllocatePacked(std::size_t size, Kind kind);
 
-/// For standard containers that become large: what is as large as a huge page stands in huge pages.
+/// An allocator for standard containers that become large: it uses huge pages for memory of at
+/// least that size.
 template <class T> struct Allocator {
     using value_type = T;
 

@@ -3,7 +3,7 @@
 
 namespace Port {
 
-/// Hints that an object is about to be read. The address may be any.
+/// Tells the processor that an object is about to be read. Any address is allowed.
 inline void Prefetch(const void* address) noexcept {
 #if defined(__GNUC__)
     __builtin_prefetch(address);

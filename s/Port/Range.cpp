@@ -48,7 +48,7 @@ Port_Regexp::Port_Regexp(Port::TextView patternText) {
     }
 }
 
-// All places in the pattern that the text read so far can have reached are followed at once.
+// Follows all positions in the pattern that the text read so far can have reached.
 bool Port_Regexp::MatchAt(std::string_view text, std::size_t start, std::size_t& length) const {
     std::vector<bool> reached(steps_.size() + 1);
     std::vector<bool> next(steps_.size() + 1);

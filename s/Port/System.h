@@ -1,5 +1,5 @@
-// The one seam around the operating system's file calls. Everything that opens, reads, writes,
-// closes, renames or removes a file goes through it, so that a test can make the N-th call fail.
+// The operating system's file calls. All code that opens, reads, writes, closes, renames or removes
+// a file uses this class, so that a test can make the N-th call fail.
 #pragma once
 
 #include "Port/Export.h"
@@ -10,7 +10,7 @@
 
 namespace Port {
 
-/// The file calls of the system, with their POSIX meaning: -1 and errno on a failure.
+/// The file calls of the system, as defined by POSIX: -1 and errno on a failure.
 class ORN_HDL_API System {
 public:
     virtual ~System();
@@ -34,8 +34,8 @@ public:
 
     /// The calls in use.
     static System& Get() noexcept;
-    /// Puts other calls in use, null for the system's own; not owned. For tests, before any file is
-    /// open.
+    /// Replaces the calls in use; null restores the system's own. The object is not owned. For
+    /// tests, before any file is open.
     static void Replace(System* system) noexcept;
 };
 

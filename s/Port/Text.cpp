@@ -26,8 +26,9 @@ std::string_view WithoutLeadingBlanks(std::string_view text) noexcept {
     return text;
 }
 
-/// Whether the whole text matches a pattern with "*"; `same` compares two characters. Linear in the
-/// product at worst: on a mismatch the last "*" takes one character more.
+/// Whether the whole text matches a pattern with "*"; `same` compares two characters. On a mismatch
+/// the last "*" takes one more character, so the time is at most proportional to the product of the
+/// lengths.
 template <class Same>
 bool Matches(std::string_view text, std::string_view pattern, Same same) noexcept {
     std::size_t t = 0;

@@ -27,7 +27,7 @@ Port::File::Mode FileMode(TextFileOutStream::Mode mode) noexcept {
     return Port::File::Overwrite;
 }
 
-/// Most pieces of a netlist are a few characters long: looking at these one by one beats a call.
+/// Most pieces of a netlist have a few characters: a loop over these is faster than a call.
 std::size_t FindLineFeed(std::string_view text) noexcept {
     constexpr std::size_t Short = 16;
     if (text.size() > Short) {
@@ -85,20 +85,20 @@ void TextFileDst::Flush() {
     if (!IsOpen()) {
         return;
     }
-    // The text goes on in a new line, which begins when something is written into it. The line end
-    // is not put into the buffer, which could have to grow: this also runs when a stream ends.
+    // The text continues in a new line, which begins with its first character. The line end is not
+    // added to the buffer, which might have to grow: this also runs in the destructor.
     const bool endsLine = !GetLine().empty();
     StartLine();
     SendLines();
     Send(endsLine ? "\n" : "");
 }
 
-/// After a failure nothing more is sent: a file with a hole in it would be worse than a short one.
+/// After a failure nothing more is written: a file with a gap would be worse than a short one.
 void TextFileDst::Send(std::string_view text) {
     isGood_ = isGood_ && (text.empty() || file_.write(text.data(), text.size()));
 }
 
-/// The line in hand moves to the front of the buffer.
+/// Writes the complete lines and moves the current line to the front of the buffer.
 void TextFileDst::SendLines() {
     Send(std::string_view(buffer_.get(), lineStart_));
     const std::string_view line = GetLine();
@@ -161,7 +161,7 @@ void TextFileDst::WriteToLineEnd(std::string_view text) {
         StartLine();
         return;
     }
-    // A text of many megabytes need not go through the buffer.
+    // A long text is not copied to the buffer.
     StartLine();
     SendLines();
     Send(text);
@@ -187,7 +187,7 @@ inline void TextFileDst::AppendWrapping(std::string_view text) {
     Append(text);
 }
 
-/// Breaks the line in hand where it may be broken.
+/// Breaks the current line where it may be broken.
 void TextFileDst::Wrap() {
     SearchBreak();
     if (search_.isComment) {

@@ -39,16 +39,15 @@ public:
     void WritePieces(const std::string_view* pieces, std::size_t count) override;
 
 private:
-    /// What a search for a place to break has found so far in the line. It goes on where it
+    /// The state of the search for a position to break the line. The search continues where it
     /// stopped, so a line of any length is searched once.
     struct BreakSearch {
         std::size_t searched = 0;
         std::size_t afterSpace = 0;
         std::size_t afterComma = 0;
-        /// Between double quotes, a quote behind a backslash being one like any other, as in
-        /// VHDL...
+        /// Between double quotes, if a backslash does not escape a quote, as in VHDL.
         bool inLiteral = false;
-        /// ... or being a character of the literal, as in Verilog.
+        /// Between double quotes, if a backslash escapes a quote, as in Verilog.
         bool inEscapingLiteral = false;
         bool isEscaped = false;
         bool isComment = false;
@@ -73,7 +72,7 @@ private:
         used_ += text.size();
     }
     void MakeRoom(std::size_t size);
-    /// Ends the line in hand, of which nothing will change any more.
+    /// Ends the current line, which will not change any more.
     void StartLine() noexcept {
         lineStart_ = used_;
         search_ = BreakSearch();
@@ -85,7 +84,7 @@ private:
     bool replaces_ = false;
     bool isGood_ = true;
     Port::StringBase<char> fileName_;
-    /// Lines that wait for being sent to the file, and behind them the line in hand.
+    /// Lines that are not written to the file yet, followed by the current line.
     std::unique_ptr<char[]> buffer_;
     std::size_t capacity_ = 0;
     std::size_t used_ = 0;

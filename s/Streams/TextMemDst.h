@@ -1,4 +1,4 @@
-// The memory destination: everything as it comes, no indentation, no breaks.
+// The memory destination: the text unchanged, without indentation or line breaks.
 #pragma once
 
 #include "Orn_Hdl/Streams.h"

@@ -6,7 +6,7 @@ namespace Orn_Hdl {
 
 namespace {
 
-/// Whether the number of each type is the place of its row.
+/// Whether the number of each type is the index of its row.
 constexpr bool IsInOrder() {
     for (std::size_t i = 0; i < std::size(Dialects); ++i) {
         if (Dialects[i].type != static_cast<int>(i)) {

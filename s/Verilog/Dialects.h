@@ -1,5 +1,5 @@
-// The synthesis dialects: for each tool, how Verilog shows it the attributes of an object. All that
-// chooses a dialect, names it or writes in it reads the one table here.
+// The synthesis dialects: how the attributes of an object are written in Verilog for each tool.
+// Look-up, help and the writer read the table in this file.
 #pragma once
 
 #include "Orn_Hdl/Options.h"
@@ -15,17 +15,16 @@ namespace Orn_Hdl {
 /// One dialect.
 struct Dialect {
     HdlOptions::VerilogOption::SynthesisType type;
-    /// As the command SET SYNTHESIS takes it.
+    /// The argument of the command SET SYNTHESIS.
     std::string_view name;
-    /// Whether the attributes stand behind the semicolon of their object's statement, not before
-    /// it.
+    /// Whether the attributes follow the semicolon of their object's statement.
     bool isSemicolonFirst;
     /// Writes the attributes of the object of that name.
     void (*write)(VerilogStatements& statements, const Iterator<Attribute*>& attributes,
                   const char* objectName);
 };
 
-/// Calls a function of `VerilogStatements`, which may do without the object's name.
+/// Calls a function of `VerilogStatements`, which need not have a parameter for the object's name.
 template <auto Function>
 void WriteAttributes(VerilogStatements& statements, const Iterator<Attribute*>& attributes,
                      const char* objectName) {
@@ -55,7 +54,7 @@ inline constexpr Dialect Dialects[] = {
      WriteAttributes<&VerilogStatements::WritePrecisionAttr>},
 };
 
-/// The dialect of a `SynthesisType`; of any other number the default.
+/// The dialect of a `SynthesisType`; for any other number the default.
 constexpr const Dialect& DialectOf(int synthesisType) {
     for (const Dialect& dialect : Dialects) {
         if (dialect.type == synthesisType) {
@@ -65,7 +64,7 @@ constexpr const Dialect& DialectOf(int synthesisType) {
     return *Dialects;
 }
 
-/// A sentence made by the compiler, with the names of all dialects in it: "A, B or C".
+/// A sentence with the names of all dialects, "A, B or C", composed at compile time.
 class DialectSentence {
 public:
     constexpr DialectSentence(std::string_view before, std::string_view after) {

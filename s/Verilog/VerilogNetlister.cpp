@@ -14,12 +14,12 @@ using Writers::PutLine;
 
 namespace {
 
-/// What stands before the first port's name, "module" and "(" with their blanks.
+/// The columns before the first port's name besides the module's name: "module", "(" and blanks.
 constexpr std::size_t ModuleHeadLength = 8;
-/// What stands before an instance's first pin besides both names.
+/// The columns before the first pin of an instance besides both names.
 constexpr std::size_t InstanceHeadLength = 3;
 
-/// Scalar signals and buses are named by the statements themselves.
+/// The statements write scalar signals and buses by name.
 bool IsNamedPlainly(const Signal& signal) {
     return signal.GetSignalType() == SignalTypeScalar || signal.GetSignalType() == SignalTypeBus;
 }
@@ -270,7 +270,7 @@ void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
     if (Attribute* const init = FindPassedInit(genericAttrs_)) {
         statements_.WriteDefParamInitStatement(init, name.CStr());
         WriteSemicolon();
-        // One that is hidden from synthesis stays: simulation goes on with the instance's own
+        // A parameter that is hidden from synthesis stays: simulation uses the instance's own
         // value.
         genericAttrs_.syn.Remove(init);
     }
@@ -279,7 +279,7 @@ void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
     });
 }
 
-/// Separates an item of a list from the one before it.
+/// Separates two items of a list.
 void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
     Put(out_, ", ");
     if (options_.onePortPerLine) {

@@ -17,12 +17,12 @@ using namespace std::literals::string_view_literals;
 
 namespace {
 
-/// Stands in the place of what would end a number.
+/// Replaces a character that would end a number.
 constexpr char DigitSeparator = '_';
 
 constexpr string_view ListIndentation = "                      "; // 22 blanks
 
-/// The keyword of a port's direction, padded so that the names of several ports line up.
+/// The keyword of a port's direction, padded so that the names of the ports are aligned.
 string_view DirectionKeyword(const Polarity& polarity) {
     switch (polarity.GetValue()) {
     case Polarity::Input:

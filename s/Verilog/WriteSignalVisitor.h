@@ -10,14 +10,14 @@
 
 namespace Orn_Hdl {
 
-/// Writes what connects a pin: a name, with its range or index in brackets, or a list in braces. A
-/// slice that runs against its bus is no expression of Verilog, so it becomes a list of its bits.
+/// Writes a name, with its range or index in brackets, or a concatenation. Verilog does not allow a
+/// slice against its bus, so such a slice becomes a concatenation of its bits.
 class WriteSignalVisitor : public SignalVisitor {
 public:
     enum Place {
-        /// In a pin connection, where an empty name or "open" stands for nothing.
+        /// In a pin connection, where an empty name or "open" means no connection.
         Connection,
-        /// In an assignment, where every name stands for itself.
+        /// In an assignment, where every name means a signal.
         Assignment
     };
 

@@ -1,4 +1,4 @@
-// What a VHDL file says of instances before it places them.
+// The instances that a VHDL file declares or attributes before it instantiates them.
 #pragma once
 
 #include "Orn_Hdl/Model/Netlist.h"
@@ -8,7 +8,7 @@
 
 namespace Orn_Hdl {
 
-/// The instances by component, and the holders of attributes, gathered in one walk.
+/// The instances by component, and the holders of attributes, collected in one walk.
 class InstanceLists {
 public:
     explicit InstanceLists(const Netlist& netlist);

@@ -25,7 +25,7 @@ constexpr string_view PortIndentation = "       ";      // 7 blanks
 constexpr string_view GenericIndentation = "         "; // 9 blanks
 constexpr string_view AssociationPerLine = ",\n          ";
 
-/// The fixed words of a generic clause or a generic map.
+/// The keywords of a generic clause or a generic map.
 struct GenericForm {
     string_view keyword;
     string_view separator;
@@ -38,19 +38,19 @@ bool IsWritable(string_view name) {
     return Writers::IsWritable(Language::Vhdl, name);
 }
 
-/// Whether only the signal's bits, not the signal, can stand in an assignment.
+/// Whether an assignment can only use the bits of the signal, not the whole signal.
 bool IsCompoundOrAgainst(const Signal& signal) {
     return signal.GetSignalType() == SignalTypeCompoundBus || Writers::RunsAgainstParent(signal);
 }
 
-/// Whether an alias of the signal must be written bit by bit: a bus of one bit, a vector, may be
-/// aliased with a bit.
+/// Whether an alias of the signal must be written bit by bit: a bus of one bit, which is a vector,
+/// may be aliased with a bit.
 bool IsAliasedByBits(const Signal& signal) {
     return (!SignalBits::IsSingle(signal) && signal.GetWidth() == 1) || IsCompoundOrAgainst(signal);
 }
 
-/// Whether the signal is a slice of one bit of a bus whose range ascends. VHDL reads the slice's
-/// range as a descending one, which cannot stand for a part of such a bus.
+/// Whether the signal is a slice of one bit of a bus with an ascending range. The range of such a
+/// slice is written as descending, which VHDL does not allow for a part of that bus.
 bool IsOneBitOfAscendingBus(const Signal& signal) {
     if (signal.GetSignalType() != SignalTypeBusSlice || signal.GetWidth() != 1) {
         return false;
@@ -263,7 +263,7 @@ void VhdlNetlister::Writer::WriteSignalDeclaration(const Signal& signal, int wid
     }
 }
 
-/// Of components whose names differ by letter case at most, the first is written.
+/// Of several components whose names differ only in letter case, the first is written.
 void VhdlNetlister::Writer::WriteComponents(const std::vector<const Component*>& components) {
     StringSet written;
     for (const Component* component : components) {
@@ -299,8 +299,7 @@ void VhdlNetlister::Writer::WriteGenericMap(const AttributeHolder& holder) {
                   [this](Attribute* attribute) { statements_.WriteGenericMapAttrType(attribute); });
 }
 
-/// Writes a generic clause or map; one of which every item is hidden from synthesis is hidden as a
-/// whole.
+/// Writes a generic clause or map. If every item is hidden from synthesis, all of it is hidden.
 template <class WriteItem>
 void VhdlNetlister::Writer::WriteGenerics(const Writers::GenericAttrs& attributes,
                                           const GenericForm& form, const WriteItem& writeItem) {
@@ -350,7 +349,7 @@ void VhdlNetlister::Writer::WriteSynthesisAttrAssignment(
     }
 }
 
-/// What the component's declaration says already is not repeated.
+/// Generics that the component's declaration sets already are not repeated.
 void VhdlNetlister::Writer::WriteInstanceAttrAssignment(const Instance& instance) {
     for (Attribute* attribute : instance.GetAttrIterator()) {
         if (attribute->GetSynAttrOption() == Attribute::SynAttrNone) {
@@ -373,7 +372,7 @@ void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
     }
 }
 
-/// Writes nothing when the digits of the constant are not the bits of the signal.
+/// Writes nothing if the digits of the constant are not the bits of the signal.
 void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
     const string_view digits = value.GetValue();
@@ -395,7 +394,8 @@ void VhdlNetlister::Writer::WriteAlias(const Signal& signal, const Signal& alias
     if (IsAliasedByBits(signal) || IsAliasedByBits(alias)) {
         const std::optional<std::int64_t> count = SignalBits::Count(signal);
         const std::optional<std::int64_t> aliasCount = SignalBits::Count(alias);
-        // What is listed stands in memory, so the narrower side may not be too wide either.
+        // The names of the bits are held in memory, so the narrower side must not be too wide
+        // either.
         const std::int64_t narrower = std::min(count.value_or(0), aliasCount.value_or(0));
         if (count && aliasCount && narrower <= Names::MostExpandedBits) {
             WriteAliasBits(GetBitNames(signal, narrower), GetBitNames(alias, narrower));

@@ -17,7 +17,7 @@ using namespace std::literals::string_view_literals;
 
 namespace {
 
-/// The mode of a port, padded so that the types of several ports line up.
+/// The mode of a port, padded so that the types of the ports are aligned.
 string_view Mode(const Polarity& polarity) {
     switch (polarity.GetValue()) {
     case Polarity::Input:
@@ -35,7 +35,7 @@ void WriteLines(OutStream& out, string_view keyword, const StringArray& items) {
     }
 }
 
-/// Writes a bit string literal; its base is left out of a value without base and length.
+/// Writes a bit string literal, without a base specifier if the value has no base and length.
 void WriteBitString(const BitVectorValue& value, OutStream& out) {
     if (value.HasBaseAndLength()) {
         Put(out, GetBaseLetter(Language::Vhdl, value.GetBase()));
@@ -109,7 +109,7 @@ void VhdlStatements::WriteComment(const Object* object) {
     }
 }
 
-/// A name, a blank, and blanks up to the column's width.
+/// Writes a name and at least one blank, padded to the width of the column.
 void VhdlStatements::WritePadded(string_view name, int width) {
     Put(out_, name, " ");
     if (width > 0 && static_cast<std::size_t>(width) > name.size()) {

@@ -23,7 +23,7 @@ void WritePortAssignmentVisitor::WritePin(const Pin& pin) {
     }
 }
 
-/// A formal of one bit is that bit, not a range of one.
+/// A formal of one bit is written as a bit, not as a range.
 void WritePortAssignmentVisitor::SetFormal(string_view name) {
     Names::BusName bus;
     const bool isBus = Names::ParseBus(name, bus);
@@ -35,7 +35,7 @@ void WritePortAssignmentVisitor::SetFormal(string_view name) {
     }
 }
 
-/// Makes a piece of a formal the formal; only a range can be cut.
+/// Replaces the formal by a slice of it; only a formal with a range can be sliced.
 void WritePortAssignmentVisitor::SetFormalPiece(const std::string& formal, int start, int count) {
     if (Bus::IsBusName(formal.c_str())) {
         SetFormal(Bus::GetBusSliceName(formal.c_str(), start, count));
@@ -113,7 +113,7 @@ void WritePortAssignmentVisitor::VisitCompoundBus(CompoundBus* compound) {
     }
 }
 
-/// \return false, nothing written, when the slice cannot be expanded.
+/// \return false, without writing anything, if the slice cannot be expanded.
 bool WritePortAssignmentVisitor::WriteBitByBit(string_view slice) {
     Names::BusName range;
     if (!Names::ParseBus(slice, range) || !range.IsExpandable()) {

@@ -11,17 +11,17 @@
 
 namespace Orn_Hdl {
 
-/// Writes one association or several for each pin. VHDL knows no concatenation and no slice against
-/// its bus as an actual, so these are wired in pieces, the pin's name, the formal, being cut to
-/// match.
+/// Writes one or more associations for each pin. In VHDL, neither a concatenation nor a slice
+/// against its bus can be an actual, so these are associated piece by piece with slices of the
+/// formal, the pin's name.
 class WritePortAssignmentVisitor : public SignalVisitor {
 public:
-    /// \param separator what stands between two associations; not owned.
+    /// \param separator written between two associations; not owned.
     WritePortAssignmentVisitor(std::string_view separator, VhdlStatements& statements,
                                OutStream& out) noexcept
         : separator_(separator), statements_(statements), out_(out) {}
 
-    /// Begins another port map: no separator stands before its first association.
+    /// Begins another port map, whose first association has no separator before it.
     void BeginPortMap() noexcept { pending_ = std::string_view(); }
     /// Writes the associations of a pin, which may be open.
     void WritePin(const Pin& pin);

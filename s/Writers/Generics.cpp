@@ -14,15 +14,15 @@ Attribute* FindInitIn(const PtrArray<Attribute*>& attributes) {
 }
 
 /// \{
-/// The marks, in any place of its name, of a netlist that stands for a cell of the HALVEX library
-/// and is made of such cells. INIT is the contents of such a cell, so whoever places the netlist
-/// says what the cells in it hold.
+/// Marks in the name of a netlist that models a cell of the HALVEX library and consists of such
+/// cells. INIT is the contents of such a cell: the netlist gets it as a parameter or generic and
+/// passes it on to the cells inside.
 constexpr std::string_view MacroMark = "MHALVEX";
 constexpr std::string_view VerilogMacroMark = "HHALVEX";
 /// \}
 
-/// The second mark counts in Verilog alone. Nothing in the languages asks for that: netlists have
-/// always been written so, and their bytes are kept.
+/// The second mark is only used in Verilog. The languages do not require that: it keeps the bytes
+/// of existing netlists.
 bool HasInitMark(Language language, std::string_view name) {
     return name.find(MacroMark) != std::string_view::npos ||
            (language == Language::Verilog && name.find(VerilogMacroMark) != std::string_view::npos);

@@ -18,17 +18,17 @@ struct GenericAttrs {
     explicit GenericAttrs(const Iterator<Attribute*>& attributes) { Split(attributes); }
 
     bool IsEmpty() const noexcept { return syn.IsEmpty() && nosyn.IsEmpty(); }
-    /// Replaces both lists by those of `attributes`.
+    /// Replaces both lists by the attributes in `attributes`.
     void Split(const Iterator<Attribute*>& attributes);
-    /// The first attribute named exactly "INIT", a "SYN" one before a "NOSYN" one; null without
-    /// one.
+    /// The first attribute named exactly "INIT", where "SYN" takes precedence over "NOSYN"; null if
+    /// there is none.
     Attribute* FindInit() const;
 };
 
 using Orn_Hdl::GetEffectiveAttrs;
 
-/// Whether the instances in the netlist are given the module's own parameter or generic INIT in
-/// place of values of their own: the netlist has one, and its name has a mark of the language.
+/// Whether the instances in the netlist get the module's own parameter or generic INIT instead of
+/// their own values: the netlist has such an attribute, and its name has a mark of the language.
 bool PassesInit(Language language, const Netlist& netlist);
 
 } // namespace Orn_Hdl::Writers

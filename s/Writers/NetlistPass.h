@@ -1,4 +1,4 @@
-// What the writers of all languages do alike.
+// The common part of the writers of all languages.
 #pragma once
 
 #include "Orn_Hdl/Language.h"
@@ -27,18 +27,18 @@ protected:
 
     /// Sorts the netlist and makes the dummy signals that it needs.
     void Prepare();
-    /// Writes the header, when the options ask for it, and the netlist's comment.
+    /// Writes the header, if the options ask for it, and the netlist's comment.
     void WriteOpening();
-    /// Writes what `write` writes between two comments that hide it from synthesis.
+    /// Calls `write` between two comments that hide its output from synthesis.
     template <class Write> void WriteHidden(const Write& write);
-    /// Lets `writeConstant` write each signal that has a constant, then `writeAlias` each signal
-    /// with each of its aliases.
+    /// Calls `writeConstant` for each signal that has a constant, then `writeAlias` for each signal
+    /// and each of its aliases.
     template <class WriteConstant, class WriteAlias>
     void WriteAssignments(const SignalLists& signals, const WriteConstant& writeConstant,
                           const WriteAlias& writeAlias) const;
     template <class Write> void ForEachInstance(const Write& write) const;
-    /// The attribute INIT of an instance that gets its value from the module's own INIT; null when
-    /// there is none, or when this netlist passes none down.
+    /// The attribute INIT of an instance whose value is the module's own INIT; null if there is
+    /// none, or if this netlist does not pass it on.
     Attribute* FindPassedInit(const GenericAttrs& attributes) const;
 
     OutStream& out_;
@@ -69,8 +69,8 @@ void NetlistPass::WriteAssignments(const SignalLists& signals, const WriteConsta
     }
 }
 
-/// The signals of the pins are spread over the memory of a large design. They are asked for a few
-/// instances ahead, since waiting for them takes a seventh of the time of a Verilog write.
+/// The signals of the pins are spread over the memory of a large design. They are prefetched a few
+/// instances ahead, because waiting for them takes a seventh of the time of a Verilog write.
 template <class Write> void NetlistPass::ForEachInstance(const Write& write) const {
     constexpr int lead = 4;
     Iterator<Instance*> ahead = netlist_.GetInstanceIterator();

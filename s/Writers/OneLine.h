@@ -1,4 +1,4 @@
-// Keeps texts from ending the line in which they stand.
+// Texts without line ends.
 #pragma once
 
 #include <algorithm>
@@ -7,13 +7,13 @@
 
 namespace Orn_Hdl::Writers {
 
-/// A text for the rest of a comment or for a literal, which a line end would let it leave: whatever
-/// ends a line in one of the languages (IEEE 1076-2008, 15.3) becomes a blank. A text without any,
-/// as nearly all are, is not copied.
+/// A text for a comment or a literal, which must not contain a line end: each character that ends a
+/// line in one of the languages (IEEE 1076-2008, 15.3) becomes a blank. A text without line ends,
+/// the usual case, is not copied.
 class OneLine {
 public:
-    /// \param text must outlive this.
-    /// \param instead what stands in the place of a line end.
+    /// \param text must outlive this object.
+    /// \param instead replaces a line end.
     explicit OneLine(std::string_view text, char instead = ' ') : view_(text) {
         if (std::any_of(text.begin(), text.end(), EndsLine)) {
             changed_ = text;

@@ -1,4 +1,4 @@
-// Which signals a writer has something to write for.
+// The signals that a writer declares or assigns.
 #pragma once
 
 #include "Orn_Hdl/Language.h"
@@ -9,25 +9,25 @@
 
 namespace Orn_Hdl::Writers {
 
-/// The signals that are declared or assigned, gathered in one walk, each list in the netlist's
-/// order.
+/// The signals that are declared or assigned, collected in one walk, each list in the order of the
+/// netlist.
 struct SignalLists {
-    /// \param language the signals that it cannot write are left out.
+    /// \param language signals that cannot be written in it are omitted.
     SignalLists(const Netlist& netlist, Language language);
 
     std::vector<Signal*> ports;
-    /// Declared, but no ports.
+    /// The declared signals that are not ports.
     std::vector<Signal*> internals;
     std::vector<Signal*> constants;
-    /// Each is assigned each signal of its own list.
+    /// The signals with aliases; each alias is assigned to its signal.
     std::vector<Signal*> aliased;
 };
 
-/// Whether a signal of that name can be written: it needs a name, and in VHDL another one than the
+/// Whether a signal of that name can be written: the name must not be empty and, in VHDL, not the
 /// reserved word "open".
 bool IsWritable(Language language, std::string_view name);
 
-/// Whether a slice of more than one bit counts the other way than the bus that it is a part of.
+/// Whether a slice of more than one bit is against its bus: one range descends, the other ascends.
 bool RunsAgainstParent(const Signal& signal);
 
 } // namespace Orn_Hdl::Writers

@@ -1,4 +1,4 @@
-// What both writers do with names and plain text.
+// Names and plain text, for both writers.
 #pragma once
 
 #include "HdlModel/Names/Names.h"
@@ -13,22 +13,22 @@
 
 namespace Orn_Hdl::Writers {
 
-/// Whether a signal of that name stands for no signal at all: the empty name and "open".
+/// Whether a name means no signal: the empty name and "open".
 inline bool IsOpen(std::string_view name) noexcept {
     return name.empty() || Names::IsNamed(name, "open");
 }
 
-/// As `Pin::GetBaseName`, without a copy.
+/// The base name of a pin (`Pin::GetBaseName`) without a copy.
 std::string_view GetBaseName(const Pin& pin);
 
 /// The text of an attribute's value without the quotes around it, on one line.
 Port::String GetUnquotedValue(const Attribute& attribute);
 
-/// Writes the text of an attribute's value, on one line, between double quotes in place of those
-/// that it may have.
+/// Writes the text of an attribute's value on one line and in double quotes, which replace the
+/// quotes around the value, if any.
 void WriteQuotedValue(OutStream& out, const Attribute& attribute);
 
-/// The bit that a constant gives to a signal of one bit: only a last digit 0 gives "0".
+/// The value of a constant for a signal of one bit: "0" if the last digit is 0, otherwise "1".
 std::string_view GetSingleBit(const BitVectorValue& value);
 
 inline std::string_view ToPiece(std::string_view text) {
@@ -40,31 +40,30 @@ inline std::string_view ToPiece(const char* text) {
 inline std::string ToPiece(int number) {
     return std::to_string(number);
 }
-/// Writes texts and numbers, each as a piece of its own: lines are broken between pieces only.
+/// Writes texts and numbers as separate pieces: lines are only broken between pieces.
 template <class... Pieces> void Put(OutStream& out, const Pieces&... pieces) {
     out.WritePieces({ToPiece(pieces)...});
 }
-/// The same, and the end of the line.
+/// Writes texts and numbers as separate pieces, and a line end.
 template <class... Pieces> void PutLine(OutStream& out, const Pieces&... pieces) {
     out.WritePieces({ToPiece(pieces)...});
     out << OutStream::NewLine;
 }
 
-/// Writes blanks as one piece of text, which no line break divides.
+/// Writes blanks as one piece of text, which is never broken.
 void WriteBlanks(OutStream& out, std::size_t count);
 
 /// A text as one line of comment.
 std::string InComment(Language language, std::string_view text);
 
-/// Writes what `write` writes between two comments that hide it from synthesis.
+/// Calls `write` between two comments that hide its output from synthesis.
 template <class Write> void WriteHidden(OutStream& out, Language language, const Write& write) {
     PutLine(out, InComment(language, "synopsys translate_off"));
     write();
     PutLine(out, InComment(language, "synopsys translate_on"));
 }
 
-/// Writes each line of the object's comment as a line of comment; lines without any text are left
-/// out.
+/// Writes each line of the object's comment as a comment line; empty lines are omitted.
 void WriteComment(OutStream& out, Language language, const Object& object);
 
 } // namespace Orn_Hdl::Writers

@@ -163,7 +163,7 @@ class Bash(unittest.TestCase):
         self.assertEqual(self.complete("help", "dr"), ["draw"])
 
     def test_every_option_of_every_command(self) -> None:
-        for command in ("run", "import", "draw", "commands"):
+        for command in ("run", "import", "check", "draw", "commands"):
             with self.subTest(command):
                 self.assertEqual(self.complete(command, "-"), options_of(command))
 
@@ -199,7 +199,7 @@ class Zsh(unittest.TestCase):
 
     def test_every_option_of_every_command(self) -> None:
         script = (SHARE / "zsh" / "_orn-hdl").read_text()
-        for command in ("run", "import", "draw", "commands"):
+        for command in ("run", "import", "check", "draw", "commands"):
             branch = re.search(rf"^ +{command}\) _arguments(.*?);;$", script, re.M | re.S)[1]
             named = sorted(re.findall(r"'(?:\(.*?\))?(--?[\w-]+)\[", branch))
             with self.subTest(command):

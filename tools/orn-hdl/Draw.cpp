@@ -25,11 +25,10 @@ namespace Tool {
 
 namespace {
 
-/// Graphviz takes minutes for more.
+/// Graphviz needs minutes for more.
 constexpr std::size_t MostBoxes = 5000;
 
-/// Takes the place of the write commands: `draw` must not write the files that the command file
-/// names.
+/// Replaces the WRITE commands: `draw` must not write the files that the command file names.
 class NoWriteCommand final : public Orn_Hdl::Command {
 public:
     using Command::Command;
@@ -44,7 +43,7 @@ public:
 
 using CFile = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
 
-/// A temporary file without a name that contains a text, at whose start the next read begins.
+/// An unnamed temporary file that contains a text, positioned at its start.
 CFile MakeTemporaryFile(std::string_view text) {
     CFile file(std::tmpfile(), &std::fclose);
     if (file != nullptr &&
@@ -55,7 +54,7 @@ CFile MakeTemporaryFile(std::string_view text) {
     return file;
 }
 
-/// Starts dot. \return the system's error number.
+/// Starts dot. \return 0, or the system's error number.
 int StartDot(int input, int output, pid_t& process) {
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
@@ -70,7 +69,7 @@ int StartDot(int input, int output, pid_t& process) {
     return error;
 }
 
-/// Has Graphviz draw a graph. \param picture gets the text of the picture.
+/// Draws a graph with Graphviz. \param picture receives the text of the picture.
 Status RunDot(std::string_view graph, std::string& picture) {
     const CFile input = MakeTemporaryFile(graph);
     const CFile output = MakeTemporaryFile("");

@@ -8,13 +8,13 @@
 namespace Tool {
 
 struct DrawOptions {
-    /// The command file; "-" is standard input. Its WRITE lines write nothing.
+    /// The command file; "-" is standard input. Its WRITE commands write nothing.
     std::string file;
     /// The SVG file to write.
     std::string output;
-    /// The instance, port or signal whose neighbourhood is drawn; empty for the whole design.
+    /// The instance, port or signal whose surroundings are drawn; empty for the whole design.
     std::string around;
-    /// How many instances the neighbourhood reaches away.
+    /// The distance, in instances, of the outermost drawn instances.
     int depth = 1;
 };
 

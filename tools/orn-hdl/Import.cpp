@@ -25,8 +25,8 @@ namespace {
 
 using namespace Import;
 
-/// Room after the text for the padding that the JSON parser needs; without it the text would be
-/// copied.
+/// Room for the padding that the JSON parser needs behind the text; without it the parser would
+/// copy the text.
 constexpr std::size_t Margin = 4096;
 
 Status ReadFile(const std::string& name, std::string& text) {
@@ -69,7 +69,8 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     return WriteOutputs(model, options.outputs, progress);
 }
 
-/// The command file and the name map take their places last, and only when all files are written.
+/// Writes all files. The command file and the name map are replaced last, and only if every file
+/// was written.
 Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
     OutputFile commands(options.commandFile);
     if (Port::Stream* out = commands.GetStream()) {

@@ -1,4 +1,4 @@
-// `orn-hdl import`: a design in Yosys' JSON form becomes a command file or a netlist.
+// `orn-hdl import`: converts a JSON netlist written by Yosys to a command file or a netlist.
 #pragma once
 
 #include "Output.h"
@@ -16,15 +16,15 @@ struct ImportOptions {
     /// The command file to write; empty for none.
     std::string commandFile;
     Outputs outputs;
-    /// What the values x and z become, "0" or "1"; empty to refuse them.
+    /// The replacement of x and z, "0" or "1"; empty to reject them.
     std::string unknownAs;
-    /// Take over the attributes of cells and nets.
+    /// Import the attributes of cells and nets.
     bool attributes = false;
-    /// Where the table of old and new names goes; empty for nowhere.
+    /// The file for the table of old and new names; empty for none.
     std::string nameMap;
 };
 
-/// Without any output the file is only checked.
+/// Imports a file. If no output is given, the file is only checked.
 Status ImportDesign(const ImportOptions& options);
 
 } // namespace Tool

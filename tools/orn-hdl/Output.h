@@ -1,4 +1,4 @@
-// Writing the files that the user asked for on the command line.
+// The output files named on the command line.
 #pragma once
 
 #include "Orn_Hdl/Language.h"
@@ -19,7 +19,7 @@ class Progress;
 
 /// The netlists to write.
 struct Outputs {
-    /// The file of each language. An empty name writes none.
+    /// The file of each language; "-" is standard output, and an empty name writes none.
     std::map<Orn_Hdl::Language, std::string> files;
     bool noHeader = false;
 
@@ -27,18 +27,18 @@ struct Outputs {
     bool IsEmpty() const;
 };
 
-/// A text file to be written as a whole: its name stands for what it stood for before until
-/// `Commit`, and without one for ever. Without a name there is no file, and nothing fails.
+/// A text file that is written as a whole: an existing file does not change before `Commit`. If the
+/// name is empty, there is no file, and nothing fails.
 class OutputFile {
 public:
-    /// Complains when the file cannot be written.
+    /// Prints a message if the file cannot be written.
     explicit OutputFile(const std::string& name);
 
-    /// Where the text goes; null when there is no file, or none that can be written.
+    /// The stream to write to; null if there is no file or it cannot be written.
     Port::Stream* GetStream() noexcept { return stream_ ? &*stream_ : nullptr; }
-    /// Writes what is left to be written, and complains when anything of the text got lost.
+    /// Writes the buffered text, and prints a message if any of the text was lost.
     Status Flush();
-    /// Puts the file in its place, and complains when that fails.
+    /// Replaces the named file, and prints a message if that fails.
     Status Commit();
 
 private:
@@ -50,8 +50,8 @@ private:
     Status status_ = Status::Success;
 };
 
-/// Writes the netlists in the order of their languages, and complains of those that did not reach
-/// their file.
+/// Writes the netlists in the order of their languages, and prints a message for each that could
+/// not be written.
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress);
 
 } // namespace Tool

@@ -14,7 +14,7 @@ namespace {
 constexpr std::chrono::milliseconds Patience(1000);
 constexpr std::chrono::milliseconds Refresh(100);
 
-/// 0 when it is not known, as that of a pipe.
+/// The size of a file; 0 if it is unknown, as for a pipe.
 std::uint64_t GetFileSize(const std::string& file) noexcept {
     std::error_code error;
     const std::uintmax_t size = std::filesystem::file_size(file, error);

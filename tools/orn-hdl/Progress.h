@@ -1,4 +1,4 @@
-// The line on the terminal that shows how far a long replay has come.
+// The progress line of a long replay.
 #pragma once
 
 #include <chrono>
@@ -38,7 +38,7 @@ private:
     bool IsDue();
     void Show(const std::string& text);
 
-    /// Null when nothing is shown.
+    /// Null if nothing is shown.
     std::FILE* const terminal_;
     const std::uint64_t totalBytes_;
     const std::function<Clock::time_point()> now_;

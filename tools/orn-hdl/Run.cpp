@@ -3,6 +3,7 @@
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Progress.h"
+#include "check/WriteGate.h"
 
 #include <cstdint>
 #include <string_view>
@@ -13,24 +14,28 @@ namespace Tool {
 
 namespace {
 
-/// How many lines are replayed between two looks at the clock.
+/// The number of lines between two readings of the clock.
 constexpr std::uint64_t LinesPerUpdate = 4096;
 
-/// What the model is called when the commands come from standard input and name nothing.
+/// The name of the model if the commands come from standard input and do not name it.
 constexpr const char* NamelessModel = "HDL_NETLIST";
 
-/// The replay of one file: what is told of its lines, and what became of them.
+/// The replay of one file: its progress, messages and status.
 class Replayer {
 public:
-    Replayer(Orn_Hdl::Model& model, const std::string& file, Progress& progress)
-        : model_(model), file_(file), progress_(progress) {}
+    Replayer(Orn_Hdl::Model& model, const std::string& file, Progress& progress,
+             Checking::WriteGate* gate)
+        : model_(model), file_(file), progress_(progress), gate_(gate) {}
 
-    /// Carries out one line; `position` is where it ends in the file. \return whether all went
-    /// well.
+    /// Executes one line, which ends at `position` in the file. \return whether it succeeded.
     bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
         ++lines_;
         if (lines_ % LinesPerUpdate == 0) {
             progress_.Update(lines_, position);
+        }
+        if (gate_ != nullptr && !gate_->Allows(words, lines_)) {
+            status_ = Worse(status_, Status::Failed);
+            return false;
         }
         try {
             model_.Execute(words);
@@ -43,6 +48,7 @@ public:
     }
 
     Status GetStatus() const noexcept { return status_; }
+    std::uint64_t GetLineCount() const noexcept { return lines_; }
 
 private:
     static std::string_view WithoutLineEnd(std::string_view text) noexcept {
@@ -69,7 +75,7 @@ private:
         }
         Report(text);
         status_ = Status::File;
-        // Told once: the model remembers its last write until the next one.
+        // The model keeps the error of its last write. Clear it, so that it is reported once.
         model_.RecordWrite("", 0);
         return false;
     }
@@ -77,63 +83,73 @@ private:
     Orn_Hdl::Model& model_;
     const std::string& file_;
     Progress& progress_;
+    Checking::WriteGate* const gate_;
     std::uint64_t lines_ = 0;
     Status status_ = Status::Success;
 };
 
-std::string GetModelName(const RunOptions& options) {
-    if (options.model) {
-        return *options.model;
-    }
-    if (options.file == "-") {
-        return NamelessModel;
-    }
-    return std::string(Port::FileName(options.file.c_str()).GetStem().GetView());
-}
-
 } // namespace
 
+std::string GetModelName(const std::string& file, const std::optional<std::string>& asked) {
+    if (asked) {
+        return *asked;
+    }
+    if (file == "-") {
+        return NamelessModel;
+    }
+    return std::string(Port::FileName(file.c_str()).GetStem().GetView());
+}
+
 Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
-                const WriteRules& rules) {
+                const WriteRules& rules, Checking::WriteGate* gate) {
     Orn_Hdl::CommandReader input(model);
     if (!input.Open(SystemFileName(file.c_str()))) {
-        return {ComplainUnreadable(file, input.GetError()), false};
+        return {ComplainUnreadable(file, input.GetError()), false, 0};
     }
     std::optional<RulesInForce> inForce;
     try {
         inForce.emplace(model, rules);
     } catch (const std::system_error& error) {
-        return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false};
+        return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false, 0};
     }
-    Replayer replayer(model, file, progress);
+    Replayer replayer(model, file, progress, gate);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
         if (!replayer.Execute(*words, input.GetPosition()) && !keepGoing) {
-            return {replayer.GetStatus(), false};
+            return {replayer.GetStatus(), false, 0};
         }
     }
     if (input.GetError() != 0) {
         progress.Erase();
-        return {ComplainUnreadable(file, input.GetError()), false};
+        return {ComplainUnreadable(file, input.GetError()), false, 0};
     }
-    return {replayer.GetStatus(), true};
+    return {replayer.GetStatus(), true, replayer.GetLineCount()};
 }
 
 Status Run(const RunOptions& options) {
     Progress progress(options.quiet, options.file);
-    // The design stands until the process ends, which gives its memory back at once: object by
-    // object that takes a tenth of the time of the whole run.
+    // The design is not destroyed before the process ends: freeing it object by object would take a
+    // tenth of the time of the whole run.
     static Orn_Hdl::Engine* engine = nullptr;
-    delete std::exchange(engine, nullptr); // An earlier run's.
+    delete std::exchange(engine, nullptr); // From an earlier run.
     engine = new Orn_Hdl::Engine;
-    const std::string name = GetModelName(options);
+    const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
     Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
-    const Replayed replayed =
-        Replay(model, options.file, options.keepGoing, progress, options.writeRules);
+    Checking::WriteGate gate(model, options.file);
+    const Replayed replayed = Replay(model, options.file, options.keepGoing, progress,
+                                     options.writeRules, options.check ? &gate : nullptr);
     if (!replayed.complete) {
         return replayed.status;
     }
-    return Worse(replayed.status, WriteOutputs(model, options.outputs, progress));
+    Outputs outputs = options.outputs;
+    Status status = replayed.status;
+    for (auto& [language, file] : outputs.files) {
+        if (options.check && !file.empty() && !gate.Allows(language, replayed.lines)) {
+            file.clear();
+            status = Worse(status, Status::Failed);
+        }
+    }
+    return Worse(status, WriteOutputs(model, outputs, progress));
 }
 
 } // namespace Tool

@@ -1,10 +1,11 @@
-// `orn-hdl run`: replays a command file and writes the netlists asked for.
+// `orn-hdl run`: replays a command file and writes netlists.
 #pragma once
 
 #include "Output.h"
 #include "Tool.h"
 #include "WriteRules.h"
 
+#include <cstdint>
 #include <optional>
 #include <string>
 
@@ -16,30 +17,43 @@ namespace Tool {
 
 class Progress;
 
+namespace Checking {
+class WriteGate;
+}
+
 struct RunOptions {
     /// The command file; "-" is standard input.
     std::string file;
-    /// The name of the model; without one, the file's name without folder and extension.
+    /// The name of the model; the default is the file's name without folder and extension.
     std::optional<std::string> model;
     Outputs outputs;
     WriteRules writeRules;
-    /// Go on behind a line that failed.
+    /// Continue after an error.
     bool keepGoing = false;
     bool quiet = false;
+    /// Write nothing that has errors for its language.
+    bool check = false;
 };
 
 Status Run(const RunOptions& options);
 
-/// What became of a replay.
+/// The name of a command file's model: the one asked for, or else the file's name without folder
+/// and extension.
+std::string GetModelName(const std::string& file, const std::optional<std::string>& asked);
+
+/// The result of a replay.
 struct Replayed {
     Status status = Status::Success;
     /// Whether the replay reached the end of the file.
     bool complete = false;
+    /// How many lines were replayed.
+    std::uint64_t lines = 0;
 };
 
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
-/// not write, is reported with its place; unless told to keep going, the replay ends there.
+/// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
+/// \param gate decides which lines may write; null when all may.
 Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
-                const WriteRules& rules = {});
+                const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr);
 
 } // namespace Tool

@@ -23,7 +23,7 @@ Status ComplainAbout(std::string_view what, std::string_view file, int error) {
 void PrintError(std::string_view line) {
     std::string text(line);
     text += '\n';
-    // In one piece, so that the lines of programs that share a terminal do not mix.
+    // In one call, so that the lines of programs that share a terminal are not mixed.
     std::fwrite(text.data(), 1, text.size(), stderr);
 }
 

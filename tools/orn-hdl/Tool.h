@@ -5,7 +5,7 @@
 
 namespace Tool {
 
-/// The exit status of the tool. Of several failures the greatest status counts.
+/// The exit status of the tool; after several failures, the greatest one.
 enum class Status {
     Success = 0,
     /// A command failed, or the contents of a file are invalid.
@@ -28,10 +28,10 @@ Status ComplainUnreadable(std::string_view file, int error);
 /// Reports that a file cannot be written. \param error the system's error number.
 Status ComplainUnwritable(std::string_view file, int error);
 
-/// Prints a text on standard output, and reports a failure to do so.
+/// Prints a text on standard output, or a message if that fails.
 Status Print(std::string_view text);
 
-/// The name to open for a file that the user named: "-" is standard input.
+/// The name to open for an input file on the command line: "-" is standard input.
 const char* SystemFileName(const char* file) noexcept;
 
 } // namespace Tool

@@ -14,7 +14,7 @@ namespace {
 
 constexpr const char* Outside = "it leads out of the output folder";
 
-/// Refuses every file.
+/// Rejects every file.
 class NothingMayBeWritten : public Orn_Hdl::OutputGuard {
 public:
     Port::StringBase<char> WhyNot(const char* /*fileName*/) override {
@@ -22,7 +22,7 @@ public:
     }
 };
 
-/// Keeps what is written below one folder, which is the current one as long as this lives.
+/// Confines output to one folder, which is the current folder during the lifetime of this object.
 class OutputFolder : public Orn_Hdl::OutputGuard {
 public:
     explicit OutputFolder(const fs::path& folder) : former_(fs::current_path()) {
@@ -51,8 +51,8 @@ private:
                folder_.end();
     }
 
-    /// Allows the file at a path without links and "..". It is opened by that path below the open
-    /// folder: a link that someone puts there after the check is not followed.
+    /// Allows the file at a path without links and "..". The file is opened by that path below the
+    /// open folder: a link that is created there after the check is not followed.
     Port::StringBase<char> Allow(const fs::path& path) {
         allowed_ = path.string();
         return "";
@@ -73,7 +73,7 @@ Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
     std::error_code error;
     const fs::path parent = fs::canonical(folder_ / name.parent_path(), error);
     if (error) {
-        // There is no such folder. Opening the file fails with the reason.
+        // There is no such folder. Opening the file will fail and report the reason.
         return Allow(name);
     }
     if (!Holds(parent)) {
@@ -85,7 +85,7 @@ Port::StringBase<char> OutputFolder::WhyNot(const char* fileName) {
     case fs::file_type::directory:
         return Allow(parent.lexically_relative(folder_) / name.filename());
     case fs::file_type::symlink: {
-        // A link that leads nowhere yet would make the file to which it leads.
+        // Writing through a link without a target would create the target.
         const fs::path target = fs::canonical(name, error);
         return !error && Holds(target) && fs::is_regular_file(target, error)
                    ? Allow(target.lexically_relative(folder_))

@@ -1,4 +1,4 @@
-// Limits what the WRITE lines of a command file may write, for command files that are not trusted.
+// Restricts the files that WRITE commands may write, for command files that are not trusted.
 #pragma once
 
 #include "Orn_Hdl/Model.h"
@@ -9,19 +9,19 @@
 
 namespace Tool {
 
-/// The rules, as the command line states them.
+/// The rules given on the command line.
 struct WriteRules {
-    /// The only folder below which files may be written, and in which their names begin.
+    /// The only folder below which files may be written; file names are relative to it.
     std::optional<std::string> folder;
     /// Nothing may be written.
     bool noWrite = false;
 };
 
-/// Keeps a model to the rules until it is destroyed. A folder of the rules is the current folder
-/// until then.
+/// Applies the rules to a model until this object is destroyed. A folder of the rules is the
+/// current folder until then.
 class RulesInForce {
 public:
-    /// \throws std::system_error when the folder cannot be entered.
+    /// \throws std::system_error if the folder cannot be entered.
     RulesInForce(Orn_Hdl::Model& model, const WriteRules& rules);
     RulesInForce(const RulesInForce&) = delete;
     RulesInForce& operator=(const RulesInForce&) = delete;

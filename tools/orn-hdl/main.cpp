@@ -6,6 +6,7 @@
 #include "Nearest.h"
 #include "Run.h"
 #include "Tool.h"
+#include "check/Check.h"
 
 #include "Orn_Hdl/Language.h"
 #include "Port/String.h"
@@ -16,6 +17,7 @@
 #include <algorithm>
 #include <exception>
 #include <functional>
+#include <map>
 #include <new>
 #include <sstream>
 #include <string>
@@ -73,6 +75,7 @@ public:
             "Print the version and exit");
         AddRun();
         AddImport();
+        AddCheck();
         AddDraw();
         AddCommands();
         app_.footer("\"orn-hdl help COMMAND\" prints the help of a command.");
@@ -103,7 +106,7 @@ private:
                                    GetCommandNames());
         }
         try {
-            // It takes the last word as the first.
+            // CLI11 expects the words in reverse order.
             app_.parse(std::vector<std::string>(words.rbegin(), words.rend()));
         } catch (const CLI::ParseError& error) {
             return Report(error, words);
@@ -130,7 +133,7 @@ private:
         return Status::Usage;
     }
 
-    /// Complains of a word that is none of the candidates, and suggests the one that is meant.
+    /// Prints a message about a word that is none of the candidates, with a suggestion.
     static Status ComplainUnknown(const std::string& complaint, const std::string& word,
                                   const std::vector<std::string>& candidates) {
         const std::string meant = Tool::GetNearest(word, candidates);
@@ -189,6 +192,7 @@ private:
         AddOutputs(command, run_.outputs);
         AddWriteRules(command, run_.writeRules);
         command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
+        command.add_flag("--check", run_.check, "Write nothing that has errors for its language");
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
 
@@ -206,6 +210,30 @@ private:
                          "Import the attributes of cells and nets");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         command.footer("If no output is given, the file is only checked.");
+    }
+
+    void AddCheck() {
+        CLI::App& command =
+            AddCommand("check", "Tell what tools make of the netlists of a command file",
+                       [this] { return Tool::CheckFiles(check_); });
+        command.add_option("FILE", check_.files, "The command files; - is standard input")
+            ->type_name("")
+            ->check(CheckFileName);
+        command.add_option("--model", check_.model, "The name of the design")->type_name("NAME");
+        command
+            .add_option("--target", check_.targets, "Whose rules count, with commas between them")
+            ->type_name("TARGETS");
+        command.add_option("--fail-on", check_.failOn, "What makes the exit status 1")
+            ->check(CLI::IsMember({"error", "warning", "never"}));
+        command.add_option("--format", check_.format, "How the findings are printed")
+            ->transform(CLI::CheckedTransformer(
+                std::map<std::string, Tool::CheckFormat>{{"text", Tool::CheckFormat::Text},
+                                                         {"json", Tool::CheckFormat::Json},
+                                                         {"sarif", Tool::CheckFormat::Sarif}}))
+            ->type_name("text|json|sarif");
+        command.add_flag("--list", check_.list, "List the rules");
+        command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
+        command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
     }
 
     void AddDraw() {
@@ -243,6 +271,7 @@ private:
     Tool::RunOptions run_;
     Tool::ImportOptions import_;
     Tool::DrawOptions draw_;
+    Tool::CheckOptions check_;
     std::vector<std::string> words_;
     bool markdown_ = false;
 };

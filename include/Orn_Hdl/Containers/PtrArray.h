@@ -14,8 +14,8 @@ namespace Orn_Hdl {
 struct Reordering;
 
 /// An ordered sequence of untyped pointers. It never deletes what they point at; nulls may be
-/// stored. Made small, since every signal and every instance holds one: an empty array owns no
-/// memory, and growth from empty begins with three places, what most nets need.
+/// stored. The array is small because every signal and every instance has one: an empty array owns
+/// no memory, and growth starts with room for three elements, enough for most nets.
 class ORN_HDL_API PtrArrayBase {
 public:
     /// Whether `a` comes before `b`; `context` is the caller's.
@@ -23,12 +23,13 @@ public:
 
     /// An empty array.
     PtrArrayBase() noexcept : size_(0), isOwner_(0), capacity_(0), ownsItems_(0) {}
-    /// Holds the same pointers in the same order; of an owner's elements the copy owns none.
+    /// Holds the same pointers in the same order. A copy of an owning array owns nothing.
     PtrArrayBase(const PtrArrayBase& other);
-    /// Holds the same pointers in the same order. An owner takes what it is assigned and lets go of
-    /// what it had, but for another owner's elements: then nothing changes.
+    /// Holds the same pointers in the same order. An owning array takes ownership of the new
+    /// elements and releases the former ones. Assigning an owning array to another one changes
+    /// nothing.
     PtrArrayBase& operator=(const PtrArrayBase& other);
-    /// Leaves what the elements point at alone.
+    /// Does not delete what the elements point at.
     virtual ~PtrArrayBase();
 
     /// The number of elements, nulls included.
@@ -45,17 +46,16 @@ public:
     int GetIndex(const void* p) const noexcept;
     /// Whether an element is equal to `p`.
     bool Contains(const void* p) const noexcept { return GetIndex(p) >= 0; }
-    /// Makes room for `capacity` elements in all, so that none of them takes memory when it is
-    /// added.
+    /// Makes room for `capacity` elements in all, so that adding them allocates nothing.
     void Reserve(int capacity);
-    /// Appends; a pointer that an owner holds already is ignored.
+    /// Appends; a pointer that an owning array already holds is ignored.
     /// \return the index of the element.
     int Add(void* p) { return isOwner_ != 0 ? AddToOwner(p) : Append(p); }
     /// Stores at `i`, growing the array with nulls up to it. A negative index is ignored, and so is
-    /// a pointer that an owner holds already.
+    /// a pointer that an owning array already holds.
     void SetAt(int i, void* p);
-    /// Puts an element before the one at `i`. An index out of range is ignored, but for that behind
-    /// the last element, and so is a pointer that an owner holds already.
+    /// Inserts an element before the one at `i`, or behind the last one if `i` is the size. Any
+    /// other index out of range is ignored, and so is a pointer that an owning array already holds.
     void InsertAt(int i, void* p);
     /// Removes the first element equal to `p`, keeping the others' order.
     /// \return false when there is none.
@@ -73,14 +73,15 @@ public:
     /// Exchanges two elements; an index out of range changes nothing.
     void Swap(int i, int j) noexcept;
     /// Sorts stably with the caller's less-than predicate, which receives `context`; null changes
-    /// nothing. Whatever the predicate answers, each element is there once afterwards. When it
-    /// throws, or has changed the array, the array is left as it is by then, unsorted.
+    /// nothing. Whatever the predicate returns, no element is lost or duplicated. If it throws or
+    /// changes the array, the array is left unsorted.
     void Sort(Less less, void* context);
 
 protected:
-    /// Marks an array whose elements are deleted by a derived class: no pointer is held twice.
+    /// Marks the array as owning: a derived class deletes its elements, and no pointer is held
+    /// twice.
     void BecomeOwner() noexcept { isOwner_ = 1; }
-    /// Appends a pointer that an owner is known not to hold. \return its index.
+    /// Appends a pointer that the array is known not to hold. \return its index.
     int Append(void* p) {
         if (size_ >= capacity_) {
             Grow();
@@ -90,8 +91,8 @@ protected:
         size_ = (index + 1) & MostElements;
         return static_cast<int>(index);
     }
-    /// Lets an empty array use memory that somebody else owns and that outlives the array, until it
-    /// grows beyond it. The first `size` elements are there already.
+    /// Lets an empty array use memory that it does not own until it grows beyond it. The memory
+    /// must outlive the array, and its first `size` elements must be set.
     void Borrow(void** items, int size, int capacity) noexcept {
         items_ = items;
         size_ = static_cast<std::uint32_t>(size) & MostElements;
@@ -106,7 +107,7 @@ private:
 
     void TakeOver(const PtrArrayBase& other);
     int AddToOwner(void* p);
-    /// Whether `p` may be stored: an owner refuses what it holds.
+    /// Whether `p` may be stored: an owning array rejects a pointer that it already holds.
     bool Takes(const void* p) const noexcept {
         return isOwner_ == 0 || p == nullptr || GetIndex(p) < 0;
     }
@@ -133,14 +134,14 @@ public:
     int GetIndex(T p) const noexcept { return PtrArrayBase::GetIndex(p); }
     /// Whether an element is equal to `p`.
     bool Contains(T p) const noexcept { return GetIndex(p) >= 0; }
-    /// Appends; a pointer that an owner holds already is ignored.
+    /// Appends; a pointer that an owning array already holds is ignored.
     /// \return the index of the element.
     int Add(T p) { return PtrArrayBase::Add(p); }
     /// Stores at `i`, growing the array with nulls up to it. A negative index is ignored, and so is
-    /// a pointer that an owner holds already.
+    /// a pointer that an owning array already holds.
     void SetAt(int i, T p) { PtrArrayBase::SetAt(i, p); }
-    /// Puts an element before the one at `i`. An index out of range is ignored, but for that behind
-    /// the last element, and so is a pointer that an owner holds already.
+    /// Inserts an element before the one at `i`, or behind the last one if `i` is the size. Any
+    /// other index out of range is ignored, and so is a pointer that an owning array already holds.
     void InsertAt(int i, T p) { PtrArrayBase::InsertAt(i, p); }
     /// Removes the first element equal to `p`, keeping the others' order.
     /// \return false when there is none.
@@ -148,8 +149,8 @@ public:
     /// Removes the element at `i`, keeping the others' order; an index out of range is ignored.
     void RemoveAt(int i) noexcept { PtrArrayBase::RemoveAt(i); }
     /// Sorts stably with the caller's less-than predicate, which receives `context`; null changes
-    /// nothing. Whatever the predicate answers, each element is there once afterwards. When it
-    /// throws, or has changed the array, the array is left as it is by then, unsorted.
+    /// nothing. Whatever the predicate returns, no element is lost or duplicated. If it throws or
+    /// changes the array, the array is left unsorted.
     void Sort(bool (*less)(T a, T b, void* context), void* context) {
         if (less == nullptr) {
             return;
@@ -167,10 +168,10 @@ public:
     }
 };
 
-/// A `PtrArray` with room for its first elements in itself.
+/// A `PtrArray` with built-in room for its first elements.
 template <class T, int Room> class SmallPtrArray : public PtrArray<T> {
 public:
-    /// An empty array that takes no memory until it grows beyond its room.
+    /// An empty array that allocates nothing until it grows beyond its room.
     SmallPtrArray() noexcept { this->Borrow(first_, 0, Room); }
     SmallPtrArray(const SmallPtrArray&) = delete;
     SmallPtrArray& operator=(const SmallPtrArray&) = delete;
@@ -180,8 +181,9 @@ private:
 };
 
 /// A `PtrArray` that owns its elements: its destructor deletes them, the last one first. Only the
-/// destructor and `DeleteAll` delete; `Empty`, `Remove`, `RemoveAt`, `RemoveTail` and `SetAt` let
-/// go of what they drop. It holds no pointer twice but null, by whatever reference it is called.
+/// destructor and `DeleteAll` delete; `Empty`, `Remove`, `RemoveAt`, `RemoveTail` and `SetAt`
+/// release elements without deleting them. No pointer but null is held twice, even if the array is
+/// used through a reference to a base class.
 template <class T> class OwnPtrArray : public PtrArray<T> {
 public:
     /// An empty array.
@@ -191,9 +193,9 @@ public:
     /// Deletes every element, the last one first.
     ~OwnPtrArray() override { DeleteAll(); }
 
-    /// Appends and takes ownership; a pointer that the array holds already is ignored. Looks at
-    /// every element: a caller who knows that the object is new uses `AddNew`.
-    /// \return the index of the element.
+    /// Appends and takes ownership; a pointer that the array already holds is ignored. The search
+    /// for it is linear: use `AddNew` for an object that the array cannot hold yet. \return the
+    /// index of the element.
     int Add(T p) { return PtrArray<T>::Add(p); }
     /// Appends an object that the array does not hold, and takes ownership.
     /// \return its index.
@@ -208,30 +210,30 @@ public:
     }
 };
 
-/// Walks a `PtrArray<T>` by index, stored nulls included. It reads the array's present size at each
-/// step, so elements appended on the way are met too. The array must outlive it; of an object that
-/// makes its array on first use, the object must.
+/// Walks a `PtrArray<T>` by index, nulls included. It reads the array's size at each step, so
+/// elements that are appended during the walk are visited, too. The array must outlive the
+/// iterator; if an owner creates the array on first use, the owner must.
 ///
 /// \code
 /// for (Signal* signal : netlist.GetSignalIterator()) { ... }
 /// \endcode
 template <class T> class Iterator {
 public:
-    /// Gives the array of an object; null as long as it has none.
+    /// Returns the array of an owner; null as long as it has none.
     using Find = const PtrArray<T>* (*)(const void* owner);
 
     /// Over no array: yields nothing.
     Iterator() noexcept = default;
     /// Starts at the first element; the array is not owned, and null is no array.
     explicit Iterator(const PtrArray<T>* array) noexcept : source_(array) {}
-    /// Starts at the first element of an array that its owner makes on first use, or makes anew:
-    /// `find(owner)` is asked for it at each step.
+    /// Starts at the first element of an array that its owner creates on first use or replaces:
+    /// `find(owner)` returns the array at each step.
     Iterator(const void* owner, Find find) noexcept : source_(owner), find_(find) {}
-    /// Stands at the same element of the same array.
+    /// Starts at the same element of the same array.
     Iterator(const Iterator&) noexcept = default;
     /// Moves to the same element of the same array.
     Iterator& operator=(const Iterator&) noexcept = default;
-    /// Leaves the array alone.
+    /// Does not touch the array.
     virtual ~Iterator() = default;
 
     /// Whether there is no present element.
@@ -251,24 +253,24 @@ public:
         }
     }
 
-    /// A place in the array for range-based for loops, the algorithms of the standard library and
-    /// its ranges: a forward iterator that yields the pointers. It depends on what the `Iterator`
-    /// walks, not on the `Iterator`.
+    /// A position in the array for range-based for loops, the algorithms of the standard library
+    /// and its ranges: a forward iterator that yields the pointers. It depends on what the
+    /// `Iterator` walks, not on the `Iterator`.
     class Cursor {
     public:
 #if defined(__cpp_concepts)
-        /// A second walk meets the same elements.
+        /// Every walk yields the same elements.
         using iterator_concept = std::forward_iterator_tag;
 #endif
-        /// Elements are given by value, which C++17 knows of input iterators only.
+        /// Elements are returned by value, so for C++17 this is an input iterator.
         using iterator_category = std::input_iterator_tag;
         /// What is yielded.
         using value_type = T;
-        /// The distance of two places.
+        /// The distance of two positions.
         using difference_type = std::ptrdiff_t;
-        /// There is no pointer to a place.
+        /// There is no pointer to a position.
         using pointer = void;
-        /// What `*` gives.
+        /// The result of `*`.
         using reference = T;
 
         /// The end of every array.
@@ -281,24 +283,24 @@ public:
             const PtrArray<T>* const array = GetArray();
             return array == nullptr ? nullptr : array->GetAt(index_);
         }
-        /// Steps on.
+        /// Steps to the next element.
         Cursor& operator++() noexcept {
             ++index_;
             return *this;
         }
-        /// Steps on. \return the place before the step.
+        /// Steps to the next element. \return the position before the step.
         Cursor operator++(int) noexcept {
             const Cursor before = *this;
             ++*this;
             return before;
         }
-        /// Whether both are the same place, or both are at the end as it is now.
+        /// Whether both are the same position, or both are at the present end.
         friend bool operator==(const Cursor& a, const Cursor& b) noexcept {
             const bool isAtEnd = a.IsAtEnd();
             return isAtEnd || b.IsAtEnd() ? isAtEnd == b.IsAtEnd()
                                           : a.source_ == b.source_ && a.index_ == b.index_;
         }
-        /// Whether they are different places, and not both at the end as it is now.
+        /// Whether they are different positions, and not both at the present end.
         friend bool operator!=(const Cursor& a, const Cursor& b) noexcept {
             return !(a == b);
         }
@@ -316,11 +318,11 @@ public:
         Find find_ = nullptr;
         int index_ = 0;
     };
-    /// The present element's place.
+    /// The position of the present element.
     Cursor begin() const noexcept {
         return Cursor(*this);
     }
-    /// The place behind the last element, wherever that is when it is compared.
+    /// The position behind the last element; comparisons use the size at that time.
     Cursor end() const noexcept {
         return Cursor();
     }
@@ -333,7 +335,7 @@ private:
         return GetArray(source_, find_);
     }
 
-    /// The array, or the object that `find_` gives the array of.
+    /// The array, or the owner that `find_` takes.
     const void* source_ = nullptr;
     Find find_ = nullptr;
     int index_ = 0;

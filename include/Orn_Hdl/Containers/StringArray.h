@@ -16,7 +16,7 @@ namespace Orn_Hdl {
 /// An ordered list of texts, indexed from 0. Reading out of range, or a slot that was never set,
 /// gives the empty text.
 ///
-/// All texts of a list stand in one buffer, so that splitting a line costs no allocation a word.
+/// All texts of a list share one buffer, so that splitting a line needs no allocation per word.
 class ORN_HDL_API StringArray {
 public:
     /// An empty list.
@@ -33,8 +33,8 @@ public:
     Port::StringBase<char> GetAt(int i) const { return GetView(i); }
     /// A copy of the text at `i`; empty for an index out of range.
     Port::StringBase<char> operator[](int i) const { return GetView(i); }
-    /// The text at `i` without a copy, valid until the list changes or ends; empty for an index out
-    /// of range.
+    /// The text at `i` without a copy, valid until the list changes or is destroyed; empty for an
+    /// index out of range.
     std::string_view GetView(int i) const noexcept {
         if (i < 0 || i >= GetSize()) {
             return std::string_view();
@@ -43,7 +43,7 @@ public:
         return std::string_view(text_.data() + slot.start, slot.length);
     }
     /// Reads element `i` as a whole decimal number.
-    /// \param value receives the number; untouched when the result is false.
+    /// \param value receives the number; unchanged if the result is false.
     /// \param unused has no effect.
     /// \return whether the element is such a number and fits.
     bool GetIntAt(int i, int& value, int unused) const;
@@ -75,8 +75,8 @@ public:
     /// Sorts stably by bytes, a shorter text before a longer one that begins with it.
     void Sort();
     /// Sorts stably with the caller's less-than predicate, which receives `context`; null changes
-    /// nothing. Whatever the predicate answers, each text is there once afterwards. When it throws,
-    /// or has changed the list, the list is left as it is by then, unsorted.
+    /// nothing. Whatever the predicate returns, no text is lost or duplicated. If it throws or
+    /// changes the list, the list is left unsorted.
     void Sort(bool (*less)(const Port::StringBase<char>& a, const Port::StringBase<char>& b,
                            void* context),
               void* context);
@@ -84,60 +84,63 @@ public:
     /// Splits a text, which may be one of the list's own, and appends the pieces. Null is read as
     /// "", and as no quotes.
     /// \param separators single characters, each of which ends a piece.
-    /// \param skipEmpty whether empty pieces are dropped (an empty quoted piece that a separator
-    ///        follows is kept all the same).
+    /// \param skipEmpty whether empty pieces are dropped (an empty quoted piece before a separator
+    /// is
+    ///        kept nevertheless).
     /// \param quotes pairs of an opening and a closing character. A quote opens only
     ///        at the start of the text or right after a separator, and closes only before a
     ///        separator or at the end of the text; a backslash keeps a closing character inside.
     /// \return the number of pieces appended.
     int Parse(Port::TextView text, Port::TextView separators, bool skipEmpty,
               Port::TextView quotes);
-    /// Splits one command line, which may be one of the list's own texts, and appends its words: at
-    /// blanks, runs of them counting as one, with double and single quotes. Null is read as "".
+    /// Splits one command line, which may be one of the list's own texts, at runs of blanks, and
+    /// appends its words; double and single quotes group. Null is read as "".
     /// \return the number of words appended.
     int ParseCommandLine(Port::TextView line);
 
-    /// A place in a list for range-based for loops, the algorithms of the standard library and its
-    /// ranges: a forward iterator that yields views, each valid until the list changes or ends.
+    /// A position in a list for range-based for loops, the algorithms of the standard library and
+    /// its ranges: a forward iterator that yields views, each valid until the list changes or is
+    /// destroyed.
     class Cursor {
     public:
 #if defined(__cpp_concepts)
-        /// A second walk meets the same texts.
+        /// Every walk yields the same texts.
         using iterator_concept = std::forward_iterator_tag;
 #endif
-        /// Texts are given by value, which C++17 knows of input iterators only.
+        /// Texts are returned by value, so for C++17 this is an input iterator.
         using iterator_category = std::input_iterator_tag;
         /// What is yielded.
         using value_type = std::string_view;
-        /// The distance of two places.
+        /// The distance of two positions.
         using difference_type = std::ptrdiff_t;
-        /// There is no pointer to a place.
+        /// There is no pointer to a position.
         using pointer = void;
-        /// What `*` gives.
+        /// The result of `*`.
         using reference = std::string_view;
 
-        /// A place in no list.
+        /// A position in no list.
         Cursor() noexcept = default;
-        /// The text at this place, valid until the list changes or ends; empty behind the last.
+        /// The text at this position, valid until the list changes or is destroyed; empty at the
+        /// end.
         std::string_view operator*() const noexcept {
             return list_ == nullptr ? std::string_view() : list_->GetView(index_);
         }
-        /// Steps on.
+        /// Steps to the next text.
         Cursor& operator++() noexcept {
             ++index_;
             return *this;
         }
-        /// Steps on. \return the place before the step.
+        /// Steps to the next text. \return the position before the step.
         Cursor operator++(int) noexcept {
             const Cursor before = *this;
             ++*this;
             return before;
         }
-        /// Whether both are the same place of one list.
+        /// Whether both are the same position in one list.
         friend bool operator==(const Cursor& a, const Cursor& b) noexcept {
             return a.list_ == b.list_ && a.index_ == b.index_;
         }
-        /// Whether they are different places.
+        /// Whether they are different positions.
         friend bool operator!=(const Cursor& a, const Cursor& b) noexcept {
             return !(a == b);
         }
@@ -149,11 +152,11 @@ public:
         const StringArray* list_ = nullptr;
         int index_ = 0;
     };
-    /// The place of the first text.
+    /// The position of the first text.
     Cursor begin() const noexcept {
         return Cursor(this, 0);
     }
-    /// The place behind the last text that the list has now.
+    /// The position behind the last text that the list has now.
     Cursor end() const noexcept {
         return Cursor(this, GetSize());
     }

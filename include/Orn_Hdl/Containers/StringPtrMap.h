@@ -15,36 +15,36 @@ namespace Orn_Hdl {
 /// pointers point at. An empty map owns no memory.
 class ORN_HDL_API IStringPtrMapBase {
 public:
+    /// An empty map.
     IStringPtrMapBase() noexcept;
     /// Copies the names and the pointers, not what they point at.
     IStringPtrMapBase(const IStringPtrMapBase& other);
+    /// Replaces the contents by copies of the names and the pointers, not of what they point at.
     IStringPtrMapBase& operator=(const IStringPtrMapBase& other);
+    /// Does not delete what the pointers point at.
     virtual ~IStringPtrMapBase();
 
-    /// \{
-    /// Enters a name, or gives a name that is present another pointer: it keeps its first spelling.
-    /// Here and below a null name is read as "".
+    /// Adds a name, or replaces the pointer of a name that is present, which keeps its first
+    /// spelling.
     void Add(std::string_view name, void* pointer);
+    /// Adds a name, or replaces the pointer of a name that is present, which keeps its first
+    /// spelling. A null name is read as "".
     void Add(const char* name, void* pointer) { Add(Port::ViewOf(name), pointer); }
-    /// \}
-    /// \{
-    /// The pointer of a name, null when the name is absent.
+    /// The pointer of a name; null if the name is absent.
     void* Get(std::string_view name) const noexcept;
+    /// The pointer of a name; null if the name is absent. A null name is read as "".
     void* Get(const char* name) const noexcept { return Get(Port::ViewOf(name)); }
-    /// \}
-    /// \{
     /// Whether the name is present.
     bool Contains(std::string_view name) const noexcept;
+    /// Whether the name is present. A null name is read as "".
     bool Contains(const char* name) const noexcept { return Contains(Port::ViewOf(name)); }
-    /// \}
-    /// \{
-    /// Takes a name out; an absent one changes nothing.
+    /// Removes a name, if it is present.
     void Remove(std::string_view name) noexcept;
+    /// Removes a name, if it is present. A null name is read as "".
     void Remove(const char* name) noexcept { Remove(Port::ViewOf(name)); }
-    /// \}
     /// Whether there are no names.
     bool IsEmpty() const noexcept;
-    /// Takes all names out.
+    /// Removes all names.
     void Empty() noexcept;
 
 private:
@@ -57,15 +57,18 @@ template <class T> class IStringPtrMap : public IStringPtrMapBase {
 public:
     static_assert(std::is_pointer<T>::value, "the map holds pointers");
 
-    /// \{
-    /// As the operations of the base, with `T` in place of the untyped pointer.
+    /// Adds a name, or replaces the pointer of a name that is present, which keeps its first
+    /// spelling.
     void Add(std::string_view name, T pointer) { IStringPtrMapBase::Add(name, ToUntyped(pointer)); }
+    /// Adds a name, or replaces the pointer of a name that is present, which keeps its first
+    /// spelling. A null name is read as "".
     void Add(const char* name, T pointer) { Add(Port::ViewOf(name), pointer); }
+    /// The pointer of a name; null if the name is absent.
     T Get(std::string_view name) const noexcept {
         return FromUntyped(IStringPtrMapBase::Get(name));
     }
+    /// The pointer of a name; null if the name is absent. A null name is read as "".
     T Get(const char* name) const noexcept { return Get(Port::ViewOf(name)); }
-    /// \}
 
 private:
     static void* ToUntyped(T pointer) noexcept {

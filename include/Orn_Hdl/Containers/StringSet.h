@@ -15,11 +15,11 @@ namespace Orn_Hdl {
 class NameTable;
 class StringSet;
 
-/// A position in a `StringSet`, valid until the set changes or ends. An input iterator that yields
-/// copies of the names.
+/// A position in a `StringSet`, valid until the set changes or is destroyed. An input iterator that
+/// yields copies of the names.
 class ORN_HDL_API StringSetIterator {
 public:
-    /// The postfix `++` gives nothing, so that it is no more than an input iterator.
+    /// An input iterator, because the postfix `++` returns nothing.
     using iterator_category = std::input_iterator_tag;
     /// What is yielded.
     using value_type = Port::StringBase<char>;
@@ -27,12 +27,12 @@ public:
     using difference_type = std::ptrdiff_t;
     /// There is no pointer to a position.
     using pointer = void;
-    /// What `*` gives.
+    /// The result of `*`.
     using reference = const Port::StringBase<char>;
 
     /// The end position.
     StringSetIterator() noexcept = default;
-    /// A position that a set gives.
+    /// A position returned by a set.
     explicit StringSetIterator(const void* position) noexcept : position_(position) {}
 
     /// A copy of the name at the position; the empty text at the end.
@@ -43,7 +43,7 @@ public:
 
     /// Steps to the next name; at the end nothing happens.
     StringSetIterator& operator++() noexcept;
-    /// Steps to the next name and gives nothing; at the end nothing happens.
+    /// Steps to the next name and returns nothing; at the end nothing happens.
     void operator++(int) noexcept { ++*this; }
 
     /// Whether both are the same position.
@@ -64,7 +64,7 @@ private:
 /// It keeps two tables: one ignores case and holds the first spelling of each name, the other keeps
 /// every spelling. Iteration walks the case-keeping table, and its order depends only on the
 /// sequence of calls and on the spellings: the dummy signals of a netlist are made in this order.
-/// A table takes memory with its first name.
+/// A table allocates nothing before its first name.
 class ORN_HDL_API StringSet {
 public:
     /// The empty set.
@@ -73,7 +73,7 @@ public:
     StringSet(const StringSet& other);
     /// Holds the same names and walks them in the same order; the former names are dropped.
     StringSet& operator=(const StringSet& other);
-    /// Ends every position in the set.
+    /// Invalidates every position in the set.
     ~StringSet();
 
     /// Adds a copy of a name to each table that does not have it yet; null is read as "".
@@ -96,7 +96,7 @@ public:
     void Remove(std::string_view name) noexcept;
     /// Whether the case-keeping table is empty.
     bool IsEmpty() const noexcept;
-    /// Empties the case-keeping table only: `IContains` still knows the old names.
+    /// Empties the case-keeping table only: `IContains` still finds the old names.
     void Empty() noexcept;
 
     /// The position of the first name.
@@ -105,14 +105,14 @@ public:
     StringSetIterator GetEndPos() const noexcept { return StringSetIterator(); }
 
     /// A position for range-based for loops, the algorithms of the standard library and its ranges:
-    /// a forward iterator that yields views, each valid until the set changes or ends.
+    /// a forward iterator that yields views, each valid until the set changes or is destroyed.
     class Cursor {
     public:
 #if defined(__cpp_concepts)
-        /// A second walk meets the same names.
+        /// Every walk yields the same names.
         using iterator_concept = std::forward_iterator_tag;
 #endif
-        /// Names are given by value, which C++17 knows of input iterators only.
+        /// Names are returned by value, so for C++17 this is an input iterator.
         using iterator_category = std::input_iterator_tag;
         /// What is yielded.
         using value_type = std::string_view;
@@ -120,14 +120,14 @@ public:
         using difference_type = std::ptrdiff_t;
         /// There is no pointer to a position.
         using pointer = void;
-        /// What `*` gives.
+        /// The result of `*`.
         using reference = std::string_view;
 
         /// The end of every set.
         Cursor() noexcept = default;
         /// The position of an iterator.
         explicit Cursor(StringSetIterator position) noexcept : position_(position) {}
-        /// The name at the position, valid until the set changes or ends; empty at the end.
+        /// The name at the position, valid until the set changes or is destroyed; empty at the end.
         std::string_view operator*() const noexcept {
             return position_.GetView();
         }

@@ -9,7 +9,7 @@
 #include "Port/Export.h"
 #include "Port/String.h"
 
-#include <memory>
+#include <cstdint>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -17,7 +17,8 @@ namespace Orn_Hdl {
 struct ComponentAnchor;
 class PinIndex;
 
-/// The pins of a component or an instance, in order. Long lists are searched through an index.
+/// The pins of a component or an instance, in order. A long list of theirs is searched through an
+/// index, any other list pin by pin.
 class ORN_HDL_API PinList : public PtrArray<Pin*> {
 public:
     PinList() noexcept;
@@ -32,11 +33,27 @@ public:
     void SortByPolarityAndName();
 
 private:
+    friend class Component;
     friend class PinBlock;
+    friend class PinIndex;
+    friend class PinRenaming;
 
     static constexpr int LongestUnindexed = 16;
 
-    mutable std::unique_ptr<PinIndex> index_;
+    Pin* FindOneByOne(std::string_view name) const noexcept;
+    /// The pin that stood at a place when the list was made; null for a place that it has not.
+    Pin* GetAtPlace(std::uint32_t place) const noexcept;
+    /// Enters the last pin into the index, which is made when the list gets long.
+    void IndexLast() noexcept;
+    /// Enters the pin at a place into the index, if there is one.
+    void Enter(std::uint32_t place) noexcept;
+    /// Makes sure that no other list uses the index. \return whether there is an index.
+    bool MakeOwnIndex() noexcept;
+    /// Lets the list be searched pin by pin.
+    void DropIndex() noexcept;
+
+    /// Null for a short list, and for one whose index found no memory.
+    PinIndex* index_ = nullptr;
 };
 
 /// A cell type: a name and an ordered list of pins, which it owns.
@@ -68,7 +85,7 @@ public:
 private:
     friend class Instance;
 
-    void AddNewPin(std::unique_ptr<Pin> pin);
+    void AddClone(const Pin& pin);
 
     PinList pins_;
     ComponentAnchor* anchor_;

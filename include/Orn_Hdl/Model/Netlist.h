@@ -90,6 +90,8 @@ public:
     /// Makes dummy signals for output ports that are read inside or have several drivers, and for
     /// input ports that are driven inside.
     void CreateVhdlDummySignals();
+    /// The stand-in that one of these has made for the signal; null when there is none.
+    const Signal* GetStandIn(const Signal* signal) const noexcept;
 
     /// The length of the longest name; the iterator handed in is not moved.
     static int GetLongestPinName(const Iterator<Pin*>& pins);

@@ -109,17 +109,27 @@ protected:
     bool HasFlag(unsigned flag) const noexcept { return (bits_ & flag) != 0; }
     /// Sets or clears a flag.
     void SetFlag(unsigned flag, bool on) noexcept;
+    /// Whether this is a pin that knows the list in which it stands.
+    bool HasHome() const noexcept { return (bits_ & TypeMask) == HousedPinType; }
+    /// Marks such a pin.
+    void MarkHome() noexcept {
+        bits_ = static_cast<std::uint8_t>((bits_ & ~TypeMask) | HousedPinType);
+    }
 
 private:
     friend class OwnedFlag;
     friend struct ObjectKey;
 
     static constexpr unsigned TypeMask = 0x07;
+    static constexpr unsigned PinTypeBits = ObjectTypePin - ObjectTypeAttribute;
+    static constexpr unsigned HousedPinType = 0x06;
     static constexpr unsigned OwnedFlagBit = 0x08;
     // 0x10 is the derived classes'.
     static constexpr unsigned DirectionMask = 0x60;
     static constexpr unsigned OddDirectionBit = 0x80;
 
+    /// The type, less `ObjectTypeAttribute`.
+    unsigned GetTypeBits() const noexcept { return HasHome() ? PinTypeBits : bits_ & TypeMask; }
     ObjectName& Name() noexcept;
     const ObjectName& Name() const noexcept;
     int GetOddDirection() const noexcept;

@@ -125,7 +125,9 @@ protected:
     Pin& operator=(const Pin& other);
 
 private:
+    friend class Component;
     friend class PinBlock;
+    friend struct PinHome;
     friend class PinLinks;
 
     /// Makes a copy of this pin at `place`, which has room for any pin.

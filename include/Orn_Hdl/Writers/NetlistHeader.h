@@ -11,7 +11,8 @@
 
 namespace Orn_Hdl {
 
-/// Composes and writes the banner: who wrote the file, when, from which command and design.
+/// Writes the banner: the application, the file, the time, the command, the design, the device, the
+/// purpose and the reference.
 class ORN_HDL_API NetlistHeader {
 public:
     /// A banner in the comments of a language.
@@ -20,7 +21,7 @@ public:
                   const Port::StringBase<char>& command, const Port::StringBase<char>& designName,
                   const Port::StringBase<char>& device, const Port::StringBase<char>& purpose,
                   const Port::StringBase<char>& reference, Language language, OutStream& out);
-    /// A banner in the comments that a flag chooses.
+    /// A banner in VHDL or Verilog comments.
     /// \param vhdlComments true for lines that begin with "--", false for "//".
     /// \param out not owned; it must outlive the header.
     NetlistHeader(const Port::StringBase<char>& application, const Port::StringBase<char>& fileName,

@@ -18,8 +18,8 @@
 
 namespace Orn_Hdl {
 
-/// Writes single Verilog constructs (IEEE 1364-1995), literally as it is given them. Unless its
-/// function says otherwise a statement is left open: the caller writes ";" or goes on.
+/// Writes single Verilog constructs (IEEE 1364-1995) with their parts unchanged. Unless a function
+/// says otherwise, it leaves the statement open: the caller writes ";" or continues it.
 class ORN_HDL_API VerilogStatements {
 public:
     /// \param out not owned; it must outlive the statements.
@@ -35,11 +35,11 @@ public:
     void WritePortDeclaration(const char* name, const Polarity& polarity);
     /// wire [RANGE] NAME
     void WriteSignalDeclaration(const char* name);
-    /// A reference: of a bus name with its range in brackets, of any other name as it is.
+    /// A reference: a bus name with its range in brackets, or any other name unchanged.
     void WriteSignalName(const char* name);
     /// assign LEFT = RIGHT
     void WriteSignalAssignment(const char* left, const char* right);
-    /// assign NAME = CONSTANT, the name without its range or index.
+    /// assign NAME = CONSTANT, where NAME has no range or index.
     /// \param singleBit writes a bare 0 or 1 whatever the value's base.
     void WriteConstantSignalAssignment(const char* name, bool singleBit,
                                        const BitVectorValue& value);
@@ -47,30 +47,30 @@ public:
     void WriteParameterStatement(Attribute* attribute);
     /// defparam INSTANCE.NAME = VALUE
     void WriteDefParamStatement(Attribute* attribute, const char* instanceName);
-    /// defparam INSTANCE.NAME = NAME: passes the module's parameter of that name down.
+    /// defparam INSTANCE.NAME = NAME, which passes on the module's parameter of that name.
     void WriteDefParamInitStatement(Attribute* attribute, const char* instanceName);
-    /// The object's comment, every line behind "// ".
+    /// The object's comment, each line prefixed by "// ".
     void WriteComment(const Object* object);
     /// An `include line for each file.
     void WriteIncludePath(const StringArray& fileNames);
 
-    /// The attributes whose synthesis option is not "NONE", for Synplicity: one comment, which
-    /// stands before the semicolon of their object's statement.
+    /// The attributes whose synthesis option is not "NONE", for Synplicity: one comment before the
+    /// semicolon of their object's statement.
     void WriteSynplicityAttr(const Iterator<Attribute*>& attributes);
-    /// The attributes whose synthesis option is not "NONE", for Synopsys: one comment and the line
-    /// end.
+    /// The attributes whose synthesis option is not "NONE", for Synopsys: one comment and a
+    /// line end.
     void WriteSynopsysAttr(const Iterator<Attribute*>& attributes);
-    /// The attributes whose synthesis option is not "NONE", for QSN: a line of comment each.
+    /// The attributes whose synthesis option is not "NONE", for QSN: a comment line each.
     void WriteQSNAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
-    /// The attributes whose synthesis option is not "NONE", for Exemplar: a line of comment each.
+    /// The attributes whose synthesis option is not "NONE", for Exemplar: a comment line each.
     void WriteExemplarAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
-    /// The attributes whose synthesis option is not "NONE", for Precision: a line of comment each.
+    /// The attributes whose synthesis option is not "NONE", for Precision: a comment line each.
     void WritePrecisionAttr(const Iterator<Attribute*>& attributes, const char* instanceName);
 
 private:
     friend class VerilogNetlister;
 
-    // These take names as the objects hold them, without a copy.
+    // Overloads for names that are not copied.
     void WritePortDeclaration(std::string_view name, const Polarity& polarity);
     void WriteSignalDeclaration(std::string_view name);
     void WriteSignalName(std::string_view name);
@@ -121,14 +121,15 @@ class ORN_HDL_API VerilogNetlister {
 public:
     /// \param out not owned; it must outlive the netlister.
     explicit VerilogNetlister(OutStream& out);
+    /// The stream stays open.
     ~VerilogNetlister();
 
-    /// Sorts the netlist, makes the dummy signals that it needs, renames its objects when the
-    /// options ask for upper or lower case, and writes it. A null netlist writes nothing.
+    /// Sorts the netlist, makes the dummy signals that it needs, renames its objects if the options
+    /// ask for upper or lower case, and writes it. If the netlist is null, nothing is written.
     void WriteNetlist(Netlist* netlist, const HdlOptions& options);
-    /// Writes the netlist, as with constant options, and records in `options.hierarchicalInit`
-    /// whether its instances are given the module's INIT parameter. A null netlist writes nothing
-    /// and leaves the options as they are.
+    /// Writes the netlist like the overload with constant options, and records in
+    /// `options.hierarchicalInit` whether its instances are given the module's INIT parameter. If
+    /// the netlist is null, nothing is written and the options do not change.
     void WriteNetlist(Netlist* netlist, HdlOptions& options);
 
 private:

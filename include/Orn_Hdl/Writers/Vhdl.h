@@ -15,8 +15,8 @@
 
 namespace Orn_Hdl {
 
-/// Writes single VHDL constructs (IEEE 1076-1993), literally as it is given them. Unless its
-/// function says otherwise a construct ends its line.
+/// Writes single VHDL constructs (IEEE 1076-1993) with their parts unchanged. Unless a function
+/// says otherwise, it ends the line.
 class ORN_HDL_API VhdlStatements {
 public:
     /// \param out not owned; it must outlive the statements.
@@ -24,29 +24,29 @@ public:
 
     /// std_logic, the line left open.
     void WriteStdLogic();
-    /// (FIRST downto SECOND), or "to" when the first is smaller; the line left open.
+    /// (FIRST downto SECOND), or "to" for an ascending range; the line left open.
     void WriteBusIndex(int first, int second);
     /// std_logic_vector (RANGE), the line left open.
     void WriteStdLogicVector(int first, int second);
-    /// A reference: of a bus name with its range, of any other name as it is; the line left open.
+    /// A reference: a bus name with its range, or any other name unchanged; the line left open.
     void WriteBus(const char* name);
     /// The clauses for the IEEE packages.
     void WriteIEEELibrary();
     /// The clauses for the package of cells.
-    /// \param guard whether comments hide the clauses from synthesis.
+    /// \param guard whether translate_off comments hide the clauses from synthesis.
     void WriteKestraLibrary(bool guard);
-    /// A library clause for each.
+    /// A library clause for each library.
     void WriteUserLibrary(const StringArray& libraries);
-    /// A use clause for each.
+    /// A use clause for each name.
     void WriteUseUserLibrary(const StringArray& useClauses);
     /// A comment line with the source file, if any, and the time.
     void WriteTimeStamp(const char* sourceFileName);
-    /// The object's comment, every line behind "-- ".
+    /// The object's comment, each line prefixed by "-- ".
     void WriteComment(const Object* object);
     /// signal NAME : std_logic;
     /// \param width the column width to which the name is padded.
     void WriteSignalStatement(const char* name, int width);
-    /// signal NAME : std_logic_vector (RANGE); of a name without a range, signal NAME : std_logic;
+    /// signal NAME : std_logic_vector (RANGE); for a name without a range, signal NAME : std_logic;
     /// \param width the column width to which the name is padded.
     void WriteSignalVectorStatement(const char* name, int width);
     /// The declaration of a port, the line left open.
@@ -62,8 +62,8 @@ public:
     void WriteGenericMapAttrType(Attribute* attribute);
     /// NAME => VALUE, the line left open. Null writes nothing.
     void WriteGenericMapAttr(Attribute* attribute);
-    /// NAME => NAME, the line left open: passes the entity's generic of that name down. Null writes
-    /// nothing.
+    /// NAME => NAME, which passes on the entity's generic of that name, the line left open. Null
+    /// writes nothing.
     void WriteGenericMapInitAttr(Attribute* attribute);
     /// attribute NAME : TYPE ; null writes nothing.
     /// \param typed whether the attribute has its own type or is a string.
@@ -88,7 +88,7 @@ private:
     friend class VhdlNetlister;
     friend class WritePortAssignmentVisitor;
 
-    // These take names as the objects hold them, without a copy.
+    // Overloads for names that are not copied.
     void WriteBus(std::string_view name);
     void WriteSignalStatement(std::string_view name, int width);
     void WriteSignalVectorStatement(std::string_view name, int width);
@@ -155,11 +155,13 @@ class ORN_HDL_API VhdlNetlister {
 public:
     /// \param out not owned; it must outlive the netlister.
     explicit VhdlNetlister(OutStream& out);
+    /// A netlister for the same stream.
     VhdlNetlister(const VhdlNetlister& other);
+    /// The stream stays open.
     ~VhdlNetlister();
 
-    /// Sorts the netlist, makes the dummy signals that it needs, and writes it. A null netlist,
-    /// and null options, write nothing.
+    /// Sorts the netlist, makes the dummy signals that it needs, and writes it. If the netlist or
+    /// the options are null, nothing is written.
     void WriteNetlist(Netlist* netlist, const HdlOptions* options);
 
 private:

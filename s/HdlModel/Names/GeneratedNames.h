@@ -1,5 +1,5 @@
-// Suffixes of the names that the library gives to signals of its own. A user's name must not end in
-// one, or two signals could get the same name.
+// Suffixes of the names that the library gives to signals of its own. If a user's name ends in one,
+// two signals may get the same name.
 #pragma once
 
 #include "Port/Ascii.h"

@@ -1,4 +1,4 @@
-// An index from names to the objects that bear them. It keeps no names: it asks the objects.
+// An index from names to objects. It stores no names but reads them from the objects.
 #pragma once
 
 #include "Containers/HashByEights.h"
@@ -29,7 +29,7 @@ inline constexpr std::array<unsigned char, 256> Table = MakeTable();
 
 } // namespace FoldedDetail
 
-/// One character of a name as look-ups compare it: normalised, letter case ignored.
+/// One character of a name as compared by look-ups: normalised and in one letter case.
 inline unsigned char FoldedNameChar(char c) noexcept {
     return FoldedDetail::Table[static_cast<unsigned char>(c)];
 }
@@ -46,11 +46,12 @@ inline bool EqualFolded(std::string_view a, std::string_view b) noexcept {
     return true;
 }
 
-/// Eight characters of a name as look-ups compare them.
+/// Eight characters of a name as compared by look-ups.
 inline std::uint64_t FoldEightNameChars(std::uint64_t text) noexcept {
     using namespace EightBytes;
-    // Few names have characters that are normalised: brackets, which differ from braces in one bit,
-    // angle brackets and the minus. The bit makes a few others look like these.
+    // Few names contain characters that normalisation changes: brackets, which differ from braces
+    // in one bit, angle brackets and the minus. Ignoring the bit also selects a few other
+    // characters.
     const std::uint64_t alike = text | Each(0x20);
     const std::uint64_t marks =
         MarkRange(alike, '{', '}') | MarkRange(alike, '<', '>') | MarkRange(alike, '-', '-');
@@ -68,8 +69,8 @@ inline std::uint32_t HashName(std::string_view name) noexcept {
     return HashByEights(name, FoldEightNameChars);
 }
 
-/// A name to look up, hashed once. Its group sets apart what may bear the same name: it stands in
-/// the two lowest bits of the hash, which do not move an object in the table.
+/// A name to look up, hashed once. Objects of different groups may have the same name. The group is
+/// stored in the two lowest bits of the hash, which do not affect the slot in the table.
 class NameKey {
 public:
     static constexpr std::uint32_t NameBits = HashSlots<void*>::PlaceBits;
@@ -85,11 +86,11 @@ private:
     std::uint32_t hash_;
 };
 
-/// `KeyOf` gives an object's name, which must stay equal (normalised, letter case ignored) as long
-/// as the object is in the index.
+/// `KeyOf` returns the name of an object, which must stay equal (normalised, letter case ignored)
+/// while the object is in the index.
 template <class T, class KeyOf> class NameIndex {
 public:
-    /// The object of that name and group; null when there is none.
+    /// The object of that name and group; null if there is none.
     T* Find(const NameKey& key) const noexcept {
         return slots_.Find(key.GetHash(), IsNamed{key, GroupsApart});
     }
@@ -98,16 +99,16 @@ public:
         return slots_.Find(key.GetHash(), IsNamed{key, NameKey::NameBits}) != nullptr;
     }
 
-    /// Makes sure that the next object can be entered without allocating memory.
+    /// Makes room, so that adding the next object allocates nothing.
     void MakeRoom() { slots_.MakeRoom(); }
 
-    /// Enters an object, in the place of another of its name and group.
+    /// Adds an object, or replaces another one of its name and group.
     void Add(T* object, unsigned group = 0) {
         const NameKey key(KeyOf()(object), group);
         slots_.AddOrReplace(key.GetHash(), object, IsNamed{key, GroupsApart});
     }
 
-    /// Takes an object out, unless another has taken its place.
+    /// Removes an object, unless another one has replaced it.
     void Remove(T* object, unsigned group = 0) noexcept {
         slots_.Remove(NameKey(KeyOf()(object), group).GetHash(), object);
     }
@@ -115,9 +116,9 @@ public:
     int GetSize() const noexcept { return static_cast<int>(slots_.GetSize()); }
     void Clear() noexcept { slots_.Clear(); }
 
-    /// Hints that a name of this hash is about to be looked up. The index must not be empty.
+    /// Prefetches the slots of a hash. The index must not be empty.
     void PrefetchPlace(std::uint32_t hash) const noexcept { slots_.PrefetchPlace(hash); }
-    /// An object that probably has a name of this hash; null when there is none.
+    /// An object whose name probably has this hash; null if there is none.
     const T* GuessObject(std::uint32_t hash) const noexcept {
         return slots_.Find(hash, [hash](std::uint32_t other, const T*) {
             return ((other ^ hash) & NameKey::NameBits) == 0;
@@ -127,7 +128,7 @@ public:
 private:
     static constexpr std::uint32_t GroupsApart = ~std::uint32_t(0);
 
-    /// Whether an object has a name; `mask` says which bits of the hash must agree.
+    /// Whether an object has a name; `mask` selects the bits of the hash that must be equal.
     struct IsNamed {
         const NameKey& key;
         std::uint32_t mask;

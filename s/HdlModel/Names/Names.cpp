@@ -195,7 +195,7 @@ std::size_t SharedLength(string_view a, string_view b, std::size_t known) noexce
     while (length < common && Rank(a[length]) == Rank(b[length])) {
         ++length;
     }
-    // A run of digits counts as a whole.
+    // A run of digits is compared as a number.
     while (length > known && Port::IsDigit(a[length - 1])) {
         --length;
     }
@@ -228,7 +228,7 @@ int CompareNatural(string_view a, string_view b) noexcept {
 
 namespace {
 
-/// Gathers the bytes of a sort key. Each step must keep the order.
+/// Collects the bytes of a sort key. Each step must preserve the order.
 class NaturalKeyBytes {
 public:
     static constexpr unsigned Size = 12;
@@ -247,7 +247,7 @@ public:
             bytes_[used_++] = static_cast<unsigned char>(byte);
         }
     }
-    /// \return false when the rest must not be added: what has no value of its own ends the key.
+    /// \return false if the rest must not be added, because the key ends at an ambiguous character.
     bool AppendRank(int rank) noexcept {
         constexpr int FirstPlain = -1;
         constexpr int LastPlain = FirstPlain + 253;
@@ -269,7 +269,7 @@ public:
     }
 
 private:
-    /// A run of digits is coded as 255, its length, and two digits a byte, so that it sorts after
+    /// A run of digits is encoded as 255, its length, and two digits a byte, so that it sorts after
     /// every other character, and a longer run after a shorter one.
     /// \return the index behind the digits.
     std::size_t AppendDigits(string_view name, std::size_t start) noexcept {

@@ -1,5 +1,5 @@
-// What names mean: the scanners behind every rule that reads a name. All of them take views and run
-// in one pass without recursion, and so hold up at names of any length.
+// The scanners for names. All of them take views and run in one pass without recursion, so names of
+// any length are safe.
 #pragma once
 
 #include "HdlModel/Names/GeneratedNames.h"
@@ -13,7 +13,6 @@
 #include <string_view>
 
 namespace Orn_Hdl::Names {
-
 
 /// One character of a name in its normalised form.
 constexpr char Normalized(char c) noexcept {
@@ -39,7 +38,7 @@ void Normalize(std::string& name) noexcept;
 /// A normalised view of a text, copied only when the text is not normalised already.
 class NormalizedText {
 public:
-    /// \param text must outlive this.
+    /// \param text must outlive this object.
     explicit NormalizedText(std::string_view text);
     NormalizedText(const NormalizedText&) = delete;
     NormalizedText& operator=(const NormalizedText&) = delete;
@@ -68,16 +67,16 @@ struct BitName {
     int value = 0;
 };
 
-/// Reads a normalised bus name. \return false, `parsed` untouched, for a name of another form.
+/// Reads a normalised bus name. \return false, `parsed` unchanged, for a name of another form.
 bool ParseBus(std::string_view name, BusName& parsed) noexcept;
-/// Reads a normalised bit name. \return false, `parsed` untouched, for a name of another form.
+/// Reads a normalised bit name. \return false, `parsed` unchanged, for a name of another form.
 bool ParseBit(std::string_view name, BitName& parsed) noexcept;
 
 /// The number of bits of a bus name, at most INT_MAX; 0 for a name of another form.
 int GetWidth(std::string_view name) noexcept;
 /// Whether a name is a bus name with a descending range.
 bool IsDownTo(std::string_view name) noexcept;
-/// Copies the texts of a bus name's indices. \return false, both untouched, for a name of another
+/// Copies the texts of a bus name's indices. \return false, both unchanged, for a name of another
 /// form.
 bool GetIndexTexts(std::string_view name, Port::StringBase<char>& left,
                    Port::StringBase<char>& right);
@@ -89,17 +88,17 @@ bool IsCompound(std::string_view name) noexcept;
 class CompoundPieces {
 public:
     explicit CompoundPieces(std::string_view name) noexcept : rest_(name) {}
-    /// \return false when there is no further piece.
+    /// \return false if there is no further piece.
     bool Next(std::string_view& piece) noexcept;
 
 private:
     std::string_view rest_;
 };
 
-/// The part of a normalised name before its first "(" when it holds "(" and ")" and no ",",
+/// The part of a normalised name before its first "(" if it contains "(" and ")" and no ",",
 /// otherwise the whole name.
 std::string_view BaseName(std::string_view name) noexcept;
-/// What stands before the first "(", or the whole name.
+/// The part of a name before its first "(", or the whole name.
 std::string_view BeforeParenthesis(std::string_view name) noexcept;
 
 /// Text of a name with an index or a range in parentheses.
@@ -108,11 +107,11 @@ std::string WithIndex(std::string_view base, int index);
 std::string WithRange(std::string_view base, std::string_view left, std::string_view right);
 std::string WithRange(std::string_view base, int left, int right);
 
-/// Whether a base name ends as those of dummy signals do, letter case ignored.
+/// Whether a base name ends in the suffix of dummy signals, letter case ignored.
 bool IsDummy(std::string_view base) noexcept;
 /// The name of the dummy signal of a scalar signal.
 std::string DummyOf(std::string_view base);
-/// The name of the dummy signal of a bus or a part of one: the range or index stays behind.
+/// The name of the dummy signal of a bus or a part of one, with its range or index at the end.
 std::string DummyOfPart(std::string_view name);
 
 inline bool IsNamed(std::string_view name, std::string_view other) noexcept {

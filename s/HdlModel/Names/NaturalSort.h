@@ -13,9 +13,9 @@
 
 namespace Orn_Hdl {
 
-/// Sorts the objects of a long list by keys. A key holds the first characters of a name only, so
-/// those that all names share are left out of it; objects whose keys are equal then get new keys
-/// behind the characters that they share.
+/// Sorts the objects of a long list by keys. A key contains only some characters of a name, so the
+/// common prefix of all names is omitted; objects with equal keys then get new keys from the
+/// characters behind their common prefix.
 template <class T, class RankOf, class Compare> class NaturalKeySort {
 public:
     NaturalKeySort(const PtrArray<T*>& objects, RankOf rankOf, Compare compare)
@@ -37,7 +37,7 @@ private:
         return objects_.GetAt(static_cast<int>(key.GetIndex()));
     }
 
-    /// How many characters all names of a range begin with, `known` of them for certain.
+    /// The length of the common prefix of all names in a range, which is at least `known`.
     std::size_t SharedOf(Place first, Place last, std::size_t known) const noexcept {
         const std::string_view name = ObjectOf(*first)->GetNameView();
         std::size_t shared = name.size();
@@ -48,7 +48,7 @@ private:
         return shared;
     }
 
-    /// The index makes every comparison decide, so the order is the stable one.
+    /// Comparing the indices of equal names makes the order stable.
     void SortByKeys(Place first, Place last, std::size_t shared) {
         for (Place key = first; key != last; ++key) {
             const T* const object = ObjectOf(*key);
@@ -85,9 +85,9 @@ private:
     std::vector<Key> keys_;
 };
 
-/// Sorts stably. `rankOf(object)` gives an int. A short array is sorted by the names as they are;
-/// of a long one the keys are made once, and one that is in order already, as after a former write,
-/// is only looked at.
+/// Sorts stably. `rankOf(object)` returns an int. A short array is sorted by comparing names; for a
+/// long one the keys are computed once. An array that is sorted already, as after an earlier write,
+/// is only checked.
 template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankOf rankOf) {
     const auto compare = [&rankOf](const T* a, const T* b) {
         const int rankA = rankOf(a);

@@ -7,7 +7,7 @@
 
 namespace Orn_Hdl::Names {
 
-/// The most bits that one name is ever expanded into.
+/// The greatest number of bits into which a name is expanded.
 constexpr std::int64_t MostExpandedBits = 1048576;
 
 /// The indices in a name such as D(7:0), saturated to 32 bits. A range is descending, ascending, or

@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Model/Component.h"
 
+#include "Containers/Reordering.h"
 #include "HdlModel/Names/NaturalSort.h"
 #include "HdlModel/Netlist/PinIndex.h"
 #include "HdlModel/Signals/SignalCast.h"
@@ -8,25 +9,28 @@
 
 #include <algorithm>
 #include <functional>
+#include <memory>
+#include <new>
 #include <unordered_set>
 #include <vector>
 
 namespace Orn_Hdl {
 
 PinList::PinList() noexcept = default;
-PinList::~PinList() = default;
+
+PinList::~PinList() {
+    DropIndex();
+}
 
 Pin* PinList::GetPin(const char* name) const {
     return GetPin(Port::ViewOf(name));
 }
 
 Pin* PinList::GetPin(std::string_view name) const {
-    if (GetSize() > LongestUnindexed) {
-        if (index_ == nullptr) {
-            index_ = std::make_unique<PinIndex>();
-        }
-        return index_->Find(*this, name);
-    }
+    return index_ == nullptr ? FindOneByOne(name) : index_->Find(*this, name);
+}
+
+Pin* PinList::FindOneByOne(std::string_view name) const noexcept {
     for (Pin* pin : Iterator<Pin*>(this)) {
         // The wanted name is normalised for the comparison; the pin's is already.
         if (EqualFolded(pin->GetNameView(), name)) {
@@ -36,11 +40,50 @@ Pin* PinList::GetPin(std::string_view name) const {
     return nullptr;
 }
 
+void PinList::IndexLast() noexcept {
+    const int size = GetSize();
+    if (size == LongestUnindexed + 1) {
+        index_ = new (std::nothrow) PinIndex();
+        for (std::uint32_t i = 0; i < LongestUnindexed; ++i) {
+            Enter(i);
+        }
+    }
+    Enter(static_cast<std::uint32_t>(size - 1));
+}
+
+void PinList::Enter(std::uint32_t place) noexcept {
+    if (index_ != nullptr) {
+        try {
+            index_->Enter(*this, place);
+        } catch (const std::bad_alloc&) {
+            DropIndex();
+        }
+    }
+}
+
+bool PinList::MakeOwnIndex() noexcept {
+    if (index_ != nullptr && index_->IsShared()) {
+        PinIndex* own = nullptr;
+        try {
+            own = index_->Clone();
+        } catch (const std::bad_alloc&) {
+            own = nullptr;
+        }
+        index_->Leave();
+        index_ = own;
+    }
+    return index_ != nullptr;
+}
+
+void PinList::DropIndex() noexcept {
+    if (index_ != nullptr) {
+        index_->Leave();
+        index_ = nullptr;
+    }
+}
+
 void PinList::SortByPolarityAndName() {
     SortNaturally(*this, [](const Pin* pin) { return pin->GetPolarity().GetValue(); });
-    if (index_ != nullptr) {
-        index_->Forget();
-    }
 }
 
 /// What the instances of a component hold in place of a pointer to it, so that the component can
@@ -74,9 +117,22 @@ void Component::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitComponent(this);
 }
 
-void Component::AddNewPin(std::unique_ptr<Pin> pin) {
-    pins_.Add(pin.get());
-    pin.release();
+void Component::AddClone(const Pin& pin) {
+    void* const memory =
+        Port::Pool::Allocate(sizeof(Pin) + PinHome::Size, Port::Pool::DesignObjects);
+    Pin* clone = nullptr;
+    try {
+        clone = pin.CloneInto(memory);
+        pins_.Add(clone);
+    } catch (...) {
+        if (clone != nullptr) {
+            clone->~Pin();
+        }
+        Port::Pool::Free(memory);
+        throw;
+    }
+    PinHome::Set(*clone, &pins_);
+    pins_.IndexLast();
 }
 
 void Component::AddPin(const char* name, const Polarity& polarity,
@@ -85,7 +141,7 @@ void Component::AddPin(const char* name, const Polarity& polarity,
     if (!defaultValue.GetValue().IsEmpty()) {
         pin->SetDefaultValue(defaultValue);
     }
-    AddNewPin(std::move(pin));
+    AddClone(*pin);
 }
 
 void Component::AddPin(const char* name, const Polarity& polarity, const char* defaultValue) {
@@ -93,11 +149,11 @@ void Component::AddPin(const char* name, const Polarity& polarity, const char* d
 }
 
 void Component::AddPin(const Pin& pin) {
-    AddNewPin(std::unique_ptr<Pin>(pin.ClonePin()));
+    AddClone(pin);
 }
 
 /// The pins of an instance stand in one block of memory, in the order of the component's pins, and
-/// behind them the array of pointers to them.
+/// behind them the array of pointers to them. Behind each pin of a long list stands its home.
 class PinBlock {
 public:
     static void CloneAll(const PinList& from, PinList& to) {
@@ -105,14 +161,15 @@ public:
         if (count == 0) {
             return;
         }
+        const std::size_t placeSize = PlaceSizeFor(from.GetSize());
         auto* const block = static_cast<char*>(Port::Pool::AllocatePacked(
-            count * (PlaceSize + sizeof(void*)), Port::Pool::DesignObjects));
-        void** const pointers = reinterpret_cast<void**>(block + count * PlaceSize);
+            count * (placeSize + sizeof(void*)), Port::Pool::DesignObjects));
+        void** const pointers = reinterpret_cast<void**>(block + count * placeSize);
         std::size_t made = 0;
         try {
             for (; made < count; ++made) {
                 const Pin* const pin = from.GetAt(static_cast<int>(made));
-                pointers[made] = pin->CloneInto(block + made * PlaceSize);
+                pointers[made] = pin->CloneInto(block + made * placeSize);
             }
         } catch (...) {
             to.Borrow(pointers, static_cast<int>(made), static_cast<int>(made));
@@ -120,6 +177,13 @@ public:
             throw;
         }
         to.Borrow(pointers, from.GetSize(), from.GetSize());
+        if (placeSize > sizeof(Pin)) {
+            SettleAll(to);
+            to.index_ = from.index_;
+            if (to.index_ != nullptr) {
+                to.index_->Join();
+            }
+        }
     }
 
     static void DestroyAll(PinList& pins) noexcept {
@@ -133,10 +197,27 @@ public:
         }
     }
 
+    /// The pin that stood at a place of the list before it was sorted.
+    static Pin* GetAtPlace(const PinList& pins, std::uint32_t place) noexcept {
+        const auto count = static_cast<std::size_t>(pins.GetSize());
+        char* const end = reinterpret_cast<char*>(Reordering::GetPlaces(pins));
+        return reinterpret_cast<Pin*>(end - (count - place) * PlaceSizeFor(pins.GetSize()));
+    }
+
 private:
-    static constexpr std::size_t PlaceSize = sizeof(ScalarPin);
-    static_assert(sizeof(BusPin) == PlaceSize && sizeof(BusIndexPin) == PlaceSize);
-    static_assert(alignof(ScalarPin) <= 8);
+    static_assert(sizeof(ScalarPin) == sizeof(Pin) && sizeof(BusPin) == sizeof(Pin) &&
+                  sizeof(BusIndexPin) == sizeof(Pin));
+    static_assert(alignof(Pin) <= 8);
+
+    static std::size_t PlaceSizeFor(int count) noexcept {
+        return sizeof(Pin) + (count > PinList::LongestUnindexed ? PinHome::Size : 0);
+    }
+
+    static void SettleAll(PinList& pins) noexcept {
+        for (Pin* pin : Iterator<Pin*>(&pins)) {
+            PinHome::Set(*pin, &pins);
+        }
+    }
 
     static void Destroy(PinList& pins, void* block) noexcept {
         for (int i = pins.GetSize(); i > 0; --i) {
@@ -146,6 +227,14 @@ private:
         Port::Pool::Free(block);
     }
 };
+
+Pin* PinList::GetAtPlace(std::uint32_t place) const noexcept {
+    if (place >= static_cast<std::uint32_t>(GetSize())) {
+        return nullptr;
+    }
+    return Reordering::IsInBorrowedPlaces(*this) ? PinBlock::GetAtPlace(*this, place)
+                                                 : GetAt(static_cast<int>(place));
+}
 
 Instance::Instance(const char* name, const Component* component)
     : Object(ObjectTypeInstance), anchor_(component == nullptr ? nullptr : component->anchor_) {

@@ -26,6 +26,8 @@ public:
     /// \param forOutputs whether the signals are output ports, which their dummies drive, or input
     ///        ports, which drive their dummies.
     void Make(Netlist& netlist, const StringSet& names, bool forOutputs);
+    /// The dummy that was made for a signal; null when there is none.
+    Signal* Find(const Signal* original) const noexcept;
     /// Drops the entries of a signal that is about to be destroyed, be it a dummy or not.
     void Forget(const Signal* signal) noexcept;
     /// Drops all entries, before the signals of the netlist are destroyed.
@@ -38,7 +40,6 @@ private:
         bool forOutputs;
     };
 
-    Signal* Find(const Signal* original) const noexcept;
     void MakeForScalar(Netlist& netlist, ScalarSignal& signal, bool forOutputs);
     void MakeForBus(Netlist& netlist, Bus& bus, bool forOutputs);
     void MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool forOutputs);

@@ -301,6 +301,10 @@ void Netlist::CreateVhdlDummySignals() {
     dummies.Make(*this, names, true);
 }
 
+const Signal* Netlist::GetStandIn(const Signal* signal) const noexcept {
+    return implementation_->dummies.Find(signal);
+}
+
 namespace {
 
 /// \param to has no comment yet.

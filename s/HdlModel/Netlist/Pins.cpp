@@ -46,8 +46,10 @@ Pin::Pin(const Pin& other) : Object(ObjectTypePin), AttributeHolder() {
 
 Pin& Pin::operator=(const Pin& other) {
     if (this != &other) {
-        CopyNameFrom(other);
-        PinIndex::NoteRenaming();
+        {
+            const PinRenaming renaming(*this);
+            CopyNameFrom(other);
+        }
         SetPolarity(other.GetPolarity());
         const bool hasValue = !GetDefaultValue().GetValue().IsEmpty();
         if (hasValue || !other.GetDefaultValue().GetValue().IsEmpty()) {
@@ -70,8 +72,8 @@ void Pin::AcceptObject(ObjectVisitor& visitor) {
 }
 
 void Pin::SetName(const char* name) {
+    const PinRenaming renaming(*this);
     Object::SetName(name);
-    PinIndex::NoteRenaming();
 }
 
 void Pin::Connect(Signal* signal) {

@@ -25,7 +25,7 @@ Object::Object(ObjectType type) noexcept {
 }
 
 Object::Object(const Object& other)
-    : Object(static_cast<ObjectType>(ObjectTypeAttribute + (other.bits_ & TypeMask))) {
+    : Object(static_cast<ObjectType>(ObjectTypeAttribute + other.GetTypeBits())) {
     Name() = other.Name();
     if (!other.GetCommentView().empty()) {
         MakeDetails().comment = other.GetCommentView();
@@ -35,8 +35,10 @@ Object::Object(const Object& other)
 Object& Object::operator=(const Object& other) {
     if (this != &other) {
         CopyNameFrom(other);
-        SetFlag(TypeMask, false);
-        SetFlag(other.bits_ & TypeMask, true);
+        if (!HasHome()) {
+            SetFlag(TypeMask, false);
+            SetFlag(other.GetTypeBits(), true);
+        }
         if (GetDetails() != nullptr || !other.GetCommentView().empty()) {
             MakeDetails().comment = other.GetCommentView();
         }
@@ -79,7 +81,7 @@ int Object::GetOddDirection() const noexcept {
 }
 
 int Object::GetObjectType() const {
-    return ObjectTypeAttribute + static_cast<int>(bits_ & TypeMask);
+    return ObjectTypeAttribute + static_cast<int>(GetTypeBits());
 }
 
 void Object::SetName(const char* name) {
@@ -133,7 +135,7 @@ std::string_view Object::GetCommentView() const noexcept {
 
 bool Object::operator==(const Object& other) const noexcept {
     return GetCommentView() == other.GetCommentView() && GetNameView() == other.GetNameView() &&
-           ((bits_ ^ other.bits_) & TypeMask) == 0;
+           GetTypeBits() == other.GetTypeBits();
 }
 
 void Object::NormalizeName(Port::StringBase<char>& name) {

@@ -357,4 +357,88 @@ TEST(PinLookUp, OfManyPinsIsFast) {
     }
 }
 
+/// The first pin of that name, looked for one by one.
+Pin* FirstNamed(const Iterator<Pin*>& pins, const std::string& name) {
+    for (Pin* pin : pins) {
+        if (pin->IsNamed(name.c_str())) {
+            return pin;
+        }
+    }
+    return nullptr;
+}
+
+/// Long lists with pins that are added, renamed to new names and to names that are taken, assigned
+/// and sorted, in any order: each look-up finds what a search one by one finds.
+RC_GTEST_PROP(PinLists, FindTheFirstPinOfAnyName, ()) {
+    Component component("C");
+    std::vector<std::unique_ptr<Instance>> instances;
+    const auto name = [] { return "P" + std::to_string(*rc::gen::inRange(0, 40)); };
+    const int steps = *rc::gen::inRange(1, 60);
+    for (int i = 0; i < *rc::gen::inRange(0, 30); ++i) {
+        component.AddPin(name().c_str(), *rc::gen::element(In, Out), "");
+    }
+    const auto anyPin = [&]() -> Pin* {
+        const int which = *rc::gen::inRange(0, static_cast<int>(instances.size()) + 1);
+        Iterator<Pin*> pins =
+            which == 0 ? component.GetPinIterator()
+                       : instances[static_cast<std::size_t>(which - 1)]->GetPinIterator();
+        for (int skipped = *rc::gen::inRange(0, 40); skipped > 0 && !pins.IsAtEnd(); --skipped) {
+            pins.Next();
+        }
+        return pins.GetCurrent();
+    };
+    for (int step = 0; step < steps; ++step) {
+        Pin* const pin = anyPin();
+        switch (*rc::gen::inRange(0, 6)) {
+        case 0:
+            component.AddPin(name().c_str(), *rc::gen::element(In, Out), "");
+            break;
+        case 1:
+            instances.push_back(std::make_unique<Instance>("u", &component));
+            break;
+        case 2:
+            if (!instances.empty()) {
+                instances.back()->SortPinName();
+            }
+            break;
+        case 3:
+            if (auto* const scalar = dynamic_cast<ScalarPin*>(pin)) {
+                *scalar = ScalarPin(name().c_str(), In);
+            }
+            break;
+        default:
+            if (pin != nullptr) {
+                pin->SetName(name().c_str());
+            }
+        }
+        for (int i = 0; i < 41; ++i) {
+            const std::string wanted = "p" + std::to_string(i);
+            RC_ASSERT(component.GetPin(wanted.c_str()) ==
+                      FirstNamed(component.GetPinIterator(), wanted));
+            for (const auto& instance : instances) {
+                RC_ASSERT(instance->GetPin(wanted.c_str()) ==
+                          FirstNamed(instance->GetPinIterator(), wanted));
+            }
+        }
+    }
+}
+
+TEST(PinLists, AnInstanceKeepsItsLongListWithoutTheComponent) {
+    auto component = std::make_unique<Component>("C");
+    for (int i = 0; i < 20; ++i) {
+        component->AddPin(("P" + std::to_string(i)).c_str(), In, "");
+    }
+    const Instance instance("u", component.get());
+    component->AddPin("P20", In, "");
+    component->GetPin("P3")->SetName("Q");
+    EXPECT_NE(instance.GetPin("P3"), nullptr);
+    EXPECT_EQ(instance.GetPin("P20"), nullptr);
+    EXPECT_EQ(component->GetPin("P3"), nullptr);
+    EXPECT_NE(component->GetPin("Q"), nullptr);
+    component.reset();
+    EXPECT_NE(instance.GetPin("P19"), nullptr);
+    EXPECT_EQ(instance.GetPin("Q"), nullptr);
+    EXPECT_EQ(instance.GetPin("P19")->GetObjectType(), ObjectTypePin);
+}
+
 } // namespace

@@ -10,7 +10,7 @@ using namespace Orn_Hdl;
 
 namespace {
 
-/// Lines of nets with more ends than this say little about the design, and hide the other lines.
+/// Nets with more ends than this are not drawn as lines, which would hide the other lines.
 constexpr std::size_t MostEndsDrawn = 32;
 
 std::string GetConstantText(const BitVectorValue& value) {
@@ -225,7 +225,7 @@ DesignGraph::SortedEnds DesignGraph::SortEnds(const Net& net) const {
             both = both == nullptr && end.role == Role::Both ? &end : both;
         }
     }
-    // A net of bidirectional ends alone begins at the first of them.
+    // A net with only bidirectional ends is drawn from the first of them.
     if (sorted.drivers.empty() && !sorted.hasHiddenDriver && both != nullptr) {
         sorted.drivers.push_back(both);
         std::erase(sorted.readers, both);

@@ -1,4 +1,4 @@
-// A design as a graph: boxes, nets, and what of them is drawn.
+// A design as a graph: boxes, nets, and the part to draw.
 #pragma once
 
 #include <cstddef>
@@ -15,7 +15,7 @@ class Signal;
 
 namespace Tool {
 
-/// The bus that a slice or bit belongs to; any other signal itself.
+/// The bus of a slice or bit; any other signal itself.
 const Orn_Hdl::Signal& GetWholeSignal(const Orn_Hdl::Signal& signal);
 
 /// Instances are boxes; whole signals are nets, which end at pins of boxes and at ports. Slices,
@@ -36,15 +36,15 @@ public:
         const Orn_Hdl::Signal* part = nullptr;
         Role role = Role::Reads;
     };
-    /// Another net whose value a net or a part of it takes.
+    /// Another net that drives a net or a part of it.
     struct Source {
         std::size_t net = 0;
-        /// The part of the net that takes the value.
+        /// The driven part of the net.
         const Orn_Hdl::Signal* part = nullptr;
     };
     struct Constant {
         std::string value;
-        /// The net or the part of it that has the value.
+        /// The driving net or part of it.
         const Orn_Hdl::Signal* part = nullptr;
     };
     struct Net {
@@ -60,7 +60,7 @@ public:
         /// The number of the pin in its instance.
         std::size_t pin = 0;
         std::size_t net = 0;
-        /// The net or the part of it that is wired to the pin.
+        /// The net or the part of it that is connected to the pin.
         const Orn_Hdl::Signal* part = nullptr;
     };
     struct Box {
@@ -69,7 +69,7 @@ public:
         std::vector<Wire> wires;
         bool drawn = true;
     };
-    /// The ends of one net, apart by their roles.
+    /// The ends of one net by their roles.
     struct SortedEnds {
         std::vector<const End*> drivers;
         std::vector<const End*> readers;
@@ -87,16 +87,15 @@ public:
     std::size_t CountDrawnBoxes() const noexcept;
 
     /// Draws only the surroundings of an instance or signal: the instance, or the instances at the
-    /// signal, and the instances that `depth` steps along nets reach. Steps do not go along nets
-    /// with very many ends.
-    /// \return false when there is no instance and no signal of that name.
+    /// signal, and the instances within `depth` steps along nets. Nets with very many ends are not
+    /// followed.
+    /// \return false if there is no instance and no signal of that name.
     bool KeepAround(const std::string& name, int depth);
 
     /// Whether a net has too many ends to be drawn as lines.
     static bool HasManyEnds(const Net& net) noexcept;
     SortedEnds SortEnds(const Net& net) const;
-    /// Whether the lines of a net meet in a point, because no single end of the net drives all of
-    /// it.
+    /// Whether the lines of a net meet in a point, because no single end drives the whole net.
     static bool NeedsPoint(const Net& net, const SortedEnds& ends);
 
 private:
@@ -118,7 +117,7 @@ private:
     void AddPieces(const Orn_Hdl::Signal& signal, std::vector<Piece>& pieces);
 
     /// Draws a net and its aliases, and appends the boxes that it reaches to `boxes`.
-    /// \param always also a net with very many ends.
+    /// \param always draws a net with very many ends, too.
     void Reach(std::size_t net, bool always, std::vector<std::size_t>& boxes);
     bool IsDrawn(const End& end) const { return end.box == NoBox || boxes_[end.box].drawn; }
 

@@ -10,15 +10,15 @@ using namespace Orn_Hdl;
 
 namespace {
 
-/// With more boxes than this, Graphviz takes minutes unless its limits are lowered.
+/// With more boxes than this, Graphviz needs minutes unless its limits are lowered.
 constexpr std::size_t MostBoxesDrawnWell = 150;
 /// With more boxes than this, the limits have to be lower still.
 constexpr std::size_t MostBoxesDrawnFairly = 1500;
 
-// Kinds of nodes; the number of the net makes a node's name of them.
+// Prefixes of node names, followed by the number of the net.
 constexpr std::string_view PortNode = "s";
 constexpr std::string_view PointNode = "n";
-/// The name of a net in place of lines to the rest of it.
+/// The name of a net, drawn instead of lines.
 constexpr std::string_view StubNode = "h";
 constexpr std::string_view ConstantNode = "c";
 
@@ -141,7 +141,7 @@ void DotWriter::WriteSources(const Net& net, const std::string& to) {
     for (const DesignGraph::Source& source : net.sources) {
         const Net& from = graph_.GetNets()[source.net];
         if (from.drawn) {
-            // Sorting the ends of a net with very many would be done again for each alias.
+            // The ends of a net with very many would be sorted again for each alias.
             const std::string start = DesignGraph::HasManyEnds(from)
                                           ? GetNode(StubNode, from)
                                           : GetStart(from, graph_.SortEnds(from));

@@ -1,4 +1,4 @@
-// Spells a graph in DOT, the language of Graphviz.
+// Writes a graph in DOT, the language of Graphviz.
 #pragma once
 
 #include "draw/DesignGraph.h"
@@ -12,8 +12,8 @@ class Pin;
 
 namespace Tool {
 
-/// Boxes show their pins, inputs at the left; ports are arrows; buses are thick. A net with one
-/// driver runs from it to every reader; any other net has a point, to which its drivers lead. Nets
+/// Boxes show their pins, inputs on the left; ports are arrows; buses are thick. A net with one
+/// driver is drawn from it to every load; any other net has a point to which its drivers lead. Nets
 /// with very many ends, such as clocks, are drawn as names at the pins.
 class DotWriter {
 public:
@@ -42,7 +42,7 @@ private:
     void WriteLine(std::string_view from, std::string_view to, const Orn_Hdl::Signal& part,
                    std::string_view more);
 
-    /// The node, and the side of it, where the lines of a net begin that has not very many ends.
+    /// The node, and its side, where the lines of a net begin, unless it has very many ends.
     std::string GetStart(const Net& net, const SortedEnds& ends) const;
     std::string GetEndNode(const Net& net, const End& end) const;
     std::string GetNode(std::string_view kind, const Net& net) const;

@@ -10,13 +10,13 @@
 
 namespace Tool::Import {
 
-/// Gives the bit numbers of each module consecutive indices, in the order of their first use.
-/// Programs number bits without large gaps, so numbers up to a limit have a table; larger ones must
-/// not make the table huge. All modules share the table: a file may have many modules, each with
-/// few bits of large numbers.
+/// Assigns consecutive indices to the bit numbers of each module, in the order of their first use.
+/// Programs number bits without large gaps, so a table contains the numbers up to a limit; larger
+/// numbers must not make the table huge. All modules share the table, because a file may have many
+/// modules, each with a few bits of large numbers.
 class BitNumbers {
 public:
-    /// \param limit the greatest number that gets a place in the table.
+    /// \param limit the greatest number in the table.
     explicit BitNumbers(std::size_t limit) : limit_(limit) {}
 
     /// Begins a module, whose first index is 0.
@@ -26,8 +26,8 @@ public:
     std::uint32_t GetCount() const noexcept { return next_ - first_; }
 
 private:
-    /// A bit's index counted over all modules, plus 1. Entries of earlier modules are lower than
-    /// those of the present one, and so need not be removed.
+    /// For each bit its index counted over all modules, plus 1. Entries of earlier modules are
+    /// lower than those of the present one and need not be removed.
     using Entry = std::uint32_t;
 
     Bit Claim(Entry& entry);
@@ -36,7 +36,7 @@ private:
     Entry first_ = 1;
     Entry next_ = 1;
     std::vector<Entry> table_;
-    /// Sorted, since numbers can be chosen to collide in a hash table.
+    /// Sorted, because numbers could be chosen to collide in a hash table.
     std::map<std::int64_t, Entry> others_;
 };
 

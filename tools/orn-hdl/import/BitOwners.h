@@ -16,11 +16,11 @@
 namespace Tool::Import {
 
 struct ImportedSignal {
-    /// Until the names are claimed, the name wanted.
+    /// The wanted name until names are claimed.
     std::string name;
-    /// The port of the file that it is; null for an internal signal.
+    /// The port in the file; null for an internal signal.
     const ModulePort* port = nullptr;
-    /// The net of the file that it was; null for a signal that the import adds.
+    /// The net in the file; null for a signal that the import adds.
     const Net* net = nullptr;
     BitRange range;
     std::uint32_t width = 1;
@@ -39,9 +39,9 @@ struct BitOwner {
     std::uint32_t position = 0;
 };
 
-/// Gives every bit that is used one owner: a port, or the best of the nets that share it. Output
-/// ports that share a bit with another port own none, so that no bit gets a second driver, and no
-/// output port is read for the sake of another.
+/// Assigns an owner to every used bit: a port, or the best of the nets that share it. An output
+/// port that shares a bit with another port owns no bit, so that no bit gets a second driver and no
+/// output port is read to drive another.
 class BitOwners {
 public:
     /// \param top must outlive the result.
@@ -51,13 +51,14 @@ public:
     const std::vector<ImportedSignal>& GetSignals() const noexcept { return signals_; }
     /// The owner of a net bit.
     const BitOwner& Get(Bit bit) const { return owners_[bit]; }
-    /// The signal that carries the constant `Zero` or `One` among nets; null when none is needed.
+    /// The signal that carries the constant `Zero` or `One` inside compounds; null if none is
+    /// needed.
     const ImportedSignal* GetConstant(Bit bit) const noexcept {
         const std::uint32_t index = constants_[bit - Zero];
         return index == BitOwner::NoSignal ? nullptr : &signals_[index];
     }
 
-    /// Names that can stay are claimed before others are made that resemble theirs.
+    /// Legal names are claimed before similar names are generated for others.
     void ClaimLegalNames(UniqueNames& names);
     void ClaimOtherNames(UniqueNames& names);
     /// Adds the signal that carries a constant unless there is one.
@@ -79,8 +80,7 @@ private:
     void AddSharedOutputs(const BitUses& uses);
     void AddNamelessBits(const BitUses& uses);
     void SetOwner(Bit bit, std::uint32_t index, std::uint32_t position);
-    /// Adds a signal that owns those of the bits that need an owner and have none. Without such
-    /// bits, nothing is added.
+    /// Adds a signal that owns the bits that need an owner and have none, if there are any.
     void AddSignal(ImportedSignal signal, const Span& bits, const BitUses& uses);
     std::uint32_t AddScalar(std::string_view name);
 
@@ -89,7 +89,7 @@ private:
     std::vector<ImportedSignal> signals_;
     /// By signal: whether it has its final name.
     std::vector<bool> named_;
-    /// The net of the same name as a port, by that name; null when there is none.
+    /// The net of the same name as a port; null if there is none.
     std::unordered_map<std::string_view, const Net*> portNets_;
     std::vector<Candidate> publicNets_;
     std::vector<Candidate> hiddenNets_;

@@ -59,7 +59,7 @@ void BitUses::CheckConstant(const ModulePort& port, std::uint32_t i) const {
     }
 }
 
-/// An output port that shares a bit with another one becomes an alias as a whole.
+/// An output port that shares a bit with another one is driven by other signals in all its bits.
 void BitUses::ShareWholePort(const ModulePort& port) {
     const auto isShared = [](const BitUse& use) {
         return use.outputs == UseCount::Many && !use.input && !use.inout;
@@ -104,7 +104,7 @@ void BitUses::CountConnections(const ImportedComponents& components) {
 
 void BitUses::CountConnection(const Cell& cell, std::uint32_t index, const ImportedPin& pin) {
     const Span& bits = top_.connections[index].bits;
-    // An input pin keeps its net, which shows that the net is read there.
+    // An input pin keeps its net, which shows that it is a load of the net.
     if (bits.count == 0 || (pin.direction != Direction::Input && !IsUsedElsewhere(bits))) {
         open_[index] = true;
         return;

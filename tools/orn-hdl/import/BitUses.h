@@ -26,7 +26,7 @@ struct BitUse {
     /// A port with any bit that several outputs share counts as `Many` for all its bits.
     UseCount outputs : 2 = UseCount::None;
     UseCount pins : 2 = UseCount::None;
-    /// Whether a net has the bit whose name no program made up.
+    /// Whether the bit belongs to a net whose name no program generated.
     bool publicName : 1 = false;
     /// Whether the bit needs a signal.
     bool needed : 1 = false;
@@ -35,15 +35,15 @@ struct BitUse {
 /// The uses of all bits.
 class BitUses {
 public:
-    /// \param top must outlive the result, as must `unknown`.
-    /// \throws Error when ports contradict each other, or an x or z without a replacement drives
-    ///         something.
+    /// \param top must outlive the result, and so must `unknown`.
+    /// \throws Error if ports contradict each other, or an x or z without a replacement is a
+    /// driver.
     static BitUses Count(const Module& top, const ImportedComponents& components,
                          const UnknownValues& unknown);
 
     const BitUse& Get(Bit bit) const { return uses_[bit]; }
     /// Whether a connection, given by its index, is left open: none of its bits has another pin, a
-    /// port, or a name that no program made up.
+    /// port, or a name that no program generated.
     bool IsOpen(std::uint32_t connection) const { return open_[connection]; }
 
 private:

@@ -4,7 +4,7 @@ namespace Tool::Import {
 
 namespace {
 
-/// The type of cells without pins that only record where flattened cells came from.
+/// The type of cells without pins that only record the origin of flattened cells.
 constexpr std::string_view ScopeInfo("$scopeinfo");
 
 } // namespace

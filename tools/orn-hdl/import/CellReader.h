@@ -1,4 +1,4 @@
-// Reads cells, and collects the types that they have.
+// Reads cells and collects their types.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -18,8 +18,8 @@ public:
     CellReader(ImportedDesign& design, JsonWalker& walker, PartReader& parts, bool keepAttributes)
         : design_(design), walker_(walker), parts_(parts), keepAttributes_(keepAttributes) {}
 
-    /// Reads a cell into a module. Cells that only record where flattened cells came from are left
-    /// out.
+    /// Reads a cell into a module. Cells that only record the origin of flattened cells are
+    /// omitted.
     void Read(Module& module, std::string_view name, JsonValue& value);
 
 private:
@@ -35,7 +35,7 @@ private:
     const bool keepAttributes_;
     std::unordered_map<std::string_view, std::uint32_t> typeIndex_;
 
-    // Parts of the present cell; members so that a cell costs no allocation.
+    // Parts of the present cell; members, so that a cell needs no allocation.
     std::string_view type_;
     std::vector<std::pair<std::string_view, Span>> connections_;
     std::vector<std::pair<std::string_view, Direction>> directions_;

@@ -7,7 +7,7 @@
 namespace Tool::Import {
 
 void AppendWord(std::string& line, std::string_view word) {
-    // A line ends at a line feed or NUL, and loses a carriage return before its end.
+    // A line ends at a line feed or NUL, and a carriage return before its end is dropped.
     if (word.find_first_of(std::string_view("\n\r\0", 3)) != std::string_view::npos) {
         throw Error("a text with a line end or a NUL cannot be written to a command file");
     }

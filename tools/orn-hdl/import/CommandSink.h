@@ -48,8 +48,8 @@ private:
     std::string line_;
 };
 
-/// Appends a word of a command line, quoted where that is needed.
-/// \throws Error when no quoting carries it.
+/// Appends a word to a command line, with quotes if necessary.
+/// \throws Error if the word cannot be quoted.
 void AppendWord(std::string& line, std::string_view word);
 
 } // namespace Tool::Import

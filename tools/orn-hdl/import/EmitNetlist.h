@@ -1,4 +1,4 @@
-// Hands an imported netlist to a sink.
+// Passes an imported netlist to a sink.
 #pragma once
 
 #include "import/ImportedNetlist.h"
@@ -6,7 +6,7 @@
 
 namespace Tool::Import {
 
-/// Every sink gets the same sequence of operations.
+/// Calls the same sequence of operations for every sink.
 void EmitNetlist(const ImportedNetlist& netlist, Sink& sink);
 
 } // namespace Tool::Import

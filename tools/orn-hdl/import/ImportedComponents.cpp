@@ -16,9 +16,8 @@ namespace {
 
 /// The differences of a component from others of its type, as sorted numbers: `PinKey` for pins
 /// whose width is not the type's (for all pins of a type that is split by pins), then
-/// `ParameterKey` for parameters that other cells lack and that have no default. Only what the cell
-/// itself has takes part, so that many different cells of one type cost no more than their own
-/// sizes.
+/// `ParameterKey` for parameters that other cells lack and that have no default. Only parts
+/// of the cell itself are included, so that the cost of a cell depends only on its own size.
 using Variant = std::vector<std::uint64_t>;
 
 constexpr std::uint64_t PinKey(std::uint32_t pin, std::uint32_t width) noexcept {

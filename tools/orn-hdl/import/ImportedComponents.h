@@ -1,4 +1,4 @@
-// The components whose instances the cells of an imported design become.
+// The components of an imported design, whose instances are its cells.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -22,9 +22,9 @@ struct ImportedPin {
     std::string_view oldName;
     /// Its index in the pins of the type.
     std::uint32_t typePin = 0;
-    /// Without the range.
+    /// The name without the range.
     std::string baseName;
-    /// With the range, if the pin has one.
+    /// The name with the range, if the pin has one.
     std::string name;
     Direction direction = Direction::InOut;
     std::uint32_t width = 1;
@@ -33,7 +33,7 @@ struct ImportedPin {
 
 struct ImportedGeneric {
     std::string_view oldName;
-    /// With the value for cells that have none of their own.
+    /// The name, and the value for cells without a value of their own.
     TypedValue value;
 };
 
@@ -58,7 +58,7 @@ struct ImportedComponent {
 };
 
 /// One component for each type of cell, and further ones where cells of one type differ in the
-/// widths of their pins, or in parameters whose default is not in the file, or have few pins in
+/// widths of their pins, or in parameters without a default in the file, or have few pins in
 /// common.
 class ImportedComponents {
 public:
@@ -81,7 +81,7 @@ private:
 /// Checks the cells of the top module against the leaf modules of the design, and makes and names
 /// their components.
 /// \param names the scope that components share with instances and signals.
-/// \throws Error when a cell has contents, or does not fit its leaf module.
+/// \throws Error if a cell has contents, or does not match its leaf module.
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
                                   const UnknownValues& unknown, UniqueNames& names,
                                   Warnings& warnings);

@@ -64,7 +64,7 @@ struct ModulePort {
 
 struct Net {
     std::string_view name;
-    /// Whether a program made the name up.
+    /// Whether a program generated the name.
     bool hidden = false;
     BitRange range;
     Span bits;
@@ -79,7 +79,7 @@ struct Connection {
 
 struct Cell {
     std::string_view name;
-    /// Whether a program made the name up.
+    /// Whether a program generated the name.
     bool hidden = false;
     std::uint32_t type = 0;
     Span connections;
@@ -89,9 +89,9 @@ struct Cell {
 
 struct Module {
     std::string_view name;
-    /// Marked as one whose contents do not matter.
+    /// Whether the module is marked as a black box or white box.
     bool blackBox = false;
-    /// Marked as the top of the design.
+    /// Whether the module is marked as the top of the design.
     bool top = false;
     bool hasMemories = false;
     std::vector<ModulePort> ports;
@@ -121,7 +121,7 @@ struct TypePin {
     Direction direction = Direction::Unspecified;
 };
 
-/// What the cells of one type have in common.
+/// The type of cells.
 struct CellType {
     std::string_view name;
     std::vector<TypePin> pins;

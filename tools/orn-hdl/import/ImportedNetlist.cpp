@@ -13,7 +13,7 @@ namespace Tool::Import {
 
 namespace {
 
-/// Whether a bit of a pin drives nothing and nothing is driven by it, although it is a constant.
+/// Whether a constant at a pin is neither a driver nor a load, so that the bit is open.
 bool IsOpenConstant(const ImportedPin& pin, Bit bit) noexcept {
     return pin.direction == Direction::Output
                ? !IsNet(bit)
@@ -35,7 +35,7 @@ void OpenConstants(Module& top, const Cell& cell, const ImportedPin& pin, const 
     }
 }
 
-/// Gives each constant at an output pin, which drives nothing, a net bit of its own.
+/// Replaces each constant at an output pin, which has no effect, by a net bit of its own.
 void OpenConstantOutputs(Module& top, const ImportedComponents& components, Warnings& warnings) {
     for (std::size_t c = 0; c < top.cells.size(); ++c) {
         const Cell& cell = top.cells[c];

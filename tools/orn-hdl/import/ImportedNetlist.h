@@ -1,4 +1,4 @@
-// One imported netlist: every name and every connection is decided.
+// An imported netlist, with all names and connections.
 #pragma once
 
 #include "import/BitOwners.h"
@@ -35,10 +35,9 @@ struct ImportedNetlist {
     bool hasOpenInputs = false;
 };
 
-/// Decides everything, and so finds all errors before anything is written. In the design, constants
-/// at output pins are replaced by net bits.
-/// \param top a module of the design.
-/// \throws Error when the design cannot be imported.
+/// Determines all names and connections, so that all errors are found before anything is written.
+/// In the design, constants at output pins are replaced by net bits. \param top a module of the
+/// design. \throws Error if the design cannot be imported.
 ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const UnknownValues& unknown,
                             Warnings& warnings);
 

@@ -28,7 +28,7 @@ private:
     std::string text_;
 };
 
-/// A place in a module whose path is only built when a message needs it. Empty keys are left out.
+/// A place in a module whose path is only built for a message. Empty keys are omitted.
 struct Place {
     std::string_view module;
     std::string_view table;

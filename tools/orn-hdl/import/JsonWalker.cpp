@@ -10,7 +10,7 @@ namespace {
 
 using simdjson::ondemand::json_type;
 
-/// No netlist is nested so deeply, and the stack holds many times as much.
+/// More than the depth of any netlist, and far less than would overflow the stack.
 constexpr std::size_t DeepestNesting = 200;
 
 } // namespace

@@ -16,12 +16,12 @@ using JsonValue = simdjson::ondemand::value;
 
 class JsonWalker {
 public:
-    /// Parses a text and calls `visit` with its value. \throws Error when the text is not JSON; the
-    /// message names the place that the walk has reached.
+    /// Parses a text and calls `visit` with its value. \throws Error if the text is not JSON; the
+    /// message contains the place that the walk has reached.
     template <class Visit> void Walk(std::string text, Visit visit) {
         const std::size_t size = text.size();
         text.resize(size + simdjson::SIMDJSON_PADDING);
-        // The parser holds the keys of the path that a message needs, so it outlives the try block.
+        // The parser owns the keys of the path in a message, so it outlives the try block.
         simdjson::ondemand::parser parser;
         try {
             simdjson::ondemand::document document = parser.iterate(text.data(), size, text.size());
@@ -55,7 +55,8 @@ public:
             steps_.pop_back();
         }
     }
-    /// Calls `visit` with each element of a list, in the manner of `ForEachField`.
+    /// Calls `visit` with each element of a list. During the call, and when an error ends the walk,
+    /// the present place includes the index.
     template <class Visit> void ForEachElement(JsonValue& value, Visit visit) {
         if (value.type() != simdjson::ondemand::json_type::array) {
             Fail("a list is expected");

@@ -13,7 +13,7 @@ namespace {
 using Port::IsDigit;
 using Port::IsLetter;
 
-/// Words that Verilog gained after IEEE 1364-1995, SystemVerilog's included (IEEE 1800-2017, annex
+/// Words added to Verilog after IEEE 1364-1995, including SystemVerilog's (IEEE 1800-2017, annex
 /// B), and "force". Each has a blank before and after it.
 constexpr std::string_view VerilogWords =
     " accept_on alias always_comb always_ff always_latch assert assume automatic"
@@ -34,7 +34,7 @@ constexpr std::string_view VerilogWords =
     " until_with untyped use uwire var virtual void wait_order weak wildcard with"
     " within ";
 
-/// Words that VHDL gained after IEEE 1076-1993, the names of types, literals and libraries that
+/// Words added to VHDL after IEEE 1076-1993, the names of types, literals and libraries that
 /// written VHDL mentions, and of the architecture, in lower case. Each has a blank before and
 /// after it.
 constexpr std::string_view VhdlWords =
@@ -88,8 +88,8 @@ bool IsNumber(std::string_view text) noexcept {
     return !text.empty() && std::all_of(text.begin(), text.end(), IsDigit);
 }
 
-/// A part of a made-up name without the place in a source file at its start: "opt_dff.cc:744:run"
-/// gives "run", "top.v:12" the empty text.
+/// A part of a generated name without the source location at its start: "opt_dff.cc:744:run"
+/// becomes "run", and "top.v:12" becomes empty.
 std::string_view WithoutPlace(std::string_view part) {
     const std::size_t line = part.find(':');
     if (line == std::string_view::npos) {
@@ -102,8 +102,8 @@ std::string_view WithoutPlace(std::string_view part) {
     return end == part.size() ? std::string_view() : part.substr(end + 1);
 }
 
-/// The parts of a name that mean something to a reader: of "$abc$97$auto$opt_dff.cc:744:run$12",
-/// which a program made up, "run$12". A name that no program made up stays whole.
+/// The meaningful parts of a name: "run$12" for the generated name
+/// "$abc$97$auto$opt_dff.cc:744:run$12". A name that no program generated stays whole.
 std::string GetMeaningfulParts(std::string_view name) {
     std::string result;
     if (name.empty() || name.front() != '$') {

@@ -55,7 +55,7 @@ void WriteComponent(const ImportedComponent& component, Port::Stream& out) {
     }
 }
 
-/// The signal that each net became, by the net's index; null for a net that owns no bit.
+/// The signal of each net, by the index of the net; null for a net that owns no bit.
 std::vector<const ImportedSignal*> GetSignalsOfNets(const ImportedNetlist& netlist) {
     std::vector<const ImportedSignal*> result(netlist.top.nets.size());
     for (const ImportedSignal& signal : netlist.owners.GetSignals()) {

@@ -60,7 +60,8 @@ void DecideConnections(ImportedNetlist& netlist, const BitUses& uses, UniqueName
             }
             const ImportedPin& pin = netlist.components.GetOf(c).GetPin(connection.pin);
             const SignalReferences references(top, netlist.owners, netlist.unknown);
-            // Two pins whose constant signals would share a name get a signal of the import's.
+            // If the constant signals of two pins would have the same name, the import adds a
+            // signal.
             if (references.IsConstant(connection.bits) &&
                 names.Claim(GetConstantSignalName(netlist.cellNames[c], pin))) {
                 netlist.connections[index] = ConnectionKind::Constant;

@@ -17,8 +17,8 @@ namespace {
 std::string GetWantedCellName(const ImportedNetlist& netlist, std::size_t cell) {
     const std::string_view name = netlist.top.cells[cell].name;
     const std::size_t number = name.find_last_not_of("0123456789") + 1;
-    // A name that a program made up names the step that made the cell; the component's name says
-    // more.
+    // A generated name only contains the program's step that created the cell, so the component's
+    // name is more useful.
     return netlist.top.cells[cell].hidden && number < name.size()
                ? netlist.components.GetOf(cell).name + "_" + std::string(name.substr(number))
                : std::string(name);
@@ -55,7 +55,7 @@ void NameDesign(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings
                                             : Quote(top.name) + NotLegal) +
                          "; the netlist is renamed to " + netlist.name);
     }
-    // A signal may hide its entity, but tools warn of it; a port keeps its name all the same.
+    // A signal may hide its entity, but tools warn about it; a port keeps its name nevertheless.
     if (std::none_of(top.ports.begin(), top.ports.end(), [&](const ModulePort& port) {
             return Port::EqualIgnoringCase(port.name, netlist.name);
         })) {

@@ -10,8 +10,8 @@ namespace Tool::Import {
 /// Sets the name of the netlist.
 /// \param names the scope of signals, instances and components.
 void NameDesign(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings);
-/// Sets the names of cells and signals. All names that can stay are claimed before others are made
-/// that resemble them.
+/// Sets the names of cells and signals. Legal names are claimed before similar names are generated
+/// for others.
 void NameCellsAndSignals(ImportedNetlist& netlist, UniqueNames& names);
 /// Sets the names of attributes, and warns of values that cannot be written unchanged.
 void NameAttributes(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings);

@@ -13,28 +13,28 @@
 
 namespace Tool::Import {
 
-/// All functions fail with the place of a part that is not of the expected form.
+/// All functions fail with the place of a part that does not have the expected form.
 class PartReader {
 public:
     /// \param fileSize bounds the bit numbers that a program writes into such a file.
     PartReader(ImportedDesign& design, JsonWalker& walker, std::size_t fileSize)
         : design_(design), walker_(walker), bitNumbers_(fileSize) {}
 
-    /// Begins a module, whose bits have indices of their own.
+    /// Begins a module, whose bit indices start from 0.
     void StartModule() { bitNumbers_.StartModule(); }
     /// The number of net bits that the present module has.
     std::uint32_t CountNetBits() const noexcept { return bitNumbers_.GetCount(); }
 
     Direction ReadDirection(JsonValue& value);
-    /// \return false, with nothing read, when `key` is no part of a range.
+    /// \return false, without reading anything, if `key` is not part of a range.
     bool ReadRange(std::string_view key, JsonValue& value, BitRange& range);
     Span ReadBits(Module& module, JsonValue& value);
     /// The value of a parameter or attribute. A text of the digits 0, 1, x and z is a bit vector. A
-    /// text that would look like one is followed by one blank more than it contains.
+    /// text that would look like one has an extra blank at its end.
     Value ReadValue(JsonValue& value);
     Span ReadValues(Module& module, JsonValue& value);
 
-    /// Calls `visit` with the name, kept in the design, and the value of each field. Fails when a
+    /// Calls `visit` with the name, kept in the design, and the value of each field. Fails if a
     /// name occurs twice.
     template <class Visit> void ForEachNamed(JsonValue& value, Visit visit) {
         std::pmr::monotonic_buffer_resource memory;

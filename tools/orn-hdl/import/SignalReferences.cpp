@@ -50,7 +50,7 @@ std::string SignalReferences::GetReference(const Span& bits) const {
     return text;
 }
 
-/// The name of the longest run of neighbours in one signal, in either direction, from bit `i` on.
+/// The name of the longest ascending or descending run of bits of one signal from bit `i` on.
 /// \param i becomes the last bit of the run.
 std::string SignalReferences::TakeRun(const Span& bits, std::uint32_t& i) const {
     const BitOwner first = owners_.Get(GetBit(bits, i));
@@ -71,8 +71,8 @@ std::string SignalReferences::TakeRun(const Span& bits, std::uint32_t& i) const 
         last = owners_.Get(next).position;
     }
     if (step == 1 && last - first.position == signal.highest - signal.lowest) {
-        // The name of the whole reversed bus would declare the bus anew, so the first bit stands
-        // alone.
+        // The reversed range of a whole bus would declare the bus again, so the first bit is
+        // written separately.
         i = start;
         last = first.position;
     }

@@ -1,4 +1,4 @@
-// How bits are spelt: by the name of a signal, of a part of one, or of a compound.
+// References to bits: by the name of a signal, of a part of one, or of a compound.
 #pragma once
 
 #include "import/BitOwners.h"
@@ -20,7 +20,7 @@ inline std::string GetFullName(const ImportedSignal& signal) {
 
 class SignalReferences {
 public:
-    /// \param owners not owned; it must outlive this.
+    /// \param owners not owned; it must outlive this object.
     SignalReferences(const Module& top, const BitOwners& owners,
                      const UnknownValues& unknown) noexcept
         : top_(top), owners_(owners), unknown_(unknown) {}
@@ -32,7 +32,7 @@ public:
     bool IsConstant(const Span& bits) const;
     /// The digits of bits that are all constants, leftmost first.
     std::string GetDigits(const Span& bits) const;
-    /// The name of all bits together, "-" when a bit has no owner.
+    /// The name of all bits together; "-" if a bit has no owner.
     std::string GetReference(const Span& bits) const;
 
 private:

@@ -1,12 +1,12 @@
-// Where an imported design goes. A model and a command file get the same sequence of operations, so
-// that the command file, replayed, gives the same netlist.
+// The destination of an imported design. A model and a command file receive the same sequence of
+// operations, so that replaying the command file gives the same netlist.
 #pragma once
 
 #include <string>
 
 namespace Tool::Import {
 
-/// An attribute of a given type, as the command language spells both.
+/// An attribute and its type, as written in the command language.
 struct TypedValue {
     std::string name;
     std::string type;

@@ -1,4 +1,4 @@
-// Which modules of a design are which.
+// The roles of modules: the top module, and leaf modules.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -7,9 +7,9 @@
 
 namespace Tool::Import {
 
-/// The module to import: the named one, or, when `name` is empty, the one marked as top, or the
-/// only one that is no black box.
-/// \throws Error when there is none, or more than one.
+/// The module to import: the named one, or, if `name` is empty, the one marked as top, or the only
+/// one that is not a black box.
+/// \throws Error if there is none, or more than one.
 Module& FindTop(ImportedDesign& design, std::string_view name);
 
 /// Whether a module is a leaf: marked as a black box, or without contents.

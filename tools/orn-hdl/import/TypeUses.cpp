@@ -18,9 +18,9 @@ bool MayBeInteger(const Value& value) noexcept {
     return value.kind == Value::Bits && value.text.size() == 32;
 }
 
-/// Types with more open pins for each connection are split by the pins that cells have.
+/// Types with more pins than this for each connection are split by the pins of their cells.
 constexpr std::uint64_t MostPinsPerConnection = 8;
-/// So many pins of instances are no burden, open or not.
+/// Types whose instances have no more pins than this in all are not split.
 constexpr std::uint64_t FewPins = 65536;
 
 void AppendName(std::string& list, std::string_view name) {
@@ -129,7 +129,7 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
     }
 }
 
-/// Decides what the components of a type have in common.
+/// Determines the common parameters of the components of a type, and whether it is split by pins.
 void CompareCells(TypeUse& type) {
     for (TypeUse::Pin& pin : type.pins) {
         pin.width = std::max<std::uint32_t>(pin.width, 1);

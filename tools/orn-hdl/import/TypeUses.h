@@ -1,4 +1,4 @@
-// How the cells of the top module use their types: widths of pins, and parameters.
+// The uses of cell types in the top module: widths of pins, and parameters.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -16,22 +16,22 @@ struct TypeUse {
     struct Pin {
         /// The port of the leaf module; null without a leaf module.
         const ModulePort* port = nullptr;
-        /// The leaf module's width, else that of the first cell that connects the pin.
+        /// The width in the leaf module, otherwise that in the first cell that connects the pin.
         std::uint32_t width = 0;
     };
     struct Parameter {
         std::string_view name;
-        /// The value of the first cell that has it.
+        /// The value in the first cell that has the parameter.
         const Value* first = nullptr;
-        /// The value that the leaf module gives; null without one.
+        /// The default value in the leaf module; null if there is none.
         const Value* defaultValue = nullptr;
-        /// The number of cells that have it.
+        /// The number of cells that have the parameter.
         std::uint32_t cells = 0;
         /// Whether the values of the cells are of different kinds.
         bool kindVaries = false;
     };
 
-    /// The module that describes the type; null when the file has none.
+    /// The module that describes the type; null if the file has none.
     const Module* leaf = nullptr;
     const Cell* firstCell = nullptr;
     std::uint32_t cells = 0;
@@ -43,8 +43,8 @@ struct TypeUse {
     std::uint64_t connections = 0;
     /// The indices of the parameters that every component of the type has.
     std::vector<std::uint32_t> commonParameters;
-    /// Whether each set of pins needs a component of its own: with a component that has the pins of
-    /// all cells, instances would consist of open pins almost entirely.
+    /// Whether each set of pins needs a component of its own, because almost all pins of the
+    /// instances of a common component would be open.
     bool splitsByPins = false;
 
     /// Whether some cells take the default of a parameter.
@@ -57,7 +57,7 @@ struct TypeUse {
 
 /// The uses of the types of a design, by the index of the type. Adds the ports of leaf modules to
 /// the pins of their types. Warns of values whose type the file does not contain. \throws Error
-/// when a cell has contents, or does not fit its leaf module.
+/// if a cell has contents, or does not match its leaf module.
 std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top, Warnings& warnings);
 
 } // namespace Tool::Import

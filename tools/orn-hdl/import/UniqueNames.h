@@ -10,8 +10,8 @@
 
 namespace Tool::Import {
 
-/// The names of one scope. Names that differ in letter case only count as one. Millions of names
-/// are kept in a few blocks of memory.
+/// The names of one scope. Names that differ only in letter case are the same. Millions of names
+/// are stored in a few blocks of memory.
 class UniqueNames {
 public:
     UniqueNames() = default;
@@ -20,10 +20,10 @@ public:
 
     /// Makes room for a number of names.
     void Reserve(std::size_t count) { taken_.reserve(count); }
-    /// Takes a name. \return false when it is taken already.
+    /// Claims a name. \return false if it is claimed already.
     bool Claim(std::string_view name);
     bool IsTaken(std::string_view name) const { return taken_.count(name) != 0; }
-    /// Takes a legal name that resembles `name`, with a number when another one has it already.
+    /// Claims a legal name that resembles `name`, with a number if it is claimed already.
     std::string ClaimSimilar(std::string_view name, char initial);
 
 private:
@@ -38,7 +38,7 @@ private:
 
     std::pmr::monotonic_buffer_resource memory_;
     std::pmr::unordered_set<std::string_view, Hash, Equal> taken_{&memory_};
-    /// For each name that had to be numbered, the last number.
+    /// The last number of each numbered name.
     std::pmr::unordered_map<std::string_view, std::size_t, Hash, Equal> numbers_{&memory_};
 };
 

@@ -1,4 +1,4 @@
-// The values x and z, which a netlist cannot hold.
+// The values x and z, which a netlist cannot contain.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -7,10 +7,10 @@
 
 namespace Tool::Import {
 
-/// What the user wants x and z to become.
+/// The user's choice for x and z.
 class UnknownValues {
 public:
-    /// \param replacement `Zero` or `One`; without one, x and z are refused.
+    /// \param replacement `Zero` or `One`; without one, x and z are rejected.
     explicit UnknownValues(std::optional<Bit> replacement) noexcept : replacement_(replacement) {}
 
     bool HasReplacement() const noexcept { return replacement_.has_value(); }

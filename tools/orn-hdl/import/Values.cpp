@@ -10,8 +10,8 @@ namespace Tool::Import {
 
 namespace {
 
-/// Whether a text can stand between double quotes in both languages and mean itself, and is not
-/// taken for one that brought its own quotes.
+/// Whether a text can be written unchanged between double quotes in both languages, and is not
+/// itself enclosed in quotes.
 bool IsPlainText(std::string_view text) noexcept {
     const auto isPlain = [](char c) { return c >= ' ' && c <= '~' && c != '"' && c != '\\'; };
     const bool isQuoted = !text.empty() && text.front() == '\'' && text.back() == '\'';

@@ -1,4 +1,4 @@
-// Values of parameters and attributes: which of them can be imported, and as what.
+// Values of parameters and attributes: checks and conversion.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -10,14 +10,14 @@
 
 namespace Tool::Import {
 
-/// Refuses a parameter's value that holds an x or z without a replacement, and warns of a text that
-/// cannot be written as a text.
+/// Rejects a parameter's value that contains an x or z without a replacement, and warns about a
+/// text that cannot be written as a text.
 void CheckParameter(const Value& value, const Place& place, const UnknownValues& unknown,
                     Warnings& warnings);
 /// A parameter's value as a generic.
 TypedValue MakeGeneric(const std::string& name, const Value& value, const UnknownValues& unknown);
 
-/// Warns of a text that cannot be written unchanged.
+/// Warns about a text that cannot be written unchanged.
 void CheckAttribute(const Value& value, const Place& place, Warnings& warnings);
 TypedValue MakeAttribute(const std::string& name, const Value& value);
 

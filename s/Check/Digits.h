@@ -1,0 +1,54 @@
+// What the digits of a constant or of a bit vector mean in each language.
+#pragma once
+
+#include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Check.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+namespace Orn_Hdl::Checking {
+
+/// A value's bits, leftmost first, each of "01xz"; nothing when the text is no number.
+using BitText = std::optional<std::string>;
+
+/// The text that the writers write for a value, seen by each language.
+struct Digits {
+    explicit Digits(const BitVectorValue& value);
+
+    /// The digits as they stand.
+    std::string digits;
+    int base = 2;
+    int length = 1;
+    bool hasLength = false;
+
+    /// How many bits one digit stands for.
+    int BitsPerDigit() const noexcept { return base == 16 ? 4 : base == 8 ? 3 : 1; }
+    /// Whether Verilog reads a number.
+    bool IsVerilogNumber() const;
+    /// Whether Verilog reads a bit z.
+    bool HasHighImpedance() const {
+        return hasLength && digits.find_first_of("zZ?") != std::string::npos;
+    }
+    /// Whether VHDL-93, or 2008, reads a bit string or, without a length, a string of std_logic.
+    bool IsVhdlString(bool is2008) const;
+    /// The same for a bit vector, which has no bits but 0 and 1.
+    bool IsVhdlBitVector() const;
+    /// How many elements VHDL's string has.
+    std::size_t GetVhdlLength() const;
+    /// How many bits the digits need, without leading zeros.
+    std::size_t GetNeededBits() const;
+    /// The low `width` bits of the number that Verilog reads.
+    BitText ReadVerilog(std::size_t width) const;
+    /// The bits of VHDL's string.
+    BitText ReadVhdl() const;
+
+private:
+    /// The digits of a number with a base, as bits.
+    std::string ExpandDigits() const;
+    /// The digits of a decimal number, without leading zeros.
+    std::string GetDecimalDigits() const;
+};
+
+} // namespace Orn_Hdl::Checking

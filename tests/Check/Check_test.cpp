@@ -1,0 +1,203 @@
+#include "Orn_Hdl/Check.h"
+
+#include "Orn_Hdl/Orn_Hdl.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <set>
+#include <string>
+#include <vector>
+
+namespace Orn_Hdl {
+namespace {
+
+using Finding = Check::Finding;
+using Findings = std::vector<Finding>;
+using Verdict = Check::Verdict;
+
+/// A design of one inverter between two ports, without findings.
+class CheckTest : public ::testing::Test {
+protected:
+    CheckTest() : model_(&factory_) {
+        Do({"SET NETLIST NAME top", "SUPPRESS CONFIGURATION true", "ADD COMPONENT INV",
+            "ADD PIN INV I input", "ADD PIN INV O output", "ADD PORT A input", "ADD PORT Y output",
+            "ADD INSTANCE INV U1", "CONNECT SIGNAL A U1.I", "CONNECT SIGNAL Y U1.O"});
+    }
+
+    void Do(const std::vector<const char*>& lines) {
+        for (const char* line : lines) {
+            model_.Execute(line);
+        }
+    }
+    Findings Run(Check::Targets targets = Check::Targets::All()) {
+        return Check::Run(*model_.GetNetlist(), *model_.GetOptions(), targets);
+    }
+    /// The only finding of a rule.
+    Finding Find(const std::string& rule) {
+        const Findings all = Run();
+        const auto isMeant = [&](const Finding& each) { return each.rule->name == rule; };
+        EXPECT_EQ(std::count_if(all.begin(), all.end(), isMeant), 1) << rule;
+        const auto found = std::find_if(all.begin(), all.end(), isMeant);
+        return found == all.end() ? Finding() : *found;
+    }
+    std::string Write(bool verilog) {
+        TextMemOutStream out;
+        model_.GetOptions()->writeHeader = false;
+        if (verilog) {
+            VerilogNetlister(out).WriteNetlist(model_.GetNetlist(), *model_.GetOptions());
+        } else {
+            VhdlNetlister(out).WriteNetlist(model_.GetNetlist(), model_.GetOptions());
+        }
+        return std::string(out.GetValue().GetView());
+    }
+
+    CommandFactory factory_;
+    Model model_;
+};
+
+TEST_F(CheckTest, SoundDesignHasNoFindings) {
+    EXPECT_TRUE(Run().empty());
+}
+
+TEST_F(CheckTest, EmptyNetlistIsChecked) {
+    const Netlist netlist;
+    const HdlOptions options;
+    const Findings findings = Check::Run(netlist, options);
+    ASSERT_EQ(findings.size(), 1U);
+    EXPECT_EQ(findings[0].rule->name, "no-ports");
+}
+
+TEST_F(CheckTest, FindingNamesObjectsTargetsAndCause) {
+    Do({"ADD PORT wire input"});
+    const Finding finding = Find("reserved-word");
+    EXPECT_EQ(finding.GetSeverity(), Check::Severity::Error);
+    EXPECT_EQ(finding.objects, (std::vector<const Object*>{model_.GetSignal("wire")}));
+    EXPECT_EQ(finding.cause.kind, Check::Cause::Kind::Signal);
+    EXPECT_EQ(finding.cause.first, "wire");
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Icarus), Verdict::Rejects);
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Ghdl), Verdict::Accepts);
+}
+
+TEST_F(CheckTest, OnlyTheTargetsAskedForCount) {
+    Do({"ADD PORT signal input"});
+    EXPECT_TRUE(Run(Check::Targets::Verilog()).empty());
+    EXPECT_EQ(Run(Check::Targets::Vhdl()).size(), 1U);
+    EXPECT_TRUE(Run(Check::Targets()).empty());
+}
+
+TEST_F(CheckTest, LetterCaseOfTheVerilogNamesCounts) {
+    Do({"ADD PORT WIRE input"});
+    EXPECT_TRUE(Run().empty());
+    Do({"LOWERCASE SIGNAL"});
+    EXPECT_EQ(Find("reserved-word").verdicts.Get(Check::Target::Yosys), Verdict::Rejects);
+}
+
+TEST_F(CheckTest, DigitsThatMeanTwoThingsAreMisread) {
+    Do({"ASSIGN CONSTANT D(3:0) 1010"});
+    const Finding finding = Find("constant-digits");
+    EXPECT_EQ(finding.verdicts.GetWorst(), Verdict::Misreads);
+    EXPECT_EQ(finding.GetSeverity(), Check::Severity::Error);
+    ASSERT_EQ(finding.notes.size(), 1U);
+    EXPECT_EQ(finding.notes[0], "Verilog reads the bits 0010, VHDL reads 1010");
+}
+
+TEST_F(CheckTest, DigitsThatMeanOneThingAreNot) {
+    Do({"ASSIGN CONSTANT D(3:0) 0001", "ASSIGN CONSTANT E(2:0) 010"});
+    for (const Finding& finding : Run()) {
+        EXPECT_EQ(finding.GetSeverity(), Check::Severity::Warning) << finding.message;
+    }
+}
+
+TEST_F(CheckTest, ChangesNothing) {
+    Do({"CONNECT SIGNAL Y U1.I", "ADD PORT B(3:0) input", "CONNECT SIGNAL B(7) U1.I",
+        "ADD INSTANCE INV U2", "ADD SIGNAL open", "CONNECT SIGNAL open U2.I", "SET OPEN PIN false",
+        "ADD COMPONENT ATTRIBUTE INV LEVEL HALVEX"});
+    const auto count = [this] {
+        int signals = 0;
+        for ([[maybe_unused]] const Signal* signal : model_.GetNetlist()->GetSignalIterator()) {
+            ++signals;
+        }
+        return signals;
+    };
+    const int before = count();
+    const Findings once = Run();
+    const Findings twice = Run();
+    EXPECT_EQ(count(), before);
+    EXPECT_EQ(model_.GetComponent("INV")->GetAttr("BOX_TYPE"), nullptr);
+    ASSERT_EQ(once.size(), twice.size());
+    for (std::size_t i = 0; i < once.size(); ++i) {
+        EXPECT_EQ(once[i].message, twice[i].message);
+    }
+}
+
+TEST_F(CheckTest, WritesAreTheSameWithAndWithoutACheck) {
+    const std::string verilog = Write(true);
+    Run();
+    EXPECT_EQ(Write(true), verilog);
+    const std::string vhdl = Write(false);
+    Run();
+    EXPECT_EQ(Write(false), vhdl);
+}
+
+TEST_F(CheckTest, StandInsAreForeseenAndThenKnown) {
+    Do({"ADD INSTANCE INV U2", "CONNECT SIGNAL Y U2.I"});
+    EXPECT_TRUE(Run().empty());
+    Write(false);
+    EXPECT_TRUE(Run().empty());
+    EXPECT_NE(model_.GetNetlist()->GetStandIn(model_.GetSignal("Y")), nullptr);
+}
+
+TEST_F(CheckTest, StandInThatCannotBeMadeIsFound) {
+    Do({"ADD INSTANCE INV U2", "CONNECT SIGNAL Y U2.I", "ADD SIGNAL Y_DUMMY"});
+    EXPECT_EQ(Find("stand-in-taken").verdicts.Get(Check::Target::Vhdl93), Verdict::Rejects);
+    EXPECT_EQ(Find("stand-in-taken").verdicts.Get(Check::Target::Vhdl2008), Verdict::Accepts);
+}
+
+TEST_F(CheckTest, LongAndOddNamesDoNoHarm) {
+    Do({"ADD PORT a%b input", "ADD PORT \\x input", "ADD PORT D(99999999999:0) input",
+        "ASSIGN CONSTANT E(2147483647:0) 1", "ADD PORT \"(\" input", "ADD PORT \",\" input"});
+    model_.AddSignal(std::string(1000000, 'n').c_str());
+    EXPECT_FALSE(Run().empty());
+}
+
+TEST_F(CheckTest, ObjectsThatOnlyProgramsMakeDoNoHarm) {
+    Netlist& netlist = *model_.GetNetlist();
+    netlist.Add(new Bus("nobus"));
+    netlist.Add(new BusIndex("Z(3)", nullptr));
+    netlist.Add(new BusSlice("Z(3:0)", nullptr));
+    netlist.Add(new CompoundBus("none"));
+    netlist.Add(new Instance("lonely", nullptr));
+    netlist.Add(new ScalarSignal(""));
+    model_.GetInstance("U1")->GetPin("I")->Connect(model_.GetSignal("Z(3)"));
+    netlist.GetSignal("none")->AssignConstantValue("4:B:1010");
+    netlist.Remove(model_.GetComponent("INV"));
+    EXPECT_FALSE(Run().empty());
+}
+
+TEST(CheckRules, NamesAreUniqueAndFound) {
+    std::set<std::string_view> names;
+    for (const Check::Rule& rule : Check::GetRules()) {
+        EXPECT_TRUE(names.insert(rule.name).second) << rule.name;
+        EXPECT_EQ(Check::FindRule(rule.name)->name, rule.name);
+        EXPECT_FALSE(rule.what.empty() || rule.why.empty() || rule.example.empty() ||
+                     rule.help.empty());
+        EXPECT_NE(rule.verdicts.GetWorst(), Verdict::Accepts) << rule.name;
+    }
+    EXPECT_EQ(Check::FindRule("no such rule"), nullptr);
+}
+
+TEST(CheckTargets, HaveNames) {
+    for (const Check::Target target : Check::GetTargets()) {
+        Check::Target found = {};
+        EXPECT_TRUE(Check::FindTarget(Check::GetName(target), found));
+        EXPECT_EQ(found, target);
+        EXPECT_NE(Check::Targets::Verilog().Has(target), Check::Targets::Vhdl().Has(target));
+        EXPECT_TRUE(Check::Targets::All().Has(target));
+    }
+    Check::Target found = {};
+    EXPECT_FALSE(Check::FindTarget("ada", found));
+}
+
+} // namespace
+} // namespace Orn_Hdl

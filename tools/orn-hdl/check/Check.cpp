@@ -1,0 +1,217 @@
+#include "check/Check.h"
+
+#include "check/Checker.h"
+#include "check/Located.h"
+#include "check/Report.h"
+
+#include "Orn_Hdl/Orn_Hdl.h"
+#include "Port/File.h"
+#include "Run.h"
+
+#include <cstdint>
+#include <cstdio>
+#include <memory>
+#include <sstream>
+#include <string_view>
+#include <utility>
+
+namespace Tool {
+
+namespace {
+
+using Checking::Checker;
+using Checking::Located;
+using Orn_Hdl::Check;
+
+/// A command file that can be read twice: standard input is copied.
+class Source {
+public:
+    explicit Source(const std::string& file) : name_(SystemFileName(file.c_str())) {
+        if (file == "-") {
+            Copy();
+        }
+    }
+    Source(const Source&) = delete;
+    Source& operator=(const Source&) = delete;
+    ~Source() {
+        if (copy_ != nullptr) {
+            std::fclose(copy_);
+        }
+    }
+    const char* GetName() const noexcept { return name_.c_str(); }
+
+private:
+    void Copy() {
+        copy_ = std::tmpfile();
+        if (copy_ == nullptr) {
+            return;
+        }
+        char piece[1 << 16];
+        std::size_t count = 0;
+        while ((count = std::fread(piece, 1, sizeof piece, stdin)) > 0) {
+            std::fwrite(piece, 1, count, copy_);
+        }
+        std::fflush(copy_);
+        name_ = "/dev/fd/" + std::to_string(::fileno(copy_));
+    }
+
+    std::string name_;
+    std::FILE* copy_ = nullptr;
+};
+
+std::string_view WithoutLineEnd(std::string_view text) noexcept {
+    if (!text.empty() && text.back() == '\n') {
+        text.remove_suffix(1);
+    }
+    return text;
+}
+
+/// The replay of one file, with a check at each line that would write.
+class FileCheck {
+public:
+    FileCheck(const CheckOptions& options, const std::string& file, Check::Targets targets)
+        : options_(options), file_(file), targets_(targets) {}
+
+    Status Run(std::vector<Located>& all);
+
+private:
+    Status Replay(const char* systemName);
+    bool Execute(const Orn_Hdl::StringArray& words);
+
+    const CheckOptions& options_;
+    const std::string& file_;
+    const Check::Targets targets_;
+    Orn_Hdl::Model* model_ = nullptr;
+    std::unique_ptr<Checker> checker_;
+    std::vector<Located> findings_;
+    std::uint64_t line_ = 0;
+};
+
+bool FileCheck::Execute(const Orn_Hdl::StringArray& words) {
+    ++line_;
+    try {
+        if (checker_->IsWrite(words)) {
+            checker_->CheckWrite(words, line_, findings_);
+        } else {
+            checker_->BeforeCommand(words);
+            model_->Execute(words);
+        }
+        return true;
+    } catch (const Orn_Hdl::Exception& exception) {
+        PrintError(file_ + ":" + std::to_string(line_) +
+                   ": error: " + std::string(WithoutLineEnd(exception.getLocalized().GetView())));
+        return false;
+    }
+}
+
+Status FileCheck::Replay(const char* systemName) {
+    Orn_Hdl::CommandReader input(*model_);
+    if (!input.Open(systemName)) {
+        return ComplainUnreadable(file_, input.GetError());
+    }
+    while (const Orn_Hdl::StringArray* words = input.Next()) {
+        if (!Execute(*words)) {
+            return Status::Failed;
+        }
+    }
+    return input.GetError() == 0 ? Status::Success : ComplainUnreadable(file_, input.GetError());
+}
+
+Status FileCheck::Run(std::vector<Located>& all) {
+    const Source source(file_);
+    // The design stands until the process ends, as in `run`.
+    static Orn_Hdl::Engine* engine = nullptr;
+    delete std::exchange(engine, nullptr);
+    engine = new Orn_Hdl::Engine;
+    const std::string name = GetModelName(file_, options_.model);
+    engine->CreateAndAddModel(name.c_str(), file_.c_str());
+    model_ = engine->GetModel(name.c_str());
+    checker_ = std::make_unique<Checker>(*model_, targets_);
+    const Status status = Replay(source.GetName());
+    if (status != Status::Success) {
+        return status;
+    }
+    if (!checker_->IsChecked()) {
+        checker_->CheckAll(line_, findings_);
+    }
+    for (Located& located : findings_) {
+        located.file = file_;
+    }
+    if (!Checking::Locate(source.GetName(), findings_)) {
+        return ComplainUnreadable(file_, 0);
+    }
+    for (Located& located : findings_) {
+        // What no line brought in is told of at the line that writes it.
+        located.line = located.line == 0 ? located.checkedAt : located.line;
+        all.push_back(std::move(located));
+    }
+    return Status::Success;
+}
+
+bool ReadTargets(const std::string& names, Check::Targets& targets) {
+    targets = names.empty() ? Check::Targets::All() : Check::Targets();
+    std::istringstream rest(names);
+    for (std::string name; std::getline(rest, name, ',');) {
+        Check::Target target = {};
+        if (!Check::FindTarget(name, target)) {
+            std::string known;
+            for (const Check::Target each : Check::GetTargets()) {
+                known.append(known.empty() ? "" : ", ").append(Check::GetName(each));
+            }
+            Complain("there is no target " + name + "; there are " + known);
+            return false;
+        }
+        targets.Add(target);
+    }
+    return true;
+}
+
+Status ExplainRule(const std::string& name) {
+    const Check::Rule* const rule = Check::FindRule(name);
+    if (rule == nullptr) {
+        Complain("there is no rule " + name + "; check --list lists them");
+        return Status::Usage;
+    }
+    return Print(Checking::Explain(*rule));
+}
+
+bool Fails(const Located& located, const std::string& failOn) {
+    return failOn == "warning" ||
+           (failOn == "error" && located.finding.GetSeverity() == Check::Severity::Error);
+}
+
+} // namespace
+
+Status CheckFiles(const CheckOptions& options) {
+    if (options.markdown) {
+        return Print(Checking::ListRulesAsMarkdown());
+    }
+    if (options.list) {
+        return Print(Checking::ListRules());
+    }
+    if (!options.explain.empty()) {
+        return ExplainRule(options.explain);
+    }
+    Check::Targets targets;
+    if (options.files.empty()) {
+        Complain("a command file is needed; check --help tells more");
+        return Status::Usage;
+    }
+    if (!ReadTargets(options.targets, targets)) {
+        return Status::Usage;
+    }
+    std::vector<Located> findings;
+    Status status = Status::Success;
+    for (const std::string& file : options.files) {
+        status = Worse(status, FileCheck(options, file, targets).Run(findings));
+    }
+    status = Worse(status, Print(Checking::Format(findings, options.format)));
+    for (const Located& located : findings) {
+        if (Fails(located, options.failOn)) {
+            return Worse(status, Status::Failed);
+        }
+    }
+    return status;
+}
+
+} // namespace Tool
