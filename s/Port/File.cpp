@@ -306,9 +306,9 @@ bool File::close() {
     }
     if (appends_) {
         CloseAppended();
-        return error_ == 0;
+    } else {
+        CloseDescriptor();
     }
-    CloseDescriptor();
     if (!temporary_.empty() && error_ == 0) {
         if (RenameTemporary() == 0) {
             temporary_.clear();

@@ -135,4 +135,14 @@ TEST_F(Below, NoDescriptorIsLeftOpen) {
     EXPECT_FALSE(folder_.IsOpen());
 }
 
+TEST_F(Below, AClosedFileKeepsNoFolderOpen) {
+    const int before = Support::CountOpenFiles();
+    for (const File::Mode mode : {File::Append, File::Overwrite, File::Replace}) {
+        File file;
+        EXPECT_TRUE(file.OpenBelow(folder_, "sub/a", mode, true));
+        EXPECT_TRUE(file.close());
+        EXPECT_EQ(Support::CountOpenFiles(), before) << mode;
+    }
+}
+
 } // namespace
