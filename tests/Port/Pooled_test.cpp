@@ -60,7 +60,10 @@ TEST(Pooled, BuildsInAGivenPlace) {
 /// More than any address space holds, asked for by a size and not by a type.
 constexpr std::size_t TooMuch = SIZE_MAX / 4;
 
-TEST(Pooled, TellsThatAllocationFailed) {
+TEST(Pooled, ReportsThatAllocationFailed) {
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+    GTEST_SKIP() << "a sanitizer ends the program at a request of this size";
+#endif
     EXPECT_THROW(Small::operator new(TooMuch), std::bad_alloc);
     EXPECT_EQ(Small::operator new(TooMuch, std::nothrow), nullptr);
 }
