@@ -25,14 +25,14 @@ ORN_HDL_API void Free(void* memory) noexcept;
 /// Objects of derived classes are allocated in pages of their own, without bookkeeping for each
 /// object. Classes of larger alignment, for which operator new receives an alignment, are allocated
 /// on the heap.
-template <Pool::Kind kind> class Pooled {
+template <Pool::Kind PoolKind> class Pooled {
 public:
     /// Memory from the pages. \throws std::bad_alloc if allocation fails.
-    static void* operator new(std::size_t size) { return Pool::Allocate(size, kind); }
+    static void* operator new(std::size_t size) { return Pool::Allocate(size, PoolKind); }
     /// Memory from the pages; null if allocation fails.
     static void* operator new(std::size_t size, const std::nothrow_t& /*tag*/) noexcept {
         try {
-            return Pool::Allocate(size, kind);
+            return Pool::Allocate(size, PoolKind);
         } catch (const std::bad_alloc&) {
             return nullptr;
         }

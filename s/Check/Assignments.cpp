@@ -202,16 +202,17 @@ void Assignments::CheckAliasWidth(const Signal& signal, const Signal& alias) {
     }
 }
 
-/// The alias names the port itself also where a stand-in is made; a compound gets the stand-in.
+/// The alias names the port itself also where a dummy signal is made; a compound gets the dummy
+/// signal.
 void Assignments::CheckOutputRead(const Signal& signal, const Signal& alias) {
     const bool isCompound = alias.GetSignalType() == SignalTypeCompoundBus;
     ForEachRun(alias, [&](const Run& run) {
         if (!HasDirection(*run.declared, Polarity::Output)) {
             return;
         }
-        const std::string standIn =
+        const std::string dummy =
             Lower(Names::BaseName(run.declared->GetDummySignalName().GetView()));
-        if (isCompound && context_.standIns.count(standIn) != 0) {
+        if (isCompound && context_.dummies.count(dummy) != 0) {
             return;
         }
         if (Finding* finding = context_.Add(RuleId::OutputRead, AliasCause(signal, alias))) {

@@ -288,10 +288,10 @@ void Walk::NoteDirection(const Instance& instance, const Pin& pin, const Signal&
     }
 }
 
-/// Ports that are used against their direction get a stand-in, unless its name is taken.
-class StandIns {
+/// Ports that are used against their direction get a dummy signal, unless its name is taken.
+class DummyForesight {
 public:
-    explicit StandIns(Context& context) : context_(context) {}
+    explicit DummyForesight(Context& context) : context_(context) {}
 
     void Foresee() {
         for (const Misused& misused : context_.readOutputs) {
@@ -314,47 +314,48 @@ private:
     Context& context_;
 };
 
-bool StandIns::CanBeMade(const Signal& port, const std::string& name) const {
+bool DummyForesight::CanBeMade(const Signal& port, const std::string& name) const {
     const bool isBus = port.GetSignalType() == SignalTypeBus;
     return context_.netlist.GetSignal(std::string_view(name)) == nullptr &&
            (!isBus || context_.netlist.GetParentBus(name.c_str()) == nullptr);
 }
 
-/// \return false when the port has no stand-in and gets none.
-bool StandIns::Make(const Signal& port) {
-    if (context_.netlist.GetStandIn(&port) != nullptr) {
+/// \return false when the port has no dummy signal and gets none.
+bool DummyForesight::Make(const Signal& port) {
+    if (context_.netlist.GetDummySignal(&port) != nullptr) {
         return true;
     }
     const std::string name(port.GetDummySignalName().GetView());
     if (!CanBeMade(port, name)) {
         return false;
     }
-    context_.standIns.emplace(Lower(Names::BaseName(name)), &port);
+    context_.dummies.emplace(Lower(Names::BaseName(name)), &port);
     return true;
 }
 
-void StandIns::ForeseeOne(const Misused& misused, bool isOutput) {
+void DummyForesight::ForeseeOne(const Misused& misused, bool isOutput) {
     if (Make(*misused.port)) {
         return;
     }
     // VHDL-2008 reads outputs; nothing lets an input be driven.
     const Verdicts verdicts =
-        isOutput ? GetRule(RuleId::StandInTaken).verdicts : Verdicts("...rr.rwr");
-    if (Finding* finding = context_.Add(RuleId::StandInTaken, verdicts,
+        isOutput ? GetRule(RuleId::DummyTaken).verdicts : Verdicts("...rr.rwr");
+    if (Finding* finding = context_.Add(RuleId::DummyTaken, verdicts,
                                         ConnectionOf(*misused.instance, *misused.pin))) {
         const std::string_view name = misused.port->GetNameView();
         finding->objects = {misused.port, misused.instance, misused.pin};
         finding->message = "the pin " + Quoted(NameOf(*misused.instance, *misused.pin)) +
                            (isOutput ? " reads the output port " : " drives the input port ") +
-                           Quoted(name) + ", which gets no stand-in";
+                           Quoted(name) + ", which gets no dummy signal";
         finding->notes = {"the name " + Quoted(misused.port->GetDummySignalName().GetView()) +
                           ", or its base name, is taken"};
         finding->other = SignalCause(Names::BaseName(misused.port->GetDummySignalName().GetView()));
     }
 }
 
-/// Output ports that several pins drive get a stand-in too; it can take the name of something else.
-void StandIns::ForeseeWired() {
+/// Output ports that several pins drive get a dummy signal too; it can take the name of something
+/// else.
+void DummyForesight::ForeseeWired() {
     for (const Signal* signal : context_.netlist.GetSignalIterator()) {
         const bool isOutput = signal->GetPortPolarity().GetValue() == Polarity::Output;
         if (isOutput && signal->HasMultiDriver()) {
@@ -363,7 +364,7 @@ void StandIns::ForeseeWired() {
     }
 }
 
-void StandIns::ReportDrivenInput(const Misused& misused) {
+void DummyForesight::ReportDrivenInput(const Misused& misused) {
     if (misused.pin->GetPolarity().GetValue() != Polarity::Output) {
         return;
     }
@@ -380,7 +381,7 @@ void StandIns::ReportDrivenInput(const Misused& misused) {
 
 void CheckConnections(Context& context) {
     Walk(context).CheckAll();
-    StandIns(context).Foresee();
+    DummyForesight(context).Foresee();
 }
 
 } // namespace Orn_Hdl::Checking

@@ -56,9 +56,9 @@ public:
     std::vector<Misused> readOutputs;
     std::vector<Misused> drivenInputs;
     /// \}
-    /// The ports that a write would make a stand-in for, by the stand-in's name in small letters
-    /// and without a range.
-    std::unordered_map<std::string, const Signal*> standIns;
+    /// The ports that a write would make a dummy signal for, by the dummy signal's name in small
+    /// letters and without a range.
+    std::unordered_map<std::string, const Signal*> dummies;
 
     /// \{
     /// Gathered by the look at the attributes: the names that VHDL declares, in small letters, and

@@ -128,7 +128,7 @@ constexpr Check::Rule Rules[] = {
      "leaves its constants and aliases out.",
      "ADD PORT open Input", "another name"},
     {"open-signal-taken", Verdicts("...mm...m"),
-     "an open input whose stand-in bears the name of another signal",
+     "an open input whose own signal bears the name of another signal",
      "With SET OPEN PIN false the VHDL writer ties an open input to a signal "
      "INSTANCE_PIN_openSignal; one that is there is used.",
      "SET OPEN PIN false\nADD SIGNAL U1_I_openSignal", "another name for the signal"},
@@ -153,10 +153,11 @@ constexpr Check::Rule Rules[] = {
     {"output-read", Verdicts("...r....r"), "an alias that reads an output port",
      "VHDL-93 does not read a port of mode out (IEEE 1076-1993, 1.1.1.2); VHDL-2008 does.",
      "ADD PORT Y Output\nCONNECT SIGNAL Z Y", "VHDL-2008, or an alias of the driver's net"},
-    {"stand-in-taken", Verdicts("...r....r"),
-     "a port used against its direction, whose stand-in cannot be made",
-     "The writers wire such pins to a stand-in of the port's name with _DUMMY. When the name is "
-     "taken, or a narrower stand-in was made for an earlier write, the port itself is used.",
+    {"dummy-taken", Verdicts("...r....r"),
+     "a port used against its direction, whose dummy signal cannot be made",
+     "The writers wire such pins to a dummy signal of the port's name with _DUMMY. When the name "
+     "is "
+     "taken, or a narrower dummy signal was made for an earlier write, the port itself is used.",
      "ADD PORT Y Output\nADD SIGNAL Y_DUMMY\nCONNECT SIGNAL Y U2.I",
      "another name for the signal, or the whole bus declared first"},
     {"attribute-types", Verdicts("...rr...r"),

@@ -42,7 +42,7 @@ enum class RuleId {
     Undriven,
     AliasLoop,
     OutputRead,
-    StandInTaken,
+    DummyTaken,
     AttributeTypes,
     UndeclaredAttribute,
     UserType,

@@ -55,7 +55,7 @@ public:
 
     void CheckAll() {
         CheckBuses();
-        CheckStandIns();
+        CheckDummySignals();
         CheckOpenSignals();
         CheckGenerics();
         CheckAttributeNames();
@@ -66,7 +66,7 @@ public:
 
 private:
     void CheckBuses();
-    void CheckStandIns();
+    void CheckDummySignals();
     void CheckOpenSignals();
     void CheckOpenPin(const Instance& instance, const Pin& pin);
     void CheckGenerics();
@@ -164,16 +164,16 @@ void Scopes::CheckBuses() {
     }
 }
 
-void Scopes::CheckStandIns() {
-    for (const auto& [name, port] : context_.standIns) {
+void Scopes::CheckDummySignals() {
+    for (const auto& [name, port] : context_.dummies) {
         const Port::String whole = port->GetDummySignalName();
-        Declared standIn;
-        standIn.what = "the stand-in " + Quoted(whole.GetView()) + " of the port " +
-                       Quoted(port->GetNameView());
-        standIn.verilogName = Spell(Names::BaseName(whole.GetView()), options_.verilog.signalCase);
-        standIn.cause = SignalCause(Names::BaseName(port->GetNameView()));
-        ForEachInScope(name, standIn, [&](const Declared& other) {
-            ReportClash(standIn, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
+        Declared dummy;
+        dummy.what = "the dummy signal " + Quoted(whole.GetView()) + " of the port " +
+                     Quoted(port->GetNameView());
+        dummy.verilogName = Spell(Names::BaseName(whole.GetView()), options_.verilog.signalCase);
+        dummy.cause = SignalCause(Names::BaseName(port->GetNameView()));
+        ForEachInScope(name, dummy, [&](const Declared& other) {
+            ReportClash(dummy, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
         });
     }
 }
@@ -236,13 +236,13 @@ void Scopes::CheckGenerics() {
             other.cause = attributeOfName->second;
             ReportClash(other, generic, "");
         }
-        const auto standIn = context_.standIns.find(Lower(name));
-        if (standIn != context_.standIns.end()) {
+        const auto dummy = context_.dummies.find(Lower(name));
+        if (dummy != context_.dummies.end()) {
             Declared other;
-            other.what = "the stand-in of the port " + Quoted(standIn->second->GetNameView());
+            other.what = "the dummy signal of the port " + Quoted(dummy->second->GetNameView());
             other.verilogName =
-                Spell(standIn->second->GetDummySignalName().GetView(), options_.verilog.signalCase);
-            other.cause = SignalCause(Names::BaseName(standIn->second->GetNameView()));
+                Spell(dummy->second->GetDummySignalName().GetView(), options_.verilog.signalCase);
+            other.cause = SignalCause(Names::BaseName(dummy->second->GetNameView()));
             ReportClash(generic, other, "rrr..rw");
         }
         Declared hiding = generic;
@@ -258,11 +258,11 @@ void Scopes::CheckAttributeNames() {
         attribute.cause = cause;
         ForEachInScope(name, attribute,
                        [&](const Declared& other) { ReportClash(attribute, other, ""); });
-        const auto standIn = context_.standIns.find(name);
-        if (standIn != context_.standIns.end()) {
+        const auto dummy = context_.dummies.find(name);
+        if (dummy != context_.dummies.end()) {
             Declared other;
-            other.what = "the stand-in of the port " + Quoted(standIn->second->GetNameView());
-            other.cause = SignalCause(Names::BaseName(standIn->second->GetNameView()));
+            other.what = "the dummy signal of the port " + Quoted(dummy->second->GetNameView());
+            other.cause = SignalCause(Names::BaseName(dummy->second->GetNameView()));
             ReportClash(attribute, other, "");
         }
         CheckHiddenBy(attribute);

@@ -140,18 +140,18 @@ TEST_F(CheckTest, WritesAreTheSameWithAndWithoutACheck) {
     EXPECT_EQ(Write(false), vhdl);
 }
 
-TEST_F(CheckTest, StandInsAreForeseenAndThenKnown) {
+TEST_F(CheckTest, DummySignalsAreForeseen) {
     Do({"ADD INSTANCE INV U2", "CONNECT SIGNAL Y U2.I"});
     EXPECT_TRUE(Run().empty());
     Write(false);
     EXPECT_TRUE(Run().empty());
-    EXPECT_NE(model_.GetNetlist()->GetStandIn(model_.GetSignal("Y")), nullptr);
+    EXPECT_NE(model_.GetNetlist()->GetDummySignal(model_.GetSignal("Y")), nullptr);
 }
 
-TEST_F(CheckTest, StandInThatCannotBeMadeIsFound) {
+TEST_F(CheckTest, DummySignalThatCannotBeMadeIsFound) {
     Do({"ADD INSTANCE INV U2", "CONNECT SIGNAL Y U2.I", "ADD SIGNAL Y_DUMMY"});
-    EXPECT_EQ(Find("stand-in-taken").verdicts.Get(Check::Target::Vhdl93), Verdict::Rejects);
-    EXPECT_EQ(Find("stand-in-taken").verdicts.Get(Check::Target::Vhdl2008), Verdict::Accepts);
+    EXPECT_EQ(Find("dummy-taken").verdicts.Get(Check::Target::Vhdl93), Verdict::Rejects);
+    EXPECT_EQ(Find("dummy-taken").verdicts.Get(Check::Target::Vhdl2008), Verdict::Accepts);
 }
 
 TEST_F(CheckTest, LongAndOddNamesDoNoHarm) {

@@ -132,8 +132,9 @@ public:
     /// Makes dummy signals for output ports that are read inside or have several drivers, and for
     /// input ports that are driven inside.
     void CreateVhdlDummySignals();
-    /// The stand-in that one of these has made for the signal; null when there is none.
-    const Signal* GetStandIn(const Signal* signal) const noexcept;
+    /// The dummy signal that `CreateVerilogDummySignals` or `CreateVhdlDummySignals` has made for a
+    /// signal, owned by the netlist; null if there is none.
+    const Signal* GetDummySignal(const Signal* signal) const noexcept;
 
     /// The length of the longest name of the pins; nulls are skipped, and the iterator handed in is
     /// not moved.

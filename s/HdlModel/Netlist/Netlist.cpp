@@ -443,7 +443,7 @@ void Netlist::CreateVhdlDummySignals() {
     dummies.Make(*this, names, true);
 }
 
-const Signal* Netlist::GetStandIn(const Signal* signal) const noexcept {
+const Signal* Netlist::GetDummySignal(const Signal* signal) const noexcept {
     return implementation_->dummies.Find(signal);
 }
 

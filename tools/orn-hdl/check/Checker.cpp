@@ -66,8 +66,8 @@ void Checker::BeforeCommand(const StringArray& words) {
     }
 }
 
-/// A write sorts the design, makes stand-ins and changes the letter case of names, and all of that
-/// stays.
+/// A write sorts the design, makes dummy signals and changes the letter case of names, and all of
+/// that stays.
 void Checker::WriteIntoNothing() {
     Orn_Hdl::OutStream nothing(nullptr);
     if (std::exchange(pendingVerilog_, false)) {
