@@ -249,7 +249,9 @@ void Assignments::CheckDigits(const Signal& signal, const Digits& digits) {
     if (!digits.IsVerilogNumber()) {
         // Yosys takes a name for a net that it declares.
         const bool isName = !digits.hasLength && Identifier(digits.digits).isVerilog;
-        verdicts.Worsen(Verdicts(isName ? "rrr..rrw" : "rrr..rrr"));
+        // Verilator takes an underscore before the digits.
+        const bool isVerilators = digits.hasLength && digits.HasLeadingUnderscore();
+        verdicts.Worsen(Verdicts(isName ? "rrr..rrw" : isVerilators ? "rrr..rwr" : "rrr..rrr"));
     }
     if (digits.HasHighImpedance()) {
         verdicts.Worsen(Verdicts(".......w"));

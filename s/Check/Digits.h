@@ -27,6 +27,7 @@ struct Digits {
     int BitsPerDigit() const noexcept { return base == 16 ? 4 : base == 8 ? 3 : 1; }
     /// Whether Verilog reads a number.
     bool IsVerilogNumber() const;
+    bool HasLeadingUnderscore() const { return !digits.empty() && digits.front() == '_'; }
     /// Whether Verilog reads a bit z.
     bool HasHighImpedance() const {
         return hasLength && digits.find_first_of("zZ?") != std::string::npos;

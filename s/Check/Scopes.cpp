@@ -159,7 +159,12 @@ void Scopes::CheckBuses() {
         ForEachInScope(base, bus, [&](const Declared& other) {
             // Verilator takes two nets of one name for one.
             const bool isPort = IsPort(bus) && IsPort(other);
-            ReportClash(bus, other, other.isInstance || isPort ? "rrr..rrr" : "rrr..rwr");
+            // Icarus makes one net of both until a part of the bus is named.
+            const bool isUnused = IsPort(bus) && !context_.uses.IsKnown(*signal);
+            ReportClash(bus, other,
+                        other.isInstance || isPort ? "rrr..rrr"
+                        : isUnused                 ? "rrr..wwr"
+                                                   : "rrr..rwr");
         });
     }
 }

@@ -54,6 +54,8 @@ public:
     /// Asks for the place of a scalar signal early.
     void Prefetch(const Signal* signal) const noexcept;
 
+    /// Whether anything is known of a bus: nothing refers to one of which nothing is.
+    bool IsKnown(const Signal& bus) const { return buses_.count(&bus) != 0; }
     /// \{
     /// Whether a bit of a declared signal is driven twice, or read and not driven.
     bool IsDrivenTwice(const Signal& declared) const;
