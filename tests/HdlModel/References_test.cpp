@@ -1,9 +1,10 @@
 // Signals that name others: as alias, as member of a compound, as something else among the slices
 // of a bus. Whichever is destroyed first, the other names it no more.
-#include "Orn_Hdl/Model/Signals.h"
+#include "Orn_Hdl/Model.h"
 
 #include <gtest/gtest.h>
 
+#include <initializer_list>
 #include <memory>
 
 namespace {
@@ -129,6 +130,39 @@ TEST(BusParts, KnowTheirPresentBusOnly) {
     EXPECT_EQ(slice.GetParentBus(), nullptr);
     EXPECT_EQ(bit.GetParentBus(), nullptr);
     EXPECT_FALSE(slice.GetPortPolarity().IsValid());
+}
+
+TEST(References, ACompoundThatRepeatsAMemberForgetsItAltogether) {
+    auto member = std::make_unique<ScalarSignal>("A");
+    ScalarSignal other("B");
+    CompoundBus compound("C");
+    CompoundBus second("D");
+    for (Signal* signal : std::initializer_list<Signal*>{member.get(), &other, member.get()}) {
+        compound.AddBusMember(signal);
+        second.AddBusMember(signal);
+    }
+    member.reset();
+    ASSERT_EQ(compound.GetSize(), 1);
+    EXPECT_EQ(compound.GetAt(0), &other);
+    ASSERT_EQ(second.GetSize(), 1);
+    EXPECT_EQ(second.GetAt(0), &other);
+}
+
+TEST(References, AWidenedBusIsReplacedWhereverACompoundRepeatsIt) {
+    Model model(nullptr);
+    model.AddComponent("C");
+    model.AddPin("A", Polarity(Polarity::Input), "C", "");
+    model.AddInstance("u", "C");
+    model.ConnectSignalToPin("d(1:0),x,d(1:0)", "u", "A");
+    const Signal* const repeated = model.GetSignal("d(1:0),x,d(1:0)");
+    model.ConnectSignalToPin("d(2:0)", "u", "A");
+    const auto* const compound = dynamic_cast<const CompoundBus*>(repeated);
+    ASSERT_NE(compound, nullptr);
+    Signal* const slice = model.GetSignal("d(1:0)");
+    EXPECT_NE(dynamic_cast<BusSlice*>(slice), nullptr);
+    EXPECT_EQ(compound->GetAt(0), slice);
+    EXPECT_EQ(compound->GetAt(1), model.GetSignal("x"));
+    EXPECT_EQ(compound->GetAt(2), slice);
 }
 
 } // namespace

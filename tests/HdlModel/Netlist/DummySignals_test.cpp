@@ -390,6 +390,46 @@ TEST_F(DummySignals, AreForgottenWhenTheyAreRemoved) {
     EXPECT_EQ(reader_->GetSignal(), Get("Y_DUMMY"));
 }
 
+TEST_F(DummySignals, AreForgottenWithManyPortsAndMadeAnew) {
+    std::vector<Signal*> ports;
+    const auto addPort = [&](int i) {
+        const std::string number = std::to_string(i);
+        ports.push_back(new ScalarSignal(("P" + number).c_str()));
+        ports.back()->SetPortPolarity(In);
+        netlist_.Add(ports.back());
+        ports.back()->Connect(AddBuffer(("U" + number).c_str())->GetPin("O"));
+    };
+    for (int i = 0; i < 20; ++i) {
+        addPort(i);
+    }
+    netlist_.CreateVerilogDummySignals();
+    // Every third port stays.
+    for (int i = 0; i < 20; ++i) {
+        if (i % 3 != 0) {
+            netlist_.Remove(ports[static_cast<std::size_t>(i)]);
+        }
+    }
+    addPort(20);
+    netlist_.CreateVerilogDummySignals();
+    for (int i = 0; i < 21; ++i) {
+        const std::string name = "P" + std::to_string(i);
+        const Signal* const port = netlist_.GetSignal(name.c_str());
+        EXPECT_EQ(port != nullptr, i % 3 == 0 || i == 20) << name;
+        if (port != nullptr) {
+            Signal* const dummy = netlist_.GetSignal(port->GetDummySignalName().CStr());
+            ASSERT_NE(dummy, nullptr) << name;
+            EXPECT_EQ(
+                netlist_.GetInstance(("U" + name.substr(1)).c_str())->GetPin("O")->GetSignal(),
+                dummy);
+            // Later gains are taken over still.
+            const std::string later = "V" + name;
+            netlist_.GetSignal(name.c_str())->Connect(AddBuffer(later.c_str())->GetPin("O"));
+            netlist_.CreateVerilogDummySignals();
+            EXPECT_EQ(netlist_.GetInstance(later.c_str())->GetPin("O")->GetSignal(), dummy);
+        }
+    }
+}
+
 TEST_F(DummySignals, OutliveTheirSignals) {
     ScalarSignal* port = AddFeedback("Y", Out);
     Bus* bus = AddBus("D(3:0)", Out);
