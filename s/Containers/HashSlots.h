@@ -103,6 +103,7 @@ private:
     /// memory.
     struct Slot {
         std::uint32_t hash = 0;
+        // NOLINTNEXTLINE(bugprone-sizeof-expression): a value may be a pointer.
         unsigned char bytes[sizeof(Value)] = {};
 
         Value Get() const noexcept {

@@ -37,11 +37,11 @@ constexpr auto JoinedTexts = [] {
 template <FixedText Argument, FixedText Noun, AttributeOwner Owner, FixedText Remark,
           FixedText OptionRemark>
 struct AttributeOwnerTraits {
-    static constexpr auto argument = Argument;
-    static constexpr auto noun = Noun;
-    static constexpr AttributeOwner owner = Owner;
-    static constexpr auto remark = Remark;
-    static constexpr auto optionRemark = OptionRemark;
+    static constexpr auto ArgumentText = Argument;
+    static constexpr auto NounText = Noun;
+    static constexpr AttributeOwner OwnerKind = Owner;
+    static constexpr auto RemarkText = Remark;
+    static constexpr auto OptionRemarkText = OptionRemark;
 };
 
 /// What the help says where a command has no effect on the output.
@@ -63,13 +63,13 @@ using OfInstancePin = AttributeOwnerTraits<"<instance.pin> ", "a pin of an insta
 /// The entry of a command that adds an attribute or sets its value.
 template <class Owner, auto Operation> constexpr CommandEntry AddAttribute(const char* phrase) {
     return {{phrase,
-             JoinedTexts<Owner::argument, "[-TYPE=<type>] <attribute> [value]">.data(),
+             JoinedTexts<Owner::ArgumentText, "[-TYPE=<type>] <attribute> [value]">.data(),
              JoinedTexts<"Adds an attribute to ",
-                         Owner::noun,
+                         Owner::NounText,
                          ", or sets its value. The type is String, Integer, Float, Boolean, Bit, "
                          "BitVector or User.",
-                         Owner::remark>.data()},
-            ParseAddAttribute<Owner::owner>,
+                         Owner::RemarkText>.data()},
+            ParseAddAttribute<Owner::OwnerKind>,
             Apply<Operation>};
 }
 
@@ -77,9 +77,9 @@ template <class Owner, auto Operation> constexpr CommandEntry AddAttribute(const
 template <class Owner, auto Operation>
 constexpr CommandEntry SetAttributeValue(const char* phrase) {
     return {
-        {phrase, JoinedTexts<Owner::argument, "<attribute> <value>">.data(),
-         JoinedTexts<"Sets the value of an attribute of ", Owner::noun, ".", Owner::remark>.data()},
-        ParseAttributeText<Owner::owner>,
+        {phrase, JoinedTexts<Owner::ArgumentText, "<attribute> <value>">.data(),
+         JoinedTexts<"Sets the value of an attribute of ", Owner::NounText, ".", Owner::RemarkText>.data()},
+        ParseAttributeText<Owner::OwnerKind>,
         Apply<Operation>};
 }
 
@@ -87,10 +87,10 @@ constexpr CommandEntry SetAttributeValue(const char* phrase) {
 template <class Owner, auto Operation>
 constexpr CommandEntry SetAttributeUserType(const char* phrase) {
     return {
-        {phrase, JoinedTexts<Owner::argument, "<attribute> <type>">.data(),
-         JoinedTexts<"Names the type of an attribute of type User of ", Owner::noun, ".",
-                     Owner::remark>.data()},
-        ParseAttributeText<Owner::owner>,
+        {phrase, JoinedTexts<Owner::ArgumentText, "<attribute> <type>">.data(),
+         JoinedTexts<"Names the type of an attribute of type User of ", Owner::NounText, ".",
+                     Owner::RemarkText>.data()},
+        ParseAttributeText<Owner::OwnerKind>,
         Apply<Operation>};
 }
 
@@ -98,13 +98,13 @@ constexpr CommandEntry SetAttributeUserType(const char* phrase) {
 template <class Owner, auto SetGeneric, auto SetSynAttr>
 constexpr CommandEntry SetAttributeOption(const char* phrase) {
     return {{phrase,
-             JoinedTexts<Owner::argument, "<attribute> <option> [option]">.data(),
+             JoinedTexts<Owner::ArgumentText, "<attribute> <option> [option]">.data(),
              JoinedTexts<"Sets how an attribute of ",
-                         Owner::noun,
+                         Owner::NounText,
                          " is written: -GENERIC=NONE|SYN|NOSYN, "
                          "-SYNATTR=NONE|ASSIGN|ASSIGNNODEC.",
-                         Owner::optionRemark>.data()},
-            ParseAttributeOptions<Owner::owner>,
+                         Owner::OptionRemarkText>.data()},
+            ParseAttributeOptions<Owner::OwnerKind>,
             ApplyOptions<SetGeneric, SetSynAttr>};
 }
 

@@ -19,8 +19,8 @@ namespace Orn_Hdl {
 template <const auto& Table, std::size_t Index> class CatalogueCommand final : public Command {
 public:
     static Command* Create(Model* model, const StringArray& tokens) {
-        constexpr std::size_t phraseLength = std::string_view(Entry.info.phrase).size();
-        const std::size_t room = Arguments::RoomFor(tokens, phraseLength);
+        constexpr std::size_t PhraseLength = std::string_view(Entry.info.phrase).size();
+        const std::size_t room = Arguments::RoomFor(tokens, PhraseLength);
         // The arguments are the last member, with nothing between them and the base.
         void* const memory = Port::Pool::AllocatePacked(sizeof(Command) + sizeof(Arguments) + room,
                                                         Port::Pool::Commands);
