@@ -62,13 +62,23 @@ TEST(GetEffectiveAttrs, AreTheInstancesAndThoseOfItsComponentThatItDoesNotHide) 
     EXPECT_TRUE(attributes.IsEmpty());
 }
 
-TEST(InitDefined, WhereTheNetlistHasAGenericOfThatName) {
-    Netlist netlist;
-    EXPECT_FALSE(InitDefined(netlist));
+TEST(PassesInit, NeedsAGenericOfThatName) {
+    Netlist netlist("a_MHALVEX_b");
+    EXPECT_FALSE(PassesInit(Language::Verilog, netlist));
     Attribute* const init = Add(netlist, "INIT", "1", "NONE");
-    EXPECT_FALSE(InitDefined(netlist));
+    EXPECT_FALSE(PassesInit(Language::Verilog, netlist));
     init->SetGeneric("NOSYN");
-    EXPECT_TRUE(InitDefined(netlist));
+    EXPECT_TRUE(PassesInit(Language::Verilog, netlist));
+    EXPECT_TRUE(PassesInit(Language::Vhdl, netlist));
+}
+
+TEST(PassesInit, NeedsAMarkOfTheLanguage) {
+    Netlist netlist("HHALVEX");
+    Add(netlist, "INIT", "1", "SYN");
+    EXPECT_TRUE(PassesInit(Language::Verilog, netlist));
+    EXPECT_FALSE(PassesInit(Language::Vhdl, netlist));
+    netlist.SetName("top");
+    EXPECT_FALSE(PassesInit(Language::Verilog, netlist));
 }
 
 } // namespace

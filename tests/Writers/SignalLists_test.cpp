@@ -2,7 +2,7 @@
 
 #include "Support/Names.h"
 #include "Support/Parts.h"
-#include "Writers/InstanceWalk.h"
+#include "Writers/NetlistPass.h"
 
 #include <gtest/gtest.h>
 
@@ -33,25 +33,17 @@ TEST(SignalLists, HoldEachSignalWhereItIsWritten) {
     Netlist netlist;
     Added(netlist, new ScalarSignal("port"))->SetPortPolarity(Support::In);
     Signal* const net = Added(netlist, new ScalarSignal("net"));
-    Added(netlist, new ScalarSignal("hidden"))->AssignConstantValue("1");
+    // VHDL has no signal of this name.
+    Added(netlist, new ScalarSignal("open"))->AssignConstantValue("1");
     Bus* const bus = Added(netlist, new Bus("b(1:0)"));
     Signal* const bit = Added(netlist, new BusIndex("b(0)", bus));
     bit->AssignConstantValue("1");
     net->Connect(bit);
-    const SignalLists lists(netlist, [](std::string_view name) { return name != "hidden"; });
+    const SignalLists lists(netlist, Language::Vhdl);
     EXPECT_EQ(NamesOf(lists.ports), Names{"port"});
     EXPECT_EQ(NamesOf(lists.internals), (Names{"net", "b(1:0)"})) << "a bit comes with its bus";
     EXPECT_EQ(NamesOf(lists.constants), Names{"b(0)"});
     EXPECT_EQ(NamesOf(lists.aliased), Names{"net"});
-}
-
-TEST(IsSingleBit, NotEvenOfABusOfOneBit) {
-    Bus bus("b(0:0)");
-    EXPECT_TRUE(IsSingleBit(ScalarSignal("s")));
-    EXPECT_TRUE(IsSingleBit(BusIndex("b(0)", &bus)));
-    EXPECT_FALSE(IsSingleBit(bus));
-    EXPECT_FALSE(IsSingleBit(BusSlice("b(0:0)", &bus)));
-    EXPECT_FALSE(IsSingleBit(CompoundBus("s,b(0)")));
 }
 
 TEST(RunsAgainstParent, OnlyOfASliceOfSeveralBits) {
@@ -65,6 +57,14 @@ TEST(RunsAgainstParent, OnlyOfASliceOfSeveralBits) {
     EXPECT_FALSE(RunsAgainstParent(descending));
 }
 
+/// Opens what the netlisters derive from.
+class Pass : public NetlistPass {
+public:
+    Pass(OutStream& out, Netlist& netlist, const HdlOptions& options)
+        : NetlistPass(Language::Verilog, out, netlist, options) {}
+    using NetlistPass::ForEachInstance;
+};
+
 TEST(ForEachInstance, VisitsEachOnceInOrderInDesignsOfAnySize) {
     for (const int count : {0, 1, 3, 4, 5, 12, 13, 40}) {
         Netlist netlist;
@@ -76,7 +76,9 @@ TEST(ForEachInstance, VisitsEachOnceInOrderInDesignsOfAnySize) {
             netlist.Add(new Instance(expected.back().c_str(), component));
         }
         Names visited;
-        ForEachInstance(netlist, [&](const Instance& instance) {
+        TextMemOutStream out;
+        const HdlOptions options;
+        Pass(out, netlist, options).ForEachInstance([&](const Instance& instance) {
             visited.push_back(Support::Text(instance.GetName()));
         });
         EXPECT_EQ(visited, expected);

@@ -1,5 +1,6 @@
 #include "Writers/Text.h"
 
+#include "Orn_Hdl/Model/Component.h"
 #include "Writers/OneLine.h"
 
 #include <gtest/gtest.h>
@@ -63,9 +64,9 @@ TEST(WriteBlanks, WritesAnyNumber) {
     }
 }
 
-TEST(WriteCommentLines, PutsThePrefixBeforeEachLineThatHasText) {
+TEST(WriteComment, PutsThePrefixBeforeEachLineThatHasText) {
     const struct {
-        std::string_view comment;
+        const char* comment;
         const char* written;
     } cases[] = {{"", ""},
                  {"one", "// one\n"},
@@ -74,8 +75,10 @@ TEST(WriteCommentLines, PutsThePrefixBeforeEachLineThatHasText) {
                  {"\n\none\n\n\ntwo\n\n", "// one\n// two\n"},
                  {"a\rb\vc\fd", "// a b c d\n"}};
     for (const auto& each : cases) {
+        Component component("C");
+        component.AddComment(each.comment);
         TextMemOutStream out;
-        WriteCommentLines(out, "// ", each.comment);
+        WriteComment(out, Language::Verilog, component);
         EXPECT_EQ(Written(out), each.written);
     }
 }
