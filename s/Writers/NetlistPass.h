@@ -72,9 +72,9 @@ void NetlistPass::WriteAssignments(const SignalLists& signals, const WriteConsta
 /// The signals of the pins are spread over the memory of a large design. They are prefetched a few
 /// instances ahead, because waiting for them takes a seventh of the time of a Verilog write.
 template <class Write> void NetlistPass::ForEachInstance(const Write& write) const {
-    constexpr int lead = 4;
+    constexpr int Lead = 4;
     Iterator<Instance*> ahead = netlist_.GetInstanceIterator();
-    for (int i = 0; i < lead; ++i) {
+    for (int i = 0; i < Lead; ++i) {
         ahead.Next();
     }
     for (const Instance* instance : netlist_.GetInstanceIterator()) {
