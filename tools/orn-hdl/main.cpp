@@ -175,7 +175,7 @@ private:
                                          const std::vector<std::string>& options) {
         const auto end = std::find(words.begin(), words.end(), "--");
         for (auto word = words.begin(); word != end; ++word) {
-            const std::string name = word->substr(0, word->find('='));
+            std::string name = word->substr(0, word->find('='));
             if (name.rfind("--", 0) == 0 &&
                 std::find(options.begin(), options.end(), name) == options.end()) {
                 return name;

@@ -158,7 +158,8 @@ bool ReadTargets(const std::string& names, Check::Targets& targets) {
             for (const Check::Target each : Check::GetTargets()) {
                 known.append(known.empty() ? "" : ", ").append(Check::GetName(each));
             }
-            Complain("there is no target " + name + "; there are " + known);
+            std::string message = "there is no target ";
+            Complain(message.append(name).append("; there are ").append(known));
             return false;
         }
         targets.Add(target);

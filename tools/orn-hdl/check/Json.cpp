@@ -30,8 +30,8 @@ std::size_t CountUtf8(string_view text) {
 }
 
 void AppendEscape(unsigned char byte, std::string& text) {
-    constexpr string_view digits = "0123456789abcdef";
-    text.append("\\u00").append({digits[byte >> 4U], digits[byte & 15U]});
+    constexpr string_view Digits = "0123456789abcdef";
+    text.append("\\u00").append({Digits[byte >> 4U], Digits[byte & 15U]});
 }
 
 } // namespace

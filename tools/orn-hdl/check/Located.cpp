@@ -301,12 +301,12 @@ public:
 
 private:
     bool Fill() {
-        constexpr std::size_t piece = std::size_t(1) << 18;
+        constexpr std::size_t Piece = std::size_t(1) << 18;
         buffer_.erase(0, start_);
         start_ = 0;
         const std::size_t size = buffer_.size();
-        buffer_.resize(size + piece);
-        const std::size_t count = file_.read(buffer_.data() + size, piece);
+        buffer_.resize(size + Piece);
+        const std::size_t count = file_.read(buffer_.data() + size, Piece);
         buffer_.resize(size + count);
         return count > 0;
     }

@@ -146,17 +146,17 @@ void WriteSarifRules(JsonWriter& json) {
 
 /// Blanks and the like are written as %XX, as in any address.
 std::string ToUri(string_view file) {
-    constexpr string_view plain = "-._~/";
-    constexpr string_view digits = "0123456789ABCDEF";
+    constexpr string_view Plain = "-._~/";
+    constexpr string_view Digits = "0123456789ABCDEF";
     std::string uri;
     for (const char c : file) {
         const auto byte = static_cast<unsigned char>(c);
         const bool isPlain = (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') ||
-                             (c >= 'a' && c <= 'z') || plain.find(c) != string_view::npos;
+                             (c >= 'a' && c <= 'z') || Plain.find(c) != string_view::npos;
         if (isPlain) {
             uri.push_back(c);
         } else {
-            uri.append({'%', digits[byte >> 4U], digits[byte & 15U]});
+            uri.append({'%', Digits[byte >> 4U], Digits[byte & 15U]});
         }
     }
     return uri;
@@ -238,7 +238,7 @@ std::string ListRulesAsMarkdown() {
                        "| --- | --- | --- | --- |\n";
     for (const Check::Rule& rule : Check::GetRules()) {
         text.append("| `").append(rule.name).append("` | ").append(rule.what).append(" | ");
-        string_view separator = "";
+        string_view separator;
         for (const std::string& saying : GetSayings(rule.verdicts)) {
             text.append(separator).append(saying);
             separator = "; ";

@@ -5,8 +5,8 @@
 namespace Tool::Import {
 
 void BitNumbers::StartModule() {
-    constexpr Entry half = 0x80000000;
-    if (next_ > half) {
+    constexpr Entry Half = 0x80000000;
+    if (next_ > Half) {
         // The counter must not overflow.
         table_.clear();
         others_.clear();

@@ -155,7 +155,8 @@ void DesignReader::ReadNet(Module& module, std::string_view name, JsonValue& val
 
 std::unique_ptr<ImportedDesign> ReadDesign(std::string text, bool keepAttributes) {
     auto design = std::make_unique<ImportedDesign>();
-    DesignReader(*design, keepAttributes, text.size()).Read(std::move(text));
+    const std::size_t size = text.size();
+    DesignReader(*design, keepAttributes, size).Read(std::move(text));
     return design;
 }
 

@@ -5,8 +5,8 @@
 namespace Tool::Import {
 
 BitRange Normalize(BitRange range, std::uint32_t width) noexcept {
-    constexpr std::int64_t greatest = std::numeric_limits<std::int32_t>::max();
-    if (range.offset < 0 || range.offset > greatest - width + 1) {
+    constexpr std::int64_t Greatest = std::numeric_limits<std::int32_t>::max();
+    if (range.offset < 0 || range.offset > Greatest - width + 1) {
         range.offset = 0;
     }
     return range;

@@ -78,13 +78,13 @@ void CheckAttribute(const Value& value, const Place& place, Warnings& warnings) 
 }
 
 TypedValue MakeAttribute(const std::string& name, const Value& value) {
-    constexpr std::size_t integerWidth = 32;
+    constexpr std::size_t IntegerWidth = 32;
     if (value.kind == Value::Integer) {
         return TypedValue{name, "Integer", std::to_string(value.integer)};
     }
     std::string text(value.text);
     if (value.kind == Value::Bits && text.find_first_of("xz") == std::string::npos) {
-        return text.size() == integerWidth
+        return text.size() == IntegerWidth
                    ? TypedValue{name, "Integer", std::to_string(ToInteger(text))}
                    : TypedValue{name, "BitVector", MakeConstant(text, false)};
     }
