@@ -76,14 +76,15 @@ struct Netlist::Implementation {
 
     ~Implementation() {
         dummies.Clear();
-        // Signals are destroyed first: an instance then has nothing to leave.
+        // Signals are destroyed first, so that instances have no signals to leave.
         References::LeaveTogether(signals);
         DestroyAll(signals);
         DestroyAll(instances);
         DestroyAll(components);
     }
 
-    /// Each object is owned until it is its turn, so that it leaves if another one destroys it.
+    /// Each object stays owned until its turn, so that it leaves the list if another object
+    /// destroys it.
     template <class T> static void DestroyAll(OwnPtrArray<T*>& objects) noexcept {
         while (T* const last = objects.GetTail()) {
             objects.RemoveTail();
@@ -113,7 +114,7 @@ struct Netlist::Implementation {
         Enter(object);
     }
 
-    /// Whether an object is found by its key name, so that it has a place in the index.
+    /// Whether an object is found by its key name and is therefore in the index.
     bool IsFound(const Component* object) const noexcept {
         return byName.Find(NameKey(ObjectKey::Get(*object), ComponentGroup)) == object;
     }
@@ -138,8 +139,8 @@ struct Netlist::Implementation {
         Enter(object);
     }
 
-    /// Takes an object out without destroying it.
-    /// \return the object; null when the netlist does not hold it.
+    /// Removes an object without destroying it.
+    /// \return the object; null if the netlist does not hold it.
     template <class T> std::unique_ptr<T> Detach(T* object, OwnPtrArray<T*>& objects) noexcept {
         const int place = object == nullptr ? -1 : PlaceOf<T>(objects, object);
         if (place < 0) {
@@ -150,7 +151,7 @@ struct Netlist::Implementation {
         return std::unique_ptr<T>(object);
     }
 
-    /// Takes out the object at a place. The classes that are derived from `T` may be gone.
+    /// Removes the object at a position. Classes derived from `T` may already be destroyed.
     template <class T> void LetGo(T& object, OwnPtrArray<T*>& objects, int place) noexcept {
         Forget(&object);
         byName.Remove(&object, GroupOf(&object));
@@ -391,7 +392,7 @@ void Netlist::ConnectOpenPinToDummy() {
             if (pin->GetPinType() == PinTypeBusIndex) {
                 continue;
             }
-            // The range is the rest of the pin's name, as it is spelled there.
+            // The range is the rest of the pin's name, exactly as spelled there.
             const std::string_view pinName = pin->GetNameView();
             const bool isBus = pin->GetPinType() == PinTypeBus;
             const std::string_view base = isBus ? Names::BeforeParenthesis(pinName) : pinName;
@@ -453,7 +454,7 @@ namespace {
 void CopyComment(const Object& from, Object& to) {
     std::string_view comment = from.GetCommentView();
     if (!comment.empty()) {
-        // AddComment puts the last line feed back.
+        // AddComment appends the last line feed again.
         comment.remove_suffix(1);
         to.AddComment(std::string(comment).c_str());
     }
