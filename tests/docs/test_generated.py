@@ -34,8 +34,8 @@ def run(*command: str | Path, **options) -> str:
 
 def options_of(command: str) -> list[str]:
     """The options that the help of one of the tool's commands names."""
-    found = re.findall(r"^  (?:(-\w)\b,?)?(--[\w-]+)?", run(TOOL, command, "--help"), re.M)
-    options = sorted({name for names in found for name in names if name})
+    found = re.findall(r"^  ((?:-\w\b,?)?(?:--[\w-]+,?)*)", run(TOOL, command, "--help"), re.M)
+    options = sorted({name for names in found for name in names.split(",") if name})
     if "--help" not in options:
         raise AssertionError(f"the help of {command} is not understood")
     return options

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Runs random command files through the reference and the real tool and compares everything.
 
-Compared are the lines on standard error, the exit status and every written file; of a banner the
+Compared are the errors on standard error, the exit status and every written file; of a banner the
 emblem, the copyright wording and the version are left out.
 """
 
@@ -10,6 +10,7 @@ from __future__ import annotations
 import argparse
 import difflib
 import os
+import re
 import shutil
 import subprocess
 import sys
@@ -53,6 +54,12 @@ def run_reference(folder: Path, model: bytes, source: Path) -> Result:
     return Result({"status": status, "standard error": messages, **files_in(folder)})
 
 
+def errors_of(source: Path, printed: bytes) -> bytes:
+    """The first line of each message, without source lines, notes and counts."""
+    head = re.compile(re.escape(os.fsencode(source)) + rb":\d+: error: ")
+    return b"".join(line + b"\n" for line in printed.split(b"\n") if head.match(line))
+
+
 def run_tool(tool: str, folder: Path, model: bytes, source: Path) -> Result:
     command = [tool, "run", "--keep-going", "--quiet", "--model", model, source]
     try:
@@ -65,7 +72,7 @@ def run_tool(tool: str, folder: Path, model: bytes, source: Path) -> Result:
             timeout=TIME_LIMIT_SECONDS,
             check=False,
         )
-        status, messages = b"%d\n" % done.returncode, done.stderr
+        status, messages = b"%d\n" % done.returncode, errors_of(source, done.stderr)
     except subprocess.TimeoutExpired:
         status, messages = b"out of time\n", b""
     return Result({"status": status, "standard error": messages, **files_in(folder)})

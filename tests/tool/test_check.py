@@ -29,9 +29,11 @@ class Check(ToolTest):
         self.assertEqual(outcome.status, FAILED)
         self.assertEqual(outcome.out, """\
 t.cmd:10: error: the constant "1010" of "D(3:0)" is a decimal number in Verilog [constant-digits]
-    read otherwise than meant by icarus
-    Verilog reads the bits 0010, VHDL reads 1010
-    what helps: 4:B:1010
+   10 | ASSIGN CONSTANT D(3:0) 1010
+      |                        ^~~~
+note: read otherwise than meant by icarus
+note: Verilog reads the bits 0010, VHDL reads 1010
+note: what helps: 4:B:1010
 1 error, 0 warnings: 1 constant-digits
 """)
 
@@ -39,7 +41,9 @@ t.cmd:10: error: the constant "1010" of "D(3:0)" is a decimal number in Verilog 
         outcome = self.check(SOUND + "ADD SIGNAL y(3:0)\n", "--target", "ghdl")
         self.assertIn('t.cmd:10: error: the signal "y(3:0)" and the port "Y" bear one name',
                       outcome.out)
-        self.assertIn("    t.cmd:6: the other half is here\n", outcome.out)
+        self.assertIn("t.cmd:6: note: the other half is here\n"
+                      "    6 | ADD PORT Y output\n"
+                      "      |          ^\n", outcome.out)
 
     def test_lines_of_causes(self) -> None:
         lines = ["ADD COMPONENT buf", "ADD PIN INV end Input", "ADD PORT a_ Input",
@@ -122,6 +126,24 @@ t.cmd:10: error: the constant "1010" of "D(3:0)" is a decimal number in Verilog 
             place = result["locations"][0]["physicalLocation"]
             self.assertEqual(place["artifactLocation"]["uri"], "t.cmd")
             self.assertGreaterEqual(place["region"]["startLine"], 1)
+        places = [result["locations"][0]["physicalLocation"]["region"] for result in run["results"]]
+        self.assertIn({"startLine": 10, "startColumn": 24, "endColumn": 28}, places)
+
+    def test_lines_that_fail(self) -> None:
+        """Text has findings and failures in places of their own; a document has both."""
+        text = SOUND + "NO SUCH LINE\n"
+        outcome = self.check(text)
+        self.assertEqual(outcome.out, "1 error, 0 warnings\n")
+        self.assertTrue(outcome.err.startswith("t.cmd:10: error: Command not find.\n"), outcome.err)
+        for option in ("--format", "--diagnostics"):
+            outcome = self.check(text, option, "json")
+            self.assertEqual(outcome.err, "")
+            finding, = json.loads(outcome.out)["findings"]
+            self.assertEqual((finding["line"], finding["severity"], finding["message"]),
+                             (10, "error", "Command not find."))
+        outcome = self.check(text, "--format", "sarif")
+        result, = json.loads(outcome.out)["runs"][0]["results"]
+        self.assertEqual((result["level"], outcome.err), ("error", ""))
 
     def test_rules_are_listed_and_explained(self) -> None:
         listed = self.run_tool("check", "--list").out.splitlines()

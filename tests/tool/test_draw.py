@@ -120,7 +120,8 @@ class Draw(ToolTest):
     def test_failed_command(self) -> None:
         self.write("d.cmd", INVERTER + "ADD\n")
         self.expect(self.run_tool("draw", "d.cmd", "-o", "o.svg"), FAILED,
-                    "d.cmd:9: error: Command not find.\n")
+                    "d.cmd:9: error: Command not find.\n"
+                    "    9 | ADD\n")
         self.assertFalse((self.folder / "o.svg").exists())
 
     def test_unreadable_and_unwritable(self) -> None:

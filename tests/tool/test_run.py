@@ -4,6 +4,7 @@ from __future__ import annotations
 
 import os
 import pty
+import re
 import socket
 import subprocess
 import threading
@@ -46,7 +47,8 @@ class Replay(ToolTest):
 
     def test_standard_input_is_called_a_dash(self) -> None:
         self.expect(self.run_tool("run", "-", stdin="NOOP\nADD\n"), FAILED,
-                    "-:2: error: Command not find.\n")
+                    "-:2: error: Command not find.\n"
+                    "    2 | ADD\n")
 
     def test_empty_file(self) -> None:
         self.write("empty", "")
@@ -55,7 +57,9 @@ class Replay(ToolTest):
 
     def test_last_line_without_line_end(self) -> None:
         self.write("d.cmd", "NOOP\nADD")
-        self.expect(self.run_tool("run", "d.cmd"), FAILED, "d.cmd:2: error: Command not find.\n")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED,
+                    "d.cmd:2: error: Command not find.\n"
+                    "    2 | ADD\n")
 
     def test_carriage_returns(self) -> None:
         self.write("dos.cmd", INVERTER.replace("\n", "\r\n"))
@@ -68,42 +72,53 @@ class Replay(ToolTest):
     def test_a_command_ends_at_its_first_nul(self) -> None:
         self.write("d.cmd", "ADD SIGNAL a\0b c\nADD SIGNAL a\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
-                    'd.cmd:2: error: Identifier "a" already defined.\n')
+                    'd.cmd:2: error: Identifier "a" already defined.\n'
+                    "    2 | ADD SIGNAL a\n")
 
     def test_blank_lines_count(self) -> None:
         self.write("d.cmd", "\n   \n\r\nADD\n")
-        self.expect(self.run_tool("run", "d.cmd"), FAILED, "d.cmd:4: error: Command not find.\n")
+        self.expect(self.run_tool("run", "d.cmd"), FAILED,
+                    "d.cmd:4: error: Command not find.\n"
+                    "    4 | ADD\n")
 
     def test_long_line(self) -> None:
         name = "x" * 3_000_000
         self.write("d.cmd", f"ADD SIGNAL {name}\nADD SIGNAL {name}\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
-                    f'd.cmd:2: error: Identifier "{name}" already defined.\n')
+                    f'd.cmd:2: error: Identifier "{name}" already defined.\n'
+                    f"    2 | ADD SIGNAL {'x' * 149}...\n")
 
     def test_the_file_is_called_as_given(self) -> None:
         self.write("d.cmd", "ADD\n")
         self.expect(self.run_tool("run", "./d.cmd"), FAILED,
-                    "./d.cmd:1: error: Command not find.\n")
+                    "./d.cmd:1: error: Command not find.\n"
+                    "    1 | ADD\n")
 
     def test_bytes_of_names_are_kept_in_messages(self) -> None:
         self.write("d.cmd", "CONNECT SIGNAL \xff\x80 \xe9%s.%n\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
-                    'd.cmd:1: error: Signal "\xe9%s" not found.\n')
+                    'd.cmd:1: error: Signal "\xe9%s" not found.\n'
+                    "    1 | CONNECT SIGNAL \xff\x80 \xe9%s.%n\n")
 
 
 class Failures(ToolTest):
     def test_the_first_failure_ends_the_replay(self) -> None:
         self.write("d.cmd", "NOOP\nADD\nADD\n")
         self.expect(self.run_tool("run", "d.cmd", "--verilog", "o.v"), FAILED,
-                    "d.cmd:2: error: Command not find.\n")
+                    "d.cmd:2: error: Command not find.\n"
+                    "    2 | ADD\n")
         self.assertFalse((self.folder / "o.v").exists())
 
     def test_keep_going_reports_every_failure_and_writes(self) -> None:
         self.write("d.cmd", "ADD\n" + INVERTER + "SET NETLIST NAME\nADD PIN INV I input\n")
         self.expect(self.run_tool("run", "--keep-going", "d.cmd", "--verilog", "o.v"), FAILED,
                     "d.cmd:1: error: Command not find.\n"
+                    "    1 | ADD\n"
                     "d.cmd:10: error: SET NETLIST NAME: Invalid Arguments.\n"
-                    'd.cmd:11: error: Component "INV" already has pin "I".\n')
+                    "   10 | SET NETLIST NAME\n"
+                    'd.cmd:11: error: Component "INV" already has pin "I".\n'
+                    "   11 | ADD PIN INV I input\n"
+                    "3 errors\n")
         self.assertIn("INV U1", self.read("o.v"))
 
     def test_missing_file(self) -> None:
@@ -171,19 +186,24 @@ class Outputs(ToolTest):
     def test_write_line_that_cannot_be_opened(self) -> None:
         self.write("w.cmd", "NOOP\nWRITE VERILOG no/o.v\nADD\n")
         self.expect(self.run_tool("run", "w.cmd", "--vhdl", "o.vhd"), FILE,
-                    "w.cmd:2: error: cannot write no/o.v: No such file or directory\n")
+                    "w.cmd:2: error: cannot write no/o.v: No such file or directory\n"
+                    "    2 | WRITE VERILOG no/o.v\n")
         self.assertFalse((self.folder / "o.vhd").exists())
 
     def test_write_line_to_a_full_device(self) -> None:
         self.write("w.cmd", INVERTER + "WRITE VHDL -APPEND /dev/full\n")
         self.expect(self.run_tool("run", "w.cmd"), FILE,
-                    "w.cmd:9: error: cannot write /dev/full: No space left on device\n")
+                    "w.cmd:9: error: cannot write /dev/full: No space left on device\n"
+                    "    9 | WRITE VHDL -APPEND /dev/full\n")
 
     def test_a_write_failure_is_reported_once_and_outweighs_a_failed_command(self) -> None:
         self.write("w.cmd", "WRITE VERILOG /dev/full\nNOOP\nADD\nWRITE VERILOG fine.v\n")
         self.expect(self.run_tool("run", "w.cmd", "--keep-going"), FILE,
                     "w.cmd:1: error: cannot write /dev/full: No space left on device\n"
-                    "w.cmd:3: error: Command not find.\n")
+                    "    1 | WRITE VERILOG /dev/full\n"
+                    "w.cmd:3: error: Command not find.\n"
+                    "    3 | ADD\n"
+                    "2 errors\n")
         self.assertTrue((self.folder / "fine.v").exists())
 
     def test_standard_output_as_a_file(self) -> None:
@@ -231,7 +251,8 @@ class Outputs(ToolTest):
     def test_messages_stay_off_standard_output(self) -> None:
         self.write("w.cmd", "ADD\n" + INVERTER)
         outcome = self.run_tool("run", "w.cmd", "--keep-going", "--verilog", "-", "--no-header")
-        self.assertEqual((outcome.status, outcome.err), (FAILED, "w.cmd:1: error: Command not find.\n"))
+        self.assertEqual((outcome.status, outcome.err),
+                         (FAILED, "w.cmd:1: error: Command not find.\n    1 | ADD\n"))
         self.assertTrue(outcome.out.startswith("`timescale"))
         self.assertTrue(outcome.out.endswith("endmodule\n"))
 
@@ -259,7 +280,7 @@ class WriteRules(ToolTest):
         self.write("w.cmd", INVERTER + "".join(f"{line}\n" for line in lines))
         before = self.all_files()
         outcome = self.run_tool("run", "w.cmd", "--output-dir", folder, "--keep-going")
-        self.errors = [line.partition(" error: ")[2] for line in outcome.err.splitlines()]
+        self.errors = re.findall(r"^w\.cmd:\d+: error: (.*)$", outcome.err, re.M)
         return outcome.status, sorted(self.all_files() - before)
 
     def refuse(self, name: str, reason: str = "it leads out of the output folder") -> None:
@@ -390,13 +411,17 @@ class WriteRules(ToolTest):
         before = self.all_files()
         self.expect(self.run_tool("run", "w.cmd", "--no-write", "--keep-going"), FAILED,
                     'w.cmd:9: error: Cannot write "a.v": --no-write is in force.\n'
-                    'w.cmd:10: error: Cannot write "/dev/null": --no-write is in force.\n')
+                    "    9 | WRITE VERILOG a.v\n"
+                    'w.cmd:10: error: Cannot write "/dev/null": --no-write is in force.\n'
+                    "   10 | WRITE VHDL -APPEND /dev/null\n"
+                    "2 errors\n")
         self.assertEqual(self.all_files(), before)
 
     def test_a_refused_line_ends_the_replay(self) -> None:
         self.write("w.cmd", "WRITE VERILOG /a.v\nADD\n")
         self.expect(self.run_tool("run", "w.cmd", "--output-dir", "out"), FAILED,
-                    'w.cmd:1: error: Cannot write "/a.v": it leads out of the output folder.\n')
+                    'w.cmd:1: error: Cannot write "/a.v": it leads out of the output folder.\n'
+                    "    1 | WRITE VERILOG /a.v\n")
 
     def test_folder_that_cannot_be_entered(self) -> None:
         self.write("w.cmd", "WRITE VERILOG a.v\n")
@@ -507,7 +532,8 @@ class ProgressDisplay(ToolTest):
             return False
 
         with subprocess.Popen([TOOL, "run", "-", *options], stdin=subprocess.PIPE,
-                              stderr=standard_error, cwd=self.folder) as process:
+                              stderr=standard_error, cwd=self.folder,
+                              env={**os.environ, "NO_COLOR": "1"}) as process:
             os.close(standard_error)
             assert process.stdin is not None
             while not done(shown, lines):
@@ -525,12 +551,15 @@ class ProgressDisplay(ToolTest):
         return shown.decode(), lines + 1
 
     def test_shown_and_erased(self) -> None:
+        def message(last: int) -> str:
+            return f"-:{last}: error: Command not find.\r\n{last:5} | ADD\r\n"
+
         shown, last = self.replay_until(lambda shown, _: b" lines" in shown)
         self.assertRegex(shown, r"^orn-hdl: \d+ lines")
-        self.assertTrue(shown.endswith(f"\r\033[K-:{last}: error: Command not find.\r\n"), shown)
+        self.assertTrue(shown.endswith(f"\r\033[K{message(last)}"), shown)
         # As many lines, and the time that they take, show nothing when asked for quiet.
         shown, last = self.replay_until(lambda _, lines: lines >= last, "--quiet")
-        self.assertEqual(shown, f"-:{last}: error: Command not find.\r\n")
+        self.assertEqual(shown, message(last))
 
 
 class Examples(ToolTest):

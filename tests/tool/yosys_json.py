@@ -87,7 +87,14 @@ class ImportTest(ToolTest):
         self.judge_verilog(commands, allowed)
         self.judge_vhdl(allowed)
         return Imported(commands, self.read("x.verilog"), self.read("x.vhdl"),
-                        outcome.err.splitlines(), self.read_names())
+                        self.read_warnings(outcome.err), self.read_names())
+
+    def read_warnings(self, printed: str) -> list[str]:
+        """The warnings; behind several of them stands their number."""
+        warnings = printed.splitlines()
+        if len(warnings) > 1:
+            self.assertEqual(warnings.pop(), f"{len(warnings)} warnings")
+        return warnings
 
     def import_design(self, contents: Json, *options: str, allowed: str = "") -> Imported:
         (self.folder / "d.json").write_text(json.dumps(contents), encoding="utf-8")

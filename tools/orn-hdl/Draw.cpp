@@ -135,7 +135,9 @@ Status Draw(const DrawOptions& options) {
         model.GetCommandFactory()->AddCommandCreator(phrase.c_str(), &NoWriteCommand::Create);
     }
     Progress progress(true, options.file);
-    const Replayed replayed = Replay(model, options.file, false, progress);
+    CommandFile file(options.file, options.report, progress);
+    const Replayed replayed = Replay(model, file, false);
+    file.reporter.Finish();
     return replayed.complete ? DrawNetlist(*model.GetNetlist(), options) : replayed.status;
 }
 

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "Tool.h"
+#include "diagnostics/Reporter.h"
 
 #include <string>
 
@@ -16,6 +17,7 @@ struct DrawOptions {
     std::string around;
     /// The distance, in instances, of the outermost drawn instances.
     int depth = 1;
+    ReportOptions report;
 };
 
 Status Draw(const DrawOptions& options);

@@ -18,6 +18,7 @@
 #include <filesystem>
 #include <optional>
 #include <system_error>
+#include <utility>
 
 namespace Tool {
 
@@ -88,14 +89,17 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
 
-} // namespace
+void Report(const ImportOptions& options, Severity severity, std::string message,
+            Reporter& reporter) {
+    Diagnostic diagnostic;
+    diagnostic.severity = severity;
+    diagnostic.place.file = options.file;
+    diagnostic.message = std::move(message);
+    reporter.Report(std::move(diagnostic));
+}
 
-Status ImportDesign(const ImportOptions& options) {
-    std::string text;
-    const Status read = ReadFile(options.file, text);
-    if (read != Status::Success) {
-        return read;
-    }
+/// Imports the text of a file.
+Status ImportText(std::string text, const ImportOptions& options, Reporter& reporter) {
     try {
         const std::unique_ptr<ImportedDesign> design =
             ReadDesign(std::move(text), options.attributes);
@@ -104,14 +108,28 @@ Status ImportDesign(const ImportOptions& options) {
         const ImportedNetlist netlist =
             MakeNetlist(*design, top, GetUnknownValues(options), warnings);
         const Status written = WriteAll(netlist, options);
-        for (const std::string& warning : warnings.GetLines()) {
-            PrintError(options.file + ": warning: " + warning);
+        for (std::string& warning : warnings.GetLines()) {
+            Report(options, Severity::Warning, std::move(warning), reporter);
         }
         return written;
     } catch (const Import::Error& error) {
-        PrintError(options.file + ": error: " + error.what());
+        Report(options, Severity::Error, error.what(), reporter);
         return Status::Failed;
     }
+}
+
+} // namespace
+
+Status ImportDesign(const ImportOptions& options) {
+    std::string text;
+    const Status read = ReadFile(options.file, text);
+    if (read != Status::Success) {
+        return read;
+    }
+    Reporter reporter(options.report);
+    const Status status = ImportText(std::move(text), options, reporter);
+    reporter.Finish();
+    return status;
 }
 
 } // namespace Tool

@@ -3,6 +3,7 @@
 
 #include "Output.h"
 #include "Tool.h"
+#include "diagnostics/Reporter.h"
 
 #include <string>
 
@@ -22,6 +23,7 @@ struct ImportOptions {
     bool attributes = false;
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
+    ReportOptions report;
 };
 
 /// Imports a file. If no output is given, the file is only checked.

@@ -23,15 +23,14 @@ constexpr const char* NamelessModel = "HDL_NETLIST";
 /// The replay of one file: its progress, messages and status.
 class Replayer {
 public:
-    Replayer(Orn_Hdl::Model& model, const std::string& file, Progress& progress,
-             Checking::WriteGate* gate)
-        : model_(model), file_(file), progress_(progress), gate_(gate) {}
+    Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate)
+        : model_(model), file_(file), gate_(gate) {}
 
     /// Executes one line, which ends at `position` in the file. \return whether it succeeded.
     bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
         ++lines_;
         if (lines_ % LinesPerUpdate == 0) {
-            progress_.Update(lines_, position);
+            file_.progress.Update(lines_, position);
         }
         if (gate_ != nullptr && !gate_->Allows(words, lines_)) {
             status_ = Worse(status_, Status::Failed);
@@ -40,11 +39,11 @@ public:
         try {
             model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
-            Report(WithoutLineEnd(exception.getLocalized().GetView()));
+            Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
             status_ = Worse(status_, Status::Failed);
             return false;
         }
-        return model_.GetWriteError() == 0 || ReportWriteError();
+        return model_.GetWriteError() == 0 || ReportWriteError(words);
     }
 
     Status GetStatus() const noexcept { return status_; }
@@ -58,14 +57,14 @@ private:
         return text;
     }
 
-    void Report(std::string_view text) {
-        progress_.Erase();
-        std::string message(file_);
-        message.append(":").append(std::to_string(lines_)).append(": error: ").append(text);
-        PrintError(message);
+    void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
+        Diagnostic diagnostic;
+        diagnostic.place = file_.lines.GetPlace(lines_, words);
+        diagnostic.message = text;
+        file_.reporter.Report(std::move(diagnostic));
     }
 
-    bool ReportWriteError() {
+    bool ReportWriteError(const Orn_Hdl::StringArray& words) {
         std::string text("cannot write ");
         text.append(model_.GetWrittenFileName().GetView()).append(": ");
         text.append(Port::ErrorText(model_.GetWriteError()).GetView());
@@ -73,7 +72,7 @@ private:
             text.append("; the last ").append(std::to_string(leftover));
             text.append(" bytes of the file are a part of the new text");
         }
-        Report(text);
+        Report(words, text);
         status_ = Status::File;
         // The model keeps the error of its last write. Clear it, so that it is reported once.
         model_.RecordWrite("", 0);
@@ -81,8 +80,7 @@ private:
     }
 
     Orn_Hdl::Model& model_;
-    const std::string& file_;
-    Progress& progress_;
+    CommandFile& file_;
     Checking::WriteGate* const gate_;
     std::uint64_t lines_ = 0;
     Status status_ = Status::Success;
@@ -100,11 +98,16 @@ std::string GetModelName(const std::string& file, const std::optional<std::strin
     return std::string(Port::FileName(file.c_str()).GetStem().GetView());
 }
 
-Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
-                const WriteRules& rules, Checking::WriteGate* gate) {
+CommandFile::CommandFile(const std::string& fileName, const ReportOptions& report,
+                         Progress& shownProgress)
+    : name(fileName), progress(shownProgress), lines(fileName, SystemFileName(fileName.c_str())),
+      reporter(report, [&shownProgress] { shownProgress.Erase(); }) {}
+
+Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const WriteRules& rules,
+                Checking::WriteGate* gate) {
     Orn_Hdl::CommandReader input(model);
-    if (!input.Open(SystemFileName(file.c_str()))) {
-        return {ComplainUnreadable(file, input.GetError()), false, 0};
+    if (!input.Open(SystemFileName(file.name.c_str()))) {
+        return {ComplainUnreadable(file.name, input.GetError()), false, 0};
     }
     std::optional<RulesInForce> inForce;
     try {
@@ -112,21 +115,46 @@ Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, 
     } catch (const std::system_error& error) {
         return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false, 0};
     }
-    Replayer replayer(model, file, progress, gate);
+    Replayer replayer(model, file, gate);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
-        if (!replayer.Execute(*words, input.GetPosition()) && !keepGoing) {
+        if (!replayer.Execute(*words, input.GetPosition()) &&
+            (!keepGoing || file.reporter.IsAtLimit())) {
             return {replayer.GetStatus(), false, 0};
         }
     }
     if (input.GetError() != 0) {
-        progress.Erase();
-        return {ComplainUnreadable(file, input.GetError()), false, 0};
+        file.progress.Erase();
+        return {ComplainUnreadable(file.name, input.GetError()), false, 0};
     }
     return {replayer.GetStatus(), true, replayer.GetLineCount()};
 }
 
+namespace {
+
+/// Replays the file of the options and writes its netlists.
+Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
+    Checking::WriteGate gate(model, file.lines, file.reporter);
+    const Replayed replayed =
+        Replay(model, file, options.keepGoing, options.writeRules, options.check ? &gate : nullptr);
+    if (!replayed.complete) {
+        return replayed.status;
+    }
+    Outputs outputs = options.outputs;
+    Status status = replayed.status;
+    for (auto& [language, name] : outputs.files) {
+        if (options.check && !name.empty() && !gate.Allows(language, replayed.lines)) {
+            name.clear();
+            status = Worse(status, Status::Failed);
+        }
+    }
+    return Worse(status, WriteOutputs(model, outputs, file.progress));
+}
+
+} // namespace
+
 Status Run(const RunOptions& options) {
     Progress progress(options.quiet, options.file);
+    CommandFile file(options.file, options.report, progress);
     // The design is not destroyed before the process ends: freeing it object by object would take a
     // tenth of the time of the whole run.
     static Orn_Hdl::Engine* engine = nullptr;
@@ -134,22 +162,9 @@ Status Run(const RunOptions& options) {
     engine = new Orn_Hdl::Engine;
     const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
-    Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
-    Checking::WriteGate gate(model, options.file);
-    const Replayed replayed = Replay(model, options.file, options.keepGoing, progress,
-                                     options.writeRules, options.check ? &gate : nullptr);
-    if (!replayed.complete) {
-        return replayed.status;
-    }
-    Outputs outputs = options.outputs;
-    Status status = replayed.status;
-    for (auto& [language, file] : outputs.files) {
-        if (options.check && !file.empty() && !gate.Allows(language, replayed.lines)) {
-            file.clear();
-            status = Worse(status, Status::Failed);
-        }
-    }
-    return Worse(status, WriteOutputs(model, outputs, progress));
+    const Status status = ReplayAndWrite(*engine->GetModel(name.c_str()), file, options);
+    file.reporter.Finish();
+    return status;
 }
 
 } // namespace Tool

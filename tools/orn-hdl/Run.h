@@ -4,6 +4,8 @@
 #include "Output.h"
 #include "Tool.h"
 #include "WriteRules.h"
+#include "diagnostics/CommandLines.h"
+#include "diagnostics/Reporter.h"
 
 #include <cstdint>
 #include <optional>
@@ -33,6 +35,7 @@ struct RunOptions {
     bool quiet = false;
     /// Write nothing that has errors for its language.
     bool check = false;
+    ReportOptions report;
 };
 
 Status Run(const RunOptions& options);
@@ -50,10 +53,21 @@ struct Replayed {
     std::uint64_t lines = 0;
 };
 
+/// A command file, and where messages about it go.
+struct CommandFile {
+    /// \param fileName the file; "-" is standard input.
+    CommandFile(const std::string& fileName, const ReportOptions& report, Progress& shownProgress);
+
+    const std::string name;
+    Progress& progress;
+    CommandLines lines;
+    Reporter reporter;
+};
+
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
 /// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
 /// \param gate decides which lines may write; null when all may.
-Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, Progress& progress,
+Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing,
                 const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr);
 
 } // namespace Tool

@@ -3,10 +3,10 @@
 #include "CommandsPage.h"
 #include "Draw.h"
 #include "Import.h"
-#include "Nearest.h"
 #include "Run.h"
 #include "Tool.h"
 #include "check/Check.h"
+#include "diagnostics/Nearest.h"
 
 #include "Orn_Hdl/Language.h"
 #include "Port/String.h"
@@ -63,6 +63,31 @@ void AddWriteRules(CLI::App& command, Tool::WriteRules& rules) {
             ->check(CheckFileName);
     command.add_flag("--no-write", rules.noWrite, "Make every WRITE command fail")
         ->excludes(folder);
+}
+
+void AddFormat(CLI::App& command, const std::string& option, Tool::ReportOptions& report,
+               const std::string& help) {
+    command.add_option(option, report.format, help)
+        ->transform(CLI::CheckedTransformer(
+            std::map<std::string, Tool::ReportFormat>{{"text", Tool::ReportFormat::Text},
+                                                      {"json", Tool::ReportFormat::Json},
+                                                      {"sarif", Tool::ReportFormat::Sarif}}))
+        ->type_name("text|json|sarif");
+}
+
+void AddColor(CLI::App& command, Tool::ReportOptions& report) {
+    command.add_option("--color", report.color, "Colour messages; auto colours for a terminal")
+        ->transform(CLI::CheckedTransformer(
+            std::map<std::string, Tool::ColorChoice>{{"auto", Tool::ColorChoice::Auto},
+                                                     {"always", Tool::ColorChoice::Always},
+                                                     {"never", Tool::ColorChoice::Never}}))
+        ->type_name("auto|always|never");
+}
+
+/// The options of messages on standard error.
+void AddReport(CLI::App& command, Tool::ReportOptions& report) {
+    AddFormat(command, "--diagnostics", report, "Print messages as text, JSON or SARIF");
+    AddColor(command, report);
 }
 
 /// The command line: its options, and the command to run.
@@ -191,7 +216,15 @@ private:
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
         AddWriteRules(command, run_.writeRules);
-        command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
+        CLI::Option* keepGoing =
+            command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
+        command
+            .add_option("--error-limit", run_.report.errorLimit,
+                        "With --keep-going, stop after N errors")
+            ->type_name("N")
+            ->check(CLI::PositiveNumber)
+            ->needs(keepGoing);
+        AddReport(command, run_.report);
         command.add_flag("--check", run_.check, "Write nothing that has errors for its language");
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
@@ -209,6 +242,7 @@ private:
         command.add_flag("--attributes", import_.attributes,
                          "Import the attributes of cells and nets");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
+        AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
     }
 
@@ -225,12 +259,8 @@ private:
             ->type_name("TARGETS");
         command.add_option("--fail-on", check_.failOn, "What makes the exit status 1")
             ->check(CLI::IsMember({"error", "warning", "never"}));
-        command.add_option("--format", check_.format, "How the findings are printed")
-            ->transform(CLI::CheckedTransformer(
-                std::map<std::string, Tool::CheckFormat>{{"text", Tool::CheckFormat::Text},
-                                                         {"json", Tool::CheckFormat::Json},
-                                                         {"sarif", Tool::CheckFormat::Sarif}}))
-            ->type_name("text|json|sarif");
+        AddFormat(command, "--format,--diagnostics", check_.report, "How the findings are printed");
+        AddColor(command, check_.report);
         command.add_flag("--list", check_.list, "List the rules");
         command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
@@ -251,6 +281,7 @@ private:
             ->type_name("N")
             ->check(CLI::Range(0, 1000))
             ->needs(around);
+        AddReport(command, draw_.report);
     }
 
     void AddCommands() {

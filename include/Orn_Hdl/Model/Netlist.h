@@ -26,7 +26,7 @@ class NameListener;
 class ORN_HDL_API Netlist : public Object, public AttributeHolder {
 public:
     /// \param name null gives "hdlNetlist".
-    explicit Netlist(const char* name = nullptr);
+    explicit Netlist(const Port::TextArgument& name = nullptr);
     Netlist(const Netlist&) = delete;
     Netlist& operator=(const Netlist&) = delete;
     /// Takes over the name, comment, attributes and objects of another netlist, which is then an
@@ -43,6 +43,7 @@ public:
     void AcceptObject(ObjectVisitor& visitor) override;
     /// Stores the name as it stands; null is read as "".
     void SetName(const char* name) override;
+    using Object::SetName;
     /// Remembers from which file the design comes.
     void SetSourceFileName(const char* name);
     /// The file from which the design comes; empty when it is not known.

@@ -208,9 +208,9 @@ void NetlistOwner::LetGo(Bus& bus) noexcept {
     LetGo(static_cast<Signal&>(bus));
 }
 
-Netlist::Netlist(const char* name)
+Netlist::Netlist(const Port::TextArgument& name)
     : Object(ObjectTypeNetlist), implementation_(std::make_unique<Implementation>()) {
-    SetNameVerbatim(name == nullptr ? "hdlNetlist" : name);
+    SetNameVerbatim(name == nullptr ? "hdlNetlist" : name.Get());
 }
 
 // NOLINTNEXTLINE(performance-noexcept-move-constructor)

@@ -7,9 +7,12 @@
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Run.h"
+#include "diagnostics/CommandLines.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <cstdio>
+#include <iterator>
 #include <memory>
 #include <sstream>
 #include <string_view>
@@ -21,6 +24,7 @@ namespace {
 
 using Checking::Checker;
 using Checking::Located;
+using Checking::Reported;
 using Orn_Hdl::Check;
 
 /// A command file that can be read twice: standard input is copied.
@@ -69,17 +73,24 @@ std::string_view WithoutLineEnd(std::string_view text) noexcept {
 /// The replay of one file, with a check at each line that would write.
 class FileCheck {
 public:
-    FileCheck(const CheckOptions& options, const std::string& file, Check::Targets targets)
-        : options_(options), file_(file), targets_(targets) {}
+    FileCheck(const CheckOptions& options, const std::string& file, Check::Targets targets,
+              Reporter& reporter)
+        : options_(options), file_(file), source_(file), lines_(file, source_.GetName()),
+          reporter_(reporter), targets_(targets) {}
 
-    Status Run(std::vector<Located>& all);
+    /// Adds the findings to `all`, unless a line fails.
+    Status Run(std::vector<Reported>& all);
 
 private:
-    Status Replay(const char* systemName);
+    Status Replay();
     bool Execute(const Orn_Hdl::StringArray& words);
+    void Report(const Orn_Hdl::StringArray& words, std::string_view text);
 
     const CheckOptions& options_;
     const std::string& file_;
+    const Source source_;
+    CommandLines lines_;
+    Reporter& reporter_;
     const Check::Targets targets_;
     Orn_Hdl::Model* model_ = nullptr;
     std::unique_ptr<Checker> checker_;
@@ -98,15 +109,21 @@ bool FileCheck::Execute(const Orn_Hdl::StringArray& words) {
         }
         return true;
     } catch (const Orn_Hdl::Exception& exception) {
-        PrintError(file_ + ":" + std::to_string(line_) +
-                   ": error: " + std::string(WithoutLineEnd(exception.getLocalized().GetView())));
+        Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
         return false;
     }
 }
 
-Status FileCheck::Replay(const char* systemName) {
+void FileCheck::Report(const Orn_Hdl::StringArray& words, std::string_view text) {
+    Diagnostic diagnostic;
+    diagnostic.place = lines_.GetPlace(line_, words);
+    diagnostic.message = text;
+    reporter_.Report(std::move(diagnostic));
+}
+
+Status FileCheck::Replay() {
     Orn_Hdl::CommandReader input(*model_);
-    if (!input.Open(systemName)) {
+    if (!input.Open(source_.GetName())) {
         return ComplainUnreadable(file_, input.GetError());
     }
     while (const Orn_Hdl::StringArray* words = input.Next()) {
@@ -117,8 +134,7 @@ Status FileCheck::Replay(const char* systemName) {
     return input.GetError() == 0 ? Status::Success : ComplainUnreadable(file_, input.GetError());
 }
 
-Status FileCheck::Run(std::vector<Located>& all) {
-    const Source source(file_);
+Status FileCheck::Run(std::vector<Reported>& all) {
     // The design stands until the process ends, as in `run`.
     static Orn_Hdl::Engine* engine = nullptr;
     delete std::exchange(engine, nullptr);
@@ -127,23 +143,18 @@ Status FileCheck::Run(std::vector<Located>& all) {
     engine->CreateAndAddModel(name.c_str(), file_.c_str());
     model_ = engine->GetModel(name.c_str());
     checker_ = std::make_unique<Checker>(*model_, targets_);
-    const Status status = Replay(source.GetName());
+    const Status status = Replay();
     if (status != Status::Success) {
         return status;
     }
     if (!checker_->IsChecked()) {
         checker_->CheckAll(line_, findings_);
     }
-    for (Located& located : findings_) {
-        located.file = file_;
-    }
-    if (!Checking::Locate(source.GetName(), findings_)) {
+    if (!Checking::Locate(source_.GetName(), findings_)) {
         return ComplainUnreadable(file_, 0);
     }
-    for (Located& located : findings_) {
-        // What no line brought in is told of at the line that writes it.
-        located.line = located.line == 0 ? located.checkedAt : located.line;
-        all.push_back(std::move(located));
+    for (Reported& reported : Checking::MakeReports(findings_, lines_)) {
+        all.push_back(std::move(reported));
     }
     return Status::Success;
 }
@@ -176,9 +187,9 @@ Status ExplainRule(const std::string& name) {
     return Print(Checking::Explain(*rule));
 }
 
-bool Fails(const Located& located, const std::string& failOn) {
+bool Fails(const Reported& reported, const std::string& failOn) {
     return failOn == "warning" ||
-           (failOn == "error" && located.finding.GetSeverity() == Check::Severity::Error);
+           (failOn == "error" && reported.diagnostic.severity == Severity::Error);
 }
 
 } // namespace
@@ -201,14 +212,23 @@ Status CheckFiles(const CheckOptions& options) {
     if (!ReadTargets(options.targets, targets)) {
         return Status::Usage;
     }
-    std::vector<Located> findings;
+    Reporter reporter(options.report);
+    std::vector<Reported> findings;
     Status status = Status::Success;
     for (const std::string& file : options.files) {
-        status = Worse(status, FileCheck(options, file, targets).Run(findings));
+        status = Worse(status, FileCheck(options, file, targets, reporter).Run(findings));
     }
-    status = Worse(status, Print(Checking::Format(findings, options.format)));
-    for (const Located& located : findings) {
-        if (Fails(located, options.failOn)) {
+    // Programs get one document, with the lines that failed before the findings.
+    std::vector<Reported> all;
+    for (Diagnostic& failure : reporter.TakeCollected()) {
+        all.push_back(Reported{std::move(failure), {}});
+    }
+    std::move(findings.begin(), findings.end(), std::back_inserter(all));
+    const Checking::TextStyle style{UsesColor(options.report.color, stdout),
+                                    static_cast<std::size_t>(reporter.GetErrorCount())};
+    status = Worse(status, Print(Checking::Format(all, options.report.format, style)));
+    for (const Reported& reported : all) {
+        if (Fails(reported, options.failOn)) {
             return Worse(status, Status::Failed);
         }
     }

@@ -3,14 +3,13 @@
 
 #include "Orn_Hdl/Check.h"
 #include "Tool.h"
+#include "diagnostics/Reporter.h"
 
 #include <optional>
 #include <string>
 #include <vector>
 
 namespace Tool {
-
-enum class CheckFormat { Text, Json, Sarif };
 
 struct CheckOptions {
     /// The command files; "-" is standard input.
@@ -21,7 +20,8 @@ struct CheckOptions {
     std::string targets;
     /// "error", "warning" or "never".
     std::string failOn = "error";
-    CheckFormat format = CheckFormat::Text;
+    /// How findings are printed, and lines that fail.
+    ReportOptions report;
     /// Prints the rules in place of a check.
     bool list = false;
     /// The same as a table of the documentation.

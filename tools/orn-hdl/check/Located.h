@@ -12,8 +12,6 @@ namespace Tool::Checking {
 /// A finding, and where it is.
 struct Located {
     Orn_Hdl::Check::Finding finding;
-    /// The file as the user named it.
-    std::string file;
     /// The line of the command that brought it in; 0 when there is none.
     std::uint64_t line = 0;
     /// The line of the other half of a clash; 0 for none.

@@ -1,10 +1,14 @@
 #include "check/Report.h"
 
-#include "Port/Version.h"
-#include "check/Json.h"
+#include "Orn_Hdl/Model/Object.h"
+#include "Port/Ascii.h"
+#include "diagnostics/CommandLines.h"
+#include "diagnostics/JsonWriter.h"
+#include "diagnostics/MachineFormats.h"
 
 #include <algorithm>
 #include <map>
+#include <optional>
 #include <string_view>
 
 namespace Tool::Checking {
@@ -13,10 +17,6 @@ using std::string_view;
 using Check = Orn_Hdl::Check;
 
 namespace {
-
-string_view SeverityName(const Check::Finding& finding) {
-    return finding.GetSeverity() == Check::Severity::Error ? "error" : "warning";
-}
 
 std::string Join(const std::vector<Check::Target>& targets) {
     std::string text;
@@ -45,22 +45,103 @@ std::vector<std::string> GetSayings(const Check::Verdicts& verdicts) {
     return sayings;
 }
 
-/// Who minds, what was noted, the other half of a clash, and what helps.
-std::vector<std::string> GetNotes(const Located& located) {
-    std::vector<std::string> notes = GetSayings(located.finding.verdicts);
-    notes.insert(notes.end(), located.finding.notes.begin(), located.finding.notes.end());
-    if (located.otherLine != 0) {
-        notes.push_back(located.file + ":" + std::to_string(located.otherLine) +
-                        ": the other half is here");
+/// The text of a line with a mark at the name that a cause has.
+class MarkedLines {
+public:
+    MarkedLines(const std::vector<Located>& findings, CommandLines& lines);
+
+    Place Get(std::uint64_t line, const Check::Cause& cause) const;
+
+private:
+    /// By line; they are read in ascending order.
+    std::map<std::uint64_t, Place> places_;
+};
+
+/// The line at which a finding is reported.
+std::uint64_t GetLine(const Located& located) {
+    return located.line != 0 ? located.line : located.checkedAt;
+}
+
+MarkedLines::MarkedLines(const std::vector<Located>& findings, CommandLines& lines) {
+    for (const Located& located : findings) {
+        places_[GetLine(located)];
+        places_[located.otherLine];
     }
-    notes.push_back("what helps: " + std::string(located.finding.rule->help));
+    for (auto& [line, place] : places_) {
+        place = lines.GetPlace(line);
+    }
+}
+
+std::string Normal(string_view name) {
+    Port::StringBase<char> text(name);
+    Orn_Hdl::Object::NormalizeName(text);
+    text.MakeLower();
+    return std::string(text.GetView());
+}
+
+/// The word of a line that names a cause: its second name, which is the narrower one, or its first.
+std::optional<Mark> FindName(const std::string& name, const std::vector<WordPlace>& words) {
+    const std::string wanted = Normal(name);
+    for (std::size_t i = 1; i < words.size() && !wanted.empty(); ++i) {
+        const std::string word = Normal(words[i].text);
+        const std::size_t dot = word.find('.');
+        const int index = static_cast<int>(i);
+        if (word == wanted || word.substr(0, word.find('(')) == wanted) {
+            return Mark::Word(index);
+        }
+        if (dot != std::string::npos && word.substr(dot + 1) == wanted) {
+            return Mark::Part(index, dot + 1);
+        }
+    }
+    return std::nullopt;
+}
+
+/// What of a line is marked for a cause: a constant, or else the second name, which is the narrower
+/// one, or the first.
+std::optional<Mark> FindMark(const Check::Cause& cause, const std::vector<WordPlace>& words) {
+    std::optional<Mark> mark = FindName(cause.second, words);
+    if (!mark) {
+        mark = FindName(cause.first, words);
+    }
+    if (mark && cause.kind == Check::Cause::Kind::Constant &&
+        mark->last + 1 < static_cast<int>(words.size())) {
+        mark = Mark::Word(mark->last + 1);
+    }
+    return mark;
+}
+
+Place MarkedLines::Get(std::uint64_t line, const Check::Cause& cause) const {
+    Place place = places_.at(line);
+    const std::vector<WordPlace> words = FindWords(place.source);
+    if (const std::optional<Mark> mark = FindMark(cause, words)) {
+        place.columns = GetColumns(*mark, words);
+    }
+    return place;
+}
+
+/// Who minds, what was noted, the other half of a clash, and what helps.
+std::vector<Note> GetNotes(const Located& located, const MarkedLines& lines) {
+    std::vector<Note> notes;
+    for (std::string& saying : GetSayings(located.finding.verdicts)) {
+        notes.push_back({std::move(saying)});
+    }
+    for (const std::string& note : located.finding.notes) {
+        notes.push_back({note});
+    }
+    if (located.otherLine != 0) {
+        notes.push_back(
+            {"the other half is here", lines.Get(located.otherLine, located.finding.other)});
+    }
+    notes.push_back({"what helps: " + std::string(located.finding.rule->help)});
     return notes;
 }
 
-std::map<string_view, std::size_t> CountRules(const std::vector<Located>& findings) {
+std::map<string_view, std::size_t> CountRules(const std::vector<Reported>& findings) {
     std::map<string_view, std::size_t> counts;
-    for (const Located& located : findings) {
-        ++counts[located.finding.rule->name];
+    for (const Reported& reported : findings) {
+        if (!reported.diagnostic.rule.empty()) {
+            ++counts[reported.diagnostic.rule];
+        }
     }
     return counts;
 }
@@ -76,23 +157,15 @@ std::vector<Check::Target> GetTargets(const Check::Finding& finding) {
     return targets;
 }
 
-std::string FormatText(const std::vector<Located>& findings) {
+std::string FormatAsText(const std::vector<Reported>& findings, const TextStyle& style) {
     std::string text;
-    std::size_t errors = 0;
-    for (const Located& located : findings) {
-        const bool isError = located.finding.GetSeverity() == Check::Severity::Error;
-        errors += isError ? 1 : 0;
-        text.append(located.file).append(":");
-        text.append(std::to_string(located.line)).append(": ");
-        text.append(SeverityName(located.finding)).append(": ");
-        text.append(located.finding.message);
-        text.append(" [").append(located.finding.rule->name).append("]\n");
-        for (const std::string& note : GetNotes(located)) {
-            text.append("    ").append(note).append("\n");
-        }
+    std::size_t errors = style.failures;
+    for (const Reported& reported : findings) {
+        errors += reported.diagnostic.severity == Severity::Error ? 1 : 0;
+        text.append(FormatText(reported.diagnostic, style.useColor));
     }
     text.append(std::to_string(errors)).append(errors == 1 ? " error, " : " errors, ");
-    const std::size_t warnings = findings.size() - errors;
+    const std::size_t warnings = findings.size() + style.failures - errors;
     text.append(std::to_string(warnings)).append(warnings == 1 ? " warning" : " warnings");
     string_view separator = ": ";
     for (const auto& [rule, count] : CountRules(findings)) {
@@ -102,26 +175,39 @@ std::string FormatText(const std::vector<Located>& findings) {
     return text.append("\n");
 }
 
-std::string FormatJson(const std::vector<Located>& findings) {
+/// A note on one line; one about another place names it.
+std::string ToLine(const Note& note) {
+    if (note.place.line == 0) {
+        return note.text;
+    }
+    return note.place.file + ":" + std::to_string(note.place.line) + ": " + note.text;
+}
+
+void WriteFinding(const Reported& reported, JsonWriter& json) {
+    const Diagnostic& diagnostic = reported.diagnostic;
+    json.BeginObject();
+    json.Key("rule").Text(diagnostic.rule);
+    json.Key("severity").Text(GetSeverityName(diagnostic.severity));
+    json.Key("file").Text(diagnostic.place.file);
+    json.Key("line").Number(diagnostic.place.line);
+    json.Key("targets").BeginArray();
+    for (const Check::Target target : reported.targets) {
+        json.Text(Check::GetName(target));
+    }
+    json.EndArray();
+    json.Key("message").Text(diagnostic.message);
+    json.Key("notes").BeginArray();
+    for (const Note& note : diagnostic.notes) {
+        json.Text(ToLine(note));
+    }
+    json.EndArray().EndObject();
+}
+
+std::string FormatAsJson(const std::vector<Reported>& findings) {
     JsonWriter json;
     json.BeginObject().Key("findings").BeginArray();
-    for (const Located& located : findings) {
-        json.BeginObject();
-        json.Key("rule").Text(located.finding.rule->name);
-        json.Key("severity").Text(SeverityName(located.finding));
-        json.Key("file").Text(located.file);
-        json.Key("line").Number(located.line);
-        json.Key("targets").BeginArray();
-        for (const Check::Target target : GetTargets(located.finding)) {
-            json.Text(Check::GetName(target));
-        }
-        json.EndArray();
-        json.Key("message").Text(located.finding.message);
-        json.Key("notes").BeginArray();
-        for (const std::string& note : GetNotes(located)) {
-            json.Text(note);
-        }
-        json.EndArray().EndObject();
+    for (const Reported& reported : findings) {
+        WriteFinding(reported, json);
     }
     json.EndArray().Key("counts").BeginObject();
     for (const auto& [rule, count] : CountRules(findings)) {
@@ -131,77 +217,16 @@ std::string FormatJson(const std::vector<Located>& findings) {
     return json.Take();
 }
 
-void WriteSarifRules(JsonWriter& json) {
-    json.Key("rules").BeginArray();
+std::string FormatAsSarif(const std::vector<Reported>& findings) {
+    std::vector<RuleTexts> rules;
     for (const Check::Rule& rule : Check::GetRules()) {
-        json.BeginObject();
-        json.Key("id").Text(rule.name);
-        json.Key("shortDescription").BeginObject().Key("text").Text(rule.what).EndObject();
-        json.Key("fullDescription").BeginObject().Key("text").Text(rule.why).EndObject();
-        json.Key("help").BeginObject().Key("text").Text(rule.help).EndObject();
-        json.EndObject();
+        rules.push_back({rule.name, rule.what, rule.why, rule.help});
     }
-    json.EndArray();
-}
-
-/// Blanks and the like are written as %XX, as in any address.
-std::string ToUri(string_view file) {
-    constexpr string_view Plain = "-._~/";
-    constexpr string_view Digits = "0123456789ABCDEF";
-    std::string uri;
-    for (const char c : file) {
-        const auto byte = static_cast<unsigned char>(c);
-        const bool isPlain = (c >= '0' && c <= '9') || (c >= 'A' && c <= 'Z') ||
-                             (c >= 'a' && c <= 'z') || Plain.find(c) != string_view::npos;
-        if (isPlain) {
-            uri.push_back(c);
-        } else {
-            uri.append({'%', Digits[byte >> 4U], Digits[byte & 15U]});
-        }
+    std::vector<Diagnostic> diagnostics;
+    for (const Reported& reported : findings) {
+        diagnostics.push_back(reported.diagnostic);
     }
-    return uri;
-}
-
-void WriteSarifPlace(JsonWriter& json, const std::string& file, std::uint64_t line) {
-    json.BeginObject().Key("physicalLocation").BeginObject();
-    json.Key("artifactLocation").BeginObject().Key("uri").Text(ToUri(file)).EndObject();
-    json.Key("region").BeginObject().Key("startLine");
-    json.Number(std::max<std::uint64_t>(line, 1)).EndObject();
-    json.EndObject();
-}
-
-std::string FormatSarif(const std::vector<Located>& findings) {
-    JsonWriter json;
-    json.BeginObject();
-    json.Key("$schema").Text("https://json.schemastore.org/sarif-2.1.0.json");
-    json.Key("version").Text("2.1.0").Key("runs").BeginArray().BeginObject();
-    json.Key("tool").BeginObject().Key("driver").BeginObject();
-    json.Key("name").Text("orn-hdl");
-    json.Key("version").Text(Port::Version::getValue("version").GetView());
-    WriteSarifRules(json);
-    json.EndObject().EndObject().Key("results").BeginArray();
-    for (const Located& located : findings) {
-        std::string text = located.finding.message;
-        for (const std::string& note : GetNotes(located)) {
-            text.append("\n").append(note);
-        }
-        json.BeginObject();
-        json.Key("ruleId").Text(located.finding.rule->name);
-        json.Key("level").Text(SeverityName(located.finding));
-        json.Key("message").BeginObject().Key("text").Text(text).EndObject();
-        json.Key("locations").BeginArray();
-        WriteSarifPlace(json, located.file, located.line);
-        json.EndObject().EndArray();
-        if (located.otherLine != 0) {
-            json.Key("relatedLocations").BeginArray();
-            WriteSarifPlace(json, located.file, located.otherLine);
-            json.Key("message").BeginObject().Key("text").Text("the other half").EndObject();
-            json.EndObject().EndArray();
-        }
-        json.EndObject();
-    }
-    json.EndArray().EndObject().EndArray().EndObject();
-    return json.Take();
+    return FormatSarif(diagnostics, rules);
 }
 
 string_view SeverityOf(const Check::Rule& rule) {
@@ -210,14 +235,30 @@ string_view SeverityOf(const Check::Rule& rule) {
 
 } // namespace
 
-std::string Format(const std::vector<Located>& findings, CheckFormat format) {
+std::vector<Reported> MakeReports(const std::vector<Located>& findings, CommandLines& lines) {
+    const MarkedLines marked(findings, lines);
+    std::vector<Reported> reports;
+    for (const Located& located : findings) {
+        const Check::Finding& finding = located.finding;
+        Reported& reported = reports.emplace_back();
+        reported.targets = GetTargets(finding);
+        reported.diagnostic = Diagnostic{
+            finding.GetSeverity() == Check::Severity::Error ? Severity::Error : Severity::Warning,
+            std::string(finding.rule->name), marked.Get(GetLine(located), finding.cause),
+            finding.message, GetNotes(located, marked)};
+    }
+    return reports;
+}
+
+std::string Format(const std::vector<Reported>& findings, ReportFormat format,
+                   const TextStyle& style) {
     switch (format) {
-    case CheckFormat::Json:
-        return FormatJson(findings);
-    case CheckFormat::Sarif:
-        return FormatSarif(findings);
+    case ReportFormat::Json:
+        return FormatAsJson(findings);
+    case ReportFormat::Sarif:
+        return FormatAsSarif(findings);
     default:
-        return FormatText(findings);
+        return FormatAsText(findings, style);
     }
 }
 

@@ -4,8 +4,11 @@
 #include "Port/Ascii.h"
 #include "check/Checker.h"
 #include "check/Report.h"
+#include "diagnostics/CommandLines.h"
+#include "diagnostics/Reporter.h"
 
-#include <algorithm>
+#include <utility>
+#include <vector>
 
 namespace Tool::Checking {
 
@@ -28,24 +31,17 @@ bool WriteGate::Allows(Orn_Hdl::Language language, std::uint64_t line) {
         if (finding.GetSeverity() == Check::Severity::Error) {
             Located& located = findings.emplace_back();
             located.finding = std::move(finding);
-            located.file = file_;
             located.checkedAt = line;
         }
     }
-    if (findings.empty()) {
-        return true;
+    // A pipe is read once; its findings stand at the line that writes.
+    if (!findings.empty() && CanReadAgain(lines_.GetSystemName())) {
+        Locate(lines_.GetSystemName().c_str(), findings);
     }
-    // Standard input is read once; its findings stand at the line that writes.
-    if (file_ != "-") {
-        Locate(file_.c_str(), findings);
+    for (Reported& reported : MakeReports(findings, lines_)) {
+        reporter_.Report(std::move(reported.diagnostic));
     }
-    for (Located& located : findings) {
-        located.line = located.line == 0 ? line : located.line;
-    }
-    std::string text = Format(findings, CheckFormat::Text);
-    text.pop_back();
-    PrintError(text);
-    return false;
+    return findings.empty();
 }
 
 } // namespace Tool::Checking

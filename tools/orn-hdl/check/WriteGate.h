@@ -4,20 +4,25 @@
 #include "Orn_Hdl/Language.h"
 
 #include <cstdint>
-#include <string>
 
 namespace Orn_Hdl {
 class Model;
 class StringArray;
 } // namespace Orn_Hdl
 
+namespace Tool {
+class CommandLines;
+class Reporter;
+} // namespace Tool
+
 namespace Tool::Checking {
 
 /// Checks a model before it is written, and reports what is wrong with it.
 class WriteGate {
 public:
-    /// \param file the command file, as the user named it; must outlive this.
-    WriteGate(Orn_Hdl::Model& model, const std::string& file) : model_(model), file_(file) {}
+    /// \param lines the command file; must outlive this object, as must the reporter.
+    WriteGate(Orn_Hdl::Model& model, CommandLines& lines, Reporter& reporter)
+        : model_(model), lines_(lines), reporter_(reporter) {}
 
     /// Whether a line may be carried out: any line may that does not write.
     bool Allows(const Orn_Hdl::StringArray& words, std::uint64_t line);
@@ -26,7 +31,8 @@ public:
 
 private:
     Orn_Hdl::Model& model_;
-    const std::string& file_;
+    CommandLines& lines_;
+    Reporter& reporter_;
 };
 
 } // namespace Tool::Checking

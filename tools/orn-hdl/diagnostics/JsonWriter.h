@@ -5,7 +5,7 @@
 #include <string>
 #include <string_view>
 
-namespace Tool::Checking {
+namespace Tool {
 
 /// Writes one value of JSON, member by member. Commas and quoting are its business; the caller ends
 /// what it begins.
@@ -33,4 +33,4 @@ private:
     bool needsComma_ = false;
 };
 
-} // namespace Tool::Checking
+} // namespace Tool

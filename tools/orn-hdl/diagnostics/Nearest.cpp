@@ -1,4 +1,4 @@
-#include "Nearest.h"
+#include "diagnostics/Nearest.h"
 
 #include "Port/Ascii.h"
 
