@@ -36,6 +36,18 @@ std::string CheckDigit(const std::string& text) {
     return text == "0" || text == "1" ? "" : "0 or 1 is needed";
 }
 
+const std::map<std::string, Tool::Import::NameLanguages>& GetNameLanguages() {
+    using Tool::Import::NameLanguages;
+    static const std::map<std::string, NameLanguages> words = {{"verilog", NameLanguages::Verilog},
+                                                               {"vhdl", NameLanguages::Vhdl},
+                                                               {"both", NameLanguages::Both}};
+    return words;
+}
+
+std::string CheckNameLanguages(const std::string& text) {
+    return GetNameLanguages().count(text) != 0 ? "" : "verilog, vhdl or both is needed";
+}
+
 CLI::Option* AddFile(CLI::App& command, const std::string& option, std::string& name,
                      const std::string& help) {
     return command.add_option(option, name, help)
@@ -236,6 +248,15 @@ private:
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
+        const auto setNames = [this](const std::string& word) {
+            import_.names = GetNameLanguages().at(word);
+        };
+        command
+            .add_option_function<std::string>("--names", setNames,
+                                              "Make names legal in these languages")
+            ->type_name("verilog|vhdl|both")
+            ->check(CheckNameLanguages);
+        command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
         command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")
             ->check(CheckDigit);

@@ -99,7 +99,7 @@ void NetlistEmitter::EmitPortBits(const ImportedSignal& signal, std::uint32_t in
         const Bit bit = references_.GetBit(signal.port->bits, left);
         if (bit == Zero || bit == One) {
             EmitPortConstant(signal, left);
-        } else if (IsNet(bit) &&
+        } else if (IsNet(bit) && owners_.Get(bit).signal != BitOwner::NoSignal &&
                    (owners_.Get(bit).signal != index || owners_.Get(bit).position != left)) {
             EmitAlias(signal, left);
         }
@@ -141,7 +141,8 @@ void NetlistEmitter::EmitAlias(const ImportedSignal& signal, std::uint32_t& left
     const std::string own = GetPartName(signal, start, left);
     const std::string owner =
         GetPartName(owners_.GetSignals()[first.signal], first.position, last.position);
-    // An input port does not own a bit only when an inout port has the bit too.
+    // An input port that does not own a bit drives the inout port, or the internal signal, that
+    // owns it.
     const bool drives = signal.port->direction == Direction::Input;
     sink_.Alias(drives ? owner : own, drives ? own : owner);
 }

@@ -1,6 +1,6 @@
 #include "import/ImportedComponents.h"
 
-#include "import/LegalNames.h"
+#include "import/NameRules.h"
 #include "import/Spelling.h"
 #include "import/Values.h"
 
@@ -8,6 +8,7 @@
 #include <cstddef>
 #include <iterator>
 #include <map>
+#include <unordered_set>
 #include <utility>
 
 namespace Tool::Import {
@@ -43,9 +44,9 @@ class ComponentFinder {
 public:
     ComponentFinder(const ImportedDesign& design, const Module& top,
                     const std::vector<TypeUse>& types, const UnknownValues& unknown,
-                    Warnings& warnings)
-        : design_(design), top_(top), types_(types), unknown_(unknown), warnings_(warnings),
-          variants_(types.size()) {}
+                    const NameRules& rules, Warnings& warnings)
+        : design_(design), top_(top), types_(types), unknown_(unknown), rules_(rules),
+          warnings_(warnings), variants_(types.size()) {}
 
     std::uint32_t GetOrAdd(const Cell& cell);
     std::vector<ImportedComponent>& GetComponents() noexcept { return components_; }
@@ -67,6 +68,7 @@ private:
     const Module& top_;
     const std::vector<TypeUse>& types_;
     const UnknownValues& unknown_;
+    const NameRules& rules_;
     Warnings& warnings_;
     std::vector<ImportedComponent> components_;
     /// The components of each type.
@@ -175,30 +177,43 @@ void ComponentFinder::AddGeneric(ImportedComponent& component, const TypeUse& ty
     generic.value = MakeGeneric("", *value, unknown_);
 }
 
+BitRange GetRange(const TypeUse& type, const ImportedPin& pin) noexcept {
+    const ModulePort* port = type.pins[pin.typePin].port;
+    return Normalize(port == nullptr ? BitRange() : port->range, pin.width);
+}
+
+/// \param mayEscape whether an escaped name may be used: the library takes none for a bus.
+void ClaimUnchanged(UniqueNames& scope, std::string_view oldName, bool mayEscape,
+                    std::string& name) {
+    if (scope.ClaimLegal(oldName)) {
+        name = oldName;
+    } else if (mayEscape) {
+        name = scope.ClaimSame(oldName);
+    }
+}
+
 void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& type) {
     // In VHDL, pins and generics share the scope of the component.
-    UniqueNames scope;
-    const auto claimUnchanged = [&](std::string_view oldName, std::string& name) {
-        if (IsLegalName(oldName) && scope.Claim(oldName)) {
-            name = oldName;
-        }
-    };
+    UniqueNames scope(rules_);
+    UniqueNames verilogGenerics(rules_);
+    UniqueNames& genericScope = rules_.MayEscape() ? verilogGenerics : scope;
     for (ImportedPin& pin : component.pins) {
-        claimUnchanged(pin.oldName, pin.baseName);
+        const BitRange range = GetRange(type, pin);
+        pin.scalar = pin.width == 1 && range.offset == 0;
+        ClaimUnchanged(scope, pin.oldName, pin.scalar, pin.baseName);
     }
     for (ImportedGeneric& generic : component.generics) {
-        claimUnchanged(generic.oldName, generic.value.name);
+        // Yosys reads no escaped name in a defparam statement.
+        ClaimUnchanged(genericScope, generic.oldName, false, generic.value.name);
     }
     for (ImportedPin& pin : component.pins) {
         ClaimSimilar(scope, component, "connections", pin.oldName, pin.baseName);
     }
     for (ImportedGeneric& generic : component.generics) {
-        ClaimSimilar(scope, component, "parameters", generic.oldName, generic.value.name);
+        ClaimSimilar(genericScope, component, "parameters", generic.oldName, generic.value.name);
     }
     for (ImportedPin& pin : component.pins) {
-        const ModulePort* port = type.pins[pin.typePin].port;
-        const BitRange range = Normalize(port == nullptr ? BitRange() : port->range, pin.width);
-        pin.scalar = pin.width == 1 && range.offset == 0;
+        const BitRange range = GetRange(type, pin);
         pin.name = pin.scalar ? pin.baseName
                               : MakeBusName(pin.baseName, GetIndex(range, pin.width, pin.width - 1),
                                             GetIndex(range, pin.width, 0));
@@ -212,17 +227,17 @@ void ComponentFinder::ClaimSimilar(UniqueNames& scope, const ImportedComponent& 
     if (name.empty()) {
         name = scope.ClaimSimilar(oldName, 'p');
         warnings_.Add(top_.GetPlace(*component.firstCell, part, oldName).ToPath(),
-                      (IsLegalName(oldName)
+                      (rules_.IsLegal(oldName)
                            ? "another pin or parameter has the name " + Quote(oldName)
-                           : Quote(oldName) + NotLegal) +
+                           : Quote(oldName) + rules_.GetComplaint()) +
                           "; renamed to " + name + " in component " + Quote(component.oldName));
     }
 }
 
 /// The warning for a component that could not keep the name of its type.
-std::string MakeWarning(const ImportedComponent& component) {
-    if (!IsLegalName(component.oldName)) {
-        return Quote(component.oldName) + NotLegal + "; renamed to " + component.name;
+std::string MakeWarning(const ImportedComponent& component, const NameRules& rules) {
+    if (!rules.IsLegal(component.oldName)) {
+        return Quote(component.oldName) + rules.GetComplaint() + "; renamed to " + component.name;
     }
     const std::string reason = component.splitByPins
                                    ? "the cells of the type have few pins in common"
@@ -233,16 +248,17 @@ std::string MakeWarning(const ImportedComponent& component) {
 
 void NameComponents(std::vector<ImportedComponent>& components, const Module& top,
                     UniqueNames& names, Warnings& warnings) {
+    std::unordered_set<std::string_view> types;
     for (ImportedComponent& component : components) {
-        if (IsLegalName(component.oldName) && names.Claim(component.oldName)) {
-            component.name = component.oldName;
+        if (types.insert(component.oldName).second) {
+            component.name = names.ClaimModule(component.oldName);
         }
     }
     for (ImportedComponent& component : components) {
         if (component.name.empty()) {
             component.name = names.ClaimSimilar(component.oldName, 'c');
             warnings.Add(top.GetPath("cells", component.firstCell->name).AddKey("type"),
-                         MakeWarning(component));
+                         MakeWarning(component, names.GetRules()));
         }
     }
 }
@@ -262,7 +278,7 @@ ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
                                   const UnknownValues& unknown, UniqueNames& names,
                                   Warnings& warnings) {
     const std::vector<TypeUse> types = CountTypeUses(design, top, warnings);
-    ComponentFinder finder(design, top, types, unknown, warnings);
+    ComponentFinder finder(design, top, types, unknown, names.GetRules(), warnings);
     std::vector<std::uint32_t> componentOf;
     componentOf.reserve(top.cells.size());
     for (const Cell& cell : top.cells) {

@@ -70,18 +70,21 @@ void CheckParameters(const Module& top, const UnknownValues& unknown, Warnings& 
 
 } // namespace
 
-ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const UnknownValues& unknown,
+ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRules& rules,
                             Warnings& warnings) {
-    UniqueNames names;
+    const UnknownValues& unknown = rules.unknown;
+    UniqueNames names(rules.names);
+    const std::vector<std::string> portNames = ClaimPortNames(top, names);
     ImportedComponents components = FindComponents(design, top, unknown, names, warnings);
     OpenConstantOutputs(top, components, warnings);
-    const BitUses uses = BitUses::Count(top, components, unknown);
-    BitOwners owners = BitOwners::Choose(top, uses, warnings);
+    const BitUses uses = BitUses::Count(top, components, unknown, portNames);
+    BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
     WarnOfModule(top, warnings);
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
     NameDesign(netlist, names, warnings);
     NameCellsAndSignals(netlist, names);
+    ReportRenamedPorts(netlist, rules.names, rules.keepPorts, warnings);
     DecideConnections(netlist, uses, names);
     NameAttributes(netlist, names, warnings);
     return netlist;
