@@ -62,8 +62,11 @@ void CheckParameters(const Module& top, const UnknownValues& unknown, Warnings& 
     for (const Cell& cell : top.cells) {
         for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
             const NamedValue& value = top.values[cell.parameters.start + i];
-            CheckParameter(value.value, top.GetPlace(cell, "parameters", value.name), unknown,
-                           warnings);
+            const Place place = top.GetPlace(cell, "parameters", value.name);
+            CheckParameter(value.value, place, unknown, warnings);
+            if (MeansAny(value.value, unknown)) {
+                WarnOfAny(place, warnings);
+            }
         }
     }
 }
@@ -82,6 +85,7 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     WarnOfModule(top, warnings);
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
+    netlist.hasVhdl = rules.names.HasVhdl();
     NameDesign(netlist, names, warnings);
     NameCellsAndSignals(netlist, names);
     ReportRenamedPorts(netlist, rules.names, rules.keepPorts, warnings);

@@ -42,6 +42,8 @@ struct ImportedNetlist {
     std::vector<ConnectionKind> connections;
     /// Whether an input pin of some cell is open.
     bool hasOpenInputs = false;
+    /// Whether the netlist may be written in VHDL.
+    bool hasVhdl = true;
 };
 
 /// Determines all names and connections, so that all errors are found before anything is written.

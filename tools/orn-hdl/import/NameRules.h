@@ -23,6 +23,8 @@ public:
     /// The end of a message about a name for which `IsLegal` is false.
     const char* GetComplaint() const noexcept;
 
+    /// Whether names must be legal in VHDL.
+    bool HasVhdl() const noexcept { return languages_ != NameLanguages::Verilog; }
     /// Whether names that are not legal may be escaped. Only Verilog has such names: an escaped
     /// name is the same identifier as the name itself, but the library takes it for another name.
     bool MayEscape() const noexcept { return languages_ == NameLanguages::Verilog; }
