@@ -7,6 +7,7 @@
 #include "Tool.h"
 #include "check/Check.h"
 #include "diagnostics/Nearest.h"
+#include "stats/Stats.h"
 
 #include "Orn_Hdl/Language.h"
 #include "Port/String.h"
@@ -114,6 +115,7 @@ public:
         AddImport();
         AddCheck();
         AddDraw();
+        AddStats();
         AddCommands();
         app_.footer("\"orn-hdl help COMMAND\" prints the help of a command.");
     }
@@ -305,6 +307,21 @@ private:
         AddReport(command, draw_.report);
     }
 
+    void AddStats() {
+        CLI::App& command =
+            AddCommand("stats", "Count what the design of a command file is made of",
+                       [this] { return Tool::PrintStats(stats_); });
+        AddFile(command, "FILE", stats_.file, "The command file; - is standard input")->required();
+        command.add_option("--model", stats_.model, "The name of the design")->type_name("NAME");
+        command.add_option("--format", stats_.format, "Print the counts as text or JSON")
+            ->transform(CLI::CheckedTransformer(std::map<std::string, Tool::StatsFormat>{
+                {"text", Tool::StatsFormat::Text}, {"json", Tool::StatsFormat::Json}}))
+            ->type_name("text|json");
+        AddReport(command, stats_.report);
+        command.add_flag("--quiet", stats_.quiet, "Do not show progress");
+        command.footer("WRITE commands in the file do nothing.");
+    }
+
     void AddCommands() {
         CLI::App& command = AddCommand("commands", "Print the command language", [this] {
             return markdown_ ? Tool::PrintCommandsPage() : Tool::PrintCommands(words_);
@@ -324,6 +341,7 @@ private:
     Tool::ImportOptions import_;
     Tool::DrawOptions draw_;
     Tool::CheckOptions check_;
+    Tool::StatsOptions stats_;
     std::vector<std::string> words_;
     bool markdown_ = false;
 };
