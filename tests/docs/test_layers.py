@@ -29,6 +29,8 @@ LAYERS = layers()
 UPWARDS = {
     ("HdlModel/Model.cpp", "Orn_Hdl/Commands.h"),
     ("Options/HdlUtilities.cpp", "Orn_Hdl/Writers/NetlistHeader.h"),
+    ("Verilog/VerilogNetlister.cpp", "Orn_Hdl/LegalNetlist.h"),
+    ("Vhdl/VhdlNetlister.cpp", "Orn_Hdl/LegalNetlist.h"),
 }
 
 
@@ -60,7 +62,7 @@ class Layers(unittest.TestCase):
         self.assertEqual(upwards, UPWARDS)
 
     def test_every_place_of_the_table_exists(self) -> None:
-        self.assertEqual(len(LAYERS), 11)
+        self.assertEqual(len(LAYERS), 12)
         for name, places in LAYERS:
             for place in places:
                 self.assertTrue(any((PROJECT / root / place).exists()
