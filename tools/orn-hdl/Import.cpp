@@ -9,6 +9,7 @@
 #include "import/TopModule.h"
 
 #include "Orn_Hdl/Engine.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 #include "Progress.h"
@@ -66,7 +67,16 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     ModelSink sink(model);
     EmitNetlist(netlist, sink);
     Progress progress(false, options.file);
-    return WriteOutputs(model, options.outputs, progress);
+    if (!options.legal) {
+        return WriteOutputs(model, options.outputs, progress);
+    }
+    Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
+    for (const Orn_Hdl::Check::Finding& error : legal.GetErrors()) {
+        PrintError(options.file + ": error: " + error.message + " [" +
+                   std::string(error.rule->name) + "]");
+    }
+    return legal.GetErrors().empty() ? WriteOutputs(model, options.outputs, progress, &legal)
+                                     : Status::Failed;
 }
 
 /// Writes all files. The command file and the name map are replaced last, and only if every file

@@ -22,6 +22,8 @@ struct ImportOptions {
     bool attributes = false;
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
+    /// Write legal netlists, or nothing.
+    bool legal = false;
 };
 
 /// Imports a file. If no output is given, the file is only checked.

@@ -1,8 +1,10 @@
 #include "Run.h"
 
+#include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Progress.h"
+#include "check/Checker.h"
 #include "check/WriteGate.h"
 
 #include <cstdint>
@@ -40,7 +42,9 @@ public:
         try {
             model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
-            Report(WithoutLineEnd(exception.getLocalized().GetView()));
+            if (!TellWhyNotLegal(words)) {
+                Report(WithoutLineEnd(exception.getLocalized().GetView()));
+            }
             status_ = Worse(status_, Status::Failed);
             return false;
         }
@@ -56,6 +60,17 @@ private:
             text.remove_suffix(1);
         }
         return text;
+    }
+
+    /// Tells what keeps a write command from writing a legal netlist, with the lines that brought
+    /// it in. \return whether there is anything.
+    bool TellWhyNotLegal(const Orn_Hdl::StringArray& words) {
+        if (!model_.GetOptions()->legal || !Checking::Checker::IsWrite(words)) {
+            return false;
+        }
+        progress_.Erase();
+        const Orn_Hdl::LegalNetlist legal(*model_.GetNetlist(), *model_.GetOptions());
+        return Checking::WriteGate(model_, file_).Tell(legal.GetErrors(), lines_);
     }
 
     void Report(std::string_view text) {
@@ -125,6 +140,31 @@ Replayed Replay(Orn_Hdl::Model& model, const std::string& file, bool keepGoing, 
     return {replayer.GetStatus(), true, replayer.GetLineCount()};
 }
 
+namespace {
+
+/// Writes the outputs and the table of names, or tells why there is no legal netlist.
+Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOptions& options,
+                    std::uint64_t lines, Progress& progress) {
+    if (outputs.IsEmpty() && options.nameMap.empty()) {
+        return Status::Success;
+    }
+    Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
+    if (Checking::WriteGate(model, options.file).Tell(legal.GetErrors(), lines)) {
+        return Status::Failed;
+    }
+    OutputFile nameMap(options.nameMap);
+    if (Port::Stream* out = nameMap.GetStream()) {
+        WriteLegalNames(*model.GetNetlist(), legal, *out);
+    }
+    Status status = nameMap.Flush();
+    if (status == Status::Success) {
+        status = WriteOutputs(model, outputs, progress, &legal);
+    }
+    return status == Status::Success ? nameMap.Commit() : status;
+}
+
+} // namespace
+
 Status Run(const RunOptions& options) {
     Progress progress(options.quiet, options.file);
     // The design is not destroyed before the process ends: freeing it object by object would take a
@@ -135,6 +175,8 @@ Status Run(const RunOptions& options) {
     const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
     Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
+    model.GetOptions()->legal = options.legal;
+    model.GetOptions()->escapeNames = options.names == "escape";
     Checking::WriteGate gate(model, options.file);
     const Replayed replayed = Replay(model, options.file, options.keepGoing, progress,
                                      options.writeRules, options.check ? &gate : nullptr);
@@ -149,7 +191,9 @@ Status Run(const RunOptions& options) {
             status = Worse(status, Status::Failed);
         }
     }
-    return Worse(status, WriteOutputs(model, outputs, progress));
+    return Worse(status, options.legal
+                             ? WriteLegally(model, outputs, options, replayed.lines, progress)
+                             : WriteOutputs(model, outputs, progress));
 }
 
 } // namespace Tool

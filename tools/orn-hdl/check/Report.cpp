@@ -80,11 +80,11 @@ std::string FormatText(const std::vector<Located>& findings) {
     std::string text;
     std::size_t errors = 0;
     for (const Located& located : findings) {
-        const bool isError = located.finding.GetSeverity() == Check::Severity::Error;
+        const bool isError = located.IsError();
         errors += isError ? 1 : 0;
         text.append(located.file).append(":");
         text.append(std::to_string(located.line)).append(": ");
-        text.append(SeverityName(located.finding)).append(": ");
+        text.append(isError ? "error" : "warning").append(": ");
         text.append(located.finding.message);
         text.append(" [").append(located.finding.rule->name).append("]\n");
         for (const std::string& note : GetNotes(located)) {

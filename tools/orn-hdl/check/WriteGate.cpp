@@ -22,18 +22,27 @@ bool WriteGate::Allows(const Orn_Hdl::StringArray& words, std::uint64_t line) {
 bool WriteGate::Allows(Orn_Hdl::Language language, std::uint64_t line) {
     const Check::Targets targets =
         language == Orn_Hdl::Language::Verilog ? Check::Targets::Verilog() : Check::Targets::Vhdl();
+    std::vector<Check::Finding> errors =
+        Check::Run(*model_.GetNetlist(), *model_.GetOptions(), targets);
+    errors.erase(std::remove_if(errors.begin(), errors.end(),
+                                [](const Check::Finding& finding) {
+                                    return finding.GetSeverity() != Check::Severity::Error;
+                                }),
+                 errors.end());
+    return !Tell(errors, line);
+}
+
+bool WriteGate::Tell(const std::vector<Check::Finding>& errors, std::uint64_t line) {
     std::vector<Located> findings;
-    for (Check::Finding& finding :
-         Check::Run(*model_.GetNetlist(), *model_.GetOptions(), targets)) {
-        if (finding.GetSeverity() == Check::Severity::Error) {
-            Located& located = findings.emplace_back();
-            located.finding = std::move(finding);
-            located.file = file_;
-            located.checkedAt = line;
-        }
+    for (const Check::Finding& finding : errors) {
+        Located& located = findings.emplace_back();
+        located.finding = finding;
+        located.file = file_;
+        located.checkedAt = line;
+        located.isObstacle = true;
     }
     if (findings.empty()) {
-        return true;
+        return false;
     }
     // Standard input is read once; its findings stand at the line that writes.
     if (file_ != "-") {
@@ -45,7 +54,7 @@ bool WriteGate::Allows(Orn_Hdl::Language language, std::uint64_t line) {
     std::string text = Format(findings, CheckFormat::Text);
     text.pop_back();
     PrintError(text);
-    return false;
+    return true;
 }
 
 } // namespace Tool::Checking
