@@ -9,6 +9,7 @@
 #include "import/TopModule.h"
 
 #include "Orn_Hdl/Engine.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 #include "Progress.h"
@@ -74,7 +75,18 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
-Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options) {
+void Report(const ImportOptions& options, Severity severity, std::string message,
+            Reporter& reporter, std::string_view rule = {}) {
+    Diagnostic diagnostic;
+    diagnostic.severity = severity;
+    diagnostic.rule = rule;
+    diagnostic.place.file = options.file;
+    diagnostic.message = std::move(message);
+    reporter.Report(std::move(diagnostic));
+}
+
+Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options,
+                     Reporter& reporter) {
     if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
@@ -84,12 +96,20 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     ModelSink sink(model);
     EmitNetlist(netlist, sink);
     Progress progress(false, options.file);
-    return WriteOutputs(model, options.outputs, progress);
+    if (!options.legal) {
+        return WriteOutputs(model, options.outputs, progress);
+    }
+    Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
+    for (const Orn_Hdl::Check::Finding& error : legal.GetErrors()) {
+        Report(options, Severity::Error, error.message, reporter, error.rule->name);
+    }
+    return legal.GetErrors().empty() ? WriteOutputs(model, options.outputs, progress, &legal)
+                                     : Status::Failed;
 }
 
 /// Writes all files. The command file and the name map are replaced last, and only if every file
 /// was written.
-Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
+Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options, Reporter& reporter) {
     OutputFile commands(options.commandFile);
     if (Port::Stream* out = commands.GetStream()) {
         CommandSink sink(*out);
@@ -101,18 +121,9 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
     }
     Status status = Worse(commands.Flush(), nameMap.Flush());
     if (status == Status::Success) {
-        status = WriteNetlists(netlist, options);
+        status = WriteNetlists(netlist, options, reporter);
     }
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
-}
-
-void Report(const ImportOptions& options, Severity severity, std::string message,
-            Reporter& reporter) {
-    Diagnostic diagnostic;
-    diagnostic.severity = severity;
-    diagnostic.place.file = options.file;
-    diagnostic.message = std::move(message);
-    reporter.Report(std::move(diagnostic));
 }
 
 /// Imports the text of a file.
@@ -125,7 +136,7 @@ Status ImportText(std::string text, const ImportOptions& options, Reporter& repo
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
         const ImportRules rules{GetUnknownValues(options), names, options.keepPorts};
         const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
-        const Status written = WriteAll(netlist, options);
+        const Status written = WriteAll(netlist, options, reporter);
         for (std::string& warning : warnings.GetLines()) {
             Report(options, Severity::Warning, std::move(warning), reporter);
         }
