@@ -18,7 +18,7 @@ using Orn_Hdl::Polarity;
 /// Makes an object of the design and gives it to the netlist, which owns it from then on.
 template <class T, class... Arguments>
 T* AddNew(Orn_Hdl::Netlist& netlist, const std::string& name, Arguments... arguments) {
-    auto made = std::make_unique<T>(name.c_str(), arguments...);
+    auto made = std::make_unique<T>(name, arguments...);
     T* const object = made.get();
     netlist.Add(made.release());
     return object;
@@ -27,7 +27,7 @@ T* AddNew(Orn_Hdl::Netlist& netlist, const std::string& name, Arguments... argum
 template <class T>
 T* AddPort(Orn_Hdl::Netlist& netlist, const std::string& name, Polarity::Value direction) {
     T* const port = AddNew<T>(netlist, name);
-    port->SetPortPolarity(Polarity(direction));
+    port->SetPortPolarity(direction);
     return port;
 }
 
@@ -42,15 +42,15 @@ Orn_Hdl::Signal* AddBit(Orn_Hdl::Netlist& netlist, Orn_Hdl::Bus* bus, int bit) {
 }
 
 std::unique_ptr<Orn_Hdl::Netlist> BuildAdder(int width) {
-    auto netlist = std::make_unique<Orn_Hdl::Netlist>(("adder" + std::to_string(width)).c_str());
+    auto netlist = std::make_unique<Orn_Hdl::Netlist>("adder" + std::to_string(width));
     netlist->AddComment("A ripple-carry adder.");
 
     auto* const fullAdder = AddNew<Orn_Hdl::Component>(*netlist, "FULL_ADDER");
     for (const char* input : {"A", "B", "CI"}) {
-        fullAdder->AddPin(input, Polarity(Polarity::Input), "");
+        fullAdder->AddPin(input, Polarity::Input, "");
     }
     for (const char* output : {"S", "CO"}) {
-        fullAdder->AddPin(output, Polarity(Polarity::Output), "");
+        fullAdder->AddPin(output, Polarity::Output, "");
     }
 
     const std::string range = std::to_string(width - 1) + ":0";

@@ -34,9 +34,9 @@ public:
         for (int i = 1; i <= count_; ++i) {
             const std::string name = instance_ + std::to_string(i);
             const std::string next = i == count_ ? to_ : name + "_O";
-            GetModel()->AddInstance(name.c_str(), component_.c_str());
-            GetModel()->ConnectSignalToPin(signal.c_str(), name.c_str(), "I");
-            GetModel()->ConnectSignalToPin(next.c_str(), name.c_str(), "O");
+            GetModel()->AddInstance(name, component_);
+            GetModel()->ConnectSignalToPin(signal, name, "I");
+            GetModel()->ConnectSignalToPin(next, name, "O");
             signal = next;
         }
     }

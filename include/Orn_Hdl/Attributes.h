@@ -86,6 +86,8 @@ public:
     /// Sets the generic option from "NONE", "SYN" or "NOSYN", letter case ignored.
     /// \return false, the option unchanged, for any other text.
     bool SetGeneric(const char* text) noexcept;
+    /// Sets the generic option.
+    void SetGeneric(GenericOption option) noexcept { SetOption(GenericFlags, option); }
     /// The generic option as a text.
     Port::StringBase<char> GetGeneric() const;
     /// The generic option.
@@ -96,6 +98,8 @@ public:
     /// ignored.
     /// \return false, the option unchanged, for any other text.
     bool SetSynAttr(const char* text) noexcept;
+    /// Sets the synthesis-attribute option.
+    void SetSynAttr(SynAttrOption option) noexcept { SetOption(SynAttrFlags, option); }
     /// The synthesis-attribute option as a text.
     Port::StringBase<char> GetSynAttr() const;
     /// The synthesis-attribute option.
@@ -326,6 +330,8 @@ public:
     std::unique_ptr<Attribute> DetachAttr(Attribute* attribute) noexcept;
     /// The attribute of that name, normalised and letter case ignored; null when there is none.
     virtual Attribute* GetAttr(const char* name) const;
+    /// The attribute of that name, given as any other kind of text; null when there is none.
+    Attribute* GetAttr(const Port::TextArgument& name) const { return GetAttr(name.Get()); }
 
     /// The attributes, in the order in which they were added, those included that are added or
     /// assigned while it walks. The holder must outlive it.

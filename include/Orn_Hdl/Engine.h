@@ -23,6 +23,7 @@
 #pragma once
 
 #include "Port/Export.h"
+#include "Port/TextArgument.h"
 
 #include <memory>
 
@@ -57,41 +58,43 @@ public:
     /// Makes a model, which does not become the current one.
     /// \param sourceFile the source file to record in the model.
     /// \return false, without a change, if a model of that name exists.
-    bool CreateAndAddModel(const char* name, const char* sourceFile);
+    bool CreateAndAddModel(const Port::TextArgument& name, const Port::TextArgument& sourceFile);
     /// Makes a model the current one. \return false if there is none of that name.
-    bool UseModel(const char* name);
+    bool UseModel(const Port::TextArgument& name);
     /// Deletes a model. If the model is executing a command, which may be the caller, the engine
     /// gives it up at once, and the model is destroyed when its outermost line or file is done.
     /// \return false if there is none of that name.
-    bool RemoveModel(const char* name);
+    bool RemoveModel(const Port::TextArgument& name);
     /// The model of that name, owned by the engine; null if there is none.
-    Model* GetModel(const char* name) const;
+    Model* GetModel(const Port::TextArgument& name) const;
 
     /// Runs one command line on the current model.
     /// \throws Exception if the line fails; "Missing Model.\n" if there is no current model.
-    void Execute(const char* text);
+    void Execute(const Port::TextArgument& text);
     /// Runs one command line on a named model.
     /// \throws Exception if the line fails; "Missing Model.\n" if there is no such model.
-    void Execute(const char* modelName, const char* text);
+    void Execute(const Port::TextArgument& modelName, const Port::TextArgument& text);
     /// Replays a command file on a named model, which is created if it does not exist.
     /// \return false if the file cannot be opened.
     /// \throws Exception if a line fails; earlier lines keep their effect.
-    bool ReadCommandFile(const char* modelName, const char* fileName);
+    bool ReadCommandFile(const Port::TextArgument& modelName, const Port::TextArgument& fileName);
     /// Clears the model's modified flag. No file is written.
     /// \return false if there is no model of that name.
-    bool WriteCommandFile(const char* modelName, const char* fileName);
+    bool WriteCommandFile(const Port::TextArgument& modelName, const Port::TextArgument& fileName);
 
     /// Whether a word is reserved in VHDL (IEEE 1076-1993, 13.9), in any letter case.
-    static bool IsVhdlKeyword(const char* word);
+    static bool IsVhdlKeyword(const Port::TextArgument& word);
     /// Whether a word is reserved in Verilog (IEEE 1364-1995, annex B; without "force"), in this
     /// letter case.
-    static bool IsVerilogKeyword(const char* word);
+    static bool IsVerilogKeyword(const Port::TextArgument& word);
     /// Writes a file that holds only the header banner. Null texts are read as "". A failure to
     /// write the file is not reported: to detect it, write a `NetlistHeader` to a stream of your
     /// own. \param vhdlComments true for VHDL comments, false for Verilog's.
-    static void WriteHalvexHeader(const char* application, const char* command,
-                                  const char* designName, const char* device, const char* purpose,
-                                  const char* reference, bool vhdlComments, const char* fileName);
+    static void
+    WriteHalvexHeader(const Port::TextArgument& application, const Port::TextArgument& command,
+                      const Port::TextArgument& designName, const Port::TextArgument& device,
+                      const Port::TextArgument& purpose, const Port::TextArgument& reference,
+                      bool vhdlComments, const Port::TextArgument& fileName);
 
 private:
     struct Implementation;

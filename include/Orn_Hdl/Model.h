@@ -13,6 +13,8 @@
 #include "Orn_Hdl/Options.h"
 #include "Port/Export.h"
 #include "Port/String.h"
+#include "Port/TextArgument.h"
+#include "Port/TextView.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -51,11 +53,11 @@ public:
 
 /// One design: its netlist, its output options and its done commands.
 ///
-/// Every operation takes plain texts, looks the named objects up, checks them, and throws
-/// `Orn_Hdl::Exception` with a fixed message when a check fails; nothing that was done before is
-/// undone. A null name reads as "" in every look-up. Operations that change the design set the
-/// modified flag, but for `SetName` and `SetSourceFileName`. Where an operation returns a `bool`
-/// and nothing else is said, that is always true: what fails throws.
+/// Every operation takes texts of any kind (`Port::TextArgument`), looks the named objects up,
+/// checks them, and throws `Orn_Hdl::Exception` with a fixed message when a check fails; nothing
+/// that was done before is undone. A null name reads as "" in every look-up. Operations that change
+/// the design set the modified flag, but for `SetName` and `SetSourceFileName`. Where an operation
+/// returns a `bool` and nothing else is said, that is always true: what fails throws.
 ///
 /// Signals need not be declared: the first use of a name in a connection or constant declares it,
 /// and its form tells what it is: N a scalar signal, D(7:0) a bus or a slice of the bus D, D(2) a
@@ -94,15 +96,15 @@ public:
     /// The netlist's name, which is the model's.
     Port::StringBase<char> GetName() const;
     /// Renames the netlist; null gives "HDL_NETLIST".
-    void SetName(const char* name);
+    void SetName(const Port::TextArgument& name);
     /// The file from which the design comes; empty when it is not known.
     Port::StringBase<char> GetSourceFileName() const;
     /// Remembers from which file the design comes; null is read as "".
-    void SetSourceFileName(const char* name);
+    void SetSourceFileName(const Port::TextArgument& name);
 
     /// Splits a command line and executes it. An empty line, and null, do nothing.
     /// \return true whenever no exception is thrown.
-    bool Execute(const char* text);
+    bool Execute(Port::TextView text) { return ExecuteLine(text); }
     /// Splits a line of known length, which ends at its first NUL, and executes it.
     /// \return true whenever no exception is thrown.
     bool ExecuteLine(std::string_view line);
@@ -113,9 +115,9 @@ public:
     /// lines before it stay done.
     /// \return false when the file cannot be opened or read; otherwise true, since no line fails
     ///         without an exception.
-    bool Read(const char* fileName);
+    bool Read(const Port::TextArgument& fileName);
     /// Clears the modified flag and returns true; done commands are kept in memory only.
-    bool Write(const char* fileName);
+    bool Write(const Port::TextArgument& fileName);
 
     /// Sets who is asked before a write command opens its file. What it refuses fails the command,
     /// which then changes nothing.
@@ -126,7 +128,7 @@ public:
     /// Remembers what became of the last netlist that a write command wrote.
     /// \param error the system's error number; 0 when every byte was written.
     /// \param leftover how many bytes stand at the end of a file although appending has failed.
-    void RecordWrite(const char* fileName, int error, std::uint64_t leftover = 0);
+    void RecordWrite(const Port::TextArgument& fileName, int error, std::uint64_t leftover = 0);
     /// The error number of the last write; 0 when it succeeded, and before the first.
     int GetWriteError() const noexcept;
     /// How many bytes of the last write stand at the end of the file although appending has failed.
@@ -135,52 +137,81 @@ public:
     Port::StringBase<char> GetWrittenFileName() const;
 
     /// The component of that name, owned by the netlist; null when there is none.
-    Component* GetComponent(const char* name) const;
+    Component* GetComponent(const Port::TextArgument& name) const;
     /// The instance of that name, owned by the netlist; null when there is none.
-    Instance* GetInstance(const char* name) const;
+    Instance* GetInstance(const Port::TextArgument& name) const;
     /// The signal of that name, owned by the netlist; null when there is none.
-    Signal* GetSignal(const char* name) const;
+    Signal* GetSignal(const Port::TextArgument& name) const;
     /// The pin of that name, owned by the component; null when there is none, or no component.
-    Pin* GetPin(const char* name, const Component* component) const;
+    Pin* GetPin(const Port::TextArgument& name, const Component* component) const;
     /// The pin of that name, owned by the instance; null when there is none, or no instance.
-    Pin* GetPin(const char* name, const Instance* instance) const;
+    Pin* GetPin(const Port::TextArgument& name, const Instance* instance) const;
     /// Null, since there is no owner to look in.
-    Pin* GetPin(const char* /*name*/, std::nullptr_t) const noexcept { return nullptr; }
+    Pin* GetPin(const Port::TextArgument& /*name*/, std::nullptr_t) const noexcept {
+        return nullptr;
+    }
     /// The attribute of that name, owned by the holder; null when there is none, or no holder.
-    Attribute* GetAttr(const char* name, const AttributeHolder* holder) const;
+    Attribute* GetAttr(const Port::TextArgument& name, const AttributeHolder* holder) const;
 
     /// Declares a component without pins. Components, instances and signals share one name space.
     /// \return true.
     /// \throws Exception "Identifier ... already defined.\n" when the name is taken.
-    bool AddComponent(const char* name);
+    bool AddComponent(const Port::TextArgument& name);
     /// Appends a pin to a component; a default value that is not empty is taken. Instances that are
     /// there already do not get it.
+    /// \param polarity not checked: a pin of an invalid one is written as an output in VHDL. The
+    ///        overload that takes a text refuses what is no direction.
     /// \return true.
     /// \throws Exception "Component ... not found.\n", "Component ... already has pin ...\n".
-    bool AddPin(const char* name, const Polarity& polarity, const char* component,
-                const char* defaultValue);
+    bool AddPin(const Port::TextArgument& name, const Polarity& polarity,
+                const Port::TextArgument& component, const Port::TextArgument& defaultValue);
+    /// Appends a pin to a component, as the overload with a `Polarity` does.
+    /// \param direction as `Polarity::Parse` reads it: "inout" is bidirectional.
+    /// \return true.
+    /// \throws Exception "Invalid direction ...\n", "Component ... not found.\n", "Component ...
+    ///         already has pin ...\n".
+    bool AddPin(const Port::TextArgument& name, const Port::TextArgument& direction,
+                const Port::TextArgument& component,
+                const Port::TextArgument& defaultValue = nullptr);
     /// Places a component: the instance gets its own copies of the component's pins, all open.
     /// \return true.
     /// \throws Exception "Identifier ... already defined.\n", "Component ... not found.\n".
-    bool AddInstance(const char* name, const char* component);
+    bool AddInstance(const Port::TextArgument& name, const Port::TextArgument& component);
     /// Declares a signal, or a bus when the name has a range. It is no port until it is given a
     /// polarity.
     /// \return true.
     /// \throws Exception "Identifier ... already defined.\n", or, for a bus whose base name another
     ///         bus has, "Signal ... already declared.\n".
-    bool AddSignal(const char* name);
+    bool AddSignal(const Port::TextArgument& name);
+    /// Declares a port: a signal, or a bus when the name has a range, with a direction.
+    /// \return true.
+    /// \throws Exception "Invalid direction ...\n" if the polarity is not valid; what `AddSignal`
+    ///         throws.
+    bool AddPort(const Port::TextArgument& name, const Polarity& polarity);
+    /// Declares a port: a signal, or a bus when the name has a range, with a direction.
+    /// \param direction as `Polarity::Parse` reads it: "inout" is bidirectional.
+    /// \return true.
+    /// \throws Exception "Invalid direction ...\n"; what `AddSignal` throws.
+    bool AddPort(const Port::TextArgument& name, const Port::TextArgument& direction);
+    /// The net of one bit of a bus, owned by the netlist, made on its first use. Unlike a name such
+    /// as "D(3)" in a connection, the index has to be in the range of the bus.
+    /// \param bus the bus, with or without its range.
+    /// \return never null.
+    /// \throws Exception "Signal ... not found.\n" if there is no such bus, if the index is out of
+    ///         its range, and if another kind of signal has the name of the bit.
+    BusIndex* Bit(const Port::TextArgument& bus, int index);
     /// Renames a component, which is found by the new name from then on. The new name
     /// may differ from the old one in letter case alone.
     /// \return true.
     /// \throws Exception "Invalid Name.\n" for a null new name, "Component ... not found.\n",
     ///         "Identifier ... already defined.\n".
-    bool RenameComponent(const char* name, const char* newName);
+    bool RenameComponent(const Port::TextArgument& name, const Port::TextArgument& newName);
     /// Renames an instance, which is found by the new name from then on. The new name
     /// may differ from the old one in letter case alone.
     /// \return true.
     /// \throws Exception "Invalid Name.\n" for a null new name, "... not found.\n", "Identifier ...
     ///         already defined.\n".
-    bool RenameInstance(const char* name, const char* newName);
+    bool RenameInstance(const Port::TextArgument& name, const Port::TextArgument& newName);
     /// Renames a scalar signal or a bus, which is found by the new name from then on. The slices
     /// and bits of a bus are renamed with it, and so is every compound whose name names one of
     /// these. A bus keeps its range, and the new name has to have it too. The new name
@@ -191,241 +222,307 @@ public:
     ///         range, and a slice, bit or compound; "Signal ... not found.\n"; "Identifier ...
     ///         already defined.\n" for any of the new names; for a bus whose new base name another
     ///         bus has, "Signal ... already declared.\n".
-    bool RenameSignal(const char* name, const char* newName);
+    bool RenameSignal(const Port::TextArgument& name, const Port::TextArgument& newName);
     /// Connects a pin to a signal, which is declared on its first use.
     /// \return true.
     /// \throws Exception "Signal ... not found.\n" for an instance that is not there, and for a bit
     ///         of a bus that is not there; "Pin ... not found.\n".
-    bool ConnectSignalToPin(const char* signal, const char* instance, const char* pin);
+    bool ConnectSignalToPin(const Port::TextArgument& signal, const Port::TextArgument& instance,
+                            const Port::TextArgument& pin);
     /// Makes the second signal an alias of the first; both are declared on their first use.
     /// \return true.
     /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
-    bool ConnectSignals(const char* first, const char* second);
+    bool ConnectSignals(const Port::TextArgument& first, const Port::TextArgument& second);
     /// Ties a signal to a constant; the signal is declared on its first use.
     /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
     /// \return true.
     /// \throws Exception "Signal ... not found.\n" for a bit of a bus that is not there.
-    bool AssignConstantToSignal(const char* signal, const char* value);
+    bool AssignConstantToSignal(const Port::TextArgument& signal, const Port::TextArgument& value);
     /// Connects a pin to a signal of its own that carries the constant.
     /// \param value digits, or LENGTH:BASE:DIGITS as `BitVectorValue` reads it; not checked.
     /// \return true.
     /// \throws Exception "Signal ... not found.\n" for an instance that is not there, "Pin ... not
     ///         found.\n".
-    bool AssignConstantToPin(const char* instance, const char* pin, const char* value);
+    bool AssignConstantToPin(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                             const Port::TextArgument& value);
 
     /// Adds an attribute to a holder, which owns it, or gives one that is present another value,
     /// its type kept.
     /// \param type one of the seven type names; null means "String".
     /// \return false for a null holder, else true.
     /// \throws Exception "Invalid attribute type.\n".
-    bool AddAttr(AttributeHolder* holder, const char* name, const char* value, const char* type);
+    bool AddAttr(AttributeHolder* holder, const Port::TextArgument& name,
+                 const Port::TextArgument& value, const Port::TextArgument& type);
+    /// Adds an attribute to a holder, or gives one that is present another value, and sets both of
+    /// its options.
+    /// \param type one of the seven type names; null means "String". It does not count for an
+    ///        attribute that is present.
+    /// \return false for a null holder, else true.
+    /// \throws Exception "Invalid attribute type.\n".
+    bool AddAttr(AttributeHolder* holder, const Port::TextArgument& name,
+                 const Port::TextArgument& value, const Port::TextArgument& type,
+                 Attribute::GenericOption generic,
+                 Attribute::SynAttrOption synAttr = Attribute::SynAttrNone);
+    /// Adds an attribute to a holder, or gives one that is present another value, and sets its
+    /// synthesis option; its generic option becomes `GenericNone`.
+    /// \param type one of the seven type names; null means "String". It does not count for an
+    ///        attribute that is present.
+    /// \return false for a null holder, else true.
+    /// \throws Exception "Invalid attribute type.\n".
+    bool AddAttr(AttributeHolder* holder, const Port::TextArgument& name,
+                 const Port::TextArgument& value, const Port::TextArgument& type,
+                 Attribute::SynAttrOption synAttr) {
+        return AddAttr(holder, name, value, type, Attribute::GenericNone, synAttr);
+    }
     /// Adds an attribute to the module, as `AddAttr` does.
     /// \return true.
     /// \throws Exception "Invalid Name.\n" for a null name, "Invalid attribute type.\n".
-    bool AddModuleAttr(const char* name, const char* value, const char* type);
+    bool AddModuleAttr(const Port::TextArgument& name, const Port::TextArgument& value,
+                       const Port::TextArgument& type);
     /// Adds an attribute to a component, as `AddAttr` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
     ///         type.\n".
-    bool AddComponentAttr(const char* component, const char* name, const char* value,
-                          const char* type);
+    bool AddComponentAttr(const Port::TextArgument& component, const Port::TextArgument& name,
+                          const Port::TextArgument& value, const Port::TextArgument& type);
     /// Adds an attribute to an instance, as `AddAttr` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
     ///         type.\n".
-    bool AddInstanceAttr(const char* instance, const char* name, const char* value,
-                         const char* type);
+    bool AddInstanceAttr(const Port::TextArgument& instance, const Port::TextArgument& name,
+                         const Port::TextArgument& value, const Port::TextArgument& type);
     /// Adds an attribute to a signal, as `AddAttr` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Invalid Name.\n" for a null name, "Invalid attribute
     ///         type.\n".
-    bool AddSignalAttr(const char* signal, const char* name, const char* value, const char* type);
+    bool AddSignalAttr(const Port::TextArgument& signal, const Port::TextArgument& name,
+                       const Port::TextArgument& value, const Port::TextArgument& type);
     /// Adds an attribute to a pin of a component, as `AddAttr` does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Invalid Name.\n" for a null name, "Invalid
     ///         attribute type.\n".
-    bool AddComponentPinAttr(const char* component, const char* pin, const char* name,
-                             const char* value, const char* type);
+    bool AddComponentPinAttr(const Port::TextArgument& component, const Port::TextArgument& pin,
+                             const Port::TextArgument& name, const Port::TextArgument& value,
+                             const Port::TextArgument& type);
     /// Adds an attribute to a pin of an instance, as `AddAttr` does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Invalid Name.\n" for a null name, "Invalid
     ///         attribute type.\n".
-    bool AddInstancePinAttr(const char* instance, const char* pin, const char* name,
-                            const char* value, const char* type);
+    bool AddInstancePinAttr(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                            const Port::TextArgument& name, const Port::TextArgument& value,
+                            const Port::TextArgument& type);
 
     /// Sets the value of a holder's attribute; null is read as "".
     /// \return false, nothing done, for a null holder, else true.
     /// \throws Exception "Attribute ... not found.\n".
-    bool SetAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    bool SetAttrValue(AttributeHolder* holder, const Port::TextArgument& attribute,
+                      const Port::TextArgument& value);
     /// Sets the generic option of a holder's attribute.
     /// \param value "NONE", "SYN" or "NOSYN", letter case ignored.
     /// \return false, nothing done, for a null holder, else true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
-    bool SetGenericAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    bool SetGenericAttrValue(AttributeHolder* holder, const Port::TextArgument& attribute,
+                             const Port::TextArgument& value);
     /// Sets the synthesis option of a holder's attribute.
     /// \param value "NONE", "ASSIGN" or "ASSIGNNODEC", letter case ignored.
     /// \return false, nothing done, for a null holder, else true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
-    bool SetSynAttrValue(AttributeHolder* holder, const char* attribute, const char* value);
+    bool SetSynAttrValue(AttributeHolder* holder, const Port::TextArgument& attribute,
+                         const Port::TextArgument& value);
     /// Names the type of a holder's attribute, which has to be an `AttributeUser`.
     /// \return false, nothing done, for a null holder, else true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid attribute type.\n".
-    bool SetUserType(AttributeHolder* holder, const char* attribute, const char* type);
+    bool SetUserType(AttributeHolder* holder, const Port::TextArgument& attribute,
+                     const Port::TextArgument& type);
 
     /// Sets the value of an attribute of the module, as `SetAttrValue` does.
     /// \return true.
     /// \throws Exception "Attribute ... not found.\n".
-    bool SetModuleAttrValue(const char* attribute, const char* value);
+    bool SetModuleAttrValue(const Port::TextArgument& attribute, const Port::TextArgument& value);
     /// Sets the value of an attribute of a component, as `SetAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
-    bool SetComponentAttrValue(const char* component, const char* attribute, const char* value);
+    bool SetComponentAttrValue(const Port::TextArgument& component,
+                               const Port::TextArgument& attribute,
+                               const Port::TextArgument& value);
     /// Sets the value of an attribute of an instance, or of its component, as `SetAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
-    bool SetInstanceAttrValue(const char* instance, const char* attribute, const char* value);
+    bool SetInstanceAttrValue(const Port::TextArgument& instance,
+                              const Port::TextArgument& attribute, const Port::TextArgument& value);
     /// Sets the value of an attribute of a signal, as `SetAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n".
-    bool SetSignalAttrValue(const char* signal, const char* attribute, const char* value);
+    bool SetSignalAttrValue(const Port::TextArgument& signal, const Port::TextArgument& attribute,
+                            const Port::TextArgument& value);
     /// Sets the value of an attribute of a pin of a component, as `SetAttrValue` does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n".
-    bool SetComponentPinAttrValue(const char* component, const char* pin, const char* attribute,
-                                  const char* value);
+    bool SetComponentPinAttrValue(const Port::TextArgument& component,
+                                  const Port::TextArgument& pin,
+                                  const Port::TextArgument& attribute,
+                                  const Port::TextArgument& value);
     /// Sets the value of an attribute of a pin of an instance, as `SetAttrValue` does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n".
-    bool SetInstancePinAttrValue(const char* instance, const char* pin, const char* attribute,
-                                 const char* value);
+    bool SetInstancePinAttrValue(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                                 const Port::TextArgument& attribute,
+                                 const Port::TextArgument& value);
 
     /// Sets the generic option of an attribute of the module, as `SetGenericAttrValue` does.
     /// \return true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
-    bool SetModuleGenericAttrValue(const char* attribute, const char* value);
+    bool SetModuleGenericAttrValue(const Port::TextArgument& attribute,
+                                   const Port::TextArgument& value);
     /// Sets the generic option of an attribute of a component, as `SetGenericAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetComponentGenericAttrValue(const char* component, const char* attribute,
-                                      const char* value);
+    bool SetComponentGenericAttrValue(const Port::TextArgument& component,
+                                      const Port::TextArgument& attribute,
+                                      const Port::TextArgument& value);
     /// Sets the generic option of an attribute of an instance, or of its component, as
     /// `SetGenericAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetInstanceGenericAttrValue(const char* instance, const char* attribute,
-                                     const char* value);
+    bool SetInstanceGenericAttrValue(const Port::TextArgument& instance,
+                                     const Port::TextArgument& attribute,
+                                     const Port::TextArgument& value);
     /// Sets the generic option of an attribute of a signal, as `SetGenericAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetSignalGenericAttrValue(const char* signal, const char* attribute, const char* value);
+    bool SetSignalGenericAttrValue(const Port::TextArgument& signal,
+                                   const Port::TextArgument& attribute,
+                                   const Port::TextArgument& value);
     /// Sets the generic option of an attribute of a pin of a component, as `SetGenericAttrValue`
     /// does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetComponentPinGenericAttrValue(const char* component, const char* pin,
-                                         const char* attribute, const char* value);
+    bool SetComponentPinGenericAttrValue(const Port::TextArgument& component,
+                                         const Port::TextArgument& pin,
+                                         const Port::TextArgument& attribute,
+                                         const Port::TextArgument& value);
     /// Sets the generic option of an attribute of a pin of an instance, as `SetGenericAttrValue`
     /// does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetInstancePinGenericAttrValue(const char* instance, const char* pin,
-                                        const char* attribute, const char* value);
+    bool SetInstancePinGenericAttrValue(const Port::TextArgument& instance,
+                                        const Port::TextArgument& pin,
+                                        const Port::TextArgument& attribute,
+                                        const Port::TextArgument& value);
 
     /// Sets the synthesis option of an attribute of the module, as `SetSynAttrValue` does.
     /// \return true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid generic value.\n".
-    bool SetModuleSynAttrValue(const char* attribute, const char* value);
+    bool SetModuleSynAttrValue(const Port::TextArgument& attribute,
+                               const Port::TextArgument& value);
     /// Sets the synthesis option of an attribute of a component, as `SetSynAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetComponentSynAttrValue(const char* component, const char* attribute, const char* value);
+    bool SetComponentSynAttrValue(const Port::TextArgument& component,
+                                  const Port::TextArgument& attribute,
+                                  const Port::TextArgument& value);
     /// Sets the synthesis option of an attribute of an instance, or of its component, as
     /// `SetSynAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetInstanceSynAttrValue(const char* instance, const char* attribute, const char* value);
+    bool SetInstanceSynAttrValue(const Port::TextArgument& instance,
+                                 const Port::TextArgument& attribute,
+                                 const Port::TextArgument& value);
     /// Sets the synthesis option of an attribute of a signal, as `SetSynAttrValue` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetSignalSynAttrValue(const char* signal, const char* attribute, const char* value);
+    bool SetSignalSynAttrValue(const Port::TextArgument& signal,
+                               const Port::TextArgument& attribute,
+                               const Port::TextArgument& value);
     /// Sets the synthesis option of an attribute of a pin of a component, as `SetSynAttrValue`
     /// does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetComponentPinSynAttrValue(const char* component, const char* pin, const char* attribute,
-                                     const char* value);
+    bool SetComponentPinSynAttrValue(const Port::TextArgument& component,
+                                     const Port::TextArgument& pin,
+                                     const Port::TextArgument& attribute,
+                                     const Port::TextArgument& value);
     /// Sets the synthesis option of an attribute of a pin of an instance, as `SetSynAttrValue`
     /// does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid generic
     ///         value.\n".
-    bool SetInstancePinSynAttrValue(const char* instance, const char* pin, const char* attribute,
-                                    const char* value);
+    bool SetInstancePinSynAttrValue(const Port::TextArgument& instance,
+                                    const Port::TextArgument& pin,
+                                    const Port::TextArgument& attribute,
+                                    const Port::TextArgument& value);
 
     /// Names the type of an attribute of the module, as `SetUserType` does.
     /// \return true.
     /// \throws Exception "Attribute ... not found.\n", "Invalid attribute type.\n".
-    bool SetModuleUserType(const char* attribute, const char* type);
+    bool SetModuleUserType(const Port::TextArgument& attribute, const Port::TextArgument& type);
     /// Names the type of an attribute of a component, as `SetUserType` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
-    bool SetComponentUserType(const char* component, const char* attribute, const char* type);
+    bool SetComponentUserType(const Port::TextArgument& component,
+                              const Port::TextArgument& attribute, const Port::TextArgument& type);
     /// Names the type of an attribute of an instance, or of its component, as `SetUserType` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
-    bool SetInstanceUserType(const char* instance, const char* attribute, const char* type);
+    bool SetInstanceUserType(const Port::TextArgument& instance,
+                             const Port::TextArgument& attribute, const Port::TextArgument& type);
     /// Names the type of an attribute of a signal, as `SetUserType` does.
     /// \return true.
     /// \throws Exception "... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
-    bool SetSignalUserType(const char* signal, const char* attribute, const char* type);
+    bool SetSignalUserType(const Port::TextArgument& signal, const Port::TextArgument& attribute,
+                           const Port::TextArgument& type);
     /// Names the type of an attribute of a pin of a component, as `SetUserType` does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
-    bool SetComponentPinUserType(const char* component, const char* pin, const char* attribute,
-                                 const char* type);
+    bool SetComponentPinUserType(const Port::TextArgument& component, const Port::TextArgument& pin,
+                                 const Port::TextArgument& attribute,
+                                 const Port::TextArgument& type);
     /// Names the type of an attribute of a pin of an instance, as `SetUserType` does.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n", "Attribute ... not found.\n", "Invalid attribute
     ///         type.\n".
-    bool SetInstancePinUserType(const char* instance, const char* pin, const char* attribute,
-                                const char* type);
+    bool SetInstancePinUserType(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                                const Port::TextArgument& attribute,
+                                const Port::TextArgument& type);
 
     /// Adds a line to the module's comment; null adds nothing.
     /// \return true.
-    bool AddNotes(const char* text);
+    bool AddNotes(const Port::TextArgument& text);
     /// Adds a line to the comment of a component; null is read as "".
     /// \return true.
     /// \throws Exception "... not found.\n".
-    bool AddComponentComment(const char* component, const char* text);
+    bool AddComponentComment(const Port::TextArgument& component, const Port::TextArgument& text);
     /// Adds a line to the comment of an instance; null is read as "".
     /// \return true.
     /// \throws Exception "... not found.\n".
-    bool AddInstanceComment(const char* instance, const char* text);
+    bool AddInstanceComment(const Port::TextArgument& instance, const Port::TextArgument& text);
     /// Adds a line to the comment of a signal; null is read as "".
     /// \return true.
     /// \throws Exception "... not found.\n".
-    bool AddSignalComment(const char* signal, const char* text);
+    bool AddSignalComment(const Port::TextArgument& signal, const Port::TextArgument& text);
     /// Adds a line to the comment of a pin of a component; null adds nothing.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n".
-    bool AddComponentPinComment(const char* component, const char* pin, const char* text);
+    bool AddComponentPinComment(const Port::TextArgument& component, const Port::TextArgument& pin,
+                                const Port::TextArgument& text);
     /// Adds a line to the comment of a pin of an instance; null adds nothing.
     /// \return true.
     /// \throws Exception "Pin ... not found.\n".
-    bool AddInstancePinComment(const char* instance, const char* pin, const char* text);
+    bool AddInstancePinComment(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                               const Port::TextArgument& text);
 
 private:
     friend class Engine;

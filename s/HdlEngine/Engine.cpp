@@ -46,18 +46,19 @@ Engine& Engine::operator=(Engine&& other) {
 
 Engine::~Engine() = default;
 
-bool Engine::CreateAndAddModel(const char* name, const char* sourceFile) {
+bool Engine::CreateAndAddModel(const Port::TextArgument& name,
+                               const Port::TextArgument& sourceFile) {
     if (implementation_->Find(name) != nullptr) {
         return false;
     }
     std::unique_ptr<Model> model(implementation_->factory.CreateModel());
-    model->SetName(name == nullptr ? "" : name);
+    model->SetName(name.GetView());
     model->SetSourceFileName(sourceFile);
     implementation_->models.Add(std::move(model));
     return true;
 }
 
-bool Engine::UseModel(const char* name) {
+bool Engine::UseModel(const Port::TextArgument& name) {
     Model* const model = implementation_->Find(name);
     if (model != nullptr) {
         implementation_->current = model;
@@ -65,7 +66,7 @@ bool Engine::UseModel(const char* name) {
     return model != nullptr;
 }
 
-bool Engine::RemoveModel(const char* name) {
+bool Engine::RemoveModel(const Port::TextArgument& name) {
     std::unique_ptr<Model> model = implementation_->models.Remove(Port::ViewOf(name));
     if (model == nullptr) {
         return false;
@@ -77,44 +78,49 @@ bool Engine::RemoveModel(const char* name) {
     return true;
 }
 
-Model* Engine::GetModel(const char* name) const {
+Model* Engine::GetModel(const Port::TextArgument& name) const {
     return implementation_->Find(name);
 }
 
-void Engine::Execute(const char* text) {
+void Engine::Execute(const Port::TextArgument& text) {
     Implementation::Execute(implementation_->current, text);
 }
 
-void Engine::Execute(const char* modelName, const char* text) {
+void Engine::Execute(const Port::TextArgument& modelName, const Port::TextArgument& text) {
     Implementation::Execute(implementation_->Find(modelName), text);
 }
 
-bool Engine::ReadCommandFile(const char* modelName, const char* fileName) {
+bool Engine::ReadCommandFile(const Port::TextArgument& modelName,
+                             const Port::TextArgument& fileName) {
     if (implementation_->Find(modelName) == nullptr) {
-        CreateAndAddModel(modelName, fileName == nullptr ? "" : fileName);
+        CreateAndAddModel(modelName, fileName.GetView());
     }
     return implementation_->Find(modelName)->Read(fileName);
 }
 
-bool Engine::WriteCommandFile(const char* modelName, const char* fileName) {
+bool Engine::WriteCommandFile(const Port::TextArgument& modelName,
+                              const Port::TextArgument& fileName) {
     Model* const model = implementation_->Find(modelName);
     return model != nullptr && model->Write(fileName);
 }
 
-bool Engine::IsVhdlKeyword(const char* word) {
+bool Engine::IsVhdlKeyword(const Port::TextArgument& word) {
     return TraitsOf(Language::Vhdl).isReserved(Port::ViewOf(word));
 }
 
-bool Engine::IsVerilogKeyword(const char* word) {
+bool Engine::IsVerilogKeyword(const Port::TextArgument& word) {
     return TraitsOf(Language::Verilog).isReserved(Port::ViewOf(word));
 }
 
-void Engine::WriteHalvexHeader(const char* application, const char* command, const char* designName,
-                               const char* device, const char* purpose, const char* reference,
-                               bool vhdlComments, const char* fileName) {
-    TextFileOutStream out(fileName == nullptr ? "" : fileName, false);
-    NetlistHeader(application, fileName, command, designName, device, purpose, reference,
-                  vhdlComments, out)
+void Engine::WriteHalvexHeader(const Port::TextArgument& application,
+                               const Port::TextArgument& command,
+                               const Port::TextArgument& designName,
+                               const Port::TextArgument& device, const Port::TextArgument& purpose,
+                               const Port::TextArgument& reference, bool vhdlComments,
+                               const Port::TextArgument& fileName) {
+    TextFileOutStream out(fileName == nullptr ? "" : fileName.Get(), false);
+    NetlistHeader(application.Get(), fileName.Get(), command.Get(), designName.Get(), device.Get(),
+                  purpose.Get(), reference.Get(), vhdlComments, out)
         .Write();
 }
 

@@ -84,20 +84,16 @@ Port::StringBase<char> Model::GetName() const {
     return implementation_->netlist.GetName();
 }
 
-void Model::SetName(const char* name) {
-    implementation_->netlist.SetName(name == nullptr ? "HDL_NETLIST" : name);
+void Model::SetName(const Port::TextArgument& name) {
+    implementation_->netlist.SetName(name == nullptr ? "HDL_NETLIST" : name.Get());
 }
 
 Port::StringBase<char> Model::GetSourceFileName() const {
     return implementation_->netlist.GetSourceFileName();
 }
 
-void Model::SetSourceFileName(const char* name) {
+void Model::SetSourceFileName(const Port::TextArgument& name) {
     implementation_->netlist.SetSourceFileName(name);
-}
-
-bool Model::Execute(const char* text) {
-    return ExecuteLine(ViewOf(text));
 }
 
 bool Model::ExecuteLine(std::string_view line) {
@@ -119,7 +115,7 @@ bool Model::Execute(const StringArray& tokens) {
            implementation_->commands.CreateAndExecute(tokens, this, GetCommandFactory());
 }
 
-bool Model::Read(const char* fileName) {
+bool Model::Read(const Port::TextArgument& fileName) {
     const Use use(this);
     CommandReader reader(*this);
     if (!reader.Open(fileName)) {
@@ -137,7 +133,7 @@ bool Model::Read(const char* fileName) {
     return reader.GetError() == 0;
 }
 
-bool Model::Write(const char* /*fileName*/) {
+bool Model::Write(const Port::TextArgument& /*fileName*/) {
     SetModifiedFlag(false);
     return true;
 }
@@ -150,8 +146,8 @@ OutputGuard* Model::GetOutputGuard() const noexcept {
     return implementation_->outputGuard;
 }
 
-void Model::RecordWrite(const char* fileName, int error, std::uint64_t leftover) {
-    implementation_->writtenFileName = fileName;
+void Model::RecordWrite(const Port::TextArgument& fileName, int error, std::uint64_t leftover) {
+    implementation_->writtenFileName = fileName.Get();
     implementation_->writeError = error;
     implementation_->writeLeftover = leftover;
 }

@@ -138,8 +138,8 @@ bool Comment(Model& model, const ObjectPath& path, const char* text) {
 
 } // namespace
 
-bool Model::AddAttr(AttributeHolder* holder, const char* name, const char* value,
-                    const char* type) {
+bool Model::AddAttr(AttributeHolder* holder, const Port::TextArgument& name,
+                    const Port::TextArgument& value, const Port::TextArgument& type) {
     if (holder == nullptr) {
         return false;
     }
@@ -147,7 +147,7 @@ bool Model::AddAttr(AttributeHolder* holder, const char* name, const char* value
         present->SetValue(value);
     } else {
         const auto creator = AttributeFactory::GetCreators().Get(
-            type == nullptr ? Attribute::DEFAULT_ATTRTYPE : type);
+            type == nullptr ? Attribute::DEFAULT_ATTRTYPE : type.Get());
         if (creator == nullptr) {
             FailInModel(__LINE__, "Invalid attribute type.\n");
         }
@@ -157,181 +157,240 @@ bool Model::AddAttr(AttributeHolder* holder, const char* name, const char* value
     return true;
 }
 
-bool Model::AddModuleAttr(const char* name, const char* value, const char* type) {
+bool Model::AddAttr(AttributeHolder* holder, const Port::TextArgument& name,
+                    const Port::TextArgument& value, const Port::TextArgument& type,
+                    Attribute::GenericOption generic, Attribute::SynAttrOption synAttr) {
+    if (!AddAttr(holder, name, value, type)) {
+        return false;
+    }
+    Attribute& attribute = *holder->GetAttr(name);
+    attribute.SetGeneric(generic);
+    attribute.SetSynAttr(synAttr);
+    return true;
+}
+
+bool Model::AddModuleAttr(const Port::TextArgument& name, const Port::TextArgument& value,
+                          const Port::TextArgument& type) {
     return Add(*this, {Kind::Module}, name, value, type);
 }
 
-bool Model::AddComponentAttr(const char* component, const char* name, const char* value,
-                             const char* type) {
+bool Model::AddComponentAttr(const Port::TextArgument& component, const Port::TextArgument& name,
+                             const Port::TextArgument& value, const Port::TextArgument& type) {
     return Add(*this, {Kind::Component, component}, name, value, type);
 }
 
-bool Model::AddInstanceAttr(const char* instance, const char* name, const char* value,
-                            const char* type) {
+bool Model::AddInstanceAttr(const Port::TextArgument& instance, const Port::TextArgument& name,
+                            const Port::TextArgument& value, const Port::TextArgument& type) {
     return Add(*this, {Kind::Instance, instance}, name, value, type);
 }
 
-bool Model::AddSignalAttr(const char* signal, const char* name, const char* value,
-                          const char* type) {
+bool Model::AddSignalAttr(const Port::TextArgument& signal, const Port::TextArgument& name,
+                          const Port::TextArgument& value, const Port::TextArgument& type) {
     return Add(*this, {Kind::Signal, signal}, name, value, type);
 }
 
-bool Model::AddComponentPinAttr(const char* component, const char* pin, const char* name,
-                                const char* value, const char* type) {
+bool Model::AddComponentPinAttr(const Port::TextArgument& component, const Port::TextArgument& pin,
+                                const Port::TextArgument& name, const Port::TextArgument& value,
+                                const Port::TextArgument& type) {
     return Add(*this, {Kind::ComponentPin, component, pin}, name, value, type);
 }
 
-bool Model::AddInstancePinAttr(const char* instance, const char* pin, const char* name,
-                               const char* value, const char* type) {
+bool Model::AddInstancePinAttr(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                               const Port::TextArgument& name, const Port::TextArgument& value,
+                               const Port::TextArgument& type) {
     return Add(*this, {Kind::InstancePin, instance, pin}, name, value, type);
 }
 
-bool Model::SetAttrValue(AttributeHolder* holder, const char* attribute, const char* value) {
+bool Model::SetAttrValue(AttributeHolder* holder, const Port::TextArgument& attribute,
+                         const Port::TextArgument& value) {
     return Change(*this, SetValue, holder, attribute, value);
 }
 
-bool Model::SetModuleAttrValue(const char* attribute, const char* value) {
+bool Model::SetModuleAttrValue(const Port::TextArgument& attribute,
+                               const Port::TextArgument& value) {
     return Change(*this, SetValue, {Kind::Module}, attribute, value);
 }
 
-bool Model::SetComponentAttrValue(const char* component, const char* attribute, const char* value) {
+bool Model::SetComponentAttrValue(const Port::TextArgument& component,
+                                  const Port::TextArgument& attribute,
+                                  const Port::TextArgument& value) {
     return Change(*this, SetValue, {Kind::Component, component}, attribute, value);
 }
 
-bool Model::SetInstanceAttrValue(const char* instance, const char* attribute, const char* value) {
+bool Model::SetInstanceAttrValue(const Port::TextArgument& instance,
+                                 const Port::TextArgument& attribute,
+                                 const Port::TextArgument& value) {
     return Change(*this, SetValue, {Kind::Instance, instance}, attribute, value);
 }
 
-bool Model::SetSignalAttrValue(const char* signal, const char* attribute, const char* value) {
+bool Model::SetSignalAttrValue(const Port::TextArgument& signal,
+                               const Port::TextArgument& attribute,
+                               const Port::TextArgument& value) {
     return Change(*this, SetValue, {Kind::Signal, signal}, attribute, value);
 }
 
-bool Model::SetComponentPinAttrValue(const char* component, const char* pin, const char* attribute,
-                                     const char* value) {
+bool Model::SetComponentPinAttrValue(const Port::TextArgument& component,
+                                     const Port::TextArgument& pin,
+                                     const Port::TextArgument& attribute,
+                                     const Port::TextArgument& value) {
     return Change(*this, SetValue, {Kind::ComponentPin, component, pin}, attribute, value);
 }
 
-bool Model::SetInstancePinAttrValue(const char* instance, const char* pin, const char* attribute,
-                                    const char* value) {
+bool Model::SetInstancePinAttrValue(const Port::TextArgument& instance,
+                                    const Port::TextArgument& pin,
+                                    const Port::TextArgument& attribute,
+                                    const Port::TextArgument& value) {
     return Change(*this, SetValue, {Kind::InstancePin, instance, pin}, attribute, value);
 }
 
-bool Model::SetGenericAttrValue(AttributeHolder* holder, const char* attribute, const char* value) {
+bool Model::SetGenericAttrValue(AttributeHolder* holder, const Port::TextArgument& attribute,
+                                const Port::TextArgument& value) {
     return Change(*this, SetGeneric, holder, attribute, value);
 }
 
-bool Model::SetModuleGenericAttrValue(const char* attribute, const char* value) {
+bool Model::SetModuleGenericAttrValue(const Port::TextArgument& attribute,
+                                      const Port::TextArgument& value) {
     return Change(*this, SetGeneric, {Kind::Module}, attribute, value);
 }
 
-bool Model::SetComponentGenericAttrValue(const char* component, const char* attribute,
-                                         const char* value) {
+bool Model::SetComponentGenericAttrValue(const Port::TextArgument& component,
+                                         const Port::TextArgument& attribute,
+                                         const Port::TextArgument& value) {
     return Change(*this, SetGeneric, {Kind::Component, component}, attribute, value);
 }
 
-bool Model::SetInstanceGenericAttrValue(const char* instance, const char* attribute,
-                                        const char* value) {
+bool Model::SetInstanceGenericAttrValue(const Port::TextArgument& instance,
+                                        const Port::TextArgument& attribute,
+                                        const Port::TextArgument& value) {
     return Change(*this, SetGeneric, {Kind::Instance, instance}, attribute, value);
 }
 
-bool Model::SetSignalGenericAttrValue(const char* signal, const char* attribute,
-                                      const char* value) {
+bool Model::SetSignalGenericAttrValue(const Port::TextArgument& signal,
+                                      const Port::TextArgument& attribute,
+                                      const Port::TextArgument& value) {
     return Change(*this, SetGeneric, {Kind::Signal, signal}, attribute, value);
 }
 
-bool Model::SetComponentPinGenericAttrValue(const char* component, const char* pin,
-                                            const char* attribute, const char* value) {
+bool Model::SetComponentPinGenericAttrValue(const Port::TextArgument& component,
+                                            const Port::TextArgument& pin,
+                                            const Port::TextArgument& attribute,
+                                            const Port::TextArgument& value) {
     return Change(*this, SetGeneric, {Kind::ComponentPin, component, pin}, attribute, value);
 }
 
-bool Model::SetInstancePinGenericAttrValue(const char* instance, const char* pin,
-                                           const char* attribute, const char* value) {
+bool Model::SetInstancePinGenericAttrValue(const Port::TextArgument& instance,
+                                           const Port::TextArgument& pin,
+                                           const Port::TextArgument& attribute,
+                                           const Port::TextArgument& value) {
     return Change(*this, SetGeneric, {Kind::InstancePin, instance, pin}, attribute, value);
 }
 
-bool Model::SetSynAttrValue(AttributeHolder* holder, const char* attribute, const char* value) {
+bool Model::SetSynAttrValue(AttributeHolder* holder, const Port::TextArgument& attribute,
+                            const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, holder, attribute, value);
 }
 
-bool Model::SetModuleSynAttrValue(const char* attribute, const char* value) {
+bool Model::SetModuleSynAttrValue(const Port::TextArgument& attribute,
+                                  const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, {Kind::Module}, attribute, value);
 }
 
-bool Model::SetComponentSynAttrValue(const char* component, const char* attribute,
-                                     const char* value) {
+bool Model::SetComponentSynAttrValue(const Port::TextArgument& component,
+                                     const Port::TextArgument& attribute,
+                                     const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, {Kind::Component, component}, attribute, value);
 }
 
-bool Model::SetInstanceSynAttrValue(const char* instance, const char* attribute,
-                                    const char* value) {
+bool Model::SetInstanceSynAttrValue(const Port::TextArgument& instance,
+                                    const Port::TextArgument& attribute,
+                                    const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, {Kind::Instance, instance}, attribute, value);
 }
 
-bool Model::SetSignalSynAttrValue(const char* signal, const char* attribute, const char* value) {
+bool Model::SetSignalSynAttrValue(const Port::TextArgument& signal,
+                                  const Port::TextArgument& attribute,
+                                  const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, {Kind::Signal, signal}, attribute, value);
 }
 
-bool Model::SetComponentPinSynAttrValue(const char* component, const char* pin,
-                                        const char* attribute, const char* value) {
+bool Model::SetComponentPinSynAttrValue(const Port::TextArgument& component,
+                                        const Port::TextArgument& pin,
+                                        const Port::TextArgument& attribute,
+                                        const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, {Kind::ComponentPin, component, pin}, attribute, value);
 }
 
-bool Model::SetInstancePinSynAttrValue(const char* instance, const char* pin, const char* attribute,
-                                       const char* value) {
+bool Model::SetInstancePinSynAttrValue(const Port::TextArgument& instance,
+                                       const Port::TextArgument& pin,
+                                       const Port::TextArgument& attribute,
+                                       const Port::TextArgument& value) {
     return Change(*this, SetSynAttr, {Kind::InstancePin, instance, pin}, attribute, value);
 }
 
-bool Model::SetUserType(AttributeHolder* holder, const char* attribute, const char* type) {
+bool Model::SetUserType(AttributeHolder* holder, const Port::TextArgument& attribute,
+                        const Port::TextArgument& type) {
     return Change(*this, SetType, holder, attribute, type);
 }
 
-bool Model::SetModuleUserType(const char* attribute, const char* type) {
+bool Model::SetModuleUserType(const Port::TextArgument& attribute, const Port::TextArgument& type) {
     return Change(*this, SetType, {Kind::Module}, attribute, type);
 }
 
-bool Model::SetComponentUserType(const char* component, const char* attribute, const char* type) {
+bool Model::SetComponentUserType(const Port::TextArgument& component,
+                                 const Port::TextArgument& attribute,
+                                 const Port::TextArgument& type) {
     return Change(*this, SetType, {Kind::Component, component}, attribute, type);
 }
 
-bool Model::SetInstanceUserType(const char* instance, const char* attribute, const char* type) {
+bool Model::SetInstanceUserType(const Port::TextArgument& instance,
+                                const Port::TextArgument& attribute,
+                                const Port::TextArgument& type) {
     return Change(*this, SetType, {Kind::Instance, instance}, attribute, type);
 }
 
-bool Model::SetSignalUserType(const char* signal, const char* attribute, const char* type) {
+bool Model::SetSignalUserType(const Port::TextArgument& signal, const Port::TextArgument& attribute,
+                              const Port::TextArgument& type) {
     return Change(*this, SetType, {Kind::Signal, signal}, attribute, type);
 }
 
-bool Model::SetComponentPinUserType(const char* component, const char* pin, const char* attribute,
-                                    const char* type) {
+bool Model::SetComponentPinUserType(const Port::TextArgument& component,
+                                    const Port::TextArgument& pin,
+                                    const Port::TextArgument& attribute,
+                                    const Port::TextArgument& type) {
     return Change(*this, SetType, {Kind::ComponentPin, component, pin}, attribute, type);
 }
 
-bool Model::SetInstancePinUserType(const char* instance, const char* pin, const char* attribute,
-                                   const char* type) {
+bool Model::SetInstancePinUserType(const Port::TextArgument& instance,
+                                   const Port::TextArgument& pin,
+                                   const Port::TextArgument& attribute,
+                                   const Port::TextArgument& type) {
     return Change(*this, SetType, {Kind::InstancePin, instance, pin}, attribute, type);
 }
 
-bool Model::AddNotes(const char* text) {
+bool Model::AddNotes(const Port::TextArgument& text) {
     return text == nullptr || Comment(*this, {Kind::Module}, text);
 }
 
-bool Model::AddComponentComment(const char* component, const char* text) {
+bool Model::AddComponentComment(const Port::TextArgument& component,
+                                const Port::TextArgument& text) {
     return Comment(*this, {Kind::Component, component}, text);
 }
 
-bool Model::AddInstanceComment(const char* instance, const char* text) {
+bool Model::AddInstanceComment(const Port::TextArgument& instance, const Port::TextArgument& text) {
     return Comment(*this, {Kind::Instance, instance}, text);
 }
 
-bool Model::AddSignalComment(const char* signal, const char* text) {
+bool Model::AddSignalComment(const Port::TextArgument& signal, const Port::TextArgument& text) {
     return Comment(*this, {Kind::Signal, signal}, text);
 }
 
-bool Model::AddComponentPinComment(const char* component, const char* pin, const char* text) {
+bool Model::AddComponentPinComment(const Port::TextArgument& component,
+                                   const Port::TextArgument& pin, const Port::TextArgument& text) {
     return text == nullptr || Comment(*this, {Kind::ComponentPin, component, pin}, text);
 }
 
-bool Model::AddInstancePinComment(const char* instance, const char* pin, const char* text) {
+bool Model::AddInstancePinComment(const Port::TextArgument& instance, const Port::TextArgument& pin,
+                                  const Port::TextArgument& text) {
     return text == nullptr || Comment(*this, {Kind::InstancePin, instance, pin}, text);
 }
 

@@ -28,8 +28,9 @@ bool Model::Connect(Signal* first, Signal* second) {
     return true;
 }
 
-bool Model::ConnectSignalToPin(const char* signalName, const char* instanceName,
-                               const char* pinName) {
+bool Model::ConnectSignalToPin(const Port::TextArgument& signalName,
+                               const Port::TextArgument& instanceName,
+                               const Port::TextArgument& pinName) {
     Signal* const signal = GetOrCreateSignal(signalName);
     if (signal == nullptr) {
         FailSignalNotFound(__LINE__, signalName);
@@ -46,7 +47,8 @@ bool Model::ConnectSignalToPin(const char* signalName, const char* instanceName,
     return Connect(signal, pin);
 }
 
-bool Model::ConnectSignals(const char* firstName, const char* secondName) {
+bool Model::ConnectSignals(const Port::TextArgument& firstName,
+                           const Port::TextArgument& secondName) {
     const Signal* const created = GetOrCreateSignal(firstName);
     if (created == nullptr) {
         FailSignalNotFound(__LINE__, firstName);
@@ -83,7 +85,8 @@ bool Model::AssignConstant(Pin* pin, const char* value, const char* instanceName
     return true;
 }
 
-bool Model::AssignConstantToSignal(const char* signalName, const char* value) {
+bool Model::AssignConstantToSignal(const Port::TextArgument& signalName,
+                                   const Port::TextArgument& value) {
     Signal* const signal = GetOrCreateSignal(signalName);
     if (signal == nullptr) {
         FailSignalNotFound(__LINE__, signalName);
@@ -91,7 +94,9 @@ bool Model::AssignConstantToSignal(const char* signalName, const char* value) {
     return AssignConstant(signal, value);
 }
 
-bool Model::AssignConstantToPin(const char* instanceName, const char* pinName, const char* value) {
+bool Model::AssignConstantToPin(const Port::TextArgument& instanceName,
+                                const Port::TextArgument& pinName,
+                                const Port::TextArgument& value) {
     const Instance* const instance = GetInstance(instanceName);
     if (instance == nullptr) {
         FailSignalNotFound(__LINE__, instanceName);

@@ -38,31 +38,31 @@ bool CanBear(const Signal& signal, std::string_view name) {
 
 } // namespace
 
-bool Model::RenameComponent(const char* name, const char* newName) {
+bool Model::RenameComponent(const Port::TextArgument& name, const Port::TextArgument& newName) {
     RequireName(__LINE__, newName);
     Component* const component = GetComponent(name);
     if (component == nullptr) {
         FailInModel(__LINE__, "Component \"%s\" not found.\n", {ViewOf(name)});
     }
     Renaming renaming(*GetNetlist());
-    renaming.Add(*component, newName);
+    renaming.Add(*component, newName.GetView());
     Apply(*this, renaming, newName);
     return true;
 }
 
-bool Model::RenameInstance(const char* name, const char* newName) {
+bool Model::RenameInstance(const Port::TextArgument& name, const Port::TextArgument& newName) {
     RequireName(__LINE__, newName);
     Instance* const instance = GetInstance(name);
     if (instance == nullptr) {
         FailNotFound(__LINE__, name);
     }
     Renaming renaming(*GetNetlist());
-    renaming.Add(*instance, newName);
+    renaming.Add(*instance, newName.GetView());
     Apply(*this, renaming, newName);
     return true;
 }
 
-bool Model::RenameSignal(const char* name, const char* newName) {
+bool Model::RenameSignal(const Port::TextArgument& name, const Port::TextArgument& newName) {
     RequireName(__LINE__, newName);
     Signal* const signal = GetSignal(name);
     if (signal == nullptr) {
@@ -73,10 +73,10 @@ bool Model::RenameSignal(const char* name, const char* newName) {
     }
     const Bus* const namesake = GetNetlist()->GetParentBus(newName);
     if (As<Bus>(signal) != nullptr && namesake != nullptr && namesake != signal) {
-        FailInModel(__LINE__, "Signal \"%s\" already declared.\n", {newName});
+        FailInModel(__LINE__, "Signal \"%s\" already declared.\n", {newName.GetView()});
     }
     Renaming renaming(*GetNetlist());
-    renaming.AddWithParts(*signal, newName);
+    renaming.AddWithParts(*signal, newName.GetView());
     Apply(*this, renaming, newName);
     return true;
 }

@@ -1,8 +1,11 @@
 // How a name becomes a signal when it is first used.
+#include "HdlModel/ModelFailures.h"
 #include "HdlModel/Names/Names.h"
+#include "HdlModel/Signals/SignalCast.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
 
+#include <algorithm>
 #include <memory>
 #include <string>
 #include <utility>
@@ -31,6 +34,24 @@ bool IsBusName(std::string_view text) {
 
 bool IsCompoundName(std::string_view text) {
     return HasShape(text, Names::IsCompound);
+}
+
+/// Whether a text names a bus as a whole, with or without its range.
+bool IsNameOf(const Bus& bus, std::string_view text) {
+    const Names::NormalizedText name(text);
+    return Port::EqualIgnoringCase(name.GetView(), bus.GetNameView()) ||
+           Port::EqualIgnoringCase(name.GetView(), Names::BeforeParenthesis(bus.GetNameView()));
+}
+
+bool HasIndex(const Bus& bus, int index) {
+    Names::BusName range;
+    return Names::ParseBus(bus.GetNameView(), range) &&
+           index >= std::min(range.leftIndex, range.rightIndex) &&
+           index <= std::max(range.leftIndex, range.rightIndex);
+}
+
+std::string BitName(std::string_view base, int index) {
+    return std::string(base).append("(").append(std::to_string(index)).append(")");
 }
 
 /// A name with its base name spelled as the bus spells it.
@@ -89,6 +110,25 @@ Signal* Model::CreateAndAddBusSliceSignal(std::string_view name) {
     auto slice = std::make_unique<BusSlice>(present->GetName().CStr(), result);
     netlist.ReplaceBus(present, std::move(wider), std::move(slice));
     return result;
+}
+
+BusIndex* Model::Bit(const Port::TextArgument& bus, int index) {
+    const Bus* const parent = GetNetlist()->GetParentBus(bus);
+    if (parent == nullptr || !IsNameOf(*parent, bus.GetView()) || !HasIndex(*parent, index)) {
+        FailSignalNotFound(__LINE__,
+                           BitName(Names::BeforeParenthesis(bus.GetView()), index).c_str());
+    }
+    const std::string name = BitName(Names::BeforeParenthesis(parent->GetNameView()), index);
+    Signal* signal = GetNetlist()->GetSignal(std::string_view(name));
+    if (signal == nullptr) {
+        signal = CreateAndAddBusIndexSignal(name);
+        SetModifiedFlag(true);
+    }
+    auto* const bit = As<BusIndex>(signal);
+    if (bit == nullptr) {
+        FailSignalNotFound(__LINE__, name.c_str());
+    }
+    return bit;
 }
 
 Signal* Model::GetOrCreateMember(std::string_view name) {

@@ -1,5 +1,6 @@
 #include "Draw.h"
 
+#include "NoWrites.h"
 #include "Output.h"
 #include "Progress.h"
 #include "Run.h"
@@ -27,19 +28,6 @@ namespace {
 
 /// Graphviz needs minutes for more.
 constexpr std::size_t MostBoxes = 5000;
-
-/// Replaces the WRITE commands: `draw` must not write the files that the command file names.
-class NoWriteCommand final : public Orn_Hdl::Command {
-public:
-    using Command::Command;
-    bool Parse(const Orn_Hdl::StringArray&) override { return true; }
-    void Execute() override {}
-    const char* GetName() const override { return "WRITE"; }
-
-    static Command* Create(Orn_Hdl::Model* model, const Orn_Hdl::StringArray&) {
-        return new NoWriteCommand(model);
-    }
-};
 
 using CFile = std::unique_ptr<std::FILE, int (*)(std::FILE*)>;
 
@@ -130,10 +118,7 @@ Status Draw(const DrawOptions& options) {
     Orn_Hdl::Engine engine;
     engine.CreateAndAddModel("", options.file.c_str());
     Orn_Hdl::Model& model = *engine.GetModel("");
-    for (const Orn_Hdl::Language language : Orn_Hdl::Languages) {
-        const std::string phrase = std::string("WRITE ") + Orn_Hdl::GetLanguageName(language);
-        model.GetCommandFactory()->AddCommandCreator(phrase.c_str(), &NoWriteCommand::Create);
-    }
+    DropWrites(*model.GetCommandFactory());
     Progress progress(true, options.file);
     CommandFile file(options.file, options.report, progress);
     const Replayed replayed = Replay(model, file, false);

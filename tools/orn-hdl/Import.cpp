@@ -52,6 +52,23 @@ Status ReadFile(const std::string& name, std::string& text) {
     return file.GetError() == 0 ? Status::Success : ComplainUnreadable(name, file.GetError());
 }
 
+/// A command file can be written in both languages.
+NameLanguages GetNameLanguages(const ImportOptions& options) {
+    const auto isWritten = [&](Orn_Hdl::Language language) {
+        const auto file = options.outputs.files.find(language);
+        return file != options.outputs.files.end() && !file->second.empty();
+    };
+    const bool verilog = isWritten(Orn_Hdl::Language::Verilog);
+    const bool vhdl = isWritten(Orn_Hdl::Language::Vhdl);
+    if (options.names) {
+        return *options.names;
+    }
+    if (!options.commandFile.empty() || verilog == vhdl) {
+        return NameLanguages::Both;
+    }
+    return verilog ? NameLanguages::Verilog : NameLanguages::Vhdl;
+}
+
 UnknownValues GetUnknownValues(const ImportOptions& options) {
     if (options.unknownAs.empty()) {
         return UnknownValues(std::nullopt);
@@ -136,8 +153,9 @@ Status ImportText(std::string text, const ImportOptions& options, Reporter& repo
             ReadDesign(std::move(text), options.attributes);
         Module& top = FindTop(*design, options.top);
         Warnings warnings;
-        const ImportedNetlist netlist =
-            MakeNetlist(*design, top, GetUnknownValues(options), warnings);
+        const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
+        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts};
+        const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
         const Status written = WriteAll(netlist, options);
         for (std::string& warning : warnings.GetLines()) {
             reporter.Report(MakeWarning(options, std::move(warning)));

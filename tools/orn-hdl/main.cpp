@@ -8,6 +8,7 @@
 #include "check/Check.h"
 #include "diagnostics/Nearest.h"
 #include "explain/Syntax.h"
+#include "stats/Stats.h"
 
 #include "Orn_Hdl/Language.h"
 #include "Port/String.h"
@@ -35,6 +36,18 @@ std::string CheckFileName(const std::string& name) {
 
 std::string CheckDigit(const std::string& text) {
     return text == "0" || text == "1" ? "" : "0 or 1 is needed";
+}
+
+const std::map<std::string, Tool::Import::NameLanguages>& GetNameLanguages() {
+    using Tool::Import::NameLanguages;
+    static const std::map<std::string, NameLanguages> words = {{"verilog", NameLanguages::Verilog},
+                                                               {"vhdl", NameLanguages::Vhdl},
+                                                               {"both", NameLanguages::Both}};
+    return words;
+}
+
+std::string CheckNameLanguages(const std::string& text) {
+    return GetNameLanguages().count(text) != 0 ? "" : "verilog, vhdl or both is needed";
 }
 
 CLI::Option* AddFile(CLI::App& command, const std::string& option, std::string& name,
@@ -124,6 +137,7 @@ public:
         AddImport();
         AddCheck();
         AddDraw();
+        AddStats();
         AddCommands();
         app_.footer("\"orn-hdl help COMMAND\" prints the help of a command.");
     }
@@ -258,6 +272,15 @@ private:
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
+        const auto setNames = [this](const std::string& word) {
+            import_.names = GetNameLanguages().at(word);
+        };
+        command
+            .add_option_function<std::string>("--names", setNames,
+                                              "Make names legal in these languages")
+            ->type_name("verilog|vhdl|both")
+            ->check(CheckNameLanguages);
+        command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
         command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")
             ->check(CheckDigit);
@@ -307,6 +330,21 @@ private:
         AddReport(command, draw_.report);
     }
 
+    void AddStats() {
+        CLI::App& command =
+            AddCommand("stats", "Count what the design of a command file is made of",
+                       [this] { return Tool::PrintStats(stats_); });
+        AddFile(command, "FILE", stats_.file, "The command file; - is standard input")->required();
+        command.add_option("--model", stats_.model, "The name of the design")->type_name("NAME");
+        AddChoice<Tool::StatsFormat>(
+            command, "--format", stats_.format,
+            {{"text", Tool::StatsFormat::Text}, {"json", Tool::StatsFormat::Json}},
+            "Print the counts as text or JSON");
+        AddReport(command, stats_.report);
+        command.add_flag("--quiet", stats_.quiet, "Do not show progress");
+        command.footer("WRITE commands in the file do nothing.");
+    }
+
     void AddCommands() {
         CLI::App& command = AddCommand("commands", "Print the command language", [this] {
             return markdown_ ? Tool::PrintCommandsPage() : Tool::PrintCommands(words_);
@@ -326,6 +364,7 @@ private:
     Tool::ImportOptions import_;
     Tool::DrawOptions draw_;
     Tool::CheckOptions check_;
+    Tool::StatsOptions stats_;
     std::vector<std::string> words_;
     bool markdown_ = false;
 };

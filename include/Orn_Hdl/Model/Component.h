@@ -63,7 +63,7 @@ private:
 class ORN_HDL_API Component : public Object, public AttributeHolder {
 public:
     /// A component without pins; a null name is read as "".
-    explicit Component(const char* name);
+    explicit Component(const Port::TextArgument& name);
     Component(const Component&) = delete;
     Component& operator=(const Component&) = delete;
     /// The netlist drops the component, whoever destroys it. Its instances keep their pins and then
@@ -76,11 +76,13 @@ public:
     /// refused here. Instances made before do not get the pin.
     /// \param name null is read as "".
     /// \param defaultValue taken when its text is not empty.
-    void AddPin(const char* name, const Polarity& polarity, const BitVectorValue& defaultValue);
+    void AddPin(const Port::TextArgument& name, const Polarity& polarity,
+                const BitVectorValue& defaultValue);
     /// Appends a pin whose default value is given as a bit-vector literal; null is read as "". A
     /// name that is taken is not refused here. Instances made before do not get the pin.
     /// \param name null is read as "".
-    void AddPin(const char* name, const Polarity& polarity, const char* defaultValue);
+    void AddPin(const Port::TextArgument& name, const Polarity& polarity,
+                const Port::TextArgument& defaultValue);
     /// Appends a clone of a pin.
     void AddPin(const Pin& pin);
     /// Destroys a pin of this component, as `delete` does. Instances keep their pins:
@@ -105,7 +107,7 @@ private:
 class ORN_HDL_API Instance : public Object, public AttributeHolder {
 public:
     /// \param component not owned; null gives an instance without pins.
-    Instance(const char* name, const Component* component);
+    Instance(const Port::TextArgument& name, const Component* component);
     Instance(const Instance&) = delete;
     Instance& operator=(const Instance&) = delete;
     /// The netlist drops the instance, whoever destroys it, and its pins leave all signals.

@@ -5,6 +5,7 @@
 #include "Port/Export.h"
 #include "Port/Pooled.h"
 #include "Port/String.h"
+#include "Port/TextArgument.h"
 
 #include <cstdint>
 #include <string_view>
@@ -54,6 +55,8 @@ public:
     /// declared. `Model::RenameComponent`, `RenameInstance` and `RenameSignal` check the new name,
     /// and the object is found by it afterwards.
     virtual void SetName(const char* name);
+    /// Stores a name, given as any other kind of text, as the overload for a C text does.
+    void SetName(const Port::TextArgument& name) { SetName(name.Get()); }
 
     /// The name, as a copy.
     Port::StringBase<char> GetName() const { return GetNameView(); }

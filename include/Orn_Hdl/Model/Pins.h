@@ -7,7 +7,9 @@
 #include "Orn_Hdl/Model/Object.h"
 #include "Port/Export.h"
 #include "Port/String.h"
+#include "Port/TextView.h"
 
+#include <optional>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -27,12 +29,18 @@ public:
     Polarity() noexcept = default;
     /// The direction of that value, which is not checked.
     explicit Polarity(int value) noexcept : value_(value) {}
-    /// The direction that a text names, as `GetValue` reads it.
+    /// The direction of that value.
+    Polarity(Value value) noexcept : value_(value) {}
+    /// The direction that a text names, as `GetValue` reads it. Any other text, "inout" among them,
+    /// gives an invalid one; `Parse` tells, and knows that word.
     explicit Polarity(const char* text) noexcept : value_(GetValue(text)) {}
 
     /// The direction whose name begins with the text, letter case ignored, tried in the order
     /// Input, Output, BiDirectional: "in", "O" and "bidir" are directions; "" and "inputs" are not.
     static int GetValue(const char* text) noexcept;
+    /// The direction that a text names: what `GetValue` reads, and "inout" in any letter case.
+    /// \return nothing for any other text.
+    static std::optional<Polarity> Parse(Port::TextView text) noexcept;
     /// Whether a value is a direction.
     static bool IsValidValue(int value) noexcept {
         return value >= Input && value <= BiDirectional;
@@ -78,6 +86,7 @@ public:
     void AcceptObject(ObjectVisitor& visitor) override;
     /// Stores a name, normalised; null is read as "".
     void SetName(const char* name) override;
+    using Object::SetName;
     /// The class, a `PinType`.
     virtual int GetPinType() const = 0;
     /// A new pin of the same class with the same name, polarity and default value; the caller owns

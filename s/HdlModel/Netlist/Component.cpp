@@ -30,7 +30,7 @@ Pin* PinList::GetPin(std::string_view name) const {
 
 Pin* PinList::FindOneByOne(std::string_view name) const noexcept {
     for (Pin* pin : Iterator<Pin*>(this)) {
-        // The wanted name is normalised for the comparison; the pin's is already.
+        // The wanted name is normalised for the comparison; the pin's name already is.
         if (EqualFolded(pin->GetNameView(), name)) {
             return pin;
         }
@@ -108,9 +108,10 @@ struct ComponentAnchor {
     }
 };
 
-Component::Component(const char* name) : Object(ObjectTypeComponent), anchor_(nullptr) {
+Component::Component(const Port::TextArgument& name)
+    : Object(ObjectTypeComponent), anchor_(nullptr) {
     Object::SetName(name);
-    // Last: nobody would give it back if the name found no memory.
+    // Allocated last: if allocating the name failed, nobody would free the anchor.
     anchor_ = new ComponentAnchor{this, 1};
 }
 
@@ -125,7 +126,7 @@ void Component::AcceptObject(ObjectVisitor& visitor) {
     visitor.VisitComponent(this);
 }
 
-void Component::AddPin(const char* name, const Polarity& polarity,
+void Component::AddPin(const Port::TextArgument& name, const Polarity& polarity,
                        const BitVectorValue& defaultValue) {
     std::unique_ptr<Pin> pin(Pin::Create(name, polarity));
     if (!defaultValue.GetValue().IsEmpty()) {
@@ -134,7 +135,8 @@ void Component::AddPin(const char* name, const Polarity& polarity,
     PinBlock::Add(pins_, std::move(pin));
 }
 
-void Component::AddPin(const char* name, const Polarity& polarity, const char* defaultValue) {
+void Component::AddPin(const Port::TextArgument& name, const Polarity& polarity,
+                       const Port::TextArgument& defaultValue) {
     AddPin(name, polarity, BitVectorValue(defaultValue));
 }
 
@@ -146,7 +148,7 @@ void Component::RemovePin(Pin* pin) noexcept {
     PinBlock::Remove(pins_, pin);
 }
 
-Instance::Instance(const char* name, const Component* component)
+Instance::Instance(const Port::TextArgument& name, const Component* component)
     : Object(ObjectTypeInstance), anchor_(component == nullptr ? nullptr : component->anchor_) {
     Object::SetName(name);
     if (component != nullptr) {

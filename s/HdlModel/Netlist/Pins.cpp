@@ -15,7 +15,17 @@ namespace {
 
 constexpr const char* PolarityNames[] = {"Input", "Output", "BiDirectional"};
 
-/// A pin in the block of an instance. Whoever deletes it, its memory stays a part of the block.
+int FindPolarity(std::string_view start) noexcept {
+    for (int value = Polarity::Input; !start.empty() && value <= Polarity::BiDirectional; ++value) {
+        if (Port::strnicmp(PolarityNames[value], start, start.size()) == 0) {
+            return value;
+        }
+    }
+    return Polarity::Invalid;
+}
+
+/// A pin in the block of an instance. Deleting the pin does not free its memory, which belongs to
+/// the block.
 template <class T> class Placed final : public T {
 public:
     explicit Placed(const T& other) : T(other) { static_assert(sizeof(Placed) == sizeof(T)); }
@@ -27,13 +37,12 @@ public:
 } // namespace
 
 int Polarity::GetValue(const char* text) noexcept {
-    const std::string_view start = Port::ViewOf(text);
-    for (int value = Input; !start.empty() && value <= BiDirectional; ++value) {
-        if (Port::strnicmp(PolarityNames[value], text, start.size()) == 0) {
-            return value;
-        }
-    }
-    return Invalid;
+    return FindPolarity(Port::ViewOf(text));
+}
+
+std::optional<Polarity> Polarity::Parse(Port::TextView text) noexcept {
+    const int value = Port::EqualIgnoringCase(text, "inout") ? BiDirectional : FindPolarity(text);
+    return IsValidValue(value) ? std::optional<Polarity>(Polarity(value)) : std::nullopt;
 }
 
 const char* Polarity::GetValueName() const noexcept {
@@ -201,7 +210,7 @@ void PinConstantSignalVisitor::VisitScalarPin(ScalarPin* pin) {
     }
 }
 
-// The index or range is the rest of the pin's name, as it is spelled there.
+// The index or range is the rest of the pin's name, exactly as spelled there.
 void PinConstantSignalVisitor::VisitBusPin(BusPin* pin) {
     if (pin != nullptr) {
         const std::string_view base = Names::BeforeParenthesis(pin->GetNameView());

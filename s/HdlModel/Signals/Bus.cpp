@@ -10,7 +10,8 @@
 
 namespace Orn_Hdl {
 
-Bus::Bus(const char* name) : Signal(name), parts_(std::make_unique<BusParts>(*this)) {}
+Bus::Bus(const Port::TextArgument& name)
+    : Signal(name), parts_(std::make_unique<BusParts>(*this)) {}
 
 Bus::~Bus() {
     NetlistOwner::Leave(*this);

@@ -15,7 +15,8 @@ namespace Orn_Hdl {
 
 // The members are added to a compound that is whole: if allocation fails, it is destroyed as any
 // other, and leaves those that it has.
-CompoundBus::CompoundBus(const char* name, const PtrArray<Signal*>& members) : CompoundBus(name) {
+CompoundBus::CompoundBus(const Port::TextArgument& name, const PtrArray<Signal*>& members)
+    : CompoundBus(name) {
     for (int i = 0; i < members.GetSize(); ++i) {
         AddBusMember(members.GetAt(i));
     }

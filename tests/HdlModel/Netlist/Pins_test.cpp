@@ -7,6 +7,7 @@
 #include <cctype>
 #include <climits>
 #include <memory>
+#include <optional>
 #include <string>
 
 namespace {
@@ -45,6 +46,27 @@ TEST(Polarity, IsInvalidFromAnyOtherText) {
         EXPECT_EQ(Polarity::GetValue(text), -1);
     }
     EXPECT_EQ(Polarity("bi").GetValue(), 2);
+}
+
+TEST(Polarity, ParsesWhatATextNamesOrFails) {
+    EXPECT_EQ(Polarity::Parse("in"), Polarity(Polarity::Input));
+    EXPECT_EQ(Polarity::Parse("OUTPUT"), Polarity(Polarity::Output));
+    EXPECT_EQ(Polarity::Parse(std::string("bidir")), Polarity(Polarity::BiDirectional));
+    EXPECT_EQ(Polarity::Parse("inout"), Polarity(Polarity::BiDirectional));
+    EXPECT_EQ(Polarity::Parse("InOut"), Polarity(Polarity::BiDirectional));
+    for (const char* text : {"", "inou", "inouts", "inputs", "sideways", " in"}) {
+        EXPECT_EQ(Polarity::Parse(text), std::nullopt) << text;
+    }
+    EXPECT_EQ(Polarity::Parse(nullptr), std::nullopt);
+    // Of a constructor, these words are invalid, as they always were.
+    EXPECT_FALSE(Polarity("inout").IsValid());
+}
+
+TEST(Polarity, IsMadeFromItsEnumerators) {
+    const Polarity output = Polarity::Output;
+    EXPECT_EQ(output.GetValue(), 1);
+    EXPECT_EQ(output, Polarity::Output);
+    EXPECT_FALSE(Polarity(Polarity::Invalid).IsValid());
 }
 
 TEST(Polarity, OnlyThreeValuesAreValid) {

@@ -16,7 +16,7 @@ class BusParts;
 class ORN_HDL_API Bus final : public Signal {
 public:
     /// A bus that is no port and has no slices; a null name is read as "".
-    explicit Bus(const char* name);
+    explicit Bus(const Port::TextArgument& name);
     /// Leaves the slices and bits without a parent.
     ~Bus() override;
 

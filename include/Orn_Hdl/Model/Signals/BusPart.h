@@ -46,7 +46,7 @@ public:
     /// A slice that its bus lists.
     /// \param name null is read as "".
     /// \param parent the bus; not owned, may be null.
-    BusSlice(const char* name, Bus* parent) : BusPart(name, parent) {}
+    BusSlice(const Port::TextArgument& name, Bus* parent) : BusPart(name, parent) {}
 
     int GetSignalType() const override { return SignalTypeBusSlice; }
     /// Does nothing: a slice has its parent's polarity.
@@ -72,7 +72,7 @@ public:
     /// A bit that its bus lists.
     /// \param name null is read as "".
     /// \param parent the bus; not owned, may be null.
-    BusIndex(const char* name, Bus* parent) : BusPart(name, parent) {}
+    BusIndex(const Port::TextArgument& name, Bus* parent) : BusPart(name, parent) {}
 
     int GetSignalType() const override { return SignalTypeBusIndex; }
     /// Sets the bit's own polarity, which shows only without a parent.

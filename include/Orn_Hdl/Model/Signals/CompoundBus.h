@@ -19,9 +19,9 @@ public:
     static constexpr int MostCompounds = 4000;
 
     /// A compound without members; a null name is read as "".
-    explicit CompoundBus(const char* name) : Signal(name) {}
+    explicit CompoundBus(const Port::TextArgument& name) : Signal(name) {}
     /// A compound with members, which are added as `AddBusMember` does; a null name is read as "".
-    CompoundBus(const char* name, const PtrArray<Signal*>& members);
+    CompoundBus(const Port::TextArgument& name, const PtrArray<Signal*>& members);
     ~CompoundBus() override;
 
     int GetSignalType() const override { return SignalTypeCompoundBus; }

@@ -11,7 +11,7 @@ namespace Orn_Hdl {
 class ORN_HDL_API ScalarSignal final : public Signal {
 public:
     /// A signal that is no port; a null name is read as "".
-    explicit ScalarSignal(const char* name) : Signal(name) {}
+    explicit ScalarSignal(const Port::TextArgument& name) : Signal(name) {}
 
     int GetSignalType() const override { return SignalTypeScalar; }
     void SetPortPolarity(const Polarity& polarity) override { SetDirection(polarity.GetValue()); }
