@@ -157,8 +157,11 @@ class ImportTest(ToolTest):
                 others = other["connections"].get(new_pin.partition("(")[0])
                 wiring.meet_pin(f"{name}.{pin}", bits, others)
 
-    def refuse(self, contents: Json | str | bytes, message: str, *options: str) -> None:
-        """Expects an import to fail with a message behind the file's name, and to write nothing."""
+    def refuse(self, contents: Json | str | bytes, message: str, *options: str, place: str = "") -> None:
+        """Expects an import to fail with a message behind the file's name, and to write nothing.
+
+        If the contents are no JSON, `place` is the mark under their only line.
+        """
         path = self.folder / "d.json"
         if isinstance(contents, bytes):
             path.write_bytes(contents)
@@ -167,7 +170,11 @@ class ImportTest(ToolTest):
                             encoding="utf-8")
         outcome = self.run_tool("import", "d.json", "-o", "x.cmd", "--verilog", "x.v", "--vhdl",
                                 "x.vhd", "--name-map", "x.map", *options)
-        self.expect(outcome, 1, f"d.json: error: {message}\n")
+        if place:
+            self.expect(outcome, 1, f"d.json:1: error: {message}\n    1 | {self.read('d.json')}\n"
+                                    f"      | {place}\n")
+        else:
+            self.expect(outcome, 1, f"d.json: error: {message}\n")
         self.assertEqual([p.name for p in self.folder.iterdir() if p.name.startswith("x.")], [])
 
 

@@ -1,5 +1,7 @@
 #include "Import.h"
 
+#include "explain/FileKind.h"
+#include "explain/Syntax.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
 #include "import/EmitNetlist.h"
@@ -126,8 +128,46 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options, Re
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
 
+/// How much of a file tells what it is.
+constexpr std::size_t BeginningSize = 4096;
+
+/// What the file is if it is no JSON; empty if that is not known.
+std::string DescribeKind(const std::string& beginning) {
+    const std::size_t first = beginning.find_first_not_of(" \t\r\n");
+    if (first == std::string::npos || beginning[first] == '{' || beginning[first] == '[') {
+        return {};
+    }
+    Orn_Hdl::StringArray words;
+    words.ParseCommandLine(beginning.substr(first, beginning.find_first_of("\r\n", first) - first));
+    return Explain::FindPhrase(words) != nullptr ? "this looks like a command file; use orn-hdl run"
+                                                 : DescribeFileKind(beginning);
+}
+
+/// \param beginning the beginning of the file.
+Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
+                     const std::string& beginning) {
+    const Import::TextPlace& place = error.GetPlace();
+    Diagnostic diagnostic;
+    diagnostic.place =
+        Tool::Place{options.file, place.line, place.source, Columns{place.column, 1}};
+    diagnostic.message = error.what();
+    if (const std::string kind = DescribeKind(beginning); !kind.empty()) {
+        diagnostic.notes.push_back({kind});
+    }
+    return diagnostic;
+}
+
+Diagnostic MakeWarning(const ImportOptions& options, std::string message) {
+    Diagnostic diagnostic;
+    diagnostic.severity = Severity::Warning;
+    diagnostic.place.file = options.file;
+    diagnostic.message = std::move(message);
+    return diagnostic;
+}
+
 /// Imports the text of a file.
 Status ImportText(std::string text, const ImportOptions& options, Reporter& reporter) {
+    const std::string beginning = text.substr(0, BeginningSize);
     try {
         const std::unique_ptr<ImportedDesign> design =
             ReadDesign(std::move(text), options.attributes);
@@ -138,11 +178,11 @@ Status ImportText(std::string text, const ImportOptions& options, Reporter& repo
         const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
         const Status written = WriteAll(netlist, options, reporter);
         for (std::string& warning : warnings.GetLines()) {
-            Report(options, Severity::Warning, std::move(warning), reporter);
+            reporter.Report(MakeWarning(options, std::move(warning)));
         }
         return written;
     } catch (const Import::Error& error) {
-        Report(options, Severity::Error, error.what(), reporter);
+        reporter.Report(MakeError(options, error, beginning));
         return Status::Failed;
     }
 }

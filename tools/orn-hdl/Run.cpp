@@ -6,6 +6,7 @@
 #include "Progress.h"
 #include "check/Checker.h"
 #include "check/WriteGate.h"
+#include "explain/FailureExplainer.h"
 
 #include <cstdint>
 #include <string_view>
@@ -26,7 +27,7 @@ constexpr const char* NamelessModel = "HDL_NETLIST";
 class Replayer {
 public:
     Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate)
-        : model_(model), file_(file), gate_(gate) {}
+        : model_(model), file_(file), gate_(gate), explainer_(model, file.lines) {}
 
     /// Executes one line, which ends at `position` in the file. \return whether it succeeded.
     bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
@@ -41,9 +42,13 @@ public:
         try {
             model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
+<<<<<<< HEAD
             if (!TellWhyNotLegal(words)) {
                 Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
             }
+=======
+            Report(words, exception.getLocalized().GetView());
+>>>>>>> x/diag
             status_ = Worse(status_, Status::Failed);
             return false;
         }
@@ -54,6 +59,7 @@ public:
     std::uint64_t GetLineCount() const noexcept { return lines_; }
 
 private:
+<<<<<<< HEAD
     static std::string_view WithoutLineEnd(std::string_view text) noexcept {
         if (!text.empty() && text.back() == '\n') {
             text.remove_suffix(1);
@@ -72,11 +78,10 @@ private:
             .Tell(legal.GetErrors(), lines_);
     }
 
+=======
+>>>>>>> x/diag
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
-        Diagnostic diagnostic;
-        diagnostic.place = file_.lines.GetPlace(lines_, words);
-        diagnostic.message = text;
-        file_.reporter.Report(std::move(diagnostic));
+        file_.reporter.Report(explainer_.Explain(lines_, words, text));
     }
 
     bool ReportWriteError(const Orn_Hdl::StringArray& words) {
@@ -97,6 +102,7 @@ private:
     Orn_Hdl::Model& model_;
     CommandFile& file_;
     Checking::WriteGate* const gate_;
+    FailureExplainer explainer_;
     std::uint64_t lines_ = 0;
     Status status_ = Status::Success;
 };
