@@ -1,5 +1,7 @@
 #include "Import.h"
 
+#include "cells/CellDeclaration.h"
+#include "import/CellLibrary.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
 #include "import/EmitNetlist.h"
@@ -73,6 +75,27 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
+/// Reads the cell libraries, and prints a message if one cannot be read.
+Status ReadLibrary(const std::vector<std::string>& files, CellLibrary& library) {
+    for (const std::string& file : files) {
+        std::string text;
+        const Status read = ReadFile(file, text);
+        if (read != Status::Success) {
+            return read;
+        }
+        try {
+            library.Add(file, std::move(text));
+        } catch (const Cells::Error& error) {
+            PrintError(file + ":" + std::to_string(error.GetLine()) + ": error: " + error.what());
+            return Status::Failed;
+        } catch (const Import::Error& error) {
+            PrintError(file + ": error: " + error.what());
+            return Status::Failed;
+        }
+    }
+    return Status::Success;
+}
+
 Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options) {
     if (options.outputs.IsEmpty()) {
         return Status::Success;
@@ -108,6 +131,11 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
 } // namespace
 
 Status ImportDesign(const ImportOptions& options) {
+    CellLibrary library;
+    const Status libraryRead = ReadLibrary(options.cells, library);
+    if (libraryRead != Status::Success) {
+        return libraryRead;
+    }
     std::string text;
     const Status read = ReadFile(options.file, text);
     if (read != Status::Success) {
@@ -119,7 +147,7 @@ Status ImportDesign(const ImportOptions& options) {
         Module& top = FindTop(*design, options.top);
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
-        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts};
+        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts, library};
         const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
         const Status written = WriteAll(netlist, options);
         for (const std::string& warning : warnings.GetLines()) {
