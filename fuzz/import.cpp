@@ -35,13 +35,13 @@ Import::UnknownValues PickUnknownValues(int choice) {
     }
 }
 
-Import::ImportRules PickRules(Fuzz::Bytes& bytes) {
+Import::ImportRules PickRules(Fuzz::Bytes& bytes, const Import::CellLibrary& library) {
     using Import::NameLanguages;
     constexpr NameLanguages Languages[] = {NameLanguages::Both, NameLanguages::Verilog,
                                            NameLanguages::Vhdl};
     const int choice = bytes.Choose(24);
     const Import::NameRules names(Languages[choice / 4 % 3], true);
-    return Import::ImportRules{PickUnknownValues(choice % 4), names, choice >= 12};
+    return Import::ImportRules{PickUnknownValues(choice % 4), names, choice >= 12, library};
 }
 
 std::string WriteCommands(const Import::ImportedNetlist& netlist) {
@@ -83,7 +83,8 @@ void CheckImport(const Import::ImportedNetlist& netlist) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     Fuzz::Bytes bytes(data, size);
-    const Import::ImportRules rules = PickRules(bytes);
+    const Import::CellLibrary library;
+    const Import::ImportRules rules = PickRules(bytes, library);
     const bool keepAttributes = bytes.Choose(2) == 0;
     try {
         const std::unique_ptr<Import::ImportedDesign> design =

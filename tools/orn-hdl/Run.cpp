@@ -42,13 +42,9 @@ public:
         try {
             model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
-<<<<<<< HEAD
             if (!TellWhyNotLegal(words)) {
-                Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
+                Report(words, exception.getLocalized().GetView());
             }
-=======
-            Report(words, exception.getLocalized().GetView());
->>>>>>> x/diag
             status_ = Worse(status_, Status::Failed);
             return false;
         }
@@ -59,14 +55,6 @@ public:
     std::uint64_t GetLineCount() const noexcept { return lines_; }
 
 private:
-<<<<<<< HEAD
-    static std::string_view WithoutLineEnd(std::string_view text) noexcept {
-        if (!text.empty() && text.back() == '\n') {
-            text.remove_suffix(1);
-        }
-        return text;
-    }
-
     /// Tells what keeps a write command from writing a legal netlist, with the lines that brought
     /// it in. \return whether there is anything.
     bool TellWhyNotLegal(const Orn_Hdl::StringArray& words) {
@@ -78,8 +66,6 @@ private:
             .Tell(legal.GetErrors(), lines_);
     }
 
-=======
->>>>>>> x/diag
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
         file_.reporter.Report(explainer_.Explain(lines_, words, text));
     }

@@ -282,6 +282,13 @@ private:
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
+        const auto addCells = [this](const std::string& file) { import_.cells.push_back(file); };
+        command
+            .add_option_function<std::string>(
+                "--cells", addCells, "Read cell types: Verilog, JSON or Liberty; may be repeated")
+            ->type_name("FILE")
+            ->trigger_on_parse()
+            ->check(CheckFileName);
         const auto setNames = [this](const std::string& word) {
             import_.names = GetNameLanguages().at(word);
         };
