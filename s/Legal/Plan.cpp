@@ -119,8 +119,13 @@ Plan::Plan(const Netlist& netlist, const HdlOptions& options) : netlist_(netlist
     Checking::Context context(netlist, options, Check::Targets::All());
     context.CheckAll();
     std::vector<Check::Finding> findings = context.TakeFindings();
-    const auto isFault = [](const Check::Finding& finding) {
-        return finding.GetSeverity() == Check::Severity::Error || IsOneOf(finding, TwoValues);
+    FindOpen();
+    // A signal named open that is one gets another name, and its aliases are written then.
+    const bool hasOpenSignal =
+        open_ == nullptr && netlist.GetSignal(string_view("open")) != nullptr;
+    const auto isFault = [&](const Check::Finding& finding) {
+        return finding.GetSeverity() == Check::Severity::Error || IsOneOf(finding, TwoValues) ||
+               (hasOpenSignal && Is(finding, RuleId::AliasBits));
     };
     findings.erase(std::remove_if(findings.begin(), findings.end(),
                                   [&](const Check::Finding& f) { return !isFault(f); }),
@@ -135,11 +140,8 @@ Plan::Plan(const Netlist& netlist, const HdlOptions& options) : netlist_(netlist
     }
     NoteOpen();
     FaultyNames faulty;
-    if (open_ == nullptr) {
-        // A signal of that name which is one needs another name.
-        if (const Signal* const open = netlist.GetSignal(string_view("open"))) {
-            faulty.objects.insert(open);
-        }
+    if (hasOpenSignal) {
+        faulty.objects.insert(netlist.GetSignal(string_view("open")));
     }
     for (const Check::Finding& finding : findings) {
         if (IsOneOf(finding, OfNames)) {
@@ -166,12 +168,16 @@ Plan::Plan(const Netlist& netlist, const HdlOptions& options) : netlist_(netlist
 }
 
 /// A signal named open is none unless it is a port, or has a constant or an alias.
-void Plan::NoteOpen() {
+void Plan::FindOpen() {
     const Signal* const open = netlist_.GetSignal(string_view("open"));
     const bool isNone = open != nullptr && open->GetSignalType() == SignalTypeScalar &&
                         !open->IsPort() && open->GetConstantValue().GetValue().IsEmpty() &&
                         open->GetSignalIterator().IsAtEnd();
     open_ = isNone ? open : nullptr;
+}
+
+/// Notes what nothing is wired to.
+void Plan::NoteOpen() {
     for (const Signal* signal : netlist_.GetSignalIterator()) {
         if (signal->GetSignalType() != SignalTypeCompoundBus) {
             continue;
