@@ -65,6 +65,13 @@ const Attribute* AttributeOf(const Check::Finding& finding) {
                : nullptr;
 }
 
+bool IsBeyondMending(const Check::Finding& finding) {
+    const bool isFileWithQuote = Is(finding, RuleId::IncludeFile) &&
+                                 finding.cause.first.find_first_not_of("\" ") != std::string::npos;
+    return IsOneOf(finding, Unmendable) || isFileWithQuote ||
+           (Is(finding, RuleId::CharacterInValue) && !CanBeEscaped(*AttributeOf(finding)));
+}
+
 /// Notes the names that are at fault by themselves.
 void NoteName(const Check::Finding& finding, const Netlist& netlist, FaultyNames& faulty) {
     if (IsAttributeKind(finding.cause.kind)) {
@@ -222,7 +229,7 @@ bool Plan::IsNothing(const Signal& signal) const noexcept {
 }
 
 void Plan::Note(Check::Finding& finding) {
-    if (IsOneOf(finding, Unmendable)) {
+    if (IsBeyondMending(finding)) {
         Refuse(finding);
     } else if (IsAttributeKind(finding.cause.kind) && AttributeOf(finding) != nullptr &&
                (IsOneOf(finding, OfConstants) || Is(finding, RuleId::GenericDigits))) {
@@ -242,17 +249,10 @@ void Plan::Note(Check::Finding& finding) {
         undeclared_.insert(Lower(finding.cause.second));
     } else if (Is(finding, RuleId::UndeclaredGeneric)) {
         NoteGeneric(finding);
-    } else if (Is(finding, RuleId::CharacterInValue)) {
-        if (!CanBeEscaped(*AttributeOf(finding))) {
-            Refuse(finding);
-        }
     } else if (Is(finding, RuleId::DirectiveComment)) {
         hasDirectives_ = true;
     } else if (Is(finding, RuleId::UndeclaredComponent)) {
         options_.vhdl.suppressComponent = false;
-    } else if (Is(finding, RuleId::IncludeFile) &&
-               finding.cause.first.find_first_not_of("\" ") != std::string::npos) {
-        Refuse(finding);
     }
 }
 
