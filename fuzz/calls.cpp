@@ -1,5 +1,5 @@
-// The input chooses a sequence of calls of the class interface on one design, in any order: making,
-// wiring, renaming, removing, copying, widening, writing.
+// The input chooses calls of the class interface on one design, in any order: they create, connect,
+// rename, remove, copy and widen objects and write the netlist.
 
 #include "Bytes.h"
 #include "Check.h"
@@ -70,7 +70,7 @@ public:
             try {
                 Call();
             } catch (const Orn_Hdl::Exception&) {
-                // An operation by name refuses what does not fit.
+                // An operation by name throws if its arguments do not fit.
             }
             if (checks_ == Checks::All && i % CallsPerCheck == 0) {
                 Fuzz::CheckNetlist(GetNetlist(), GetLoose());
@@ -251,7 +251,7 @@ private:
             GetNetlist().Add(loose_.back().release());
             loose_.pop_back();
         } else {
-            // What is held already is not held twice.
+            // The netlist holds the signal already, so nothing is added.
             GetNetlist().Add(PickSignal());
         }
     }
@@ -442,7 +442,7 @@ private:
             }
             return;
         default:
-            // Removed and made anew under the same name.
+            // The signal is removed, and a new one is added under its name.
             if (Signal* signal = PickSignal()) {
                 const std::string name(signal->GetNameView());
                 GetNetlist().Remove(signal);
