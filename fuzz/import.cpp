@@ -1,5 +1,5 @@
-// The input is a JSON netlist behind a byte of options. Whatever is not refused becomes the same
-// netlist by way of a model and by way of a command file.
+// The input is two bytes of options and a JSON netlist. If the netlist is not refused, it is
+// imported into a model and into a command file, and both give the same netlist.
 
 #include "Bytes.h"
 #include "Check.h"
@@ -93,7 +93,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         Import::Warnings warnings;
         CheckImport(Import::MakeNetlist(*design, top, rules, warnings));
     } catch (const Import::Error&) {
-        // What is no netlist, or cannot be imported, is told.
+        // The input is no netlist, or cannot be imported.
     }
     return 0;
 }
