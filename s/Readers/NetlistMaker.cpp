@@ -312,7 +312,7 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         name = MakeUnique(name);
     }
     auto component = std::make_unique<Component>(name.c_str());
-    const std::string problem = MakePins(head, *component);
+    std::string problem = MakePins(head, *component);
     if (!problem.empty()) {
         return problem;
     }
