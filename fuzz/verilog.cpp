@@ -47,7 +47,8 @@ bool IsPlain(std::string_view text) {
            text.find("pragma") == std::string_view::npos;
 }
 
-void CheckReadBack(Fuzz::MemoryFiles& files, Model& model) {
+void CheckReadBack(Model& model) {
+    Fuzz::MemoryFiles files;
     files.Put("back.v", WriteVerilog(model));
     CommandFactory factory;
     Model back(&factory);
@@ -86,7 +87,7 @@ void Run(Fuzz::Bytes bytes) {
     Fuzz::CheckNames(*model.GetNetlist());
     Fuzz::WriteWithChecks(*model.GetNetlist(), *model.GetOptions());
     if (!isLiteral && IsPlain(bytes.Rest())) {
-        CheckReadBack(files, model);
+        CheckReadBack(model);
     }
 }
 
