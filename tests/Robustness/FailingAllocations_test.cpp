@@ -404,6 +404,35 @@ TEST(FailingAllocation, ADoneCommandThatIsNotKeptEnds) {
     EXPECT_EQ(ended, made);
 }
 
+TEST(FailingAllocation, AModelThatIsNotReadStaysAsItWas) {
+    const Support::TemporaryFolder folder;
+    const std::string file = folder / "top.v";
+    Support::WriteWholeFile(
+        file, "`define W [3:0]\nmodule INV #(parameter P = 8'h00)(input I, output O); endmodule\n"
+              "// a comment\nmodule top(input a, output `W y); wire `W \\w.x , W, w;\n"
+              "(* LOC = \"P1\" *) INV #(.P(1)) u(.I(1'b0), .O(y[0])), \\u.1 (y[0], W[0]);\n"
+              "assign {y[3], y[2:1]} = {w[0], 2'b10}; defparam u.P = 8'h0F;\n"
+              "// synthesis attribute P of u is \"0F\"\nendmodule\n");
+    const int openFiles = Support::CountOpenFiles();
+    Orn_Hdl::CommandFactory factory;
+    FailInTurn([&] {
+        Orn_Hdl::Model model(&factory);
+        model.AddSignal("former");
+        Orn_Hdl::VerilogReader reader;
+        reader.KeepComments(true);
+        reader.SetTop("top");
+        try {
+            reader.Read(file.c_str(), model);
+        } catch (const std::bad_alloc&) {
+            EXPECT_NE(model.GetSignal("former"), nullptr);
+            throw;
+        }
+        EXPECT_EQ(model.GetSignal("former"), nullptr);
+        EXPECT_NE(model.GetInstance("u_1"), nullptr);
+    });
+    EXPECT_EQ(Support::CountOpenFiles(), openFiles);
+}
+
 TEST(FailingAllocation, AnyOneMayFail) {
     const Support::TemporaryFolder folder;
     const std::string file = folder / "netlist";
