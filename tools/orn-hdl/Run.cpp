@@ -4,6 +4,7 @@
 #include "Port/File.h"
 #include "Progress.h"
 #include "check/WriteGate.h"
+#include "warnings/SlipFinder.h"
 
 #include <cstdint>
 #include <string_view>
@@ -23,8 +24,15 @@ constexpr const char* NamelessModel = "HDL_NETLIST";
 /// The replay of one file: its progress, messages and status.
 class Replayer {
 public:
-    Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate)
-        : model_(model), file_(file), gate_(gate) {}
+    Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate,
+             const WarningOptions* warnings)
+        : model_(model), file_(file), gate_(gate), asErrors_(warnings && warnings->areErrors) {
+        if (warnings != nullptr && !warnings->dropped.all()) {
+            slips_.emplace(model, *warnings, [this](const FoundSlip& found) { Report(found); });
+        }
+    }
+    Replayer(const Replayer&) = delete;
+    Replayer& operator=(const Replayer&) = delete;
 
     /// Executes one line, which ends at `position` in the file. \return whether it succeeded.
     bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
@@ -41,13 +49,21 @@ public:
         } catch (const Orn_Hdl::Exception& exception) {
             Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
             status_ = Worse(status_, Status::Failed);
+            if (slips_) {
+                slips_->Skip();
+            }
             return false;
+        }
+        if (slips_) {
+            words_ = &words;
+            slips_->Look(words);
         }
         return model_.GetWriteError() == 0 || ReportWriteError(words);
     }
 
     Status GetStatus() const noexcept { return status_; }
     std::uint64_t GetLineCount() const noexcept { return lines_; }
+    std::uint64_t GetSlipCount() const noexcept { return slipCount_; }
 
 private:
     static std::string_view WithoutLineEnd(std::string_view text) noexcept {
@@ -61,6 +77,20 @@ private:
         Diagnostic diagnostic;
         diagnostic.place = file_.lines.GetPlace(lines_, words);
         diagnostic.message = text;
+        file_.reporter.Report(std::move(diagnostic));
+    }
+
+    /// Reports a slip in the present line.
+    void Report(const FoundSlip& found) {
+        const Warning& warning = GetWarning(found.slip);
+        ++slipCount_;
+        Diagnostic diagnostic;
+        diagnostic.severity = asErrors_ ? Severity::Error : Severity::Warning;
+        diagnostic.rule = warning.name;
+        diagnostic.place = file_.lines.GetPlace(lines_, *words_, found.mark);
+        diagnostic.message = found.message;
+        diagnostic.notes.push_back(
+            {found.hint.empty() ? "what helps: " + std::string(warning.help) : found.hint});
         file_.reporter.Report(std::move(diagnostic));
     }
 
@@ -82,6 +112,12 @@ private:
     Orn_Hdl::Model& model_;
     CommandFile& file_;
     Checking::WriteGate* const gate_;
+    const bool asErrors_;
+    /// Without a value if no slips are reported.
+    std::optional<SlipFinder> slips_;
+    /// The line that `slips_` looks at.
+    const Orn_Hdl::StringArray* words_ = nullptr;
+    std::uint64_t slipCount_ = 0;
     std::uint64_t lines_ = 0;
     Status status_ = Status::Success;
 };
@@ -104,7 +140,7 @@ CommandFile::CommandFile(const std::string& fileName, const ReportOptions& repor
       reporter(report, [&shownProgress] { shownProgress.Erase(); }) {}
 
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const WriteRules& rules,
-                Checking::WriteGate* gate) {
+                Checking::WriteGate* gate, const WarningOptions* warnings) {
     Orn_Hdl::CommandReader input(model);
     if (!input.Open(SystemFileName(file.name.c_str()))) {
         return {ComplainUnreadable(file.name, input.GetError()), false, 0};
@@ -115,7 +151,7 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
     } catch (const std::system_error& error) {
         return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false, 0};
     }
-    Replayer replayer(model, file, gate);
+    Replayer replayer(model, file, gate, warnings);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
         if (!replayer.Execute(*words, input.GetPosition()) &&
             (!keepGoing || file.reporter.IsAtLimit())) {
@@ -126,7 +162,7 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
         file.progress.Erase();
         return {ComplainUnreadable(file.name, input.GetError()), false, 0};
     }
-    return {replayer.GetStatus(), true, replayer.GetLineCount()};
+    return {replayer.GetStatus(), true, replayer.GetLineCount(), replayer.GetSlipCount()};
 }
 
 namespace {
@@ -134,10 +170,13 @@ namespace {
 /// Replays the file of the options and writes its netlists.
 Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
     Checking::WriteGate gate(model, file.lines, file.reporter);
-    const Replayed replayed =
-        Replay(model, file, options.keepGoing, options.writeRules, options.check ? &gate : nullptr);
+    const Replayed replayed = Replay(model, file, options.keepGoing, options.writeRules,
+                                     options.check ? &gate : nullptr, &options.warnings);
     if (!replayed.complete) {
         return replayed.status;
+    }
+    if (options.warnings.areErrors && replayed.slips > 0) {
+        return Worse(replayed.status, Status::Failed);
     }
     Outputs outputs = options.outputs;
     Status status = replayed.status;
@@ -163,7 +202,7 @@ Status Run(const RunOptions& options) {
     const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
     const Status status = ReplayAndWrite(*engine->GetModel(name.c_str()), file, options);
-    file.reporter.Finish();
+    file.reporter.Finish(GetWarningRules());
     return status;
 }
 

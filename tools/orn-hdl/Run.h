@@ -6,6 +6,7 @@
 #include "WriteRules.h"
 #include "diagnostics/CommandLines.h"
 #include "diagnostics/Reporter.h"
+#include "warnings/Table.h"
 
 #include <cstdint>
 #include <optional>
@@ -36,6 +37,7 @@ struct RunOptions {
     /// Write nothing that has errors for its language.
     bool check = false;
     ReportOptions report;
+    WarningOptions warnings;
 };
 
 Status Run(const RunOptions& options);
@@ -51,6 +53,8 @@ struct Replayed {
     bool complete = false;
     /// How many lines were replayed.
     std::uint64_t lines = 0;
+    /// How many slips were found.
+    std::uint64_t slips = 0;
 };
 
 /// A command file, and where messages about it go.
@@ -67,7 +71,9 @@ struct CommandFile {
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
 /// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
 /// \param gate decides which lines may write; null when all may.
+/// \param warnings the slips that are reported; null for none.
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing,
-                const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr);
+                const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr,
+                const WarningOptions* warnings = nullptr);
 
 } // namespace Tool
