@@ -95,7 +95,9 @@ void Generate(const Options& options) {
         Find(bench::GetFormats(), options.format).write(out, design);
     } else {
         const bench::Shape& shape = Find(bench::GetShapes(), options.shape);
-        out << "SET NETLIST NAME shape\n";
+        if (shape.reader == bench::Reader::Run) {
+            out << "SET NETLIST NAME shape\n";
+        }
         shape.write(out, options.size);
     }
     out.Flush();

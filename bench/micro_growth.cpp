@@ -5,7 +5,9 @@
 
 #include <benchmark/benchmark.h>
 
+#include <algorithm>
 #include <memory>
+#include <random>
 #include <string>
 #include <vector>
 
@@ -44,17 +46,72 @@ std::vector<Instance*> AddInstances(Netlist& netlist, int count) {
     return instances;
 }
 
+template <class T> void RemoveEach(Netlist& netlist, const std::vector<T*>& objects) {
+    for (T* object : objects) {
+        netlist.Remove(object);
+    }
+}
+
 /// All instances of a design, the first one first.
 void RemoveInstances(benchmark::State& state) {
     TimeOnFreshNetlists(
         state, [&](Netlist& netlist) { return AddInstances(netlist, SizeOf(state)); },
-        [](Netlist& netlist, const std::vector<Instance*>& instances) {
-            for (Instance* instance : instances) {
-                netlist.Remove(instance);
-            }
-        });
+        RemoveEach<Instance>);
 }
 BENCHMARK(RemoveInstances)->Arg(25'000)->Arg(50'000)->Arg(100'000)->Unit(benchmark::kMillisecond);
+
+/// Objects of a design in no order that it knows of.
+template <class T> std::vector<T*> Shuffled(std::vector<T*> objects) {
+    std::shuffle(objects.begin(), objects.end(), std::mt19937(1));
+    return objects;
+}
+
+/// Half of the objects of a design.
+template <class T, class Make> void RemoveRandom(benchmark::State& state, Make make) {
+    TimeOnFreshNetlists(
+        state,
+        [&](Netlist& netlist) {
+            std::vector<T*> objects;
+            for (int i = 0; i < SizeOf(state); ++i) {
+                objects.push_back(make(bench::Numbered("X", i)));
+                netlist.Add(objects.back());
+            }
+            objects = Shuffled(objects);
+            objects.resize(objects.size() / 2);
+            return objects;
+        },
+        RemoveEach<T>);
+}
+
+void RemoveRandomInstances(benchmark::State& state) {
+    RemoveRandom<Instance>(
+        state, [](const std::string& name) { return new Instance(name.c_str(), nullptr); });
+}
+BENCHMARK(RemoveRandomInstances)
+    ->Arg(100'000)
+    ->Arg(300'000)
+    ->Arg(1'000'000)
+    ->Unit(benchmark::kMillisecond);
+
+void RemoveRandomSignals(benchmark::State& state) {
+    RemoveRandom<Signal>(state,
+                         [](const std::string& name) { return new ScalarSignal(name.c_str()); });
+}
+BENCHMARK(RemoveRandomSignals)
+    ->Arg(100'000)
+    ->Arg(300'000)
+    ->Arg(1'000'000)
+    ->Unit(benchmark::kMillisecond);
+
+void RemoveRandomComponents(benchmark::State& state) {
+    RemoveRandom<Component>(state,
+                            [](const std::string& name) { return new Component(name.c_str()); });
+}
+BENCHMARK(RemoveRandomComponents)
+    ->Arg(100'000)
+    ->Arg(300'000)
+    ->Arg(1'000'000)
+    ->Unit(benchmark::kMillisecond);
 
 struct Net {
     std::unique_ptr<Component> component;

@@ -3,6 +3,8 @@
 #include "design.h"
 
 #include <array>
+#include <string>
+#include <string_view>
 
 namespace bench {
 
@@ -169,7 +171,73 @@ void WriteComment(Output& out, std::size_t size) {
     }
 }
 
-constexpr std::array<Shape, 14> Shapes = {{
+/// `size` instances and nets, whose names have 4 kB and differ at their ends.
+void WriteLongNames(Output& out, std::size_t size) {
+    const std::string common(4000, 'x');
+    out << "ADD COMPONENT INV\nADD PIN INV A INPUT\nADD PIN INV O OUTPUT\n";
+    for (std::size_t k = 0; k < size; ++k) {
+        out << "ADD INSTANCE INV u" << common << k << "\nCONNECT SIGNAL n" << common
+            << (k + size - 1) % size << " u" << common << k << ".A\nCONNECT SIGNAL n" << common << k
+            << " u" << common << k << ".O\n";
+    }
+}
+
+/// The frame of a JSON netlist around cells that `writeCells` writes.
+template <class WriteCells> void WriteModule(Output& out, WriteCells writeCells) {
+    out << R"({"modules": {"shape": {"ports": {"p": {"direction": "input", "bits": [2]}}, )"
+        << R"("cells": {)" << '\n';
+    writeCells();
+    out << R"(}, "netnames": {}}}})" << '\n';
+}
+
+/// One imported cell: its number, its only parameter's name, its only pin's name and net.
+void WriteCell(Output& out, std::size_t cell, std::string_view parameter, std::size_t pin,
+               std::size_t net) {
+    out << (cell == 0 ? "" : ",\n") << R"("u)" << cell << R"(": {"type": "C", "parameters": {"P)"
+        << parameter << R"(": "1"}, "port_directions": {"A)" << pin
+        << R"(": "input"}, "connections": {"A)" << pin << R"(": [)" << net << "]}}";
+}
+
+/// One imported cell with `size` parameters.
+void WriteImportedParameters(Output& out, std::size_t size) {
+    WriteModule(out, [&] {
+        out << R"("u": {"type": "C", "parameters": {)";
+        for (std::size_t k = 0; k < size; ++k) {
+            out << (k == 0 ? R"("P)" : R"(, "P)") << k << R"(": "1")";
+        }
+        out << R"(}, "port_directions": {"A": "input"}, "connections": {"A": [2]}})";
+    });
+}
+
+/// `size` imported cells of one type, each of which adds a parameter to it.
+void WriteImportedTypes(Output& out, std::size_t size) {
+    WriteModule(out, [&] {
+        for (std::size_t k = 0; k < size; ++k) {
+            WriteCell(out, k, std::to_string(k), 0, 2);
+        }
+    });
+}
+
+/// `size` imported cells of one type, each of which adds a pin to it.
+void WriteImportedPins(Output& out, std::size_t size) {
+    WriteModule(out, [&] {
+        for (std::size_t k = 0; k < size; ++k) {
+            WriteCell(out, k, "", k, 2);
+        }
+    });
+}
+
+/// `size` imported cells on bits whose numbers are far apart.
+void WriteImportedBits(Output& out, std::size_t size) {
+    constexpr std::size_t Distance = 100'003;
+    WriteModule(out, [&] {
+        for (std::size_t k = 0; k < size; ++k) {
+            WriteCell(out, k, "", 0, 3 + k * Distance);
+        }
+    });
+}
+
+constexpr std::array<Shape, 19> Shapes = {{
     {"clock", "one net with N loads", WriteClock},
     {"alias-chain", "N signals aliased in four chains", WriteAliasChain},
     {"readback", "N output ports that are read inside", WriteReadback},
@@ -184,6 +252,15 @@ constexpr std::array<Shape, 14> Shapes = {{
     {"components", "N components, one instance each", WriteComponents},
     {"attributes", "N attributes on the module", WriteAttributes},
     {"comment", "a comment of N bytes", WriteComment},
+    {"long-names", "N instances and nets with names of 4 kB", WriteLongNames},
+    {"import-parameters", "an imported cell with N parameters", WriteImportedParameters,
+     Reader::Import},
+    {"import-types", "N imported cells, each adds a parameter to their type", WriteImportedTypes,
+     Reader::Import},
+    {"import-pins", "N imported cells, each adds a pin to their type", WriteImportedPins,
+     Reader::Import},
+    {"import-bits", "N imported cells on bits with numbers far apart", WriteImportedBits,
+     Reader::Import},
 }};
 
 } // namespace

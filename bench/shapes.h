@@ -11,10 +11,14 @@
 
 namespace bench {
 
+/// What a program reads a shape with.
+enum class Reader { Run, Import };
+
 struct Shape {
     std::string_view name;
     std::string_view description;
     void (*write)(Output& out, std::size_t size);
+    Reader reader = Reader::Run;
 };
 
 std::span<const Shape> GetShapes() noexcept;

@@ -24,8 +24,8 @@ using Fuzz::Check;
 using namespace Orn_Hdl;
 namespace Import = Tool::Import;
 
-Import::UnknownValues PickUnknownValues(Fuzz::Bytes& bytes) {
-    switch (bytes.Choose(4)) {
+Import::UnknownValues PickUnknownValues(int choice) {
+    switch (choice) {
     case 0:
         return Import::UnknownValues(Import::Zero);
     case 1:
@@ -33,6 +33,15 @@ Import::UnknownValues PickUnknownValues(Fuzz::Bytes& bytes) {
     default:
         return Import::UnknownValues(std::nullopt);
     }
+}
+
+Import::ImportRules PickRules(Fuzz::Bytes& bytes) {
+    using Import::NameLanguages;
+    constexpr NameLanguages Languages[] = {NameLanguages::Both, NameLanguages::Verilog,
+                                           NameLanguages::Vhdl};
+    const int choice = bytes.Choose(24);
+    const Import::NameRules names(Languages[choice / 4 % 3], true);
+    return Import::ImportRules{PickUnknownValues(choice % 4), names, choice >= 12};
 }
 
 std::string WriteCommands(const Import::ImportedNetlist& netlist) {
@@ -74,14 +83,14 @@ void CheckImport(const Import::ImportedNetlist& netlist) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     Fuzz::Bytes bytes(data, size);
-    const Import::UnknownValues unknown = PickUnknownValues(bytes);
+    const Import::ImportRules rules = PickRules(bytes);
     const bool keepAttributes = bytes.Choose(2) == 0;
     try {
         const std::unique_ptr<Import::ImportedDesign> design =
             Import::ReadDesign(std::string(bytes.Rest()), keepAttributes);
         Import::Module& top = Import::FindTop(*design, "");
         Import::Warnings warnings;
-        CheckImport(Import::MakeNetlist(*design, top, unknown, warnings));
+        CheckImport(Import::MakeNetlist(*design, top, rules, warnings));
     } catch (const Import::Error&) {
         // What is no netlist, or cannot be imported, is told.
     }

@@ -70,7 +70,7 @@ public:
     /// Adds a finding. \return null when no target that counts minds; the message and what else
     /// there is to say are the caller's to fill in.
     Finding* Add(RuleId rule, const Verdicts& verdicts, Cause cause);
-    /// The same with the verdicts that the rule has in general.
+    /// Adds a finding with the verdicts that the rule has in general.
     Finding* Add(RuleId rule, Cause cause) {
         return Add(rule, GetRule(rule).verdicts, std::move(cause));
     }

@@ -34,7 +34,7 @@ struct Digits {
     }
     /// Whether VHDL-93, or 2008, reads a bit string or, without a length, a string of std_logic.
     bool IsVhdlString(bool is2008) const;
-    /// The same for a bit vector, which has no bits but 0 and 1.
+    /// Whether VHDL-93, or 2008, reads a bit vector, which has no bits but 0 and 1.
     bool IsVhdlBitVector() const;
     /// How many elements VHDL's string has.
     std::size_t GetVhdlLength() const;

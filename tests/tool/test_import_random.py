@@ -110,11 +110,18 @@ class RandomDesigns(ImportTest):
                 before, after = contents["modules"]["top"], self.read_back(contents)
                 self.compare_wiring(before, after["modules"]["top"])
 
-    def read_back(self, contents: Json) -> Json:
+    def test_connectivity_survives_with_names_of_verilog(self) -> None:
+        for seed in range(FIRST_SEED, LAST_SEED + 1):
+            with self.subTest(seed=seed):
+                contents = Generator(seed).make()
+                after = self.read_back(contents, "--names", "verilog")
+                self.compare_wiring(contents["modules"]["top"], after["modules"]["top"])
+
+    def read_back(self, contents: Json, *options: str) -> Json:
         """What Yosys reads of the written Verilog."""
         (self.folder / "d.json").write_text(json.dumps(contents), encoding="utf-8")
         outcome = self.run_tool("import", "d.json", "-o", "x.cmd", "--verilog", "x.v",
-                                "--name-map", "x.map")
+                                "--name-map", "x.map", *options)
         self.assertEqual(outcome.status, SUCCESS, outcome.err)
         self.expect(self.run_tool("run", "x.cmd", "--verilog", "r.v", "--model", "any"), SUCCESS)
         self.assertEqual(self.read("x.v").replace("x.v", "r.v"), self.read("r.v"))

@@ -11,7 +11,7 @@ import threading
 import unittest
 from collections.abc import Callable
 
-from support import EXAMPLES, FAILED, FILE, INVERTER, SUCCESS, TOOL, USAGE, ToolTest
+from support import EXAMPLES, FAILED, FILE, INVERTER, SUCCESS, TOOL, USAGE, ToolTest, lone_add
 
 
 class Replay(ToolTest):
@@ -47,8 +47,7 @@ class Replay(ToolTest):
 
     def test_standard_input_is_called_a_dash(self) -> None:
         self.expect(self.run_tool("run", "-", stdin="NOOP\nADD\n"), FAILED,
-                    "-:2: error: Command not find.\n"
-                    "    2 | ADD\n")
+                    "-:2: error: Command not find.\n" + lone_add(2))
 
     def test_empty_file(self) -> None:
         self.write("empty", "")
@@ -58,8 +57,7 @@ class Replay(ToolTest):
     def test_last_line_without_line_end(self) -> None:
         self.write("d.cmd", "NOOP\nADD")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
-                    "d.cmd:2: error: Command not find.\n"
-                    "    2 | ADD\n")
+                    "d.cmd:2: error: Command not find.\n" + lone_add(2))
 
     def test_carriage_returns(self) -> None:
         self.write("dos.cmd", INVERTER.replace("\n", "\r\n"))
@@ -73,51 +71,63 @@ class Replay(ToolTest):
         self.write("d.cmd", "ADD SIGNAL a\0b c\nADD SIGNAL a\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
                     'd.cmd:2: error: Identifier "a" already defined.\n'
-                    "    2 | ADD SIGNAL a\n")
+                    "    2 | ADD SIGNAL a\n"
+                    "      |            ^\n"
+                    "d.cmd:1: note: a is a signal, added here\n"
+                    "    1 | ADD SIGNAL a\n"
+                    "      |            ^\n")
 
     def test_blank_lines_count(self) -> None:
         self.write("d.cmd", "\n   \n\r\nADD\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
-                    "d.cmd:4: error: Command not find.\n"
-                    "    4 | ADD\n")
+                    "d.cmd:4: error: Command not find.\n" + lone_add(4))
 
     def test_long_line(self) -> None:
         name = "x" * 3_000_000
         self.write("d.cmd", f"ADD SIGNAL {name}\nADD SIGNAL {name}\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
                     f'd.cmd:2: error: Identifier "{name}" already defined.\n'
-                    f"    2 | ADD SIGNAL {'x' * 149}...\n")
+                    f"    2 | ADD SIGNAL {'x' * 149}...\n"
+                    f"      |            ^{'~' * 148}\n"
+                    f"d.cmd:1: note: {'x' * 60}... is a signal, added here\n"
+                    f"    1 | ADD SIGNAL {'x' * 149}...\n"
+                    f"      |            ^{'~' * 148}\n")
 
     def test_the_file_is_called_as_given(self) -> None:
         self.write("d.cmd", "ADD\n")
         self.expect(self.run_tool("run", "./d.cmd"), FAILED,
-                    "./d.cmd:1: error: Command not find.\n"
-                    "    1 | ADD\n")
+                    "./d.cmd:1: error: Command not find.\n" + lone_add(1))
 
     def test_bytes_of_names_are_kept_in_messages(self) -> None:
         self.write("d.cmd", "CONNECT SIGNAL \xff\x80 \xe9%s.%n\n")
         self.expect(self.run_tool("run", "d.cmd"), FAILED,
                     'd.cmd:1: error: Signal "\xe9%s" not found.\n'
-                    "    1 | CONNECT SIGNAL \xff\x80 \xe9%s.%n\n")
+                    "    1 | CONNECT SIGNAL \xff\x80 \xe9%s.%n\n"
+                    "      |                   ^~~\n"
+                    "note: there is no instance \xe9%s\n")
 
 
 class Failures(ToolTest):
     def test_the_first_failure_ends_the_replay(self) -> None:
         self.write("d.cmd", "NOOP\nADD\nADD\n")
         self.expect(self.run_tool("run", "d.cmd", "--verilog", "o.v"), FAILED,
-                    "d.cmd:2: error: Command not find.\n"
-                    "    2 | ADD\n")
+                    "d.cmd:2: error: Command not find.\n" + lone_add(2))
         self.assertFalse((self.folder / "o.v").exists())
 
     def test_keep_going_reports_every_failure_and_writes(self) -> None:
         self.write("d.cmd", "ADD\n" + INVERTER + "SET NETLIST NAME\nADD PIN INV I input\n")
         self.expect(self.run_tool("run", "--keep-going", "d.cmd", "--verilog", "o.v"), FAILED,
-                    "d.cmd:1: error: Command not find.\n"
-                    "    1 | ADD\n"
+                    "d.cmd:1: error: Command not find.\n" + lone_add(1) +
                     "d.cmd:10: error: SET NETLIST NAME: Invalid Arguments.\n"
                     "   10 | SET NETLIST NAME\n"
+                    "      |                 ^\n"
+                    "note: <name> is missing: SET NETLIST NAME <name>\n"
                     'd.cmd:11: error: Component "INV" already has pin "I".\n'
                     "   11 | ADD PIN INV I input\n"
+                    "      |             ^\n"
+                    "d.cmd:3: note: I was added here\n"
+                    "    3 | ADD PIN INV I input\n"
+                    "      |             ^\n"
                     "3 errors\n")
         self.assertIn("INV U1", self.read("o.v"))
 
@@ -187,22 +197,25 @@ class Outputs(ToolTest):
         self.write("w.cmd", "NOOP\nWRITE VERILOG no/o.v\nADD\n")
         self.expect(self.run_tool("run", "w.cmd", "--vhdl", "o.vhd"), FILE,
                     "w.cmd:2: error: cannot write no/o.v: No such file or directory\n"
-                    "    2 | WRITE VERILOG no/o.v\n")
+                    "    2 | WRITE VERILOG no/o.v\n"
+                    "      |               ^~~~~~\n"
+                    "note: there is no folder no\n")
         self.assertFalse((self.folder / "o.vhd").exists())
 
     def test_write_line_to_a_full_device(self) -> None:
         self.write("w.cmd", INVERTER + "WRITE VHDL -APPEND /dev/full\n")
         self.expect(self.run_tool("run", "w.cmd"), FILE,
                     "w.cmd:9: error: cannot write /dev/full: No space left on device\n"
-                    "    9 | WRITE VHDL -APPEND /dev/full\n")
+                    "    9 | WRITE VHDL -APPEND /dev/full\n"
+                    "      |                    ^~~~~~~~~\n")
 
     def test_a_write_failure_is_reported_once_and_outweighs_a_failed_command(self) -> None:
         self.write("w.cmd", "WRITE VERILOG /dev/full\nNOOP\nADD\nWRITE VERILOG fine.v\n")
         self.expect(self.run_tool("run", "w.cmd", "--keep-going"), FILE,
                     "w.cmd:1: error: cannot write /dev/full: No space left on device\n"
                     "    1 | WRITE VERILOG /dev/full\n"
-                    "w.cmd:3: error: Command not find.\n"
-                    "    3 | ADD\n"
+                    "      |               ^~~~~~~~~\n"
+                    "w.cmd:3: error: Command not find.\n" + lone_add(3) +
                     "2 errors\n")
         self.assertTrue((self.folder / "fine.v").exists())
 
@@ -252,7 +265,7 @@ class Outputs(ToolTest):
         self.write("w.cmd", "ADD\n" + INVERTER)
         outcome = self.run_tool("run", "w.cmd", "--keep-going", "--verilog", "-", "--no-header")
         self.assertEqual((outcome.status, outcome.err),
-                         (FAILED, "w.cmd:1: error: Command not find.\n    1 | ADD\n"))
+                         (FAILED, "w.cmd:1: error: Command not find.\n" + lone_add(1)))
         self.assertTrue(outcome.out.startswith("`timescale"))
         self.assertTrue(outcome.out.endswith("endmodule\n"))
 
@@ -412,8 +425,10 @@ class WriteRules(ToolTest):
         self.expect(self.run_tool("run", "w.cmd", "--no-write", "--keep-going"), FAILED,
                     'w.cmd:9: error: Cannot write "a.v": --no-write is in force.\n'
                     "    9 | WRITE VERILOG a.v\n"
+                    "      |               ^~~\n"
                     'w.cmd:10: error: Cannot write "/dev/null": --no-write is in force.\n'
                     "   10 | WRITE VHDL -APPEND /dev/null\n"
+                    "      |                    ^~~~~~~~~\n"
                     "2 errors\n")
         self.assertEqual(self.all_files(), before)
 
@@ -421,7 +436,8 @@ class WriteRules(ToolTest):
         self.write("w.cmd", "WRITE VERILOG /a.v\nADD\n")
         self.expect(self.run_tool("run", "w.cmd", "--output-dir", "out"), FAILED,
                     'w.cmd:1: error: Cannot write "/a.v": it leads out of the output folder.\n'
-                    "    1 | WRITE VERILOG /a.v\n")
+                    "    1 | WRITE VERILOG /a.v\n"
+                    "      |               ^~~~\n")
 
     def test_folder_that_cannot_be_entered(self) -> None:
         self.write("w.cmd", "WRITE VERILOG a.v\n")
@@ -552,7 +568,8 @@ class ProgressDisplay(ToolTest):
 
     def test_shown_and_erased(self) -> None:
         def message(last: int) -> str:
-            return f"-:{last}: error: Command not find.\r\n{last:5} | ADD\r\n"
+            text = f"-:{last}: error: Command not find.\n{lone_add(last)}"
+            return text.replace("\n", "\r\n")
 
         shown, last = self.replay_until(lambda shown, _: b" lines" in shown)
         self.assertRegex(shown, r"^orn-hdl: \d+ lines")

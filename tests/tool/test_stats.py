@@ -136,7 +136,11 @@ class Stats(ToolTest):
         self.write("d.cmd", "ADD COMPONENT A\nADD COMPONENT A\n")
         self.expect(self.run_tool("stats", "d.cmd"), FAILED,
                     'd.cmd:2: error: Identifier "A" already defined.\n'
-                    "    2 | ADD COMPONENT A\n")
+                    "    2 | ADD COMPONENT A\n"
+                    "      |               ^\n"
+                    "d.cmd:1: note: A is a component, added here\n"
+                    "    1 | ADD COMPONENT A\n"
+                    "      |               ^\n")
         outcome = self.run_tool("stats", "missing.cmd")
         self.assertEqual((outcome.status, outcome.out), (FILE, ""))
         self.assertEqual(self.run_tool("stats", "d.cmd", "--format", "xml").status, USAGE)

@@ -210,6 +210,14 @@ class Warnings(ToolTest):
             "CONNECT SIGNAL Y(3:0) u2.D(3:0)\nCONNECT SIGNAL Y(2) u2.B(2)\n"
             "ASSIGN CONSTANT u1.B(2) 1\n" + write + "CONNECT SIGNAL Y(1) u2.I\n" + write), [])
 
+    def test_slips_behind_a_write(self) -> None:
+        # Each wider bus replaces another one, and the write forgets where these stood.
+        wider = "".join(f"CONNECT SIGNAL X({i}:0) Y({i}:0)\n" for i in range(40))
+        found = self.warn(wider + "WRITE VERILOG o.v\nCONNECT SIGNAL A Z[3]\nWRITE VERILOG o.v\n"
+                          "CONNECT SIGNAL Z[4] A\n")
+        self.assertEqual([(each["rule"], each["line"]) for each in found],
+                         [("bracket-net", 42), ("bracket-net", 44)])
+
     def test_lines_that_fail_are_not_warned_of(self) -> None:
         self.write("d.cmd", "ADD PORT D(7:0) input\nCONNECT SIGNAL D(9:0) nothing.I\n"
                    "CONNECT SIGNAL D u9.I\nCONNECT SIGNAL A[2] u9.I\nASSIGN CONSTANT u9.I 8\n"

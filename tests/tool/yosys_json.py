@@ -79,7 +79,8 @@ class ImportTest(ToolTest):
         self.assertEqual((outcome.status, outcome.out), (SUCCESS, ""), outcome.err)
         for language in ("verilog", "vhdl"):
             self.expect(self.run_tool("import", name, f"--{language}", f"x.{language}",
-                                      "--no-header", *options), SUCCESS, outcome.err)
+                                      "--names", "both", "--no-header", *options),
+                        SUCCESS, outcome.err)
             self.expect(self.run_tool("run", "x.cmd", f"--{language}", f"r.{language}",
                                       "--no-header"), SUCCESS)
             self.assertEqual(self.read(f"x.{language}"), self.read(f"r.{language}"))
@@ -142,13 +143,13 @@ class ImportTest(ToolTest):
         names = self.read_names()
         wiring = Wiring(self)
         for name, p in old["ports"].items():
-            other = new["ports"][names["port", escape(name)]]
+            other = find_named(new["ports"], names["port", escape(name)])
             for key in ("direction", "offset", "upto"):
                 self.assertEqual(p.get(key), other.get(key), name)
             wiring.meet_all(f"port {name}", p["bits"], other["bits"])
         self.assertEqual(len(old["cells"]), len(new["cells"]))
         for name, c in old["cells"].items():
-            other = new["cells"][names["cell", escape(name)]]
+            other = find_named(new["cells"], names["cell", escape(name)])
             self.assertEqual(re.sub(r"_\d+$", "", names["component", escape(c["type"])]),
                              re.sub(r"_\d+$", "", other["type"]))
             for pin, bits in c["connections"].items():
@@ -156,8 +157,11 @@ class ImportTest(ToolTest):
                 others = other["connections"].get(new_pin.partition("(")[0])
                 wiring.meet_pin(f"{name}.{pin}", bits, others)
 
-    def refuse(self, contents: Json | str | bytes, message: str, *options: str) -> None:
-        """Expects an import to fail with a message behind the file's name, and to write nothing."""
+    def refuse(self, contents: Json | str | bytes, message: str, *options: str, place: str = "") -> None:
+        """Expects an import to fail with a message behind the file's name, and to write nothing.
+
+        If the contents are no JSON, `place` is the mark under their only line.
+        """
         path = self.folder / "d.json"
         if isinstance(contents, bytes):
             path.write_bytes(contents)
@@ -166,7 +170,11 @@ class ImportTest(ToolTest):
                             encoding="utf-8")
         outcome = self.run_tool("import", "d.json", "-o", "x.cmd", "--verilog", "x.v", "--vhdl",
                                 "x.vhd", "--name-map", "x.map", *options)
-        self.expect(outcome, 1, f"d.json: error: {message}\n")
+        if place:
+            self.expect(outcome, 1, f"d.json:1: error: {message}\n    1 | {self.read('d.json')}\n"
+                                    f"      | {place}\n")
+        else:
+            self.expect(outcome, 1, f"d.json: error: {message}\n")
         self.assertEqual([p.name for p in self.folder.iterdir() if p.name.startswith("x.")], [])
 
 
@@ -202,6 +210,17 @@ class Wiring:
 def escape(name: str) -> str:
     """As a field of the name map."""
     return name.replace("\\", "\\\\").replace("\t", "\\t").replace("\n", "\\n")
+
+
+def identifier(name: str) -> str:
+    """A name without the marks of an escaped name."""
+    return name.removeprefix("\\").rstrip(" ")
+
+
+def find_named(objects: Json, name: str) -> Json:
+    """The object of a name; Yosys keeps the backslash before a "$" or a digit."""
+    plain = identifier(name)
+    return objects["\\" + plain if "\\" + plain in objects else plain]
 
 
 def make_stubs(commands: list[str]) -> list[str]:

@@ -1,5 +1,7 @@
 #include "Import.h"
 
+#include "explain/FileKind.h"
+#include "explain/Syntax.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
 #include "import/EmitNetlist.h"
@@ -50,6 +52,23 @@ Status ReadFile(const std::string& name, std::string& text) {
     return file.GetError() == 0 ? Status::Success : ComplainUnreadable(name, file.GetError());
 }
 
+/// A command file can be written in both languages.
+NameLanguages GetNameLanguages(const ImportOptions& options) {
+    const auto isWritten = [&](Orn_Hdl::Language language) {
+        const auto file = options.outputs.files.find(language);
+        return file != options.outputs.files.end() && !file->second.empty();
+    };
+    const bool verilog = isWritten(Orn_Hdl::Language::Verilog);
+    const bool vhdl = isWritten(Orn_Hdl::Language::Vhdl);
+    if (options.names) {
+        return *options.names;
+    }
+    if (!options.commandFile.empty() || verilog == vhdl) {
+        return NameLanguages::Both;
+    }
+    return verilog ? NameLanguages::Verilog : NameLanguages::Vhdl;
+}
+
 UnknownValues GetUnknownValues(const ImportOptions& options) {
     if (options.unknownAs.empty()) {
         return UnknownValues(std::nullopt);
@@ -89,31 +108,61 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
 
-void Report(const ImportOptions& options, Severity severity, std::string message,
-            Reporter& reporter) {
+/// How much of a file tells what it is.
+constexpr std::size_t BeginningSize = 4096;
+
+/// What the file is if it is no JSON; empty if that is not known.
+std::string DescribeKind(const std::string& beginning) {
+    const std::size_t first = beginning.find_first_not_of(" \t\r\n");
+    if (first == std::string::npos || beginning[first] == '{' || beginning[first] == '[') {
+        return {};
+    }
+    Orn_Hdl::StringArray words;
+    words.ParseCommandLine(beginning.substr(first, beginning.find_first_of("\r\n", first) - first));
+    return Explain::FindPhrase(words) != nullptr ? "this looks like a command file; use orn-hdl run"
+                                                 : DescribeFileKind(beginning);
+}
+
+/// \param beginning the beginning of the file.
+Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
+                     const std::string& beginning) {
+    const Import::TextPlace& place = error.GetPlace();
     Diagnostic diagnostic;
-    diagnostic.severity = severity;
+    diagnostic.place =
+        Tool::Place{options.file, place.line, place.source, Columns{place.column, 1}};
+    diagnostic.message = error.what();
+    if (const std::string kind = DescribeKind(beginning); !kind.empty()) {
+        diagnostic.notes.push_back({kind});
+    }
+    return diagnostic;
+}
+
+Diagnostic MakeWarning(const ImportOptions& options, std::string message) {
+    Diagnostic diagnostic;
+    diagnostic.severity = Severity::Warning;
     diagnostic.place.file = options.file;
     diagnostic.message = std::move(message);
-    reporter.Report(std::move(diagnostic));
+    return diagnostic;
 }
 
 /// Imports the text of a file.
 Status ImportText(std::string text, const ImportOptions& options, Reporter& reporter) {
+    const std::string beginning = text.substr(0, BeginningSize);
     try {
         const std::unique_ptr<ImportedDesign> design =
             ReadDesign(std::move(text), options.attributes);
         Module& top = FindTop(*design, options.top);
         Warnings warnings;
-        const ImportedNetlist netlist =
-            MakeNetlist(*design, top, GetUnknownValues(options), warnings);
+        const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
+        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts};
+        const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
         const Status written = WriteAll(netlist, options);
         for (std::string& warning : warnings.GetLines()) {
-            Report(options, Severity::Warning, std::move(warning), reporter);
+            reporter.Report(MakeWarning(options, std::move(warning)));
         }
         return written;
     } catch (const Import::Error& error) {
-        Report(options, Severity::Error, error.what(), reporter);
+        reporter.Report(MakeError(options, error, beginning));
         return Status::Failed;
     }
 }

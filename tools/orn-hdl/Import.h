@@ -4,7 +4,9 @@
 #include "Output.h"
 #include "Tool.h"
 #include "diagnostics/Reporter.h"
+#include "import/NameRules.h"
 
+#include <optional>
 #include <string>
 
 namespace Tool {
@@ -19,6 +21,10 @@ struct ImportOptions {
     Outputs outputs;
     /// The replacement of x and z, "0" or "1"; empty to reject them.
     std::string unknownAs;
+    /// The languages in which names must be legal; without one, those of the netlists.
+    std::optional<Import::NameLanguages> names;
+    /// Reject a design whose ports cannot keep their names.
+    bool keepPorts = false;
     /// Import the attributes of cells and nets.
     bool attributes = false;
     /// The file for the table of old and new names; empty for none.

@@ -4,6 +4,7 @@
 #include "Port/File.h"
 #include "Progress.h"
 #include "check/WriteGate.h"
+#include "explain/FailureExplainer.h"
 #include "warnings/SlipFinder.h"
 
 #include <cstdint>
@@ -26,7 +27,8 @@ class Replayer {
 public:
     Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate,
              const WarningOptions* warnings)
-        : model_(model), file_(file), gate_(gate), asErrors_(warnings && warnings->areErrors) {
+        : model_(model), file_(file), gate_(gate), explainer_(model, file.lines),
+          asErrors_(warnings != nullptr && warnings->areErrors) {
         if (warnings != nullptr && !warnings->dropped.all()) {
             slips_.emplace(model, *warnings, [this](const FoundSlip& found) { Report(found); });
         }
@@ -47,7 +49,7 @@ public:
         try {
             model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
-            Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
+            Report(words, exception.getLocalized().GetView());
             status_ = Worse(status_, Status::Failed);
             if (slips_) {
                 slips_->Skip();
@@ -66,18 +68,8 @@ public:
     std::uint64_t GetSlipCount() const noexcept { return slipCount_; }
 
 private:
-    static std::string_view WithoutLineEnd(std::string_view text) noexcept {
-        if (!text.empty() && text.back() == '\n') {
-            text.remove_suffix(1);
-        }
-        return text;
-    }
-
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
-        Diagnostic diagnostic;
-        diagnostic.place = file_.lines.GetPlace(lines_, words);
-        diagnostic.message = text;
-        file_.reporter.Report(std::move(diagnostic));
+        file_.reporter.Report(explainer_.Explain(lines_, words, text));
     }
 
     /// Reports a slip in the present line.
@@ -112,6 +104,7 @@ private:
     Orn_Hdl::Model& model_;
     CommandFile& file_;
     Checking::WriteGate* const gate_;
+    FailureExplainer explainer_;
     const bool asErrors_;
     /// Without a value if no slips are reported.
     std::optional<SlipFinder> slips_;

@@ -7,6 +7,7 @@
 #include "Tool.h"
 #include "check/Check.h"
 #include "diagnostics/Nearest.h"
+#include "explain/Syntax.h"
 #include "stats/Stats.h"
 #include "warnings/WarningsPage.h"
 
@@ -19,10 +20,10 @@
 #include <algorithm>
 #include <exception>
 #include <functional>
-#include <map>
 #include <new>
 #include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace {
@@ -36,6 +37,18 @@ std::string CheckFileName(const std::string& name) {
 
 std::string CheckDigit(const std::string& text) {
     return text == "0" || text == "1" ? "" : "0 or 1 is needed";
+}
+
+const std::map<std::string, Tool::Import::NameLanguages>& GetNameLanguages() {
+    using Tool::Import::NameLanguages;
+    static const std::map<std::string, NameLanguages> words = {{"verilog", NameLanguages::Verilog},
+                                                               {"vhdl", NameLanguages::Vhdl},
+                                                               {"both", NameLanguages::Both}};
+    return words;
+}
+
+std::string CheckNameLanguages(const std::string& text) {
+    return GetNameLanguages().count(text) != 0 ? "" : "verilog, vhdl or both is needed";
 }
 
 CLI::Option* AddFile(CLI::App& command, const std::string& option, std::string& name,
@@ -67,23 +80,44 @@ void AddWriteRules(CLI::App& command, Tool::WriteRules& rules) {
         ->excludes(folder);
 }
 
+/// An option whose value is one of a few words.
+template <class Value>
+void AddChoice(CLI::App& command, const std::string& option, Value& value,
+               const std::vector<std::pair<std::string, Value>>& choices, const std::string& help) {
+    std::vector<std::string> words;
+    std::string type;
+    for (const auto& [word, meaning] : choices) {
+        type.append(type.empty() ? "" : "|").append(word);
+        words.push_back(word);
+    }
+    const auto check = [words](const std::string& word) {
+        return std::find(words.begin(), words.end(), word) != words.end()
+                   ? std::string()
+                   : "\"" + word + "\" is none of " + Tool::Explain::JoinChoices(words, "and");
+    };
+    const auto take = [choices, &value](const std::string& word) {
+        for (const auto& [name, meaning] : choices) {
+            value = name == word ? meaning : value;
+        }
+    };
+    command.add_option_function<std::string>(option, take, help)->check(check)->type_name(type);
+}
+
 void AddFormat(CLI::App& command, const std::string& option, Tool::ReportOptions& report,
                const std::string& help) {
-    command.add_option(option, report.format, help)
-        ->transform(CLI::CheckedTransformer(
-            std::map<std::string, Tool::ReportFormat>{{"text", Tool::ReportFormat::Text},
-                                                      {"json", Tool::ReportFormat::Json},
-                                                      {"sarif", Tool::ReportFormat::Sarif}}))
-        ->type_name("text|json|sarif");
+    AddChoice<Tool::ReportFormat>(command, option, report.format,
+                                  {{"text", Tool::ReportFormat::Text},
+                                   {"json", Tool::ReportFormat::Json},
+                                   {"sarif", Tool::ReportFormat::Sarif}},
+                                  help);
 }
 
 void AddColor(CLI::App& command, Tool::ReportOptions& report) {
-    command.add_option("--color", report.color, "Colour messages; auto colours for a terminal")
-        ->transform(CLI::CheckedTransformer(
-            std::map<std::string, Tool::ColorChoice>{{"auto", Tool::ColorChoice::Auto},
-                                                     {"always", Tool::ColorChoice::Always},
-                                                     {"never", Tool::ColorChoice::Never}}))
-        ->type_name("auto|always|never");
+    AddChoice<Tool::ColorChoice>(command, "--color", report.color,
+                                 {{"auto", Tool::ColorChoice::Auto},
+                                  {"always", Tool::ColorChoice::Always},
+                                  {"never", Tool::ColorChoice::Never}},
+                                 "Colour messages; auto colours for a terminal");
 }
 
 /// The options of messages on standard error.
@@ -271,6 +305,15 @@ private:
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
+        const auto setNames = [this](const std::string& word) {
+            import_.names = GetNameLanguages().at(word);
+        };
+        command
+            .add_option_function<std::string>("--names", setNames,
+                                              "Make names legal in these languages")
+            ->type_name("verilog|vhdl|both")
+            ->check(CheckNameLanguages);
+        command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
         command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")
             ->check(CheckDigit);
@@ -292,8 +335,9 @@ private:
         command
             .add_option("--target", check_.targets, "Whose rules count, with commas between them")
             ->type_name("TARGETS");
-        command.add_option("--fail-on", check_.failOn, "What makes the exit status 1")
-            ->check(CLI::IsMember({"error", "warning", "never"}));
+        AddChoice<std::string>(command, "--fail-on", check_.failOn,
+                               {{"error", "error"}, {"warning", "warning"}, {"never", "never"}},
+                               "What makes the exit status 1");
         AddFormat(command, "--format,--diagnostics", check_.report, "How the findings are printed");
         AddColor(command, check_.report);
         command.add_flag("--list", check_.list, "List the rules");
@@ -325,10 +369,10 @@ private:
                        [this] { return Tool::PrintStats(stats_); });
         AddFile(command, "FILE", stats_.file, "The command file; - is standard input")->required();
         command.add_option("--model", stats_.model, "The name of the design")->type_name("NAME");
-        command.add_option("--format", stats_.format, "Print the counts as text or JSON")
-            ->transform(CLI::CheckedTransformer(std::map<std::string, Tool::StatsFormat>{
-                {"text", Tool::StatsFormat::Text}, {"json", Tool::StatsFormat::Json}}))
-            ->type_name("text|json");
+        AddChoice<Tool::StatsFormat>(
+            command, "--format", stats_.format,
+            {{"text", Tool::StatsFormat::Text}, {"json", Tool::StatsFormat::Json}},
+            "Print the counts as text or JSON");
         AddReport(command, stats_.report);
         command.add_flag("--quiet", stats_.quiet, "Do not show progress");
         command.footer("WRITE commands in the file do nothing.");

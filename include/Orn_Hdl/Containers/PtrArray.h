@@ -249,14 +249,11 @@ public:
         return array == nullptr || index_ >= array->GetSize();
     }
     /// The present element; null at the end.
-    T GetCurrent() const noexcept {
-        const PtrArray<T>* const array = GetArray();
-        return array == nullptr ? nullptr : array->GetAt(index_);
-    }
+    T GetCurrent() const noexcept { return ElementAt(GetArray(), index_, passesNulls_); }
     /// Steps to the next element; at the end nothing happens.
     void Next() noexcept {
         if (!IsAtEnd()) {
-            ++index_;
+            index_ = (passesNulls_ ? PassNulls(GetArray(), index_) : index_) + 1;
         }
     }
 
@@ -284,15 +281,15 @@ public:
         Cursor() noexcept = default;
         /// Starts at the iterator's present element.
         explicit Cursor(const Iterator& from) noexcept
-            : source_(from.source_), find_(from.find_), index_(from.index_) {}
+            : source_(from.source_), find_(from.find_), index_(from.index_),
+              passesNulls_(from.passesNulls_) {}
         /// The present element; null at the end.
         T operator*() const noexcept {
-            const PtrArray<T>* const array = GetArray();
-            return array == nullptr ? nullptr : array->GetAt(index_);
+            return ElementAt(GetArray(), index_, passesNulls_);
         }
         /// Steps to the next element.
         Cursor& operator++() noexcept {
-            ++index_;
+            index_ = GetPlace() + 1;
             return *this;
         }
         /// Steps to the next element. \return the position before the step.
@@ -305,7 +302,7 @@ public:
         friend bool operator==(const Cursor& a, const Cursor& b) noexcept {
             const bool isAtEnd = a.IsAtEnd();
             return isAtEnd || b.IsAtEnd() ? isAtEnd == b.IsAtEnd()
-                                          : a.source_ == b.source_ && a.index_ == b.index_;
+                                          : a.source_ == b.source_ && a.GetPlace() == b.GetPlace();
         }
         /// Whether they are different positions, and not both at the present end.
         friend bool operator!=(const Cursor& a, const Cursor& b) noexcept {
@@ -320,10 +317,14 @@ public:
             const PtrArray<T>* const array = GetArray();
             return array == nullptr || index_ >= array->GetSize();
         }
+        int GetPlace() const noexcept {
+            return passesNulls_ ? PassNulls(GetArray(), index_) : index_;
+        }
 
         const void* source_ = nullptr;
         Find find_ = nullptr;
         int index_ = 0;
+        bool passesNulls_ = false;
     };
     /// The position of the present element.
     Cursor begin() const noexcept {
@@ -335,17 +336,35 @@ public:
     }
 
 private:
+    friend struct Reordering;
+
+    /// Passes over nulls, the last element not being one.
+    Iterator(const PtrArray<T>* array, int first) noexcept
+        : source_(array), index_(first), passesNulls_(true) {}
+
     static const PtrArray<T>* GetArray(const void* source, Find find) noexcept {
         return find == nullptr ? static_cast<const PtrArray<T>*>(source) : find(source);
     }
     const PtrArray<T>* GetArray() const noexcept {
         return GetArray(source_, find_);
     }
+    /// The index of the first element from `index` on that is not null.
+    static int PassNulls(const PtrArray<T>* array, int index) noexcept {
+        while (index < array->GetSize() && array->GetAt(index) == nullptr) {
+            ++index;
+        }
+        return index;
+    }
+    static T ElementAt(const PtrArray<T>* array, int index, bool passesNulls) noexcept {
+        const T found = array == nullptr ? nullptr : array->GetAt(index);
+        return found != nullptr || !passesNulls ? found : array->GetAt(PassNulls(array, index));
+    }
 
     /// The array, or the owner that `find_` takes.
     const void* source_ = nullptr;
     Find find_ = nullptr;
     int index_ = 0;
+    bool passesNulls_ = false;
 };
 
 } // namespace Orn_Hdl

@@ -107,11 +107,15 @@ public:
     /// The bus with the base name of a text: D, D(3) and D(7:0) all give the bus D.
     Bus* GetParentBus(const char* name) const;
 
-    /// The signals, in order of addition until `SortNetlist`.
+    /// The signals, in order of addition until `SortNetlist`. If the present element of a walk is
+    /// removed, the one after it becomes the present one. A walk during which objects are removed
+    /// and others added may leave some out; so may one during which the netlist is sorted.
     Iterator<Signal*> GetSignalIterator() const noexcept;
-    /// The instances, in order of addition until `SortNetlist`.
+    /// The instances, in order of addition until `SortNetlist`. Removal during a walk has the
+    /// effect that it has for signals.
     Iterator<Instance*> GetInstanceIterator() const noexcept;
-    /// The components, in order of addition until `SortNetlist`.
+    /// The components, in order of addition until `SortNetlist`. Removal during a walk has the
+    /// effect that it has for signals.
     Iterator<Component*> GetComponentIterator() const noexcept;
     /// Replaces the list by the instances of a component, in order; null has none.
     void GetInstances(const Component* component, PtrArray<Instance*>& instances) const;

@@ -30,7 +30,7 @@ Pin* PinList::GetPin(std::string_view name) const {
 
 Pin* PinList::FindOneByOne(std::string_view name) const noexcept {
     for (Pin* pin : Iterator<Pin*>(this)) {
-        // The wanted name is normalised for the comparison; the pin's is already.
+        // The wanted name is normalised for the comparison; the pin's name already is.
         if (EqualFolded(pin->GetNameView(), name)) {
             return pin;
         }
@@ -111,7 +111,7 @@ struct ComponentAnchor {
 Component::Component(const Port::TextArgument& name)
     : Object(ObjectTypeComponent), anchor_(nullptr) {
     Object::SetName(name);
-    // Last: nobody would give it back if the name found no memory.
+    // Allocated last: if allocating the name failed, nobody would free the anchor.
     anchor_ = new ComponentAnchor{this, 1};
 }
 

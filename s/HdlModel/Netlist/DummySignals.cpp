@@ -42,7 +42,7 @@ Signal* DummySignals::Find(const Signal* original) const noexcept {
     return entry == nullptr ? nullptr : entry->dummy;
 }
 
-/// Whether the signal has a dummy already, here or in another netlist.
+/// Whether the signal already has a dummy, here or in another netlist.
 bool DummySignals::IsKeptAsOriginal(const Signal& signal) const noexcept {
     const DummySignals* const keeper = References::GetKeeper(signal);
     return keeper != nullptr && (keeper != this || Find(&signal) != nullptr);
@@ -123,8 +123,8 @@ void DummySignals::Link(const Entry& entry) {
     driven->Connect(driven == entry.original ? entry.dummy : entry.original);
 }
 
-/// Replaces signals by their dummies in all compounds that have one of them as a member; each
-/// compound is gone through once.
+/// Replaces signals by their dummies in all compounds that have one of them as a member. Each
+/// compound is visited once.
 /// \param firstEntry the first of the entries whose signals are looked for.
 void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
     std::unordered_set<const Signal*> met;
@@ -133,7 +133,7 @@ void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
             continue;
         }
         const std::vector<Signal*> referrers = References::GetReferrers(*entries_[i].original);
-        // The last first: that is where the original, which drops each note, looks first.
+        // Backwards, because the original searches its notes from the end to drop them.
         for (auto referrer = referrers.rbegin(); referrer != referrers.rend(); ++referrer) {
             CompoundBus* const compound = As<CompoundBus>(*referrer);
             if (compound != nullptr && met.insert(compound).second) {
@@ -144,7 +144,7 @@ void DummySignals::ReplaceInCompounds(std::size_t firstEntry, Members which) {
 }
 
 void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
-    // From the end: that is where the notes of the members are looked for first.
+    // Backwards, because the notes of the members are searched from the end.
     for (int i = compound.GetSize() - 1; i >= 0; --i) {
         const Signal* const member = compound.GetAt(i);
         if (which == Members::All || As<CompoundBus>(member) == nullptr) {
@@ -157,7 +157,8 @@ void DummySignals::ReplaceMembers(CompoundBus& compound, Members which) {
 
 void DummySignals::Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs) {
     netlist.Add(dummy);
-    // Room comes first: an entry whose signals are kept is dropped when either is destroyed.
+    // All room is reserved first, so that an entry with marked signals is dropped with either of
+    // them.
     References::PrepareToKeep(original);
     References::PrepareToKeep(*dummy);
     byOriginal_.MakeRoom();
@@ -240,7 +241,7 @@ void DummySignals::Make(Netlist& netlist, const StringSet& names, bool forOutput
 }
 
 void DummySignals::Refresh(Netlist& netlist) {
-    // By index: dummies of new slices and bits join the list on the way.
+    // By index, because dummies of new slices and bits are appended meanwhile.
     for (std::size_t i = 0; i < entries_.size(); ++i) {
         const Entry entry = entries_[i];
         if (entry.original == nullptr) {

@@ -21,15 +21,15 @@ public:
     DummySignals(const DummySignals&) = delete;
     DummySignals& operator=(const DummySignals&) = delete;
 
-    /// Lets each dummy take over what its signal has gained since it was made.
+    /// Moves to each dummy what its signal has gained since the dummy was created.
     void Refresh(Netlist& netlist);
-    /// Makes dummies for the named signals.
+    /// Creates dummies for the named signals.
     /// \param forOutputs whether the signals are output ports, which their dummies drive, or input
     ///        ports, which drive their dummies.
     void Make(Netlist& netlist, const StringSet& names, bool forOutputs);
-    /// The dummy that was made for a signal; null when there is none.
+    /// The dummy that was created for a signal; null if there is none.
     Signal* Find(const Signal* original) const noexcept;
-    /// Drops the entries of a signal that is about to be destroyed, be it a dummy or not.
+    /// Drops the entries of a signal that is about to be destroyed, whether or not it is a dummy.
     void Forget(const Signal* signal) noexcept;
     /// Drops all entries, before the signals of the netlist are destroyed.
     void Clear() noexcept;
@@ -54,7 +54,7 @@ private:
     void ReplaceInCompounds(std::size_t firstEntry, Members which);
     void ReplaceMembers(CompoundBus& compound, Members which);
 
-    /// Where an entry stands, plus one, by a signal that it names.
+    /// For each signal that an entry names the index of the entry, plus one.
     using Places = HashSlots<std::uint32_t>;
 
     const Entry* FindBy(const Places& places, Signal* Entry::*side,
@@ -62,7 +62,8 @@ private:
     void Drop(const Entry& entry) noexcept;
     void DropEmptyPlaces() noexcept;
 
-    /// In the order in which the dummies were made. Dropped entries leave places without signals.
+    /// In the order in which the dummies were created. A dropped entry leaves a slot without
+    /// signals.
     std::vector<Entry> entries_;
     std::size_t emptyPlaces_ = 0;
     Places byOriginal_;

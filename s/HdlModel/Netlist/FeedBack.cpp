@@ -20,8 +20,8 @@ bool IsInLooseCompound(const Signal& signal) {
     });
 }
 
-/// Whether a port may be used against its direction. Most designs have no such port, and looking at
-/// the ports is faster than looking at all pins.
+/// Whether a port may be used against its direction. Most designs have no such port, and checking
+/// the ports is faster than checking all pins.
 bool MayHaveAny(const Netlist& netlist, bool outputPorts) {
     const int portPolarity = outputPorts ? Polarity::Output : Polarity::Input;
     const int pinPolarity = outputPorts ? Polarity::Input : Polarity::Output;

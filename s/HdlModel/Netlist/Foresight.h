@@ -12,11 +12,10 @@
 
 namespace Orn_Hdl {
 
-/// In a large design what a line names is nowhere near the processor, and waiting for it takes
-/// longer than the line's work. So the coming lines are looked at while others are worked on: first
-/// the places of their names in the index are asked for, and some lines later the objects that
-/// stand there. These are hints alone: that a line may name something else, or nothing, is of no
-/// consequence.
+/// In a large design the objects that a line names are rarely in the processor's cache, and waiting
+/// for them takes longer than executing the line. While earlier lines are executed, the slots of
+/// the names in the index are therefore prefetched, and some lines later the objects found there.
+/// These are only hints: nothing goes wrong if the line turns out to name another object or none.
 class Foresight {
 public:
     /// Takes note of a line that will be executed `Distance` lines later.

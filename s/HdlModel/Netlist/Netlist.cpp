@@ -1,6 +1,5 @@
 #include "Orn_Hdl/Model/Netlist.h"
 
-#include "Containers/PlaceOf.h"
 #include "HdlModel/Names/NameIndex.h"
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Names/NaturalSort.h"
@@ -8,6 +7,7 @@
 #include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/Foresight.h"
 #include "HdlModel/Netlist/NetlistOwner.h"
+#include "HdlModel/Netlist/ObjectList.h"
 #include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Netlist/ReadAhead.h"
@@ -64,9 +64,9 @@ int ToLength(std::size_t length) noexcept {
 } // namespace
 
 struct Netlist::Implementation {
-    OwnPtrArray<Component*> components;
-    OwnPtrArray<Instance*> instances;
-    OwnPtrArray<Signal*> signals;
+    ObjectList<Component> components;
+    ObjectList<Instance> instances;
+    ObjectList<Signal> signals;
     NameIndex<Object, KeyName> byName;
     NameIndex<Bus, KeyBaseName> busesByBaseName;
     Foresight foresight;
@@ -76,17 +76,17 @@ struct Netlist::Implementation {
 
     ~Implementation() {
         dummies.Clear();
-        // Signals are destroyed first: an instance then has nothing to leave.
-        References::LeaveTogether(signals);
+        // Signals are destroyed first, so that instances have no signals to leave.
+        References::LeaveTogether(signals.GetArray());
         DestroyAll(signals);
         DestroyAll(instances);
         DestroyAll(components);
     }
 
-    /// Each object is owned until it is its turn, so that it leaves if another one destroys it.
-    template <class T> static void DestroyAll(OwnPtrArray<T*>& objects) noexcept {
-        while (T* const last = objects.GetTail()) {
-            objects.RemoveTail();
+    /// Each object stays owned until its turn, so that it leaves the list if another object
+    /// destroys it.
+    template <class T> static void DestroyAll(ObjectList<T>& objects) noexcept {
+        while (T* const last = objects.TakeOutLast()) {
             OwnedFlag::Clear(*last);
             delete last;
         }
@@ -99,21 +99,21 @@ struct Netlist::Implementation {
     }
 
     /// Takes ownership of an object that has no owner, and of no other.
-    template <class T> void Take(T* object, OwnPtrArray<T*>& objects) {
+    template <class T> void Take(T* object, ObjectList<T>& objects) {
         if (object == nullptr || OwnedFlag::Get(*object)) {
             return;
         }
         // All allocation comes first, so that what the netlist holds can always be found.
         std::unique_ptr<T> taken(object);
         MakeRoomFor(object);
-        objects.AddNew(object);
+        objects.Add(object);
         OwnedFlag::Set(*taken.release());
         OwnerLink::Set(*object, this);
         byName.Add(object, GroupOf(object));
         Enter(object);
     }
 
-    /// Whether an object is found by its key name, so that it has a place in the index.
+    /// Whether an object is found by its key name and is therefore in the index.
     bool IsFound(const Component* object) const noexcept {
         return byName.Find(NameKey(ObjectKey::Get(*object), ComponentGroup)) == object;
     }
@@ -138,10 +138,10 @@ struct Netlist::Implementation {
         Enter(object);
     }
 
-    /// Takes an object out without destroying it.
-    /// \return the object; null when the netlist does not hold it.
-    template <class T> std::unique_ptr<T> Detach(T* object, OwnPtrArray<T*>& objects) noexcept {
-        const int place = object == nullptr ? -1 : PlaceOf<T>(objects, object);
+    /// Removes an object without destroying it.
+    /// \return the object; null if the netlist does not hold it.
+    template <class T> std::unique_ptr<T> Detach(T* object, ObjectList<T>& objects) noexcept {
+        const int place = object == nullptr ? -1 : objects.Find(object);
         if (place < 0) {
             return nullptr;
         }
@@ -150,11 +150,11 @@ struct Netlist::Implementation {
         return std::unique_ptr<T>(object);
     }
 
-    /// Takes out the object at a place. The classes that are derived from `T` may be gone.
-    template <class T> void LetGo(T& object, OwnPtrArray<T*>& objects, int place) noexcept {
+    /// Removes the object at a position. Classes derived from `T` may already be destroyed.
+    template <class T> void LetGo(T& object, ObjectList<T>& objects, int place) noexcept {
         Forget(&object);
         byName.Remove(&object, GroupOf(&object));
-        objects.RemoveAt(place);
+        objects.TakeOut(place);
         OwnedFlag::Clear(object);
         ObjectKey::Drop(object);
         OwnerLink::Set(object, nullptr);
@@ -188,18 +188,17 @@ struct Netlist::Implementation {
 
 void NetlistOwner::LetGo(Component& component) noexcept {
     auto& netlist = *OwnerLink::Get<Netlist::Implementation>(component);
-    netlist.LetGo(component, netlist.components,
-                  PlaceOf<Component>(netlist.components, &component));
+    netlist.LetGo(component, netlist.components, netlist.components.Find(&component));
 }
 
 void NetlistOwner::LetGo(Instance& instance) noexcept {
     auto& netlist = *OwnerLink::Get<Netlist::Implementation>(instance);
-    netlist.LetGo(instance, netlist.instances, PlaceOf<Instance>(netlist.instances, &instance));
+    netlist.LetGo(instance, netlist.instances, netlist.instances.Find(&instance));
 }
 
 void NetlistOwner::LetGo(Signal& signal) noexcept {
     auto& netlist = *OwnerLink::Get<Netlist::Implementation>(signal);
-    netlist.LetGo(signal, netlist.signals, PlaceOf<Signal>(netlist.signals, &signal));
+    netlist.LetGo(signal, netlist.signals, netlist.signals.Find(&signal));
 }
 
 void NetlistOwner::LetGo(Bus& bus) noexcept {
@@ -349,15 +348,15 @@ Bus* Netlist::GetParentBus(const char* name) const {
 }
 
 Iterator<Signal*> Netlist::GetSignalIterator() const noexcept {
-    return Iterator<Signal*>(&implementation_->signals);
+    return implementation_->signals.GetIterator();
 }
 
 Iterator<Instance*> Netlist::GetInstanceIterator() const noexcept {
-    return Iterator<Instance*>(&implementation_->instances);
+    return implementation_->instances.GetIterator();
 }
 
 Iterator<Component*> Netlist::GetComponentIterator() const noexcept {
-    return Iterator<Component*>(&implementation_->components);
+    return implementation_->components.GetIterator();
 }
 
 void Netlist::GetInstances(const Component* component, PtrArray<Instance*>& instances) const {
@@ -374,10 +373,15 @@ void Netlist::GetInstances(const char* componentName, PtrArray<Instance*>& insta
 }
 
 void Netlist::SortNetlist() {
-    SortNaturally(implementation_->signals,
-                  [](const Signal* signal) { return signal->GetPortPolarity().GetValue(); });
-    SortNaturally(implementation_->components, [](const Component*) { return 0; });
-    SortNaturally(implementation_->instances, [](const Instance*) { return 0; });
+    implementation_->signals.SortBy([](PtrArray<Signal*>& signals) {
+        SortNaturally(signals, [](const Signal* s) { return s->GetPortPolarity().GetValue(); });
+    });
+    implementation_->components.SortBy([](PtrArray<Component*>& components) {
+        SortNaturally(components, [](const Component*) { return 0; });
+    });
+    implementation_->instances.SortBy([](PtrArray<Instance*>& instances) {
+        SortNaturally(instances, [](const Instance*) { return 0; });
+    });
     for (Instance* instance : GetInstanceIterator()) {
         instance->SortPinName();
     }
@@ -391,7 +395,7 @@ void Netlist::ConnectOpenPinToDummy() {
             if (pin->GetPinType() == PinTypeBusIndex) {
                 continue;
             }
-            // The range is the rest of the pin's name, as it is spelled there.
+            // The range is the rest of the pin's name, exactly as spelled there.
             const std::string_view pinName = pin->GetNameView();
             const bool isBus = pin->GetPinType() == PinTypeBus;
             const std::string_view base = isBus ? Names::BeforeParenthesis(pinName) : pinName;
@@ -453,7 +457,7 @@ namespace {
 void CopyComment(const Object& from, Object& to) {
     std::string_view comment = from.GetCommentView();
     if (!comment.empty()) {
-        // AddComment puts the last line feed back.
+        // AddComment appends the last line feed again.
         comment.remove_suffix(1);
         to.AddComment(std::string(comment).c_str());
     }

@@ -19,7 +19,8 @@ public:
 private:
     static void LetGo(Component& component) noexcept;
     static void LetGo(Instance& instance) noexcept;
-    /// The class of the signal is gone already, so that a bus leaves before.
+    /// Called when the derived class of the signal is already destroyed, so a bus must leave
+    /// earlier.
     static void LetGo(Signal& signal) noexcept;
     static void LetGo(Bus& bus) noexcept;
 };

@@ -16,7 +16,7 @@ void PinBlock::Add(PinList& pins, std::unique_ptr<Pin> pin) {
 void PinBlock::LetGo(PinList& pins, Pin& pin) noexcept {
     const int index = PlaceOf<Pin>(pins, &pin);
     if (!pins.IsBorrowed()) {
-        // The places of the pins behind this one change.
+        // The positions of the pins after this one change.
         pins.RemoveAt(index);
         if (pins.index_ != nullptr) {
             pins.IndexAll();
@@ -40,7 +40,7 @@ void PinBlock::Remove(PinList& pins, Pin* pin) noexcept {
     }
 }
 
-/// Takes the last pin out of a list all of whose pins are destroyed.
+/// Removes the last pin from a list whose pins are all being destroyed.
 Pin* PinBlock::TakeLast(PinList& pins) noexcept {
     Pin* const last = pins.GetTail();
     if (last != nullptr) {

@@ -6,10 +6,10 @@
 
 namespace Orn_Hdl {
 
-/// The value of the slot of a name's pin; zero when there is none.
+/// The value of the slot for a pin's name; zero if there is none.
 std::uint32_t PinIndex::FindValue(const PinList& pins, const NameKey& key) const noexcept {
     return slots_.Find(key.GetHash(), [&](std::uint32_t hash, std::uint32_t value) {
-        // A component may have got further pins since the instance was made.
+        // The component may have got more pins since the instance was created.
         const Pin* const pin = hash == key.GetHash() ? pins.GetAtPlace(value - 1) : nullptr;
         return pin != nullptr && EqualFolded(pin->GetNameView(), key.GetName());
     });
@@ -21,7 +21,7 @@ Pin* PinIndex::Find(const PinList& pins, std::string_view name) const noexcept {
     if (!others_.empty()) {
         const auto other = others_.lower_bound({key.GetHash(), 0});
         if (other != others_.end() && other->first == key.GetHash()) {
-            // Which of several pins comes first depends on how the list was sorted.
+            // Which of several pins with one name comes first depends on how the list was sorted.
             return pins.FindOneByOne(name);
         }
     }

@@ -22,11 +22,11 @@ namespace Orn_Hdl {
 /// A look-up only reads, so that several threads may search a list at a time.
 class PinIndex {
 public:
-    /// The first pin of that name; null when there is none.
+    /// The first pin with that name; null if there is none.
     Pin* Find(const PinList& pins, std::string_view name) const noexcept;
     /// Enters the pin at a place of a list. If allocation fails, nothing changes.
     void Enter(const PinList& pins, std::uint32_t place);
-    /// Takes a pin out that stands in the list. \return its place.
+    /// Removes a pin that is in the list. \return its position.
     std::uint32_t TakeOut(const PinList& pins, const Pin& pin) noexcept;
 
     void Join() noexcept { ++users_; }
@@ -42,10 +42,10 @@ public:
     PinIndex() = default;
 
 private:
-    /// The place of each name's pin, plus one.
+    /// For each name the position of its pin, plus one.
     using Slots = HashSlots<std::uint32_t, Port::Pool::Allocator>;
-    /// Further pins of names that are there already, by hash and place. Only callers of the classes
-    /// give two pins of a list one name.
+    /// More pins with names that are already present, by hash and position. Only users of the
+    /// classes give two pins of a list one name.
     using Others = std::set<std::pair<std::uint32_t, std::uint32_t>>;
 
     PinIndex(const Slots& slots, const Others& others) : slots_(slots), others_(others) {}
@@ -57,7 +57,7 @@ private:
     std::size_t users_ = 1;
 };
 
-/// Keeps the index of a pin's list right while the pin gets another name.
+/// Keeps the index of a pin's list up to date while the pin is renamed.
 class PinRenaming {
 public:
     explicit PinRenaming(const Pin& pin) noexcept;

@@ -24,7 +24,8 @@ int FindPolarity(std::string_view start) noexcept {
     return Polarity::Invalid;
 }
 
-/// A pin in the block of an instance. Whoever deletes it, its memory stays a part of the block.
+/// A pin in the block of an instance. Deleting the pin does not free its memory, which belongs to
+/// the block.
 template <class T> class Placed final : public T {
 public:
     explicit Placed(const T& other) : T(other) { static_assert(sizeof(Placed) == sizeof(T)); }
@@ -209,7 +210,7 @@ void PinConstantSignalVisitor::VisitScalarPin(ScalarPin* pin) {
     }
 }
 
-// The index or range is the rest of the pin's name, as it is spelled there.
+// The index or range is the rest of the pin's name, exactly as spelled there.
 void PinConstantSignalVisitor::VisitBusPin(BusPin* pin) {
     if (pin != nullptr) {
         const std::string_view base = Names::BeforeParenthesis(pin->GetNameView());

@@ -1,4 +1,4 @@
-// What the reader of command files tells a netlist of the lines to come.
+// Hints to a netlist about the command lines to come.
 #pragma once
 
 #include "HdlModel/Netlist/Foresight.h"
@@ -9,10 +9,10 @@
 
 namespace Orn_Hdl {
 
-/// The way past the public interface of `Netlist` to its `Foresight`.
+/// Gives the reader of command files access to the `Foresight` of a netlist.
 class ReadAhead {
 public:
-    /// How many lines ahead a line is noted.
+    /// How many lines before its execution a line is noted.
     static constexpr std::size_t Distance = Foresight::Distance;
     /// Hints that a line, split into words, will be executed `Distance` lines later, so that what
     /// it names is fetched in the meantime. Changes nothing.

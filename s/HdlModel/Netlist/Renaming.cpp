@@ -41,7 +41,7 @@ void Renaming::AddWithParts(Signal& signal, std::string_view name) {
             }
         }
     }
-    // By index: a compound that is renamed may itself be a member.
+    // By index, because a renamed compound, which is appended, may itself be a member.
     for (std::size_t i = 0; i < entries_.size(); ++i) {
         AddCompounds(static_cast<const Signal&>(*entries_[i].object));
     }
@@ -88,7 +88,7 @@ void Renaming::Apply() {
             Exchange(entries_[done]);
         }
     } catch (...) {
-        // The way back takes no memory: each name returns to where it was.
+        // Undoing allocates nothing: each name returns to where it was.
         while (done > 0) {
             Exchange(entries_[--done]);
         }

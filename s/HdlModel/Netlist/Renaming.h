@@ -26,9 +26,9 @@ public:
     /// Adds a signal, its slices and bits when it is a bus, and the compounds named after these.
     void AddWithParts(Signal& signal, std::string_view name);
 
-    /// The first of the new names that something else in the netlist has; null when there is none.
+    /// The first new name that another object of the netlist has; null if there is none.
     const std::string* FindTaken() const;
-    /// Renames the objects. If allocation fails, none of them.
+    /// Renames the objects. If allocation fails, none of them is renamed.
     void Apply();
 
 private:

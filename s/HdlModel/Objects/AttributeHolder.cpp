@@ -47,7 +47,7 @@ void AttributeTable::LetGo(Attribute& attribute) noexcept {
         if (namesake == nullptr) {
             table.byName.Remove(name);
         } else {
-            // The name is there already, so that nothing is allocated.
+            // The name exists already, so nothing is allocated.
             table.byName.Add(name, namesake);
         }
     }
@@ -132,7 +132,7 @@ Attribute* AttributeHolder::GetAttr(const char* name) const {
 }
 
 Iterator<Attribute*> AttributeHolder::GetAttrIterator() const noexcept {
-    // The table is made with the first attribute, and made anew by an assignment.
+    // The first attribute creates the table, and an assignment replaces it.
     return Iterator<Attribute*>(this, [](const void* holder) -> const PtrArray<Attribute*>* {
         const AttributeTable* const table = static_cast<const AttributeHolder*>(holder)->GetTable();
         return table == nullptr ? nullptr : &table->attributes;

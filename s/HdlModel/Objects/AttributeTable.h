@@ -7,8 +7,8 @@
 
 namespace Orn_Hdl {
 
-/// Owns the attributes of a holder and finds them by name. The holder makes it when it gets its
-/// first attribute or, having one, an owner.
+/// Owns the attributes of a holder and finds them by name. The holder creates it with its
+/// first attribute, or when it gets an owner.
 struct AttributeTable {
     OwnPtrArray<Attribute*> attributes;
     IStringPtrMap<Attribute*> byName;

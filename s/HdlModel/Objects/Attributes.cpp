@@ -19,7 +19,7 @@ constexpr const char* ValueTypeNames[] = {"String", "Integer",   "Float", "Boole
 constexpr const char* GenericNames[] = {"NONE", "NOSYN", "SYN"};
 constexpr const char* SynAttrNames[] = {"NONE", "ASSIGN", "ASSIGNNODEC"};
 
-/// The place of a text in a table of option names, letter case ignored; -1 when it is none.
+/// The index of a text in a table of option names, ignoring case; -1 if it is not one of them.
 int FindOption(const char* const (&names)[3], const char* text) noexcept {
     for (int i = 0; i < 3; ++i) {
         if (Port::EqualIgnoringCase(names[i], Port::ViewOf(text))) {
@@ -166,7 +166,7 @@ Attribute* AttributeFloat::CloneAttribute() const {
 }
 
 void AttributeFloat::SetValue(const char* text) {
-    // The number is written with as many decimals as its text has, one at least.
+    // The number is written with as many decimals as its text has, but at least one.
     const StringArray parts(text, ".", true, nullptr);
     const auto length = [&parts](int i) {
         return static_cast<int>(std::max<std::size_t>(parts.GetView(i).size(), 1));
@@ -177,7 +177,7 @@ void AttributeFloat::SetValue(const char* text) {
 }
 
 Port::StringBase<char> AttributeFloat::GetValueString() const {
-    // As printf's "%*.*f", but never with the decimal comma of somebody's locale.
+    // Formats like printf's "%*.*f", but independent of the locale.
     constexpr std::size_t MostIntegerDigits = 320;
     std::string text(MostIntegerDigits + static_cast<std::size_t>(precision_), '\0');
     const auto result = std::to_chars(text.data(), text.data() + text.size(), value_,

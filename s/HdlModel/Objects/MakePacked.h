@@ -1,4 +1,4 @@
-// Objects of the library's own classes, close together.
+// Allocation of the library's own objects close together.
 #pragma once
 
 #include "Port/Pool.h"
@@ -9,8 +9,8 @@
 
 namespace Orn_Hdl {
 
-/// Makes an object of which a design has millions. The general operator new keeps sixteen bytes of
-/// alignment, for classes derived from the library's; the library's own do with eight.
+/// Creates an object of a class of which a design has millions. The general `operator new` aligns
+/// to sixteen bytes, which derived classes may need; the library's own classes need eight.
 template <class T, class... Arguments> std::unique_ptr<T> MakePacked(Arguments&&... arguments) {
     static_assert(alignof(T) <= 8);
     void* const memory = Port::Pool::AllocatePacked(sizeof(T), Port::Pool::DesignObjects);

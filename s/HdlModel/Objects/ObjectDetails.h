@@ -1,5 +1,5 @@
-// The parts of an object that few objects have. They are made when first needed, so that the
-// millions that do not need them do not pay for them.
+// The parts of an object that few objects have. They are created when first needed, so that they
+// cost the millions of other objects no memory.
 #pragma once
 
 #include "HdlModel/Objects/ObjectName.h"
@@ -12,16 +12,16 @@
 namespace Orn_Hdl {
 
 struct ObjectDetails {
-    /// The object's name, without details of its own.
+    /// The name of the object. It has no details of its own.
     ObjectName name;
     std::string comment;
     /// The name under which a netlist finds the object, when it was renamed afterwards.
     std::unique_ptr<std::string> keyName;
     /// A pin's default value, or a signal's constant.
     std::unique_ptr<BitVectorValue> value;
-    /// A direction that is none of input, output, bidirectional and invalid.
+    /// The direction, if it is not input, output, bidirectional or invalid.
     int oddDirection = 0;
-    /// Of a pin: the signals that list it although it points at another, or at none.
+    /// For a pin: the signals that list it although it points at another signal or at none.
     std::vector<Signal*> formerSignals;
 };
 

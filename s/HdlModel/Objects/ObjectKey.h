@@ -19,9 +19,9 @@ public:
 /// The name that an object had when its owner took it.
 struct ObjectKey {
     static std::string_view Get(const Object& object) noexcept { return object.GetKeyName(); }
-    /// Makes the present name the key name, when the owner lets the object go.
+    /// Makes the current name the key name. Called when the owner releases the object.
     static void Drop(Object& object) noexcept { object.DropKeyName(); }
-    /// Exchanges the name for another one, which becomes the key name.
+    /// Swaps the name with another one, which becomes the key name.
     static void Replace(Object& object, ObjectName& name) noexcept { object.SwapName(name); }
 };
 

@@ -22,7 +22,7 @@ ObjectName::Shared* ObjectName::GetShared() const noexcept {
     return static_cast<Shared*>(GetPointer());
 }
 
-/// The name itself, which stands in the details when there are any.
+/// The name itself. It is stored in the details if there are any.
 const ObjectName& ObjectName::GetPlain() const noexcept {
     const ObjectDetails* const details = GetDetails();
     return details == nullptr ? *this : details->name;
@@ -68,7 +68,7 @@ ObjectName::ObjectName(const ObjectName& other) noexcept : ObjectName() {
     *this = other;
 }
 
-// Assignment to itself is found out where the names stand, which may be in the details.
+// Self-assignment shows in the places of the names, which may be in the details.
 // NOLINTNEXTLINE(bugprone-unhandled-self-assignment)
 ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
     ObjectName& to = GetPlain();

@@ -10,12 +10,12 @@ namespace Orn_Hdl {
 
 struct ObjectDetails;
 
-/// A name in 15 bytes of any alignment. Up to 14 characters stand in the object itself; a longer
-/// name stands in a block that copies share, so that the pins of a thousand instances hold a long
-/// pin name once.
+/// A name in 15 bytes of any alignment. Up to 14 characters are stored in the object itself. A
+/// longer name is stored in a block that copies share, so that the pins of a thousand instances
+/// hold a long pin name once.
 ///
-/// An object with details keeps its name there, and a pointer to the details in these 15 bytes. So
-/// an object without details takes no memory for them.
+/// An object with details keeps its name there, and a pointer to the details in these 15 bytes, so
+/// that details cost an object without them no memory.
 class ObjectName {
 public:
     ObjectName() noexcept : bytes_(), length_(0) {}
@@ -29,11 +29,11 @@ public:
         }
     }
 
-    /// Exchanges names and details.
+    /// Swaps names and details.
     void Swap(ObjectName& other) noexcept;
-    /// Exchanges the names alone.
+    /// Swaps the names and leaves the details where they are.
     void SwapText(ObjectName& other) noexcept { GetPlain().Swap(other.GetPlain()); }
-    /// Stores a text. When allocation fails the name stays as it was.
+    /// Stores a text. If allocation fails, the name stays as it was.
     void Assign(std::string_view text);
 
     /// The name, valid until it changes or the details are made.
@@ -41,19 +41,19 @@ public:
         return length_ <= InlineCapacity ? std::string_view(bytes_, length_) : LongView();
     }
 
-    /// The owner's details; null when it has none.
+    /// The details of the object that has the name; null if there are none.
     ObjectDetails* GetDetails() const noexcept {
         return length_ == DetailedLength ? static_cast<ObjectDetails*>(GetPointer()) : nullptr;
     }
-    /// The owner's details, made when there are none.
+    /// The details of the object that has the name; created if there are none.
     ObjectDetails& MakeDetails();
 
 private:
     struct Shared;
     static constexpr std::size_t InlineCapacity = 14;
-    /// Stands in `length_` when `bytes_` hold a pointer to a shared name.
+    /// The value of `length_` if `bytes_` hold a pointer to a shared name.
     static constexpr std::uint8_t SharedLength = 255;
-    /// Stands in `length_` when `bytes_` hold a pointer to the details.
+    /// The value of `length_` if `bytes_` hold a pointer to the details.
     static constexpr std::uint8_t DetailedLength = 254;
 
     std::string_view LongView() const noexcept;

@@ -8,6 +8,7 @@
 #include "Port/File.h"
 #include "Run.h"
 #include "diagnostics/CommandLines.h"
+#include "explain/FailureExplainer.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -63,13 +64,6 @@ private:
     std::FILE* copy_ = nullptr;
 };
 
-std::string_view WithoutLineEnd(std::string_view text) noexcept {
-    if (!text.empty() && text.back() == '\n') {
-        text.remove_suffix(1);
-    }
-    return text;
-}
-
 /// The replay of one file, with a check at each line that would write.
 class FileCheck {
 public:
@@ -109,16 +103,13 @@ bool FileCheck::Execute(const Orn_Hdl::StringArray& words) {
         }
         return true;
     } catch (const Orn_Hdl::Exception& exception) {
-        Report(words, WithoutLineEnd(exception.getLocalized().GetView()));
+        Report(words, exception.getLocalized().GetView());
         return false;
     }
 }
 
 void FileCheck::Report(const Orn_Hdl::StringArray& words, std::string_view text) {
-    Diagnostic diagnostic;
-    diagnostic.place = lines_.GetPlace(line_, words);
-    diagnostic.message = text;
-    reporter_.Report(std::move(diagnostic));
+    reporter_.Report(FailureExplainer(*model_, lines_).Explain(line_, words, text));
 }
 
 Status FileCheck::Replay() {

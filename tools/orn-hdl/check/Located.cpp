@@ -1,9 +1,9 @@
 #include "check/Located.h"
 
 #include "Orn_Hdl/Containers/StringArray.h"
-#include "Orn_Hdl/Model/Object.h"
 #include "Port/Ascii.h"
 #include "Port/File.h"
+#include "diagnostics/NameKey.h"
 
 #include <algorithm>
 #include <string_view>
@@ -18,16 +18,8 @@ using Kind = Cause::Kind;
 
 namespace {
 
-/// A name as the model keeps it, in small letters.
-std::string Normal(string_view name) {
-    Port::StringBase<char> text(name);
-    Orn_Hdl::Object::NormalizeName(text);
-    text.MakeLower();
-    return std::string(text.GetView());
-}
-
 std::string Base(string_view name) {
-    const std::string normal = Normal(name);
+    const std::string normal = GetNameKey(name);
     const std::size_t end = normal.find(',') == std::string::npos ? normal.find('(') : normal.npos;
     return normal.substr(0, end);
 }
@@ -58,7 +50,7 @@ std::string KeyOf(const Cause& cause) {
         return Key(cause.kind, std::string(phrase.GetView()));
     }
     default:
-        return Key(cause.kind, Normal(cause.first), Normal(cause.second));
+        return Key(cause.kind, GetNameKey(cause.first), GetNameKey(cause.second));
     }
 }
 
@@ -136,14 +128,15 @@ bool IsWord(const StringArray& words, int index, string_view word) {
 /// Of "owner.pin", both; only the owner without a ".".
 std::pair<std::string, std::string> SplitPath(string_view text) {
     const std::size_t dot = std::min(text.find('.'), text.size());
-    return {Normal(text.substr(0, dot)), Normal(text.substr(std::min(dot + 1, text.size())))};
+    return {GetNameKey(text.substr(0, dot)),
+            GetNameKey(text.substr(std::min(dot + 1, text.size())))};
 }
 
 void Search::TakeSignal(string_view name, std::uint64_t line) {
     if (!Wants(Kind::Signal)) {
         return;
     }
-    const std::string normal = Normal(name);
+    const std::string normal = GetNameKey(name);
     for (std::size_t start = 0; start < normal.size();) {
         const std::size_t end = std::min(normal.find_first_of(",\\", start), normal.size());
         const std::string piece = normal.substr(start, end - start);
@@ -175,7 +168,7 @@ void Search::TakeConstant(const StringArray& words, std::uint64_t line) {
     const string_view target = words.GetView(2);
     if (target.find('.') == string_view::npos) {
         TakeSignal(target, line);
-        Found(Key(Kind::Constant, Normal(target)), Kind::Constant, line);
+        Found(Key(Kind::Constant, GetNameKey(target)), Kind::Constant, line);
         return;
     }
     const auto [owner, pin] = SplitPath(target);
@@ -196,11 +189,11 @@ void Search::TakeAttribute(const StringArray& words, std::uint64_t line) {
                       : IsWord(words, 1, "INSTANCE")  ? Kind::InstanceAttribute
                                                       : Kind::SignalAttribute;
     int at = isSet ? 4 : 3;
-    const std::string owner = isModule ? std::string() : Normal(words.GetView(at++));
+    const std::string owner = isModule ? std::string() : GetNameKey(words.GetView(at++));
     if (!isSet && Port::EqualIgnoringCase(words.GetView(at).substr(0, 6), "-TYPE=")) {
         ++at;
     }
-    Found(Key(kind, owner, Normal(words.GetView(at))), kind, line);
+    Found(Key(kind, owner, GetNameKey(words.GetView(at))), kind, line);
 }
 
 /// The words of a comment, joined as the command joins them.
@@ -219,11 +212,11 @@ void Search::TakeAdd(const StringArray& words, std::uint64_t line) {
     } else if (IsWord(words, 2, "COMMENT")) {
         TakeText(words, IsWord(words, 1, "MODULE") ? 3 : 4, line);
     } else if (IsWord(words, 1, "COMPONENT")) {
-        Found(Key(Kind::Component, Normal(first)), Kind::Component, line);
+        Found(Key(Kind::Component, GetNameKey(first)), Kind::Component, line);
     } else if (IsWord(words, 1, "PIN")) {
-        Found(Key(Kind::Pin, Normal(first), Normal(words.GetView(3))), Kind::Pin, line);
+        Found(Key(Kind::Pin, GetNameKey(first), GetNameKey(words.GetView(3))), Kind::Pin, line);
     } else if (IsWord(words, 1, "INSTANCE")) {
-        Found(Key(Kind::Instance, Normal(words.GetView(3))), Kind::Instance, line);
+        Found(Key(Kind::Instance, GetNameKey(words.GetView(3))), Kind::Instance, line);
     } else if (IsWord(words, 1, "PORT") || IsWord(words, 1, "SIGNAL")) {
         TakeSignal(first, line);
     } else if (IsWord(words, 1, "NOTES")) {

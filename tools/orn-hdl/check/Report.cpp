@@ -1,10 +1,9 @@
 #include "check/Report.h"
 
-#include "Orn_Hdl/Model/Object.h"
-#include "Port/Ascii.h"
 #include "diagnostics/CommandLines.h"
 #include "diagnostics/JsonWriter.h"
 #include "diagnostics/MachineFormats.h"
+#include "diagnostics/NameKey.h"
 
 #include <algorithm>
 #include <map>
@@ -72,18 +71,11 @@ MarkedLines::MarkedLines(const std::vector<Located>& findings, CommandLines& lin
     }
 }
 
-std::string Normal(string_view name) {
-    Port::StringBase<char> text(name);
-    Orn_Hdl::Object::NormalizeName(text);
-    text.MakeLower();
-    return std::string(text.GetView());
-}
-
 /// The word of a line that names a cause: its second name, which is the narrower one, or its first.
 std::optional<Mark> FindName(const std::string& name, const std::vector<WordPlace>& words) {
-    const std::string wanted = Normal(name);
+    const std::string wanted = GetNameKey(name);
     for (std::size_t i = 1; i < words.size() && !wanted.empty(); ++i) {
-        const std::string word = Normal(words[i].text);
+        const std::string word = GetNameKey(words[i].text);
         const std::size_t dot = word.find('.');
         const int index = static_cast<int>(i);
         if (word == wanted || word.substr(0, word.find('(')) == wanted) {

@@ -28,6 +28,8 @@ public:
     /// The place of a line whose words are not known.
     Place GetPlace(std::uint64_t line, const std::optional<Mark>& mark = {});
 
+    /// The file, as the user named it.
+    const std::string& GetName() const noexcept { return file_; }
     /// The absolute name of the file, for reading it again.
     const std::string& GetSystemName() const noexcept { return lines_.GetName(); }
 

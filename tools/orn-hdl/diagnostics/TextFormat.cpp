@@ -74,7 +74,8 @@ void MakePrintable(std::string& text) {
 }
 
 Excerpt CutOut(string_view line, Columns columns) {
-    columns.first = std::min(columns.first, line.size());
+    columns.first =
+        columns.first < line.size() ? GetCharacterStart(line, columns.first) : line.size();
     std::size_t start = 0;
     std::size_t end = line.size();
     if (line.size() > WidestLine) {

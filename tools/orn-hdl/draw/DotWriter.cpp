@@ -22,12 +22,20 @@ constexpr std::string_view PointNode = "n";
 constexpr std::string_view StubNode = "h";
 constexpr std::string_view ConstantNode = "c";
 
+/// Graphviz reads at most 16384 characters of a string at once, and ignores this between them.
+constexpr std::string_view Break = "\\\n";
+
 /// A text for a Graphviz string, or, with `record`, for a field of a box. Bytes that no picture can
 /// show become "?".
 std::string Quote(std::string_view text, bool record = false) {
+    constexpr std::size_t AtOnce = 4096;
     const std::string_view special = record ? "\"\\{}|<> " : "\"\\";
     std::string result;
-    for (const char c : text) {
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const char c = text[i];
+        if (i % AtOnce == AtOnce - 1) {
+            result += Break;
+        }
         if (special.find(c) != std::string_view::npos) {
             result += '\\';
         }
@@ -104,7 +112,8 @@ void DotWriter::WriteBox(std::size_t index) {
     for (const Pin* pin : instance.GetPinIterator()) {
         const bool reads = pin->GetPolarity().GetValue() == Polarity::Input;
         std::string& side = reads ? left : right;
-        side.append(side.empty() ? "<p" : "|<p").append(std::to_string(number)).append("> ");
+        side.append(side.empty() ? "" : "|").append(Break);
+        side.append("<p").append(std::to_string(number)).append("> ");
         side += GetPinText(box, *pin, number++);
     }
     text_.append("  i").append(std::to_string(index)).append(" [shape=record, label=\"{");

@@ -1,6 +1,6 @@
 #include "import/BitOwners.h"
 
-#include "import/LegalNames.h"
+#include "import/NameRules.h"
 #include "import/Spelling.h"
 
 #include <algorithm>
@@ -27,10 +27,14 @@ bool OwnsBit(const ModulePort& port, const BitUse& use) noexcept {
 
 } // namespace
 
-BitOwners BitOwners::Choose(const Module& top, const BitUses& uses, Warnings& warnings) {
+BitOwners BitOwners::Choose(const Module& top, const BitUses& uses,
+                            const std::vector<std::string>& portNames, const NameRules& rules,
+                            Warnings& warnings) {
     BitOwners owners(top);
-    owners.FindCandidates();
-    owners.AddPorts(uses, warnings);
+    owners.FindCandidates(rules);
+    for (std::size_t p = 0; p < top.ports.size(); ++p) {
+        owners.AddPort(top.ports[p], portNames[p], uses, warnings);
+    }
     owners.AddNets(owners.publicNets_, uses);
     owners.AddSharedOutputs(uses);
     owners.AddNets(owners.hiddenNets_, uses);
@@ -38,7 +42,7 @@ BitOwners BitOwners::Choose(const Module& top, const BitUses& uses, Warnings& wa
     return owners;
 }
 
-void BitOwners::FindCandidates() {
+void BitOwners::FindCandidates(const NameRules& rules) {
     for (const ModulePort& port : top_.ports) {
         portNets_.emplace(port.name, nullptr);
     }
@@ -47,7 +51,7 @@ void BitOwners::FindCandidates() {
         if (port != portNets_.end()) {
             port->second = &net;
         } else {
-            (net.hidden ? hiddenNets_ : publicNets_).push_back({&net, !IsLegalName(net.name)});
+            (net.hidden ? hiddenNets_ : publicNets_).push_back({&net, !rules.IsLegal(net.name)});
         }
     }
     // A name that can stay is best; a wide net keeps buses together.
@@ -65,16 +69,12 @@ void BitOwners::SetOwner(Bit bit, std::uint32_t index, std::uint32_t position) {
     signal.highest = std::max(signal.highest, position);
 }
 
-void BitOwners::AddPorts(const BitUses& uses, Warnings& warnings) {
-    for (const ModulePort& port : top_.ports) {
-        AddPort(port, uses, warnings);
-    }
-}
-
-void BitOwners::AddPort(const ModulePort& port, const BitUses& uses, Warnings& warnings) {
+void BitOwners::AddPort(const ModulePort& port, const std::string& name, const BitUses& uses,
+                        Warnings& warnings) {
     const auto index = static_cast<std::uint32_t>(signals_.size());
     ImportedSignal& signal = signals_.emplace_back();
-    signal.name = port.name;
+    signal.name = name.empty() ? port.name : name;
+    named_.push_back(!name.empty());
     signal.port = &port;
     signal.net = portNets_.find(port.name)->second;
     signal.width = port.bits.count;
@@ -88,7 +88,8 @@ void BitOwners::AddPort(const ModulePort& port, const BitUses& uses, Warnings& w
         warnings.Add(top_.GetPath("ports", port.name),
                      "indices below 0, or beyond 32 bits, cannot be written; counted from 0");
     }
-    for (std::uint32_t i = 0; i < port.bits.count; ++i) {
+    const bool isOwner = !NameRules::IsEscaped(name);
+    for (std::uint32_t i = 0; isOwner && i < port.bits.count; ++i) {
         const Bit bit = top_.GetBit(port.bits, i);
         if (IsNet(bit) && OwnsBit(port, uses.Get(bit))) {
             SetOwner(bit, index, i);
@@ -161,8 +162,9 @@ void BitOwners::AddNamelessBits(const BitUses& uses) {
 }
 
 void BitOwners::ClaimLegalNames(UniqueNames& names) {
-    for (const ImportedSignal& signal : signals_) {
-        named_.push_back(IsLegalName(signal.name) && names.Claim(signal.name));
+    named_.resize(signals_.size());
+    for (std::size_t i = 0; i < signals_.size(); ++i) {
+        named_[i] = named_[i] || names.ClaimLegal(signals_[i].name);
     }
 }
 

@@ -45,7 +45,13 @@ struct BitOwner {
 class BitOwners {
 public:
     /// \param top must outlive the result.
-    static BitOwners Choose(const Module& top, const BitUses& uses, Warnings& warnings);
+    /// \param portNames the names that ports have already, in the order of the file; empty for a
+    /// port without one. A port with an escaped name owns no bit, because the library takes such a
+    /// name for no part of a concatenation.
+    /// \param rules what names the nets may keep.
+    static BitOwners Choose(const Module& top, const BitUses& uses,
+                            const std::vector<std::string>& portNames, const NameRules& rules,
+                            Warnings& warnings);
 
     /// The ports come first, in the order of the file.
     const std::vector<ImportedSignal>& GetSignals() const noexcept { return signals_; }
@@ -73,9 +79,9 @@ private:
 
     explicit BitOwners(const Module& top) : top_(top), owners_(top.netBits) {}
 
-    void FindCandidates();
-    void AddPorts(const BitUses& uses, Warnings& warnings);
-    void AddPort(const ModulePort& port, const BitUses& uses, Warnings& warnings);
+    void FindCandidates(const NameRules& rules);
+    void AddPort(const ModulePort& port, const std::string& name, const BitUses& uses,
+                 Warnings& warnings);
     void AddNets(const std::vector<Candidate>& candidates, const BitUses& uses);
     void AddSharedOutputs(const BitUses& uses);
     void AddNamelessBits(const BitUses& uses);

@@ -1,11 +1,13 @@
 #include "import/BitUses.h"
 
+#include "import/NameRules.h"
+
 namespace Tool::Import {
 
 static_assert(sizeof(BitUse) == 1);
 
 BitUses BitUses::Count(const Module& top, const ImportedComponents& components,
-                       const UnknownValues& unknown) {
+                       const UnknownValues& unknown, const std::vector<std::string>& portNames) {
     BitUses uses(top, unknown);
     for (const ModulePort& port : top.ports) {
         uses.CountPort(port);
@@ -14,6 +16,11 @@ BitUses BitUses::Count(const Module& top, const ImportedComponents& components,
         uses.ShareWholePort(port);
     }
     uses.CountPins();
+    for (std::size_t p = 0; p < top.ports.size(); ++p) {
+        if (NameRules::IsEscaped(portNames[p])) {
+            uses.NeedBitsOf(top.ports[p]);
+        }
+    }
     uses.CountNames();
     uses.CountConnections(components);
     return uses;
@@ -78,6 +85,16 @@ void BitUses::CountPins() {
     for (const Connection& connection : top_.connections) {
         ForEachNetBit(connection.bits, [](BitUse& use) { use.pins = CountOneMore(use.pins); });
     }
+}
+
+/// What else uses the bits of a port with an escaped name needs a signal for them.
+void BitUses::NeedBitsOf(const ModulePort& escapedPort) {
+    ForEachNetBit(escapedPort.bits, [&](BitUse& use) {
+        const bool hasOtherPort =
+            use.inout ||
+            (escapedPort.direction == Direction::Input ? use.outputs != UseCount::None : use.input);
+        use.needed = use.needed || hasOtherPort || use.pins != UseCount::None;
+    });
 }
 
 void BitUses::CountNames() {

@@ -7,6 +7,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <string>
 #include <string_view>
 #include <unordered_set>
 #include <vector>
@@ -36,10 +37,11 @@ struct BitUse {
 class BitUses {
 public:
     /// \param top must outlive the result, and so must `unknown`.
+    /// \param portNames see `BitOwners::Choose`.
     /// \throws Error if ports contradict each other, or an x or z without a replacement is a
     /// driver.
     static BitUses Count(const Module& top, const ImportedComponents& components,
-                         const UnknownValues& unknown);
+                         const UnknownValues& unknown, const std::vector<std::string>& portNames);
 
     const BitUse& Get(Bit bit) const { return uses_[bit]; }
     /// Whether a connection, given by its index, is left open: none of its bits has another pin, a
@@ -62,6 +64,7 @@ private:
     void CheckConstant(const ModulePort& port, std::uint32_t i) const;
     void ShareWholePort(const ModulePort& port);
     void CountPins();
+    void NeedBitsOf(const ModulePort& escapedPort);
     void CountNames();
     void CountConnections(const ImportedComponents& components);
     void CountConnection(const Cell& cell, std::uint32_t index, const ImportedPin& pin);

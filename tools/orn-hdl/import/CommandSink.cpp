@@ -37,11 +37,16 @@ void CommandSink::WriteLine(std::string_view phrase, const Words&... words) {
     out_ << line_;
 }
 
+void CommandSink::WriteTypedValue(const std::string& phrase, const std::string& owner,
+                                  const TypedValue& value) {
+    const std::string type = "-TYPE=" + value.type;
+    WriteLine(phrase, owner, type, value.name, value.value);
+}
+
 void CommandSink::WriteAttribute(std::string_view object, const std::string& owner,
                                  const TypedValue& value, std::string_view option) {
     const std::string kind(object);
-    const std::string type = "-TYPE=" + value.type;
-    WriteLine("ADD " + kind + " ATTRIBUTE", owner, type, value.name, value.value);
+    WriteTypedValue("ADD " + kind + " ATTRIBUTE", owner, value);
     WriteLine("SET " + kind + " ATTRIBUTE OPTION", owner, value.name, option);
 }
 
@@ -100,6 +105,12 @@ void CommandSink::AddInstance(const std::string& name, const std::string& compon
 
 void CommandSink::AddInstanceGeneric(const std::string& instance, const TypedValue& generic) {
     WriteAttribute("INSTANCE", instance, generic, "-GENERIC=SYN");
+}
+
+void CommandSink::LeaveOutInstanceGeneric(const std::string& instance, const TypedValue& generic) {
+    // An attribute of the instance hides that of the component, and without an option it is not
+    // written.
+    WriteTypedValue("ADD INSTANCE ATTRIBUTE", instance, generic);
 }
 
 void CommandSink::AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) {

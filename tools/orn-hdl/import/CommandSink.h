@@ -33,6 +33,7 @@ public:
     void AddSignalAttribute(const std::string& signal, const TypedValue& attribute) override;
     void AddInstance(const std::string& name, const std::string& component) override;
     void AddInstanceGeneric(const std::string& instance, const TypedValue& generic) override;
+    void LeaveOutInstanceGeneric(const std::string& instance, const TypedValue& generic) override;
     void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) override;
     void Connect(const std::string& signal, const std::string& instance,
                  const std::string& pin) override;
@@ -41,6 +42,8 @@ public:
 
 private:
     template <class... Words> void WriteLine(std::string_view phrase, const Words&... words);
+    void WriteTypedValue(const std::string& phrase, const std::string& owner,
+                         const TypedValue& value);
     void WriteAttribute(std::string_view object, const std::string& owner, const TypedValue& value,
                         std::string_view option);
 

@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <string>
+#include <vector>
 
 namespace Tool::Import {
 
@@ -27,6 +28,8 @@ private:
     void EmitPortConstant(const ImportedSignal& signal, std::uint32_t& left);
     void EmitAlias(const ImportedSignal& signal, std::uint32_t& left);
     void EmitCell(std::size_t index);
+    void LeaveOutGenerics(const std::string& name, const Cell& cell,
+                          const ImportedComponent& component);
     void EmitConnection(const std::string& cell, const ImportedPin& pin, std::uint32_t index);
     void EmitAttributes();
     template <class Add> void ForEachAttribute(const Span& attributes, Add add) const;
@@ -62,7 +65,11 @@ void NetlistEmitter::EmitComponents() {
             sink_.AddPin(component.name, pin.name, GetDirectionName(pin.direction));
         }
         for (const ImportedGeneric& generic : component.generics) {
-            sink_.AddComponentGeneric(component.name, generic.value);
+            // Verilog declares no components, and a default of theirs would apply to every
+            // instance.
+            if (!generic.isPartial || netlist_.hasVhdl) {
+                sink_.AddComponentGeneric(component.name, generic.value);
+            }
         }
     }
 }
@@ -99,7 +106,7 @@ void NetlistEmitter::EmitPortBits(const ImportedSignal& signal, std::uint32_t in
         const Bit bit = references_.GetBit(signal.port->bits, left);
         if (bit == Zero || bit == One) {
             EmitPortConstant(signal, left);
-        } else if (IsNet(bit) &&
+        } else if (IsNet(bit) && owners_.Get(bit).signal != BitOwner::NoSignal &&
                    (owners_.Get(bit).signal != index || owners_.Get(bit).position != left)) {
             EmitAlias(signal, left);
         }
@@ -141,7 +148,8 @@ void NetlistEmitter::EmitAlias(const ImportedSignal& signal, std::uint32_t& left
     const std::string own = GetPartName(signal, start, left);
     const std::string owner =
         GetPartName(owners_.GetSignals()[first.signal], first.position, last.position);
-    // An input port does not own a bit only when an inout port has the bit too.
+    // An input port that does not own a bit drives the inout port, or the internal signal, that
+    // owns it.
     const bool drives = signal.port->direction == Direction::Input;
     sink_.Alias(drives ? owner : own, drives ? own : owner);
 }
@@ -157,8 +165,30 @@ void NetlistEmitter::EmitCell(std::size_t index) {
     }
     for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
         const NamedValue& value = top_.values[cell.parameters.start + i];
-        const std::string& generic = component.GetGeneric(value.name).value.name;
-        sink_.AddInstanceGeneric(name, MakeGeneric(generic, value.value, netlist_.unknown));
+        if (const ImportedGeneric* generic = component.FindGeneric(value, netlist_.unknown)) {
+            sink_.AddInstanceGeneric(
+                name, MakeGeneric(generic->value.name, value.value, netlist_.unknown));
+        }
+    }
+    if (component.hasPartialGenerics && netlist_.hasVhdl) {
+        LeaveOutGenerics(name, cell, component);
+    }
+}
+
+/// Leaves out the generics of the component that the cell does not have.
+void NetlistEmitter::LeaveOutGenerics(const std::string& name, const Cell& cell,
+                                      const ImportedComponent& component) {
+    std::vector<bool> isSet(component.generics.size());
+    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+        const NamedValue& value = top_.values[cell.parameters.start + i];
+        if (const ImportedGeneric* generic = component.FindGeneric(value, netlist_.unknown)) {
+            isSet[static_cast<std::size_t>(generic - component.generics.data())] = true;
+        }
+    }
+    for (std::size_t i = 0; i < isSet.size(); ++i) {
+        if (component.generics[i].isPartial && !isSet[i]) {
+            sink_.LeaveOutInstanceGeneric(name, component.generics[i].value);
+        }
     }
 }
 

@@ -1,6 +1,6 @@
 #include "import/ImportedComponents.h"
 
-#include "import/LegalNames.h"
+#include "import/NameRules.h"
 #include "import/Spelling.h"
 #include "import/Values.h"
 
@@ -8,6 +8,7 @@
 #include <cstddef>
 #include <iterator>
 #include <map>
+#include <unordered_set>
 #include <utility>
 
 namespace Tool::Import {
@@ -16,7 +17,7 @@ namespace {
 
 /// The differences of a component from others of its type, as sorted numbers: `PinKey` for pins
 /// whose width is not the type's (for all pins of a type that is split by pins), then
-/// `ParameterKey` for parameters that other cells lack and that have no default. Only parts
+/// `ParameterKey` for parameters that other cells lack, in a type that is split by them. Only parts
 /// of the cell itself are included, so that the cost of a cell depends only on its own size.
 using Variant = std::vector<std::uint64_t>;
 
@@ -34,31 +35,47 @@ constexpr std::uint32_t GetPinOf(std::uint64_t key) noexcept {
     return static_cast<std::uint32_t>(key >> 32);
 }
 
-/// The lower half of a key: a pin's width or a parameter's index.
-constexpr std::uint32_t GetNumberOf(std::uint64_t key) noexcept {
+constexpr std::uint32_t GetWidthOf(std::uint64_t key) noexcept {
     return static_cast<std::uint32_t>(key);
 }
+
+/// What the cells of a component have in common.
+struct ComponentUse {
+    std::uint32_t type = 0;
+    std::uint32_t cells = 0;
+    /// For each parameter that other cells of the type lack and that has no known default, the
+    /// number of cells that have it. Each set is no larger than what the component's own cells
+    /// have, whatever others have.
+    std::map<std::uint32_t, std::uint32_t> partialParameters;
+};
 
 class ComponentFinder {
 public:
     ComponentFinder(const ImportedDesign& design, const Module& top,
                     const std::vector<TypeUse>& types, const UnknownValues& unknown,
-                    Warnings& warnings)
-        : design_(design), top_(top), types_(types), unknown_(unknown), warnings_(warnings),
-          variants_(types.size()) {}
+                    const NameRules& rules, Warnings& warnings)
+        : design_(design), top_(top), types_(types), unknown_(unknown), rules_(rules),
+          warnings_(warnings), variants_(types.size()) {}
 
+    /// The component of a cell. Its generics are added later.
     std::uint32_t GetOrAdd(const Cell& cell);
+    /// Adds the generics and names the parts of all components.
+    void Finish();
     std::vector<ImportedComponent>& GetComponents() noexcept { return components_; }
 
 private:
+    void CountParameters(ComponentUse& use, const Cell& cell) const;
     Variant GetVariant(const TypeUse& type, const Cell& cell) const;
     void Add(std::uint32_t index, const Variant& variant, const Cell& cell);
     void AddPins(ImportedComponent& component, std::uint32_t type, const Variant& variant);
     void AddPin(ImportedComponent& component, const std::vector<TypePin>& pins,
                 std::uint32_t typePin, std::uint32_t width);
-    void AddGenerics(ImportedComponent& component, const TypeUse& type, const Variant& variant);
-    void AddGeneric(ImportedComponent& component, const TypeUse& type,
-                    const TypeUse::Parameter& parameter);
+    void AddGenerics(ImportedComponent& component, const ComponentUse& use);
+    ImportedGeneric& AddGeneric(ImportedComponent& component, const TypeUse::Parameter& parameter);
+    void SetCommonValue(ImportedGeneric& generic, const ImportedComponent& component,
+                        const TypeUse& type, const TypeUse::Parameter& parameter);
+    void SetFirstValue(ImportedGeneric& generic, const ImportedComponent& component,
+                       const TypeUse::Parameter& parameter);
     void NameParts(ImportedComponent& component, const TypeUse& type);
     void ClaimSimilar(UniqueNames& scope, const ImportedComponent& component, std::string_view part,
                       std::string_view oldName, std::string& name);
@@ -67,8 +84,11 @@ private:
     const Module& top_;
     const std::vector<TypeUse>& types_;
     const UnknownValues& unknown_;
+    const NameRules& rules_;
     Warnings& warnings_;
     std::vector<ImportedComponent> components_;
+    /// By the index of the component.
+    std::vector<ComponentUse> uses_;
     /// The components of each type.
     std::vector<std::map<Variant, std::uint32_t>> variants_;
 };
@@ -80,7 +100,27 @@ std::uint32_t ComponentFinder::GetOrAdd(const Cell& cell) {
     if (isNew) {
         Add(cell.type, variant, cell);
     }
+    CountParameters(uses_[place->second], cell);
     return place->second;
+}
+
+void ComponentFinder::CountParameters(ComponentUse& use, const Cell& cell) const {
+    const TypeUse& type = types_[cell.type];
+    ++use.cells;
+    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+        const std::string_view name = top_.values[cell.parameters.start + i].name;
+        const std::uint32_t index = type.parameterIndex.find(name)->second;
+        if (type.IsPartial(type.parameters[index])) {
+            ++use.partialParameters[index];
+        }
+    }
+}
+
+void ComponentFinder::Finish() {
+    for (std::size_t c = 0; c < components_.size(); ++c) {
+        AddGenerics(components_[c], uses_[c]);
+        NameParts(components_[c], types_[uses_[c].type]);
+    }
 }
 
 Variant ComponentFinder::GetVariant(const TypeUse& type, const Cell& cell) const {
@@ -93,7 +133,7 @@ Variant ComponentFinder::GetVariant(const TypeUse& type, const Cell& cell) const
             variant.push_back(PinKey(connection.pin, width));
         }
     }
-    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+    for (std::uint32_t i = 0; type.splitsByParameters && i < cell.parameters.count; ++i) {
         const std::string_view name = top_.values[cell.parameters.start + i].name;
         const std::uint32_t index = type.parameterIndex.find(name)->second;
         if (type.IsPartial(type.parameters[index])) {
@@ -111,9 +151,9 @@ void ComponentFinder::Add(std::uint32_t index, const Variant& variant, const Cel
     component.oldName = design_.types[index].name;
     component.firstCell = &cell;
     component.splitByPins = type.splitsByPins;
+    component.splitByParameters = type.splitsByParameters;
     AddPins(component, index, variant);
-    AddGenerics(component, type, variant);
-    NameParts(component, type);
+    uses_.emplace_back().type = index;
 }
 
 void ComponentFinder::AddPins(ImportedComponent& component, std::uint32_t type,
@@ -123,13 +163,13 @@ void ComponentFinder::AddPins(ImportedComponent& component, std::uint32_t type,
     const auto isPin = [&] { return key != variant.end() && *key < ParameterBit; };
     if (component.splitByPins) {
         for (; isPin(); ++key) {
-            AddPin(component, pins, GetPinOf(*key), GetNumberOf(*key));
+            AddPin(component, pins, GetPinOf(*key), GetWidthOf(*key));
         }
         return;
     }
     for (std::uint32_t pin = 0; pin < pins.size(); ++pin) {
         const bool differs = isPin() && GetPinOf(*key) == pin;
-        AddPin(component, pins, pin, differs ? GetNumberOf(*key++) : types_[type].pins[pin].width);
+        AddPin(component, pins, pin, differs ? GetWidthOf(*key++) : types_[type].pins[pin].width);
     }
 }
 
@@ -147,58 +187,107 @@ void ComponentFinder::AddPin(ImportedComponent& component, const std::vector<Typ
     }
 }
 
-void ComponentFinder::AddGenerics(ImportedComponent& component, const TypeUse& type,
-                                  const Variant& variant) {
-    std::vector<std::uint32_t> parameters = type.commonParameters;
-    const auto common = static_cast<std::ptrdiff_t>(parameters.size());
-    const auto own = std::lower_bound(variant.begin(), variant.end(), ParameterBit);
-    std::transform(own, variant.end(), std::back_inserter(parameters), GetNumberOf);
-    std::inplace_merge(parameters.begin(), parameters.begin() + common, parameters.end());
-    for (const std::uint32_t index : parameters) {
-        AddGeneric(component, type, type.parameters[index]);
+void ComponentFinder::AddGenerics(ImportedComponent& component, const ComponentUse& use) {
+    const TypeUse& type = types_[use.type];
+    std::string unknownDefaults;
+    auto partial = use.partialParameters.begin();
+    const auto addPartialBefore = [&](std::uint32_t end) {
+        for (; partial != use.partialParameters.end() && partial->first < end; ++partial) {
+            const TypeUse::Parameter& parameter = type.parameters[partial->first];
+            ImportedGeneric& generic = AddGeneric(component, parameter);
+            if (partial->second < use.cells) {
+                generic.value = MakeNeutralGeneric(*parameter.first);
+                generic.isPartial = true;
+                component.hasPartialGenerics = true;
+                unknownDefaults.append(unknownDefaults.empty() ? "" : ", ").append(parameter.name);
+            } else {
+                SetFirstValue(generic, component, parameter);
+            }
+        }
+    };
+    for (const std::uint32_t index : type.commonParameters) {
+        addPartialBefore(index);
+        const TypeUse::Parameter& parameter = type.parameters[index];
+        SetCommonValue(AddGeneric(component, parameter), component, type, parameter);
+    }
+    addPartialBefore(static_cast<std::uint32_t>(type.parameters.size()));
+    if (!unknownDefaults.empty() && rules_.HasVhdl()) {
+        warnings_.Add(top_.GetPath("cells", component.firstCell->name).AddKey("parameters"),
+                      "other cells of the type have other parameters, and their defaults are "
+                      "unknown; in VHDL they are 0 or empty: " +
+                          unknownDefaults);
     }
 }
 
-void ComponentFinder::AddGeneric(ImportedComponent& component, const TypeUse& type,
-                                 const TypeUse::Parameter& parameter) {
+ImportedGeneric& ComponentFinder::AddGeneric(ImportedComponent& component,
+                                             const TypeUse::Parameter& parameter) {
     component.genericIndex.emplace(parameter.name,
                                    static_cast<std::uint32_t>(component.generics.size()));
     ImportedGeneric& generic = component.generics.emplace_back();
     generic.oldName = parameter.name;
-    Place place = top_.GetPlace(*component.firstCell, "parameters", parameter.name);
-    const Value* value = parameter.first;
-    if (type.NeedsDefault(parameter) && parameter.defaultValue != nullptr) {
-        value = parameter.defaultValue;
-        place = Place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
+    generic.hasDefault = parameter.defaultValue != nullptr;
+    return generic;
+}
+
+void ComponentFinder::SetCommonValue(ImportedGeneric& generic, const ImportedComponent& component,
+                                     const TypeUse& type, const TypeUse::Parameter& parameter) {
+    if (!type.NeedsDefault(parameter)) {
+        SetFirstValue(generic, component, parameter);
+        return;
     }
-    CheckParameter(*value, place, unknown_, warnings_);
-    generic.value = MakeGeneric("", *value, unknown_);
+    const Place place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
+    CheckParameter(*parameter.defaultValue, place, unknown_, warnings_);
+    if (MeansAny(*parameter.defaultValue, unknown_)) {
+        WarnOfAny(place, warnings_);
+    }
+    generic.value = MakeGeneric("", *parameter.defaultValue, unknown_);
+}
+
+void ComponentFinder::SetFirstValue(ImportedGeneric& generic, const ImportedComponent& component,
+                                    const TypeUse::Parameter& parameter) {
+    CheckParameter(*parameter.first,
+                   top_.GetPlace(*component.firstCell, "parameters", parameter.name), unknown_,
+                   warnings_);
+    generic.value = MakeGeneric("", *parameter.first, unknown_);
+}
+
+BitRange GetRange(const TypeUse& type, const ImportedPin& pin) noexcept {
+    const ModulePort* port = type.pins[pin.typePin].port;
+    return Normalize(port == nullptr ? BitRange() : port->range, pin.width);
+}
+
+/// \param mayEscape whether an escaped name may be used: the library takes none for a bus.
+void ClaimUnchanged(UniqueNames& scope, std::string_view oldName, bool mayEscape,
+                    std::string& name) {
+    if (scope.ClaimLegal(oldName)) {
+        name = oldName;
+    } else if (mayEscape) {
+        name = scope.ClaimSame(oldName);
+    }
 }
 
 void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& type) {
     // In VHDL, pins and generics share the scope of the component.
-    UniqueNames scope;
-    const auto claimUnchanged = [&](std::string_view oldName, std::string& name) {
-        if (IsLegalName(oldName) && scope.Claim(oldName)) {
-            name = oldName;
-        }
-    };
+    UniqueNames scope(rules_);
+    UniqueNames verilogGenerics(rules_);
+    UniqueNames& genericScope = rules_.MayEscape() ? verilogGenerics : scope;
     for (ImportedPin& pin : component.pins) {
-        claimUnchanged(pin.oldName, pin.baseName);
+        const BitRange range = GetRange(type, pin);
+        pin.scalar = pin.width == 1 && range.offset == 0;
+        ClaimUnchanged(scope, pin.oldName, pin.scalar, pin.baseName);
     }
     for (ImportedGeneric& generic : component.generics) {
-        claimUnchanged(generic.oldName, generic.value.name);
+        // Yosys reads no escaped name in a defparam statement.
+        ClaimUnchanged(genericScope, generic.oldName, false, generic.value.name);
     }
     for (ImportedPin& pin : component.pins) {
         ClaimSimilar(scope, component, "connections", pin.oldName, pin.baseName);
     }
     for (ImportedGeneric& generic : component.generics) {
-        ClaimSimilar(scope, component, "parameters", generic.oldName, generic.value.name);
+        ClaimSimilar(genericScope, component, "parameters", generic.oldName, generic.value.name);
     }
     for (ImportedPin& pin : component.pins) {
-        const ModulePort* port = type.pins[pin.typePin].port;
-        const BitRange range = Normalize(port == nullptr ? BitRange() : port->range, pin.width);
-        pin.scalar = pin.width == 1 && range.offset == 0;
+        const BitRange range = GetRange(type, pin);
         pin.name = pin.scalar ? pin.baseName
                               : MakeBusName(pin.baseName, GetIndex(range, pin.width, pin.width - 1),
                                             GetIndex(range, pin.width, 0));
@@ -212,37 +301,40 @@ void ComponentFinder::ClaimSimilar(UniqueNames& scope, const ImportedComponent& 
     if (name.empty()) {
         name = scope.ClaimSimilar(oldName, 'p');
         warnings_.Add(top_.GetPlace(*component.firstCell, part, oldName).ToPath(),
-                      (IsLegalName(oldName)
+                      (rules_.IsLegal(oldName)
                            ? "another pin or parameter has the name " + Quote(oldName)
-                           : Quote(oldName) + NotLegal) +
+                           : Quote(oldName) + rules_.GetComplaint()) +
                           "; renamed to " + name + " in component " + Quote(component.oldName));
     }
 }
 
 /// The warning for a component that could not keep the name of its type.
-std::string MakeWarning(const ImportedComponent& component) {
-    if (!IsLegalName(component.oldName)) {
-        return Quote(component.oldName) + NotLegal + "; renamed to " + component.name;
+std::string MakeWarning(const ImportedComponent& component, const NameRules& rules) {
+    if (!rules.IsLegal(component.oldName)) {
+        return Quote(component.oldName) + rules.GetComplaint() + "; renamed to " + component.name;
     }
-    const std::string reason = component.splitByPins
-                                   ? "the cells of the type have few pins in common"
-                                   : "other cells of the type have other pin widths, or parameters "
-                                     "without a known default";
+    std::string reason = "other cells of the type have other pin widths";
+    if (component.splitByPins) {
+        reason = "the cells of the type have few pins in common";
+    } else if (component.splitByParameters) {
+        reason = "the cells of the type have few parameters in common";
+    }
     return reason + "; this component is named " + component.name;
 }
 
 void NameComponents(std::vector<ImportedComponent>& components, const Module& top,
                     UniqueNames& names, Warnings& warnings) {
+    std::unordered_set<std::string_view> types;
     for (ImportedComponent& component : components) {
-        if (IsLegalName(component.oldName) && names.Claim(component.oldName)) {
-            component.name = component.oldName;
+        if (types.insert(component.oldName).second) {
+            component.name = names.ClaimModule(component.oldName);
         }
     }
     for (ImportedComponent& component : components) {
         if (component.name.empty()) {
             component.name = names.ClaimSimilar(component.oldName, 'c');
             warnings.Add(top.GetPath("cells", component.firstCell->name).AddKey("type"),
-                         MakeWarning(component));
+                         MakeWarning(component, names.GetRules()));
         }
     }
 }
@@ -258,16 +350,27 @@ const ImportedPin& ImportedComponent::GetPin(std::uint32_t typePin) const {
         [](const ImportedPin& pin, std::uint32_t wanted) { return pin.typePin < wanted; });
 }
 
+const ImportedGeneric* ImportedComponent::FindGeneric(const NamedValue& parameter,
+                                                      const UnknownValues& unknown) const {
+    const auto found = genericIndex.find(parameter.name);
+    if (found == genericIndex.end()) {
+        return nullptr;
+    }
+    const ImportedGeneric& generic = generics[found->second];
+    return generic.hasDefault && MeansAny(parameter.value, unknown) ? nullptr : &generic;
+}
+
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
                                   const UnknownValues& unknown, UniqueNames& names,
                                   Warnings& warnings) {
-    const std::vector<TypeUse> types = CountTypeUses(design, top, warnings);
-    ComponentFinder finder(design, top, types, unknown, warnings);
+    const std::vector<TypeUse> types = CountTypeUses(design, top, unknown, warnings);
+    ComponentFinder finder(design, top, types, unknown, names.GetRules(), warnings);
     std::vector<std::uint32_t> componentOf;
     componentOf.reserve(top.cells.size());
     for (const Cell& cell : top.cells) {
         componentOf.push_back(finder.GetOrAdd(cell));
     }
+    finder.Finish();
     NameComponents(finder.GetComponents(), top, names, warnings);
     return ImportedComponents(std::move(finder.GetComponents()), std::move(componentOf));
 }

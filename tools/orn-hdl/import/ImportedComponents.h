@@ -35,6 +35,10 @@ struct ImportedGeneric {
     std::string_view oldName;
     /// The name, and the value for cells without a value of their own.
     TypedValue value;
+    /// Whether the value is the default that the cell type has.
+    bool hasDefault = false;
+    /// Whether some cells leave it out, although nothing tells the default of the cell type.
+    bool isPartial = false;
 };
 
 struct ImportedComponent {
@@ -44,22 +48,23 @@ struct ImportedComponent {
     std::string name;
     /// Whether it only has the pins of the cells that need it.
     bool splitByPins = false;
+    /// Whether it only has the parameters of the cells that need it.
+    bool splitByParameters = false;
     /// In the order of the type's pins.
     std::vector<ImportedPin> pins;
     std::vector<ImportedGeneric> generics;
     std::unordered_map<std::string_view, std::uint32_t> genericIndex;
+    bool hasPartialGenerics = false;
 
     /// A pin, by its index in the pins of the type.
     const ImportedPin& GetPin(std::uint32_t typePin) const;
-    /// A generic, by the name of the parameter.
-    const ImportedGeneric& GetGeneric(std::string_view parameter) const {
-        return generics[genericIndex.find(parameter)->second];
-    }
+    /// The generic for a parameter of a cell; null if the cell leaves the parameter out.
+    const ImportedGeneric* FindGeneric(const NamedValue& parameter,
+                                       const UnknownValues& unknown) const;
 };
 
 /// One component for each type of cell, and further ones where cells of one type differ in the
-/// widths of their pins, or in parameters without a default in the file, or have few pins in
-/// common.
+/// widths of their pins, or have few pins or parameters in common.
 class ImportedComponents {
 public:
     /// \param components those that the cells need, in the order of the first cell that needs them.

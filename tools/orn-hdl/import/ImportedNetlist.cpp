@@ -62,26 +62,33 @@ void CheckParameters(const Module& top, const UnknownValues& unknown, Warnings& 
     for (const Cell& cell : top.cells) {
         for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
             const NamedValue& value = top.values[cell.parameters.start + i];
-            CheckParameter(value.value, top.GetPlace(cell, "parameters", value.name), unknown,
-                           warnings);
+            const Place place = top.GetPlace(cell, "parameters", value.name);
+            CheckParameter(value.value, place, unknown, warnings);
+            if (MeansAny(value.value, unknown)) {
+                WarnOfAny(place, warnings);
+            }
         }
     }
 }
 
 } // namespace
 
-ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const UnknownValues& unknown,
+ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRules& rules,
                             Warnings& warnings) {
-    UniqueNames names;
+    const UnknownValues& unknown = rules.unknown;
+    UniqueNames names(rules.names);
+    const std::vector<std::string> portNames = ClaimPortNames(top, names);
     ImportedComponents components = FindComponents(design, top, unknown, names, warnings);
     OpenConstantOutputs(top, components, warnings);
-    const BitUses uses = BitUses::Count(top, components, unknown);
-    BitOwners owners = BitOwners::Choose(top, uses, warnings);
+    const BitUses uses = BitUses::Count(top, components, unknown, portNames);
+    BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
     WarnOfModule(top, warnings);
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
+    netlist.hasVhdl = rules.names.HasVhdl();
     NameDesign(netlist, names, warnings);
     NameCellsAndSignals(netlist, names);
+    ReportRenamedPorts(netlist, rules.names, rules.keepPorts, warnings);
     DecideConnections(netlist, uses, names);
     NameAttributes(netlist, names, warnings);
     return netlist;

@@ -4,6 +4,7 @@
 #include "import/BitOwners.h"
 #include "import/ImportedComponents.h"
 #include "import/ImportedDesign.h"
+#include "import/NameRules.h"
 #include "import/UnknownValues.h"
 #include "import/Warnings.h"
 
@@ -17,6 +18,14 @@ namespace Tool::Import {
 
 /// How a pin is connected: not at all, to a constant of its own, or to a signal.
 enum class ConnectionKind : std::uint8_t { Open, Constant, Signal };
+
+/// What the user asks of an import.
+struct ImportRules {
+    UnknownValues unknown;
+    NameRules names;
+    /// Whether renaming a port is an error.
+    bool keepPorts = false;
+};
 
 /// The design must outlive it.
 struct ImportedNetlist {
@@ -33,12 +42,14 @@ struct ImportedNetlist {
     std::vector<ConnectionKind> connections;
     /// Whether an input pin of some cell is open.
     bool hasOpenInputs = false;
+    /// Whether the netlist may be written in VHDL.
+    bool hasVhdl = true;
 };
 
 /// Determines all names and connections, so that all errors are found before anything is written.
 /// In the design, constants at output pins are replaced by net bits. \param top a module of the
 /// design. \throws Error if the design cannot be imported.
-ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const UnknownValues& unknown,
+ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRules& rules,
                             Warnings& warnings);
 
 } // namespace Tool::Import

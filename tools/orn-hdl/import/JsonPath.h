@@ -2,16 +2,36 @@
 #pragma once
 
 #include <cstddef>
+#include <cstdint>
 #include <stdexcept>
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace Tool::Import {
 
-/// The file cannot be imported: `what()` names the place in the file and the reason.
+/// A place in the text of a file.
+struct TextPlace {
+    /// The first line counts as 1; 0 if the place is not known.
+    std::uint64_t line = 0;
+    /// The text of the line.
+    std::string source;
+    /// The byte of the line; the first one counts as 0.
+    std::size_t column = 0;
+};
+
+/// The file cannot be imported: `what()` names the path in the JSON and the reason.
 class Error : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
+    Error(const std::string& text, TextPlace place)
+        : std::runtime_error(text), place_(std::move(place)) {}
+
+    /// Where the text is no JSON; without a line for all other errors.
+    const TextPlace& GetPlace() const noexcept { return place_; }
+
+private:
+    TextPlace place_;
 };
 
 /// A place in a JSON file, such as modules.top.cells["u.1"].connections.A[3].

@@ -23,15 +23,19 @@ public:
         text.resize(size + simdjson::SIMDJSON_PADDING);
         // The parser owns the keys of the path in a message, so it outlives the try block.
         simdjson::ondemand::parser parser;
+        simdjson::ondemand::document document;
+        const std::string_view json = std::string_view(text).substr(0, size);
+        bool isOpen = false;
         try {
-            simdjson::ondemand::document document = parser.iterate(text.data(), size, text.size());
+            document = parser.iterate(text.data(), size, text.size());
+            isOpen = true;
             JsonValue root = document.get_value();
             visit(root);
             if (document.current_location().error() != simdjson::OUT_OF_BOUNDS) {
                 Fail("nothing may follow the netlist");
             }
         } catch (const simdjson::simdjson_error& error) {
-            Fail(std::string("invalid JSON: ") + simdjson::error_message(error.error()));
+            FailToParse(error.error(), json, isOpen ? &document : nullptr);
         }
     }
 
@@ -85,6 +89,11 @@ private:
     };
     static constexpr std::size_t NoIndex = std::numeric_limits<std::size_t>::max();
 
+    /// The path of the present value, and a text behind it.
+    std::string GetMessage(const std::string& text) const;
+    /// \param document null if parsing could not even begin.
+    [[noreturn]] void FailToParse(simdjson::error_code error, std::string_view text,
+                                  simdjson::ondemand::document* document) const;
     void Enter(Step step);
 
     std::vector<Step> steps_;

@@ -71,6 +71,13 @@ void ModelSink::AddInstanceGeneric(const std::string& instance, const TypedValue
     model_.SetInstanceGenericAttrValue(instance.c_str(), generic.name.c_str(), GenericMark);
 }
 
+void ModelSink::LeaveOutInstanceGeneric(const std::string& instance, const TypedValue& generic) {
+    // An attribute of the instance hides that of the component, and without an option it is not
+    // written.
+    model_.AddInstanceAttr(instance.c_str(), generic.name.c_str(), generic.value.c_str(),
+                           generic.type.c_str());
+}
+
 void ModelSink::AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) {
     model_.AddInstanceAttr(instance.c_str(), attribute.name.c_str(), attribute.value.c_str(),
                            attribute.type.c_str());

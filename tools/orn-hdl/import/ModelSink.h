@@ -32,6 +32,7 @@ public:
     void AddSignalAttribute(const std::string& signal, const TypedValue& attribute) override;
     void AddInstance(const std::string& name, const std::string& component) override;
     void AddInstanceGeneric(const std::string& instance, const TypedValue& generic) override;
+    void LeaveOutInstanceGeneric(const std::string& instance, const TypedValue& generic) override;
     void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) override;
     void Connect(const std::string& signal, const std::string& instance,
                  const std::string& pin) override;

@@ -1,5 +1,6 @@
 #include "import/NetlistConnections.h"
 
+#include "import/NameRules.h"
 #include "import/SignalReferences.h"
 
 #include "Orn_Hdl/Model/Pins.h"
@@ -60,9 +61,9 @@ void DecideConnections(ImportedNetlist& netlist, const BitUses& uses, UniqueName
             }
             const ImportedPin& pin = netlist.components.GetOf(c).GetPin(connection.pin);
             const SignalReferences references(top, netlist.owners, netlist.unknown);
-            // If the constant signals of two pins would have the same name, the import adds a
-            // signal.
-            if (references.IsConstant(connection.bits) &&
+            // If the constant signals of two pins would have the same name, or their name would
+            // have an escaped name within it, the import adds a signal.
+            if (references.IsConstant(connection.bits) && !NameRules::IsEscaped(pin.baseName) &&
                 names.Claim(GetConstantSignalName(netlist.cellNames[c], pin))) {
                 netlist.connections[index] = ConnectionKind::Constant;
                 continue;

@@ -1,6 +1,6 @@
 #include "import/NetlistNames.h"
 
-#include "import/LegalNames.h"
+#include "import/NameRules.h"
 #include "import/Values.h"
 
 #include "Port/Ascii.h"
@@ -9,10 +9,23 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <unordered_set>
 
 namespace Tool::Import {
 
 namespace {
+
+/// The names of nets of one bit that has an index. Older files give the range of a port with the
+/// net of its name only.
+std::unordered_set<std::string_view> GetOneBitBuses(const Module& top) {
+    std::unordered_set<std::string_view> result;
+    for (const Net& net : top.nets) {
+        if (net.bits.count == 1 && net.range.offset != 0) {
+            result.insert(net.name);
+        }
+    }
+    return result;
+}
 
 std::string GetWantedCellName(const ImportedNetlist& netlist, std::size_t cell) {
     const std::string_view name = netlist.top.cells[cell].name;
@@ -39,20 +52,43 @@ void NameAttributesOf(ImportedNetlist& netlist, std::string_view table, std::str
 
 } // namespace
 
+std::vector<std::string> ClaimPortNames(const Module& top, UniqueNames& names) {
+    std::vector<std::string> result(top.ports.size());
+    if (!names.GetRules().MayEscape()) {
+        return result;
+    }
+    for (std::size_t p = 0; p < result.size(); ++p) {
+        if (names.ClaimLegal(top.ports[p].name)) {
+            result[p] = top.ports[p].name;
+        }
+    }
+    const std::unordered_set<std::string_view> oneBitBuses = GetOneBitBuses(top);
+    for (std::size_t p = 0; p < result.size(); ++p) {
+        const ModulePort& port = top.ports[p];
+        const bool isScalar =
+            port.bits.count == 1 && port.range.offset == 0 && oneBitBuses.count(port.name) == 0;
+        // An inout port cannot be connected to an internal signal by an assignment.
+        if (result[p].empty() && isScalar && port.direction != Direction::InOut) {
+            result[p] = names.ClaimSame(port.name);
+        }
+    }
+    return result;
+}
+
 void NameDesign(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings) {
     const Module& top = netlist.top;
     // Modules and entities share their names with the components only.
-    UniqueNames units;
+    const NameRules& rules = names.GetRules();
+    UniqueNames units(rules);
     for (const ImportedComponent& component : netlist.components.GetAll()) {
         units.Claim(component.name);
     }
-    if (IsLegalName(top.name) && units.Claim(top.name)) {
-        netlist.name = top.name;
-    } else {
+    netlist.name = units.ClaimSame(top.name);
+    if (netlist.name.empty()) {
         netlist.name = units.ClaimSimilar(top.name, 'm');
         warnings.Add(JsonPath("modules").AddKey(top.name),
-                     (IsLegalName(top.name) ? "a component has the name " + Quote(top.name)
-                                            : Quote(top.name) + NotLegal) +
+                     (rules.IsLegal(top.name) ? "a component has the name " + Quote(top.name)
+                                              : Quote(top.name) + rules.GetComplaint()) +
                          "; the netlist is renamed to " + netlist.name);
     }
     // A signal may hide its entity, but tools warn about it; a port keeps its name nevertheless.
@@ -70,7 +106,7 @@ void NameCellsAndSignals(ImportedNetlist& netlist, UniqueNames& names) {
     names.Reserve(cells.size() + netlist.owners.GetSignals().size());
     netlist.owners.ClaimLegalNames(names);
     for (std::size_t c = 0; c < cells.size(); ++c) {
-        if (IsLegalName(cells[c].name) && names.Claim(cells[c].name)) {
+        if (names.ClaimLegal(cells[c].name)) {
             cellNames[c] = cells[c].name;
         }
     }
@@ -82,8 +118,28 @@ void NameCellsAndSignals(ImportedNetlist& netlist, UniqueNames& names) {
     }
 }
 
-void NameAttributes(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings) {
+void ReportRenamedPorts(const ImportedNetlist& netlist, const NameRules& rules, bool keepPorts,
+                        Warnings& warnings) {
+    for (const ImportedSignal& signal : netlist.owners.GetSignals()) {
+        if (signal.port == nullptr || NameRules::WithoutEscape(signal.name) == signal.port->name) {
+            continue;
+        }
+        const std::string_view name = signal.port->name;
+        const JsonPath path = netlist.top.GetPath("ports", name);
+        const std::string reason = rules.IsLegal(name)
+                                       ? "another object has the name " + Quote(name)
+                                       : Quote(name) + rules.GetComplaint();
+        if (keepPorts) {
+            Fail(path, reason + ", and --keep-ports forbids renaming the port");
+        }
+        warnings.Add(path, reason + "; the port is renamed to " + signal.name);
+    }
+}
+
+void NameAttributes(ImportedNetlist& netlist, UniqueNames& signalNames, Warnings& warnings) {
     // VHDL declares attributes beside the signals; on an instance they stand beside its generics.
+    UniqueNames verilogNames(signalNames.GetRules());
+    UniqueNames& names = signalNames.GetRules().MayEscape() ? verilogNames : signalNames;
     for (const ImportedComponent& component : netlist.components.GetAll()) {
         for (const ImportedGeneric& generic : component.generics) {
             names.Claim(generic.value.name);

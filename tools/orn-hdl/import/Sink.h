@@ -41,6 +41,10 @@ public:
 
     virtual void AddInstance(const std::string& name, const std::string& component) = 0;
     virtual void AddInstanceGeneric(const std::string& instance, const TypedValue& generic) = 0;
+    /// A generic of the component does not apply to the instance, which takes the default of its
+    /// cell type.
+    virtual void LeaveOutInstanceGeneric(const std::string& instance,
+                                         const TypedValue& generic) = 0;
     virtual void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) = 0;
     virtual void Connect(const std::string& signal, const std::string& instance,
                          const std::string& pin) = 0;

@@ -1,6 +1,7 @@
 #include "import/TypeUses.h"
 
 #include "import/TopModule.h"
+#include "import/Values.h"
 
 #include <algorithm>
 #include <string>
@@ -18,10 +19,16 @@ bool MayBeInteger(const Value& value) noexcept {
     return value.kind == Value::Bits && value.text.size() == 32;
 }
 
-/// Types with more pins than this for each connection are split by the pins of their cells.
-constexpr std::uint64_t MostPinsPerConnection = 8;
-/// Types whose instances have no more pins than this in all are not split.
-constexpr std::uint64_t FewPins = 65536;
+/// Whether cells have so little in common that a common component would have many parts that its
+/// instances leave open: too many in all, and too many for each part that is used.
+/// \param parts the parts of the common component.
+/// \param used the parts that the cells use, counted over all cells.
+constexpr bool HaveLittleInCommon(std::uint64_t cells, std::uint64_t parts,
+                                  std::uint64_t used) noexcept {
+    constexpr std::uint64_t FewParts = 65536;
+    constexpr std::uint64_t MostPartsForEachUsed = 8;
+    return cells * parts > FewParts && cells * parts > used * MostPartsForEachUsed;
+}
 
 void AppendName(std::string& list, std::string_view name) {
     list.append(list.empty() ? "" : ", ").append(name);
@@ -29,8 +36,8 @@ void AppendName(std::string& list, std::string_view name) {
 
 class TypeUseCounter {
 public:
-    TypeUseCounter(ImportedDesign& design, const Module& top)
-        : design_(design), top_(top), uses_(design.types.size()) {
+    TypeUseCounter(ImportedDesign& design, const Module& top, const UnknownValues& unknown)
+        : design_(design), top_(top), unknown_(unknown), uses_(design.types.size()) {
         for (const Module& module : design.modules) {
             modules_.emplace(module.name, &module);
         }
@@ -47,6 +54,7 @@ private:
 
     ImportedDesign& design_;
     const Module& top_;
+    const UnknownValues& unknown_;
     std::vector<TypeUse> uses_;
     std::unordered_map<std::string_view, const Module*> modules_;
 };
@@ -121,6 +129,9 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
             type.parameters.emplace_back().name = value.name;
         }
         TypeUse::Parameter& parameter = type.parameters[place->second];
+        if (parameter.defaultValue != nullptr && MeansAny(value.value, unknown_)) {
+            continue;
+        }
         ++parameter.cells;
         if (parameter.first == nullptr) {
             parameter.first = &value.value;
@@ -129,20 +140,25 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
     }
 }
 
-/// Determines the common parameters of the components of a type, and whether it is split by pins.
+/// Determines the common parameters of the components of a type, and how it is split.
 void CompareCells(TypeUse& type) {
     for (TypeUse::Pin& pin : type.pins) {
         pin.width = std::max<std::uint32_t>(pin.width, 1);
     }
+    std::uint64_t partialParameters = 0;
+    std::uint64_t partialValues = 0;
     for (std::uint32_t i = 0; i < type.parameters.size(); ++i) {
         const TypeUse::Parameter& parameter = type.parameters[i];
         if (parameter.cells > 0 && !type.IsPartial(parameter)) {
             type.commonParameters.push_back(i);
+        } else {
+            partialParameters += parameter.cells > 0 ? 1 : 0;
+            partialValues += parameter.cells;
         }
     }
-    const std::uint64_t pins = std::uint64_t(type.cells) * type.pins.size();
     type.splitsByPins =
-        type.leaf == nullptr && pins > FewPins && pins > type.connections * MostPinsPerConnection;
+        type.leaf == nullptr && HaveLittleInCommon(type.cells, type.pins.size(), type.connections);
+    type.splitsByParameters = HaveLittleInCommon(type.cells, partialParameters, partialValues);
 }
 
 void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& warnings) {
@@ -183,8 +199,9 @@ void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& war
 
 } // namespace
 
-std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top, Warnings& warnings) {
-    TypeUseCounter counter(design, top);
+std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
+                                   const UnknownValues& unknown, Warnings& warnings) {
+    TypeUseCounter counter(design, top, unknown);
     for (const Cell& cell : top.cells) {
         counter.CountCell(cell);
     }

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "import/ImportedDesign.h"
+#include "import/UnknownValues.h"
 #include "import/Warnings.h"
 
 #include <cstdint>
@@ -25,7 +26,7 @@ struct TypeUse {
         const Value* first = nullptr;
         /// The default value in the leaf module; null if there is none.
         const Value* defaultValue = nullptr;
-        /// The number of cells that have the parameter.
+        /// The number of cells that give the parameter a value.
         std::uint32_t cells = 0;
         /// Whether the values of the cells are of different kinds.
         bool kindVaries = false;
@@ -46,6 +47,9 @@ struct TypeUse {
     /// Whether each set of pins needs a component of its own, because almost all pins of the
     /// instances of a common component would be open.
     bool splitsByPins = false;
+    /// Whether each set of parameters needs a component of its own, because almost all generics of
+    /// the instances of a common component would be left out.
+    bool splitsByParameters = false;
 
     /// Whether some cells take the default of a parameter.
     bool NeedsDefault(const Parameter& parameter) const noexcept { return parameter.cells < cells; }
@@ -58,6 +62,7 @@ struct TypeUse {
 /// The uses of the types of a design, by the index of the type. Adds the ports of leaf modules to
 /// the pins of their types. Warns of values whose type the file does not contain. \throws Error
 /// if a cell has contents, or does not match its leaf module.
-std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top, Warnings& warnings);
+std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
+                                   const UnknownValues& unknown, Warnings& warnings);
 
 } // namespace Tool::Import

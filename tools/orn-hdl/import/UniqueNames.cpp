@@ -1,7 +1,5 @@
 #include "import/UniqueNames.h"
 
-#include "import/LegalNames.h"
-
 #include "Port/Ascii.h"
 
 #include <algorithm>
@@ -32,9 +30,34 @@ bool UniqueNames::Claim(std::string_view name) {
     return !IsTaken(name) && taken_.insert(Keep(name)).second;
 }
 
+std::string UniqueNames::ClaimForm(std::string_view name, bool sharesIdentifier) {
+    if (ClaimLegal(name)) {
+        return std::string(name);
+    }
+    if (!rules_.MayEscape() || !rules_.IsEscapable(name)) {
+        return "";
+    }
+    // Names that differ in letter case only are the same for the library, and get different
+    // numbers of blanks.
+    constexpr std::size_t MostBlanks = 4;
+    std::string form(name);
+    for (std::size_t blanks = 1; blanks <= MostBlanks; ++blanks) {
+        const auto taken = taken_.find(form);
+        if (!sharesIdentifier && taken != taken_.end() &&
+            NameRules::WithoutEscape(*taken) == name) {
+            return "";
+        }
+        form = NameRules::Escape(name, blanks);
+        if (Claim(form)) {
+            return form;
+        }
+    }
+    return "";
+}
+
 std::string UniqueNames::ClaimSimilar(std::string_view name, char initial) {
-    std::string wanted = MakeLegalName(name, initial);
-    if (IsLegalName(wanted) && Claim(wanted)) {
+    std::string wanted = MakeSimilarName(name, initial);
+    if (ClaimLegal(wanted)) {
         return wanted;
     }
     auto number = numbers_.find(wanted);

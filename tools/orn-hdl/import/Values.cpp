@@ -4,6 +4,7 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <optional>
 #include <string_view>
 
 namespace Tool::Import {
@@ -39,6 +40,11 @@ std::int32_t ToInteger(std::string_view digits) noexcept {
 
 } // namespace
 
+bool MeansAny(const Value& value, const UnknownValues& unknown) noexcept {
+    return value.kind == Value::Bits && !unknown.HasReplacement() &&
+           value.text.find('x') != std::string_view::npos;
+}
+
 void CheckParameter(const Value& value, const Place& place, const UnknownValues& unknown,
                     Warnings& warnings) {
     if (value.kind == Value::Text && !IsPlainText(value.text)) {
@@ -48,10 +54,15 @@ void CheckParameter(const Value& value, const Place& place, const UnknownValues&
     if (value.kind != Value::Bits || unknown.HasReplacement()) {
         return;
     }
-    const std::size_t digit = value.text.find_first_of("xz");
-    if (digit != std::string_view::npos) {
-        UnknownValues::Refuse(value.text[digit] == 'x' ? Unknown : HighImpedance, place.ToPath());
+    if (value.text.find('z') != std::string_view::npos) {
+        UnknownValues::Refuse(HighImpedance, place.ToPath());
     }
+}
+
+void WarnOfAny(const Place& place, Warnings& warnings) {
+    warnings.Add(place.ToPath(),
+                 "x means any value in a parameter; the parameter is left out if its "
+                 "default is known, otherwise x becomes 0");
 }
 
 TypedValue MakeGeneric(const std::string& name, const Value& value, const UnknownValues& unknown) {
@@ -68,6 +79,18 @@ TypedValue MakeGeneric(const std::string& name, const Value& value, const Unknow
         digits.begin(), digits.end(), [](char c) { return c == 'x' || c == 'z'; },
         unknown.Replace(Unknown) == One ? '1' : '0');
     return TypedValue{name, "BitVector", MakeConstant(digits, false)};
+}
+
+TypedValue MakeNeutralGeneric(const Value& value) {
+    Value neutral;
+    neutral.kind = value.kind;
+    if (value.kind == Value::Text && !IsPlainText(value.text)) {
+        // Its other values are bit vectors, too.
+        return TypedValue{"", "BitVector", MakeConstant("0", false)};
+    }
+    const std::string zeros(value.kind == Value::Bits ? value.text.size() : 0, '0');
+    neutral.text = zeros;
+    return MakeGeneric("", neutral, UnknownValues(std::nullopt));
 }
 
 void CheckAttribute(const Value& value, const Place& place, Warnings& warnings) {

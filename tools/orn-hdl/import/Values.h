@@ -10,12 +10,18 @@
 
 namespace Tool::Import {
 
-/// Rejects a parameter's value that contains an x or z without a replacement, and warns about a
-/// text that cannot be written as a text.
+/// Whether a parameter's value contains an x without a replacement: any value will do there.
+bool MeansAny(const Value& value, const UnknownValues& unknown) noexcept;
+/// Rejects a parameter's value that contains a z without a replacement, and warns about a text that
+/// cannot be written as a text.
 void CheckParameter(const Value& value, const Place& place, const UnknownValues& unknown,
                     Warnings& warnings);
-/// A parameter's value as a generic.
+/// Warns about a parameter for which `MeansAny` is true.
+void WarnOfAny(const Place& place, Warnings& warnings);
+/// A parameter's value as a generic. An x without a replacement becomes 0.
 TypedValue MakeGeneric(const std::string& name, const Value& value, const UnknownValues& unknown);
+/// A generic without a name, with the type of a value, that is 0 or empty.
+TypedValue MakeNeutralGeneric(const Value& value);
 
 /// Warns about a text that cannot be written unchanged.
 void CheckAttribute(const Value& value, const Place& place, Warnings& warnings);

@@ -46,6 +46,13 @@ SlipFinder::SlipFinder(Orn_Hdl::Model& model, const WarningOptions& options, Rep
     Skip();
 }
 
+void SlipFinder::GoToEnd() {
+    signals_ = std::as_const(*model_.GetNetlist()).GetSignalIterator();
+    while (!signals_.IsAtEnd()) {
+        signals_.Next();
+    }
+}
+
 void SlipFinder::Skip() {
     for (; !signals_.IsAtEnd(); signals_.Next()) {
         TakeNew(*signals_.GetCurrent(), nullptr);
@@ -131,7 +138,9 @@ void SlipFinder::ReadAttribute(const StringArray& words) {
 }
 
 void SlipFinder::Read(const StringArray& words) {
-    if (Port::EqualIgnoringCase(words.GetView(0), "ASSIGN")) {
+    if (Port::EqualIgnoringCase(words.GetView(0), "WRITE")) {
+        GoToEnd();
+    } else if (Port::EqualIgnoringCase(words.GetView(0), "ASSIGN")) {
         ReadConstant(words);
     } else if (Phrases::IsForAttribute(words)) {
         ReadAttribute(words);

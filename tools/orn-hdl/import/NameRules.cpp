@@ -1,4 +1,4 @@
-#include "import/LegalNames.h"
+#include "import/NameRules.h"
 
 #include "Orn_Hdl/Engine.h"
 #include "Orn_Hdl/Options.h"
@@ -34,6 +34,10 @@ constexpr std::string_view VerilogWords =
     " until_with untyped use uwire var virtual void wait_order weak wildcard with"
     " within ";
 
+/// The classes of SystemVerilog, which Verilator takes for types even where the name is escaped.
+/// Each has a blank before and after it.
+constexpr std::string_view VerilogClasses = " mailbox process semaphore ";
+
 /// Words added to VHDL after IEEE 1076-1993, the names of types, literals and libraries that
 /// written VHDL mentions, and of the architecture, in lower case. Each has a blank before and
 /// after it.
@@ -44,8 +48,12 @@ constexpr std::string_view VhdlWords =
     " std_logic_1164 std_logic_vector string strong true vcomponents view vmode vprop"
     " vunit work ";
 
-/// A signal of this name could not be declared: ADD SIGNAL COMMENT is another command.
-constexpr std::string_view CommandWord("comment");
+/// Names with a meaning of their own: ADD SIGNAL COMMENT and ADD INSTANCE ATTRIBUTE are other
+/// commands, and the signal "open" is none. Each has a blank before and after it.
+constexpr std::string_view LibraryWords = " attribute comment open ";
+
+/// The length of the longest reserved word.
+constexpr std::size_t LongestWord = 20;
 
 std::string ToLower(std::string_view text) {
     std::string result(text);
@@ -57,16 +65,14 @@ bool IsListed(std::string_view words, std::string_view word) {
     return words.find(std::string(" ").append(word).append(" ")) != std::string_view::npos;
 }
 
-bool IsReserved(std::string_view name) {
-    constexpr std::size_t LongestWord = 20;
-    if (name.size() > LongestWord) {
-        return false;
-    }
-    const std::string text(name);
-    const std::string lower = ToLower(name);
-    return lower == CommandWord || Orn_Hdl::Engine::IsVhdlKeyword(text.c_str()) ||
-           Orn_Hdl::Engine::IsVerilogKeyword(text.c_str()) || IsListed(VerilogWords, name) ||
-           IsListed(VhdlWords, lower);
+bool IsVerilogWord(std::string_view name) {
+    return Orn_Hdl::Engine::IsVerilogKeyword(std::string(name).c_str()) ||
+           IsListed(VerilogWords, name) || IsListed(VerilogClasses, name);
+}
+
+bool IsVhdlWord(std::string_view name) {
+    return Orn_Hdl::Engine::IsVhdlKeyword(std::string(name).c_str()) ||
+           IsListed(VhdlWords, ToLower(name));
 }
 
 /// A letter, then letters and digits with single "_" between them.
@@ -82,6 +88,18 @@ bool IsBasicIdentifier(std::string_view name) noexcept {
         previous = c;
     }
     return true;
+}
+
+/// Letters, digits and "_", without a digit at the start. The library takes "$" for no part of
+/// the name of a bus.
+bool IsVerilogBase(std::string_view name) noexcept {
+    return !name.empty() && !IsDigit(name.front()) &&
+           std::all_of(name.begin(), name.end(),
+                       [](char c) { return IsLetter(c) || IsDigit(c) || c == '_'; });
+}
+
+bool IsGenerated(std::string_view name) {
+    return Orn_Hdl::HdlUtilities::IsGeneratedName(std::string(name).c_str());
 }
 
 bool IsNumber(std::string_view text) noexcept {
@@ -127,12 +145,54 @@ std::string GetMeaningfulParts(std::string_view name) {
 
 } // namespace
 
-bool IsLegalName(std::string_view name) {
-    return IsBasicIdentifier(name) && !IsReserved(name) &&
-           !Orn_Hdl::HdlUtilities::IsGeneratedName(std::string(name).c_str());
+bool NameRules::IsLegal(std::string_view name) const {
+    const bool isIdentifier =
+        languages_ == NameLanguages::Verilog ? IsVerilogBase(name) : IsBasicIdentifier(name);
+    return isIdentifier && !IsReserved(name) && !IsGenerated(name);
 }
 
-std::string MakeLegalName(std::string_view name, char initial) {
+bool NameRules::IsReserved(std::string_view name) const {
+    return name.size() <= LongestWord &&
+           (IsListed(LibraryWords, ToLower(name)) ||
+            (languages_ != NameLanguages::Vhdl && IsVerilogWord(name)) ||
+            (languages_ != NameLanguages::Verilog && IsVhdlWord(name)));
+}
+
+const char* NameRules::GetComplaint() const noexcept {
+    switch (languages_) {
+    case NameLanguages::Verilog:
+        return " cannot be kept as a name in Verilog";
+    case NameLanguages::Vhdl:
+        return " is not a legal name in VHDL";
+    default:
+        return " is not a legal name in Verilog and VHDL";
+    }
+}
+
+bool NameRules::IsEscapable(std::string_view name) const {
+    // The library would change brackets, "-" and ":", and split a name at "," and "\". Quotes,
+    // "`" and the marks of comments would confuse what reads the netlist.
+    const auto isAllowed = [](char c) {
+        return c > ' ' && c <= '~' &&
+               std::string_view("()[]<>{}-:,\\\"'`").find(c) == std::string_view::npos;
+    };
+    // In a command, a period stands between an instance and its pin.
+    return !name.empty() && std::all_of(name.begin(), name.end(), isAllowed) &&
+           !IsListed(VerilogClasses, name) &&
+           (!forCommands_ || name.find('.') == std::string_view::npos) &&
+           name.find("//") == std::string_view::npos && name.find("/*") == std::string_view::npos &&
+           name.find("*/") == std::string_view::npos && !IsGenerated(name);
+}
+
+std::string NameRules::Escape(std::string_view name, std::size_t blanks) {
+    return std::string("\\").append(name).append(blanks, ' ');
+}
+
+std::string_view NameRules::WithoutEscape(std::string_view name) noexcept {
+    return IsEscaped(name) ? name.substr(1, name.find(' ') - 1) : name;
+}
+
+std::string MakeSimilarName(std::string_view name, char initial) {
     std::string result;
     for (const char c : GetMeaningfulParts(name)) {
         if (IsLetter(c) || IsDigit(c)) {
