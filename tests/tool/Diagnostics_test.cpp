@@ -84,8 +84,8 @@ TEST(WordPlaces, Columns) {
     EXPECT_EQ(text(Mark::Part(2, 0, 2)), "12+2");
     EXPECT_EQ(text(Mark::Part(2, 3)), "15+1");
     EXPECT_EQ(text(Mark::Part(3, 1)), "17+6") << "a word with a backslash is marked as a whole";
-    EXPECT_EQ(text(Mark::Word(4)), "24+1") << "behind the last word";
-    EXPECT_EQ(text(Mark::Word(9)), "24+1");
+    EXPECT_EQ(text(Mark::Word(4)), "23+1") << "behind the last word";
+    EXPECT_EQ(text(Mark::Word(9)), "23+1");
     EXPECT_EQ(GetColumns(Mark::Word(0), {}).count, 0U);
 }
 

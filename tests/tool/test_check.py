@@ -163,6 +163,14 @@ note: what helps: 4:B:1010
         self.assertFalse((self.folder / "t.v").exists())
         self.assertTrue((self.folder / "t.vhd").exists())
 
+    def test_run_finds_lines_although_it_writes_elsewhere(self) -> None:
+        (self.folder / "out").mkdir()
+        self.write("t.cmd", SOUND + TEN + "WRITE VERILOG t.v\n")
+        outcome = self.run_tool("run", "--check", "--output-dir", "out", "t.cmd")
+        self.assertIn("t.cmd:10: error: the constant", outcome.err)
+        self.assertIn("   10 | ASSIGN CONSTANT D(3:0) 1010\n      |                        ^~~~\n",
+                      outcome.err)
+
     def test_run_refuses_a_write_line(self) -> None:
         self.write("t.cmd", SOUND + TEN + "WRITE VERILOG t.v\nWRITE VHDL t.vhd\n")
         outcome = self.run_tool("run", "--check", "--keep-going", "t.cmd")

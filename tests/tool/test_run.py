@@ -131,6 +131,38 @@ class Failures(ToolTest):
                     "3 errors\n")
         self.assertIn("INV U1", self.read("o.v"))
 
+    def test_only_the_first_failures_are_searched_for(self) -> None:
+        self.write("d.cmd", INVERTER + "CONNECT SIGNAL A U9.I\n" * 25)
+        outcome = self.run_tool("run", "d.cmd", "--keep-going")
+        self.assertEqual(outcome.err.count('error: Signal "U9" not found.\n'), 25)
+        self.assertEqual(outcome.err.count("note: there is no instance U9; did you mean U1?\n"), 20)
+        self.assertEqual(outcome.err.count("note: there is no instance U9\n"), 5)
+        self.assertEqual(outcome.err.count("      |                  ^~\n"), 25)
+        self.assertTrue(outcome.err.endswith("\n25 errors\n"))
+
+    def test_error_limit(self) -> None:
+        self.write("d.cmd", "ADD\n" * 5)
+        for limit, errors in (("1", 1), ("4", 4), ("5", 5), ("6", 5)):
+            outcome = self.run_tool("run", "d.cmd", "--keep-going", "--error-limit", limit, "--verilog",
+                                    f"o{limit}.v")
+            self.assertEqual((outcome.status, outcome.err.count("error:")), (FAILED, errors))
+            self.assertEqual((self.folder / f"o{limit}.v").exists(), limit == "6")
+        self.assertEqual(self.run_tool("run", "d.cmd", "--keep-going", "--error-limit", "0").status, USAGE)
+
+    def test_standard_input_that_is_a_file_is_read_again(self) -> None:
+        self.write("d.cmd", "NOOP\n  ADD   \n")
+        with open(self.folder / "d.cmd", "rb") as commands:
+            done = subprocess.run([TOOL, "run", "-"], stdin=commands, capture_output=True, check=False)
+        self.assertIn(b"\n    2 |   ADD   \n      |      ^\n", done.stderr)
+
+    def test_colours(self) -> None:
+        self.write("d.cmd", "ADD\n")
+        for options, environment, isColoured in (
+                ([], {}, False), (["--color", "always"], {"NO_COLOR": "1"}, True),
+                (["--color", "never"], {}, False), (["--color", "auto"], {}, False)):
+            outcome = self.run_tool("run", "d.cmd", *options, **environment)
+            self.assertEqual("\033[" in outcome.err, isColoured)
+
     def test_missing_file(self) -> None:
         self.expect(self.run_tool("run", "none", "--keep-going", "--verilog", "o.v"), FILE,
                     "orn-hdl: cannot read none: No such file or directory\n")

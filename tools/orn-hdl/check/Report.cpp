@@ -215,6 +215,7 @@ std::string FormatAsSarif(const std::vector<Reported>& findings) {
         rules.push_back({rule.name, rule.what, rule.why, rule.help});
     }
     std::vector<Diagnostic> diagnostics;
+    diagnostics.reserve(findings.size());
     for (const Reported& reported : findings) {
         diagnostics.push_back(reported.diagnostic);
     }

@@ -81,7 +81,7 @@ Columns GetColumns(const Mark& mark, const std::vector<WordPlace>& words) {
     const int count = static_cast<int>(words.size());
     if (mark.first >= count) {
         const Columns& last = words.back().columns;
-        return Columns{last.first + last.count + 1, 1};
+        return Columns{last.first + last.count, 1};
     }
     const WordPlace& first = getWord(std::max(mark.first, 0));
     const bool isPart = mark.offset != 0 || mark.length != Mark::ToEnd;
