@@ -79,6 +79,10 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
+Tool::Place MakePlace(const std::string& file, const Import::TextPlace& place) {
+    return Tool::Place{file, place.line, place.source, Columns{place.column, 1}};
+}
+
 Diagnostic MakeDiagnostic(const std::string& file, Severity severity, std::string message) {
     Diagnostic diagnostic;
     diagnostic.severity = severity;
@@ -104,7 +108,9 @@ Status ReadLibrary(const std::vector<std::string>& files, CellLibrary& library,
             reporter.Report(std::move(diagnostic));
             return Status::Failed;
         } catch (const Import::Error& error) {
-            reporter.Report(MakeDiagnostic(file, Severity::Error, error.what()));
+            Diagnostic diagnostic = MakeDiagnostic(file, Severity::Error, error.what());
+            diagnostic.place = MakePlace(file, error.GetPlace());
+            reporter.Report(std::move(diagnostic));
             return Status::Failed;
         }
     }
@@ -172,11 +178,8 @@ std::string DescribeKind(const std::string& beginning) {
 /// \param beginning the beginning of the file.
 Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
                      const std::string& beginning) {
-    const Import::TextPlace& place = error.GetPlace();
-    Diagnostic diagnostic;
-    diagnostic.place =
-        Tool::Place{options.file, place.line, place.source, Columns{place.column, 1}};
-    diagnostic.message = error.what();
+    Diagnostic diagnostic = MakeDiagnostic(options.file, Severity::Error, error.what());
+    diagnostic.place = MakePlace(options.file, error.GetPlace());
     if (const std::string kind = DescribeKind(beginning); !kind.empty()) {
         diagnostic.notes.push_back({kind});
     }
