@@ -89,6 +89,10 @@ struct ORN_HDL_API HdlOptions {
     /// Whether the last Verilog write passed the module's INIT parameter to instances instead of
     /// their own values. It is set by a write whose options are not constant, and never read.
     bool hierarchicalInit = false;
+    /// Whether the writers write a legal netlist (`LegalNetlist`), or the design as it stands.
+    bool legal = false;
+    /// Whether a legal netlist escapes names where that is enough, instead of changing them.
+    bool escapeNames = false;
 };
 
 /// Helpers that both writers share.

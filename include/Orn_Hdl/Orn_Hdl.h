@@ -9,6 +9,7 @@
 #include "Orn_Hdl/Engine.h"
 #include "Orn_Hdl/Exception.h"
 #include "Orn_Hdl/Language.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Orn_Hdl/Options.h"
 #include "Orn_Hdl/Streams.h"

@@ -590,6 +590,9 @@ bool IsControl(char c) {
 
 void AttributeWalk::CheckText(const Holder& holder, const Attribute& attribute, string_view text,
                               const Places& places) {
+    if (context_.isMended) {
+        return;
+    }
     if (text.find('"') != string_view::npos && (places.verilogNumber || places.vhdl)) {
         Verdicts verdicts(places.verilogNumber ? "rrr..rrr" : "");
         verdicts.Worsen(Verdicts(places.vhdl ? "...rr...r" : ""));

@@ -75,21 +75,26 @@ std::array<Check::Target, Check::TargetCount> Check::GetTargets() noexcept {
 std::vector<Check::Finding> Check::Run(const Netlist& netlist, const HdlOptions& options,
                                        Targets targets) {
     Checking::Context context(netlist, options, targets);
-    Checking::CheckConnections(context);
-    Checking::CheckAssignments(context);
-    Checking::CheckNames(context);
-    Checking::CheckAttributes(context);
-    Checking::CheckScopes(context);
-    Checking::CheckClauses(context);
+    context.CheckAll();
     return context.TakeFindings();
 }
 
 namespace Checking {
 
-Context::Context(const Netlist& design, const HdlOptions& optionsInForce, Check::Targets wanted)
+Context::Context(const Netlist& design, const HdlOptions& optionsInForce, Check::Targets wanted,
+                 bool mended)
     : netlist(design), options(optionsInForce),
       verilog(!(wanted & Check::Targets::Verilog()).IsEmpty()),
-      vhdl(!(wanted & Check::Targets::Vhdl()).IsEmpty()), targets_(wanted) {}
+      vhdl(!(wanted & Check::Targets::Vhdl()).IsEmpty()), isMended(mended), targets_(wanted) {}
+
+void Context::CheckAll() {
+    CheckConnections(*this);
+    CheckAssignments(*this);
+    CheckNames(*this);
+    CheckAttributes(*this);
+    CheckScopes(*this);
+    CheckClauses(*this);
+}
 
 Finding* Context::Add(RuleId rule, const Verdicts& verdicts, Cause cause) {
     Verdicts counted = verdicts;

@@ -77,6 +77,9 @@ private:
 };
 
 void Clauses::CheckPorts() {
+    if (context_.isMended) {
+        return;
+    }
     for (const Signal* signal : context_.netlist.GetSignalIterator()) {
         if (signal->IsNeededToDeclared() && signal->IsPort() &&
             !Writers::IsOpen(signal->GetNameView())) {

@@ -39,13 +39,17 @@ struct Misused {
 /// The design under check, what is known of it so far, and what was found.
 class Context {
 public:
-    Context(const Netlist& design, const HdlOptions& optionsInForce, Check::Targets wanted);
+    Context(const Netlist& design, const HdlOptions& optionsInForce, Check::Targets wanted,
+            bool mended = false);
 
     const Netlist& netlist;
     const HdlOptions& options;
     /// Whether any target reads the language.
     const bool verilog;
     const bool vhdl;
+    /// Whether the design was made to be written legally: the values hold the escapes of the
+    /// language, and an empty list of ports is left out.
+    const bool isMended;
 
     /// \{
     /// Gathered by the walk over the instances.
@@ -74,6 +78,8 @@ public:
     Finding* Add(RuleId rule, Cause cause) {
         return Add(rule, GetRule(rule).verdicts, std::move(cause));
     }
+    /// Checks every topic.
+    void CheckAll();
     /// Everything that was added, without repetitions.
     std::vector<Finding> TakeFindings();
 

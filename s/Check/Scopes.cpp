@@ -333,6 +333,7 @@ void Scopes::CheckHidden() {
             if (Finding* finding =
                     context_.Add(RuleId::PredefinedName,
                                  Verdicts(isLate ? "...ww...w" : "...rr...r"), declared.cause)) {
+                finding->objects = {declared.object};
                 finding->message = declared.what + " hides what VHDL knows by that name";
             }
         });
@@ -346,6 +347,7 @@ void Scopes::CheckDesignName() {
     const Cause cause = Named(Kind::DesignName, "");
     if (name == "std_logic" || name == "std_logic_vector" || context_.usedTypes.count(name) != 0) {
         if (Finding* finding = context_.Add(RuleId::PredefinedName, cause)) {
+            finding->objects = {&netlist_};
             finding->message = "the name of the design hides what VHDL knows by that name";
         }
     }
@@ -355,6 +357,7 @@ void Scopes::CheckDesignName() {
     }
     if (isLibrary) {
         if (Finding* finding = context_.Add(RuleId::HiddenLibrary, Verdicts("...rr...r"), cause)) {
+            finding->objects = {&netlist_};
             finding->message = "the design bears the name of a library that it uses";
         }
     }
@@ -399,6 +402,9 @@ void Scopes::CheckHiddenBy(const Declared& declared) {
         Verdicts verdicts(hasAttrs ? "........r" : "........w");
         verdicts.Worsen(Verdicts(isPort && isSame ? "......r" : ""));
         if (Finding* finding = context_.Add(RuleId::ModuleName, verdicts, declared.cause)) {
+            if (declared.object != nullptr) {
+                finding->objects = {declared.object, &netlist_};
+            }
             finding->message = declared.what + " bears the name of the design";
             finding->other = Named(Kind::DesignName, "");
         }

@@ -2,9 +2,12 @@
 
 #include "Exception/Failure.h"
 #include "HdlModel/ModelUse.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
+
+#include <optional>
 
 namespace Orn_Hdl {
 
@@ -68,18 +71,29 @@ TextFileOutStream Open(const Model& model, const char* fileName, TextFileOutStre
 
 /// Opens the file, lets `write` write into it, closes it, and records the outcome in the model. An
 /// existing file is replaced once everything has been written, and stays as it is otherwise.
-template <class Write> void WriteFile(Model& model, const Arguments& arguments, Write write) {
+template <class Write>
+void WriteFile(Model& model, const Arguments& arguments, Language language, Write write) {
     const char* const fileName = arguments.Get(0);
     const Model::Use use(&model);
     RequirePermission(model, fileName);
     if (!use.HasModel()) {
         return;
     }
+    std::optional<LegalNetlist> legal;
+    if (model.GetOptions()->legal) {
+        // A design that cannot be written leaves the file alone.
+        legal.emplace(*model.GetNetlist(), *model.GetOptions());
+        legal->Prepare(language);
+    }
     TextFileOutStream out = Open(model, fileName,
                                  arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
                                                                   : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
-    write(out, *model.GetNetlist(), *model.GetOptions());
+    if (legal) {
+        legal->Write(language, out);
+    } else {
+        write(out, *model.GetNetlist(), *model.GetOptions());
+    }
     out.Close();
     model.RecordWrite(fileName, out.GetError(), out.GetLeftoverSize());
 }
@@ -87,15 +101,17 @@ template <class Write> void WriteFile(Model& model, const Arguments& arguments, 
 } // namespace
 
 void ExecuteWriteVerilog(Model& model, const Arguments& arguments) {
-    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, HdlOptions& options) {
-        VerilogNetlister(out).WriteNetlist(&netlist, options);
-    });
+    WriteFile(model, arguments, Language::Verilog,
+              [](OutStream& out, Netlist& netlist, HdlOptions& options) {
+                  VerilogNetlister(out).WriteNetlist(&netlist, options);
+              });
 }
 
 void ExecuteWriteVhdl(Model& model, const Arguments& arguments) {
-    WriteFile(model, arguments, [](OutStream& out, Netlist& netlist, const HdlOptions& options) {
-        VhdlNetlister(out).WriteNetlist(&netlist, &options);
-    });
+    WriteFile(model, arguments, Language::Vhdl,
+              [](OutStream& out, Netlist& netlist, const HdlOptions& options) {
+                  VhdlNetlister(out).WriteNetlist(&netlist, &options);
+              });
 }
 
 } // namespace Orn_Hdl

@@ -2,6 +2,7 @@
 
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Signals/SignalBits.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/NetlistPass.h"
@@ -77,9 +78,15 @@ VerilogNetlister::VerilogNetlister(OutStream& out)
 VerilogNetlister::~VerilogNetlister() = default;
 
 void VerilogNetlister::WriteNetlist(Netlist* netlist, const HdlOptions& options) {
-    if (netlist != nullptr) {
-        Writer(out_, *statements_, *netlist, options).Write();
+    if (netlist != nullptr && options.legal) {
+        LegalNetlist(*netlist, options).Write(Language::Verilog, out_);
+    } else if (netlist != nullptr) {
+        WriteLiterally(*netlist, options);
     }
+}
+
+void VerilogNetlister::WriteLiterally(Netlist& netlist, const HdlOptions& options) {
+    Writer(out_, *statements_, netlist, options).Write();
 }
 
 void VerilogNetlister::WriteNetlist(Netlist* netlist, HdlOptions& options) {

@@ -3,6 +3,7 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Signals/SignalBits.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/NetlistPass.h"
@@ -135,10 +136,19 @@ VhdlNetlister::VhdlNetlister(const VhdlNetlister& other)
 VhdlNetlister::~VhdlNetlister() = default;
 
 void VhdlNetlister::WriteNetlist(Netlist* netlist, const HdlOptions* options) {
-    if (netlist != nullptr && options != nullptr) {
-        declared_ = StringSet();
-        Writer(out_, *statements_, declared_, *netlist, *options).Write();
+    if (netlist == nullptr || options == nullptr) {
+        return;
     }
+    if (options->legal) {
+        LegalNetlist(*netlist, *options).Write(Language::Vhdl, out_);
+    } else {
+        WriteLiterally(*netlist, *options);
+    }
+}
+
+void VhdlNetlister::WriteLiterally(Netlist& netlist, const HdlOptions& options) {
+    declared_ = StringSet();
+    Writer(out_, *statements_, declared_, netlist, options).Write();
 }
 
 void VhdlNetlister::Writer::Write() {
@@ -182,9 +192,12 @@ void VhdlNetlister::Writer::WriteEntity(const std::vector<Signal*>& ports) {
     out_.Indent();
     WriteGenericMap(netlist_);
     const int width = Netlist::GetLongestPortName(netlist_.GetSignalIterator());
-    WritePortClause(ports, [this, width](const Signal& port) {
-        statements_.WritePortStatement(port.GetNameView(), port.GetPortPolarity(), width);
-    });
+    // VHDL has no empty list of ports.
+    if (!ports.empty() || !options_.legal) {
+        WritePortClause(ports, [this, width](const Signal& port) {
+            statements_.WritePortStatement(port.GetNameView(), port.GetPortPolarity(), width);
+        });
+    }
     for (const Signal* port : ports) {
         WriteAttrDeclaration(port);
         WriteAttrAssignment(*port);

@@ -29,6 +29,8 @@ LAYERS = layers()
 UPWARDS = {
     ("HdlModel/Model.cpp", "Orn_Hdl/Commands.h"),
     ("Options/HdlUtilities.cpp", "Orn_Hdl/Writers/NetlistHeader.h"),
+    ("Verilog/VerilogNetlister.cpp", "Orn_Hdl/LegalNetlist.h"),
+    ("Vhdl/VhdlNetlister.cpp", "Orn_Hdl/LegalNetlist.h"),
 }
 
 

@@ -11,6 +11,7 @@
 #include "import/TopModule.h"
 
 #include "Orn_Hdl/Engine.h"
+#include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 #include "Progress.h"
@@ -76,7 +77,18 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
-Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options) {
+void Report(const ImportOptions& options, Severity severity, std::string message,
+            Reporter& reporter, std::string_view rule = {}) {
+    Diagnostic diagnostic;
+    diagnostic.severity = severity;
+    diagnostic.rule = rule;
+    diagnostic.place.file = options.file;
+    diagnostic.message = std::move(message);
+    reporter.Report(std::move(diagnostic));
+}
+
+Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options,
+                     Reporter& reporter) {
     if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
@@ -86,12 +98,20 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     ModelSink sink(model);
     EmitNetlist(netlist, sink);
     Progress progress(false, options.file);
-    return WriteOutputs(model, options.outputs, progress);
+    if (!options.legal) {
+        return WriteOutputs(model, options.outputs, progress);
+    }
+    Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
+    for (const Orn_Hdl::Check::Finding& error : legal.GetErrors()) {
+        Report(options, Severity::Error, error.message, reporter, error.rule->name);
+    }
+    return legal.GetErrors().empty() ? WriteOutputs(model, options.outputs, progress, &legal)
+                                     : Status::Failed;
 }
 
 /// Writes all files. The command file and the name map are replaced last, and only if every file
 /// was written.
-Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
+Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options, Reporter& reporter) {
     OutputFile commands(options.commandFile);
     if (Port::Stream* out = commands.GetStream()) {
         CommandSink sink(*out);
@@ -103,7 +123,7 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options) {
     }
     Status status = Worse(commands.Flush(), nameMap.Flush());
     if (status == Status::Success) {
-        status = WriteNetlists(netlist, options);
+        status = WriteNetlists(netlist, options, reporter);
     }
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
@@ -137,14 +157,6 @@ Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
     return diagnostic;
 }
 
-Diagnostic MakeWarning(const ImportOptions& options, std::string message) {
-    Diagnostic diagnostic;
-    diagnostic.severity = Severity::Warning;
-    diagnostic.place.file = options.file;
-    diagnostic.message = std::move(message);
-    return diagnostic;
-}
-
 /// Imports the text of a file.
 Status ImportText(std::string text, const ImportOptions& options, Reporter& reporter) {
     const std::string beginning = text.substr(0, BeginningSize);
@@ -156,9 +168,9 @@ Status ImportText(std::string text, const ImportOptions& options, Reporter& repo
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
         const ImportRules rules{GetUnknownValues(options), names, options.keepPorts};
         const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
-        const Status written = WriteAll(netlist, options);
+        const Status written = WriteAll(netlist, options, reporter);
         for (std::string& warning : warnings.GetLines()) {
-            reporter.Report(MakeWarning(options, std::move(warning)));
+            Report(options, Severity::Warning, std::move(warning), reporter);
         }
         return written;
     } catch (const Import::Error& error) {

@@ -29,6 +29,8 @@ struct ImportOptions {
     bool attributes = false;
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
+    /// Write legal netlists, or nothing.
+    bool legal = false;
     ReportOptions report;
 };
 

@@ -14,7 +14,12 @@ namespace Tool {
 
 namespace {
 
-void WriteNetlist(Orn_Hdl::Model& model, Orn_Hdl::Language language, Orn_Hdl::OutStream& out) {
+void WriteNetlist(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::Language language,
+                  Orn_Hdl::OutStream& out) {
+    if (legal != nullptr) {
+        legal->Write(language, out);
+        return;
+    }
     switch (language) {
     case Orn_Hdl::Language::Verilog:
         Orn_Hdl::VerilogNetlister(out).WriteNetlist(model.GetNetlist(), *model.GetOptions());
@@ -40,8 +45,8 @@ Status PrintFile(std::FILE* file) {
 
 /// Writes a netlist to standard output, by way of a temporary file: only a file that is opened by
 /// its name gets indentation, and standard output may be a socket, which cannot be opened.
-Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, bool noHeader,
-                   Progress& progress) {
+Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::Language language,
+                   bool noHeader, Progress& progress) {
     const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::tmpfile(), &std::fclose);
     if (file == nullptr) {
         return ComplainUnwritable("a temporary file", errno);
@@ -51,7 +56,7 @@ Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, bool noHea
     Orn_Hdl::TextFileOutStream out;
     const std::string name = "/dev/fd/" + std::to_string(fileno(file.get()));
     if (out.Open(name.c_str(), Orn_Hdl::TextFileOutStream::Overwrite)) {
-        WriteNetlist(model, language, out);
+        WriteNetlist(model, legal, language, out);
         out.Close();
     }
     progress.Erase();
@@ -59,13 +64,29 @@ Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, bool noHea
                                : ComplainUnwritable("a temporary file", out.GetError());
 }
 
-Status WriteOutput(Orn_Hdl::Model& model, Orn_Hdl::Language language, const std::string& file,
-                   bool noHeader, Progress& progress) {
+/// Writes a legal netlist into a file, which is replaced once all of it has been written.
+Status WriteLegally(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist& legal, Orn_Hdl::Language language,
+                    const std::string& file, bool noHeader, Progress& progress) {
+    progress.Writing(file);
+    model.GetOptions()->writeHeader = !noHeader;
+    legal.Prepare(language);
+    Orn_Hdl::TextFileOutStream out(file.c_str(), Orn_Hdl::TextFileOutStream::Replace);
+    legal.Write(language, out);
+    out.Close();
+    progress.Erase();
+    return out.GetError() == 0 ? Status::Success : ComplainUnwritable(file, out.GetError());
+}
+
+Status WriteOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::Language language,
+                   const std::string& file, bool noHeader, Progress& progress) {
     if (file.empty()) {
         return Status::Success;
     }
     if (file == "-") {
-        return PrintOutput(model, language, noHeader, progress);
+        return PrintOutput(model, legal, language, noHeader, progress);
+    }
+    if (legal != nullptr) {
+        return WriteLegally(model, *legal, language, file, noHeader, progress);
     }
     progress.Writing(file);
     Orn_Hdl::StringArray words;
@@ -110,10 +131,12 @@ Status OutputFile::Commit() {
     return stream_ && Flush() == Status::Success ? Check(file_.close()) : status_;
 }
 
-Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress) {
+Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,
+                    Orn_Hdl::LegalNetlist* legal) {
     Status status = Status::Success;
     for (const auto& [language, file] : outputs.files) {
-        status = Worse(status, WriteOutput(model, language, file, outputs.noHeader, progress));
+        status =
+            Worse(status, WriteOutput(model, legal, language, file, outputs.noHeader, progress));
     }
     return status;
 }

@@ -10,8 +10,9 @@
 #include <string>
 
 namespace Orn_Hdl {
+class LegalNetlist;
 class Model;
-}
+} // namespace Orn_Hdl
 
 namespace Tool {
 
@@ -52,6 +53,9 @@ private:
 
 /// Writes the netlists in the order of their languages, and prints a message for each that could
 /// not be written.
-Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress);
+/// \param legal the legal netlist of the model, without errors; null to write the design as it
+///        stands.
+Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,
+                    Orn_Hdl::LegalNetlist* legal = nullptr);
 
 } // namespace Tool

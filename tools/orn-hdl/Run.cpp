@@ -1,8 +1,10 @@
 #include "Run.h"
 
+#include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Progress.h"
+#include "check/Checker.h"
 #include "check/WriteGate.h"
 #include "explain/FailureExplainer.h"
 
@@ -40,7 +42,9 @@ public:
         try {
             model_.Execute(words);
         } catch (const Orn_Hdl::Exception& exception) {
-            Report(words, exception.getLocalized().GetView());
+            if (!TellWhyNotLegal(words)) {
+                Report(words, exception.getLocalized().GetView());
+            }
             status_ = Worse(status_, Status::Failed);
             return false;
         }
@@ -51,6 +55,17 @@ public:
     std::uint64_t GetLineCount() const noexcept { return lines_; }
 
 private:
+    /// Tells what keeps a write command from writing a legal netlist, with the lines that brought
+    /// it in. \return whether there is anything.
+    bool TellWhyNotLegal(const Orn_Hdl::StringArray& words) {
+        if (!model_.GetOptions()->legal || !Checking::Checker::IsWrite(words)) {
+            return false;
+        }
+        const Orn_Hdl::LegalNetlist legal(*model_.GetNetlist(), *model_.GetOptions());
+        return Checking::WriteGate(model_, file_.lines, file_.reporter)
+            .Tell(legal.GetErrors(), lines_);
+    }
+
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
         file_.reporter.Report(explainer_.Explain(lines_, words, text));
     }
@@ -123,6 +138,27 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
 
 namespace {
 
+/// Writes the outputs and the table of names, or tells why there is no legal netlist.
+Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOptions& options,
+                    std::uint64_t lines, CommandFile& file) {
+    if (outputs.IsEmpty() && options.nameMap.empty()) {
+        return Status::Success;
+    }
+    Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
+    if (Checking::WriteGate(model, file.lines, file.reporter).Tell(legal.GetErrors(), lines)) {
+        return Status::Failed;
+    }
+    OutputFile nameMap(options.nameMap);
+    if (Port::Stream* out = nameMap.GetStream()) {
+        WriteLegalNames(*model.GetNetlist(), legal, *out);
+    }
+    Status status = nameMap.Flush();
+    if (status == Status::Success) {
+        status = WriteOutputs(model, outputs, file.progress, &legal);
+    }
+    return status == Status::Success ? nameMap.Commit() : status;
+}
+
 /// Replays the file of the options and writes its netlists.
 Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
     Checking::WriteGate gate(model, file.lines, file.reporter);
@@ -139,7 +175,8 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
             status = Worse(status, Status::Failed);
         }
     }
-    return Worse(status, WriteOutputs(model, outputs, file.progress));
+    return Worse(status, options.legal ? WriteLegally(model, outputs, options, replayed.lines, file)
+                                       : WriteOutputs(model, outputs, file.progress));
 }
 
 } // namespace
@@ -154,7 +191,10 @@ Status Run(const RunOptions& options) {
     engine = new Orn_Hdl::Engine;
     const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name.c_str(), options.file.c_str());
-    const Status status = ReplayAndWrite(*engine->GetModel(name.c_str()), file, options);
+    Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
+    model.GetOptions()->legal = options.legal;
+    model.GetOptions()->escapeNames = options.names == "escape";
+    const Status status = ReplayAndWrite(model, file, options);
     file.reporter.Finish();
     return status;
 }

@@ -35,6 +35,12 @@ struct RunOptions {
     bool quiet = false;
     /// Write nothing that has errors for its language.
     bool check = false;
+    /// Write legal netlists, or nothing.
+    bool legal = false;
+    /// How a legal netlist changes names: "rename" or "escape".
+    std::string names = "rename";
+    /// The file for the table of old and new names; empty for none.
+    std::string nameMap;
     ReportOptions report;
 };
 

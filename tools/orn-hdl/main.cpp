@@ -261,7 +261,17 @@ private:
             ->check(CLI::PositiveNumber)
             ->needs(keepGoing);
         AddReport(command, run_.report);
-        command.add_flag("--check", run_.check, "Write nothing that has errors for its language");
+        CLI::Option* check = command.add_flag("--check", run_.check,
+                                              "Write nothing that has errors for its language");
+        CLI::Option* legal =
+            command.add_flag("--legal", run_.legal, "Write netlists that every tool takes")
+                ->excludes(check);
+        command.add_option("--names", run_.names, "How --legal mends names")
+            ->check(CLI::IsMember({"rename", "escape"}))
+            ->type_name("rename|escape")
+            ->needs(legal);
+        AddFile(command, "--name-map", run_.nameMap, "Write a table of old and new names")
+            ->needs(legal);
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
 
@@ -286,6 +296,7 @@ private:
             ->check(CheckDigit);
         command.add_flag("--attributes", import_.attributes,
                          "Import the attributes of cells and nets");
+        command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");

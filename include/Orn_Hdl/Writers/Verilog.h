@@ -133,7 +133,11 @@ public:
     void WriteNetlist(Netlist* netlist, HdlOptions& options);
 
 private:
+    friend class LegalNetlist;
     class ORN_HDL_LOCAL Writer;
+
+    /// Writes the netlist whether the options ask for a legal one or not.
+    void WriteLiterally(Netlist& netlist, const HdlOptions& options);
 
     OutStream& out_;
     std::unique_ptr<VerilogStatements> statements_;

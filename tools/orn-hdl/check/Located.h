@@ -18,6 +18,12 @@ struct Located {
     std::uint64_t otherLine = 0;
     /// The line at which the design was checked.
     std::uint64_t checkedAt = 0;
+    /// Whether it keeps a netlist from being written, whatever the targets make of it.
+    bool isObstacle = false;
+
+    bool IsError() const noexcept {
+        return isObstacle || finding.GetSeverity() == Orn_Hdl::Check::Severity::Error;
+    }
 };
 
 /// Reads a command file once more for the lines of the findings' causes. Only causes are kept in

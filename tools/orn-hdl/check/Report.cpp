@@ -235,10 +235,10 @@ std::vector<Reported> MakeReports(const std::vector<Located>& findings, CommandL
         const Check::Finding& finding = located.finding;
         Reported& reported = reports.emplace_back();
         reported.targets = GetTargets(finding);
-        reported.diagnostic = Diagnostic{
-            finding.GetSeverity() == Check::Severity::Error ? Severity::Error : Severity::Warning,
-            std::string(finding.rule->name), marked.Get(GetLine(located), finding.cause),
-            finding.message, GetNotes(located, marked)};
+        reported.diagnostic =
+            Diagnostic{located.IsError() ? Severity::Error : Severity::Warning,
+                       std::string(finding.rule->name), marked.Get(GetLine(located), finding.cause),
+                       finding.message, GetNotes(located, marked)};
     }
     return reports;
 }

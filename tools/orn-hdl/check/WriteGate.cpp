@@ -7,6 +7,7 @@
 #include "diagnostics/CommandLines.h"
 #include "diagnostics/Reporter.h"
 
+#include <algorithm>
 #include <utility>
 #include <vector>
 
@@ -25,23 +26,35 @@ bool WriteGate::Allows(const Orn_Hdl::StringArray& words, std::uint64_t line) {
 bool WriteGate::Allows(Orn_Hdl::Language language, std::uint64_t line) {
     const Check::Targets targets =
         language == Orn_Hdl::Language::Verilog ? Check::Targets::Verilog() : Check::Targets::Vhdl();
+    std::vector<Check::Finding> errors =
+        Check::Run(*model_.GetNetlist(), *model_.GetOptions(), targets);
+    errors.erase(std::remove_if(errors.begin(), errors.end(),
+                                [](const Check::Finding& finding) {
+                                    return finding.GetSeverity() != Check::Severity::Error;
+                                }),
+                 errors.end());
+    return !Tell(errors, line);
+}
+
+bool WriteGate::Tell(const std::vector<Check::Finding>& errors, std::uint64_t line) {
     std::vector<Located> findings;
-    for (Check::Finding& finding :
-         Check::Run(*model_.GetNetlist(), *model_.GetOptions(), targets)) {
-        if (finding.GetSeverity() == Check::Severity::Error) {
-            Located& located = findings.emplace_back();
-            located.finding = std::move(finding);
-            located.checkedAt = line;
-        }
+    for (const Check::Finding& finding : errors) {
+        Located& located = findings.emplace_back();
+        located.finding = finding;
+        located.checkedAt = line;
+        located.isObstacle = true;
+    }
+    if (findings.empty()) {
+        return false;
     }
     // A pipe is read once; its findings stand at the line that writes.
-    if (!findings.empty() && CanReadAgain(lines_.GetSystemName())) {
+    if (CanReadAgain(lines_.GetSystemName())) {
         Locate(lines_.GetSystemName().c_str(), findings);
     }
     for (Reported& reported : MakeReports(findings, lines_)) {
         reporter_.Report(std::move(reported.diagnostic));
     }
-    return findings.empty();
+    return true;
 }
 
 } // namespace Tool::Checking

@@ -1,9 +1,11 @@
 // `orn-hdl run --check`: lets nothing be written that a tool of its language rejects or misreads.
 #pragma once
 
+#include "Orn_Hdl/Check.h"
 #include "Orn_Hdl/Language.h"
 
 #include <cstdint>
+#include <vector>
 
 namespace Orn_Hdl {
 class Model;
@@ -28,6 +30,9 @@ public:
     bool Allows(const Orn_Hdl::StringArray& words, std::uint64_t line);
     /// Whether the design may be written in a language, behind a line.
     bool Allows(Orn_Hdl::Language language, std::uint64_t line);
+    /// Tells what keeps a legal netlist from being written behind a line. \return whether there is
+    /// anything.
+    bool Tell(const std::vector<Orn_Hdl::Check::Finding>& errors, std::uint64_t line);
 
 private:
     Orn_Hdl::Model& model_;
