@@ -63,7 +63,8 @@ if(TARGET orn-hdl)
   endif()
   install(TARGETS orn-hdl RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT Tool)
   set(orn_hdl_share ${PROJECT_SOURCE_DIR}/share)
-  set(orn_hdl_pages tutorial.md commands.md messages.md formats.md import.md limits.md cookbook.md)
+  set(orn_hdl_pages tutorial.md commands.md messages.md warnings.md formats.md import.md limits.md
+    cookbook.md)
   install(DIRECTORY ${orn_hdl_share}/man/ DESTINATION ${CMAKE_INSTALL_MANDIR} COMPONENT Tool)
   install(DIRECTORY ${orn_hdl_share}/bash-completion ${orn_hdl_share}/vim ${orn_hdl_share}/orn-hdl
     DESTINATION ${CMAKE_INSTALL_DATADIR} COMPONENT Tool)

@@ -1,6 +1,6 @@
 // Turns the bytes of a fuzz input into choices and texts. At the end of the input every choice is
-// the first one and every text is empty, so any input means something. It means the same to every
-// compiler when no expression makes two choices in an order that is the compiler's.
+// the first one and every text is empty, so any input is valid. No expression may make two choices
+// in an order that the compiler is free to pick: inputs would then mean different things.
 #pragma once
 
 #include <algorithm>

@@ -15,7 +15,8 @@ namespace {
 
 using namespace Orn_Hdl;
 
-/// The objects of one class that exist. Filled first, then sorted, then asked.
+/// The objects of one class that exist. They are added first, then sorted; only then can they be
+/// looked up.
 template <class T> class Alive {
 public:
     void Add(const T* object) { objects_.push_back(object); }

@@ -66,12 +66,18 @@ int MemoryFiles::Open(const char* name, int flags, unsigned /*mode*/) {
         files_[place].text.clear();
     }
     descriptors_.push_back(place);
+    offsets_.push_back(0);
     ++openCount_;
     return static_cast<int>(descriptors_.size());
 }
 
-ssize_t MemoryFiles::Read(int /*descriptor*/, void* /*buffer*/, std::size_t /*size*/) {
-    return FailWith(EIO);
+ssize_t MemoryFiles::Read(int descriptor, void* buffer, std::size_t size) {
+    const std::string& text = files_[GetOpen(descriptor)].text;
+    std::size_t& offset = offsets_[static_cast<std::size_t>(descriptor) - 1];
+    const std::size_t count = std::min(size, text.size() - std::min(offset, text.size()));
+    std::copy_n(text.data() + std::min(offset, text.size()), count, static_cast<char*>(buffer));
+    offset += count;
+    return static_cast<ssize_t>(count);
 }
 
 ssize_t MemoryFiles::Write(int descriptor, const void* data, std::size_t size) {

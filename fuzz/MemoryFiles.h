@@ -58,6 +58,8 @@ private:
     std::vector<File> files_;
     /// For each descriptor, from 1 on, the place of its file, None once it is closed.
     std::vector<std::size_t> descriptors_;
+    /// For each descriptor how many characters have been read.
+    std::vector<std::size_t> offsets_;
     std::size_t openCount_ = 0;
 };
 

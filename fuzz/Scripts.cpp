@@ -4,6 +4,7 @@
 #include "Consistency.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
+#include "Port/Ascii.h"
 #include "Writes.h"
 
 #include <cstdlib>
@@ -160,12 +161,28 @@ private:
         if (kind == "text..." || kind == "text") {
             return bytes_.Pick(Texts);
         }
-        // A word of the language itself, or a name that meets nothing else.
+        // A word of the language itself, or a name that no other argument uses.
         return std::string(kind);
     }
 
     Bytes& bytes_;
 };
+
+/// A script with its first two WRITE commands only: many scripts spend most of their time in them.
+Script WithTwoWrites(const Script& script) {
+    constexpr std::string_view Verb = "WRITE";
+    Script lines;
+    int writes = 0;
+    for (const std::string& line : script) {
+        const bool isWrite =
+            Port::EqualIgnoringCase(std::string_view(line).substr(0, Verb.size()), Verb);
+        writes += isWrite ? 1 : 0;
+        if (!isWrite || writes <= 2) {
+            lines.push_back(line);
+        }
+    }
+    return lines;
+}
 
 /// When a run checks its netlist.
 enum class When { Never, AtTheEnd, EveryFewLines };
@@ -231,7 +248,7 @@ private:
     std::string result_;
 };
 
-/// The same time in every banner.
+/// Fixes the time that banners contain.
 const int timeIsFixed = setenv("SOURCE_DATE_EPOCH", "1000000000", 1);
 
 } // namespace
@@ -264,7 +281,7 @@ void CheckScript(const Script& script, Checks checks) {
     Check(timeIsFixed == 0, "the time is fixed");
     if (checks == Checks::Few) {
         Run run(When::AtTheEnd);
-        run.Do(script);
+        run.Do(WithTwoWrites(script));
         run.WriteOnce();
         return;
     }

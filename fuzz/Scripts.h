@@ -24,8 +24,9 @@ constexpr std::size_t ScriptsPerFullCheck = 16;
 
 /// With all checks, runs a script in two engines, writes both netlists three times, does all that
 /// once more, checks the netlist every few lines and after each write, and checks that both engines
-/// did and wrote the same. With few, runs it in one engine, writes the netlist once, and checks the
-/// netlist after the last line and after each write.
+/// did and wrote the same. With few, runs it in one engine with no more than two of its WRITE
+/// commands, writes the netlist once, and checks the netlist after the last line and after each
+/// write.
 void CheckScript(const Script& script, Checks checks);
 
 } // namespace Fuzz

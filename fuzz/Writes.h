@@ -1,4 +1,4 @@
-// Writing a netlist over and over, with what must hold of every write.
+// Writes a netlist several times and checks every write.
 #pragma once
 
 #include "Orn_Hdl/Model.h"

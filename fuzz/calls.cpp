@@ -1,5 +1,5 @@
-// The input chooses a sequence of calls of the class interface on one design, in any order: making,
-// wiring, renaming, removing, copying, widening, writing.
+// The input chooses calls of the class interface on one design, in any order: they create, connect,
+// rename, remove, copy and widen objects and write the netlist.
 
 #include "Bytes.h"
 #include "Check.h"
@@ -10,10 +10,13 @@
 #include "Writes.h"
 
 #include <memory>
+#include <string>
+#include <utility>
 #include <vector>
 
 namespace {
 
+using Fuzz::Check;
 using Fuzz::Checks;
 using namespace Orn_Hdl;
 
@@ -70,7 +73,7 @@ public:
             try {
                 Call();
             } catch (const Orn_Hdl::Exception&) {
-                // An operation by name refuses what does not fit.
+                // An operation by name throws if its arguments do not fit.
             }
             if (checks_ == Checks::All && i % CallsPerCheck == 0) {
                 Fuzz::CheckNetlist(GetNetlist(), GetLoose());
@@ -198,7 +201,13 @@ private:
     }
 
     void Call() {
-        switch (bytes_.Choose(6)) {
+        // Few bytes lead to calls about ownership, so that the others keep their meaning.
+        constexpr int LeastOfOwning = 232;
+        const int choice = bytes_.Choose(256);
+        if (choice >= LeastOfOwning) {
+            return Own();
+        }
+        switch (choice % 6) {
         case 0:
             return Make();
         case 1:
@@ -251,7 +260,7 @@ private:
             GetNetlist().Add(loose_.back().release());
             loose_.pop_back();
         } else {
-            // What is held already is not held twice.
+            // The netlist holds the signal already, so nothing is added.
             GetNetlist().Add(PickSignal());
         }
     }
@@ -442,7 +451,7 @@ private:
             }
             return;
         default:
-            // Removed and made anew under the same name.
+            // The signal is removed, and a new one is added under its name.
             if (Signal* signal = PickSignal()) {
                 const std::string name(signal->GetNameView());
                 GetNetlist().Remove(signal);
@@ -450,6 +459,203 @@ private:
             }
             return;
         }
+    }
+
+    /// Calls after which another object owns something, or nothing does.
+    void Own() {
+        switch (bytes_.Choose(12)) {
+        case 0:
+            if (AttributeHolder* holder = PickHolder()) {
+                holder->RemoveAttr(At(holder->GetAttrIterator(), bytes_.Choose(256)));
+            }
+            return;
+        case 1:
+            return MoveAttribute();
+        case 2:
+            return RemovePin();
+        case 3:
+            return Destroy();
+        case 4:
+            if (std::unique_ptr<Signal> signal = GetNetlist().DetachSignal(PickSignal())) {
+                loose_.push_back(std::move(signal));
+            }
+            return;
+        case 5:
+            // Detached and added again, an object stands behind all others.
+            if (std::unique_ptr<Instance> instance = GetNetlist().DetachInstance(PickInstance())) {
+                GetNetlist().Add(instance.release());
+            }
+            return;
+        case 6:
+            if (std::unique_ptr<Component> component =
+                    GetNetlist().DetachComponent(PickComponent())) {
+                GetNetlist().Add(component.release());
+            }
+            return;
+        case 7:
+        case 8:
+            return RenameByName();
+        case 9:
+            return RemoveWhileWalking();
+        case 10:
+            return MoveNetlist();
+        default:
+            return MoveEngine();
+        }
+    }
+
+    void MoveAttribute() {
+        AttributeHolder* const from = PickHolder();
+        AttributeHolder* const to = PickHolder();
+        if (from == nullptr || to == nullptr) {
+            return;
+        }
+        Attribute* const attribute = At(from->GetAttrIterator(), bytes_.Choose(256));
+        std::unique_ptr<Attribute> detached = from->DetachAttr(attribute);
+        Check(detached.get() == attribute, "a holder owns what it lists");
+        switch (bytes_.Choose(3)) {
+        case 0:
+            to->AddAttr(detached.release());
+            return;
+        case 1:
+            from->AddAttr(detached.release());
+            // Whoever destroys an attribute, it leaves its holder.
+            delete attribute;
+            return;
+        default:
+            return;
+        }
+    }
+
+    void RemovePin() {
+        Component* const component = PickComponent();
+        Pin* const pin = PickPin();
+        switch (bytes_.Choose(4)) {
+        case 0:
+            return GetNetlist().RemovePin(component, pin);
+        case 1:
+            if (component != nullptr) {
+                component->RemovePin(At(component->GetPinIterator(), bytes_.Choose(256)));
+            }
+            return;
+        case 2:
+            if (Instance* instance = PickInstance()) {
+                instance->RemovePin(At(instance->GetPinIterator(), bytes_.Choose(256)));
+            }
+            return;
+        default:
+            delete pin;
+            return;
+        }
+    }
+
+    /// Destroys what the netlist owns.
+    void Destroy() {
+        switch (bytes_.Choose(3)) {
+        case 0:
+            delete At(GetNetlist().GetSignalIterator(), bytes_.Choose(256));
+            return;
+        case 1:
+            delete PickInstance();
+            return;
+        default:
+            delete PickComponent();
+            return;
+        }
+    }
+
+    void RenameByName() {
+        const std::string newName = PickName();
+        switch (bytes_.Choose(4)) {
+        case 0:
+            if (const Component* component = PickComponent()) {
+                model_.RenameComponent(component->GetName().CStr(), newName.c_str());
+            }
+            return;
+        case 1:
+            if (const Instance* instance = PickInstance()) {
+                model_.RenameInstance(instance->GetName().CStr(), newName.c_str());
+            }
+            return;
+        default:
+            if (const Signal* signal = PickSignal()) {
+                model_.RenameSignal(signal->GetName().CStr(), newName.c_str());
+            }
+            return;
+        }
+    }
+
+    /// Removes some signals during one walk. What is left keeps its order.
+    void RemoveWhileWalking() {
+        std::vector<const Signal*> kept;
+        const int every = 2 + bytes_.Choose(4);
+        int met = bytes_.Choose(8);
+        const int count = CountSignals();
+        Iterator<Signal*> at = GetNetlist().GetSignalIterator();
+        for (int i = 0; !at.IsAtEnd(); ++i) {
+            Check(i < count, "a walk meets no signal twice");
+            if (++met % every == 0) {
+                GetNetlist().Remove(at.GetCurrent());
+            } else {
+                kept.push_back(at.GetCurrent());
+                at.Next();
+            }
+        }
+        std::size_t place = 0;
+        for (const Signal* signal : GetNetlist().GetSignalIterator()) {
+            Check(place < kept.size() && signal == kept[place++], "removal keeps the order");
+        }
+        Check(place == kept.size(), "only what was removed is missing");
+    }
+
+    int CountSignals() {
+        int count = 0;
+        for (const Signal* signal : GetNetlist().GetSignalIterator()) {
+            count += signal == nullptr ? 0 : 1;
+        }
+        return count;
+    }
+
+    void MoveNetlist() {
+        Netlist moved(std::move(GetNetlist()));
+        Fuzz::CheckNetlist(moved, GetLoose());
+        Check(GetNetlist().GetSignalIterator().IsAtEnd(), "what was moved has left");
+        switch (bytes_.Choose(3)) {
+        case 0:
+            GetNetlist() = std::move(moved);
+            return;
+        case 1:
+            // The design begins anew.
+            return;
+        default:
+            GetNetlist().Add(new Component("A"));
+            GetNetlist() = std::move(moved);
+            return;
+        }
+    }
+
+    /// An engine of its own, which is slow to make: the calls of this design need none.
+    void MoveEngine() {
+        if (checks_ != Checks::All || movesEngine_) {
+            return;
+        }
+        movesEngine_ = true;
+        Engine engine;
+        engine.CreateAndAddModel("m", "");
+        Model* const model = engine.GetModel("m");
+        const char* const name = PickName();
+        Engine other(std::move(engine));
+        if (bytes_.Choose(2) == 0) {
+            engine.CreateAndAddModel("m", "");
+            engine = std::move(other);
+        } else {
+            engine = std::move(other);
+            other = std::move(engine);
+            engine = std::move(other);
+        }
+        Check(engine.GetModel("m") == model, "a model stays where it is");
+        model->AddSignal(name);
+        Fuzz::CheckNetlist(*model->GetNetlist(), {});
     }
 
     void CallByName() {
@@ -535,6 +741,7 @@ private:
     std::vector<std::unique_ptr<Signal>> loose_;
     Model model_{&GetFactory()};
     int writes_ = 0;
+    bool movesEngine_ = false;
 };
 
 } // namespace

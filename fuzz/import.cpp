@@ -1,5 +1,5 @@
-// The input is a JSON netlist behind a byte of options. Whatever is not refused becomes the same
-// netlist by way of a model and by way of a command file.
+// The input is two bytes of options and a JSON netlist. If the netlist is not refused, it is
+// imported into a model and into a command file, and both give the same netlist.
 
 #include "Bytes.h"
 #include "Check.h"
@@ -35,13 +35,13 @@ Import::UnknownValues PickUnknownValues(int choice) {
     }
 }
 
-Import::ImportRules PickRules(Fuzz::Bytes& bytes) {
+Import::ImportRules PickRules(Fuzz::Bytes& bytes, const Import::CellLibrary& library) {
     using Import::NameLanguages;
     constexpr NameLanguages Languages[] = {NameLanguages::Both, NameLanguages::Verilog,
                                            NameLanguages::Vhdl};
     const int choice = bytes.Choose(24);
     const Import::NameRules names(Languages[choice / 4 % 3], true);
-    return Import::ImportRules{PickUnknownValues(choice % 4), names, choice >= 12};
+    return Import::ImportRules{PickUnknownValues(choice % 4), names, choice >= 12, library};
 }
 
 std::string WriteCommands(const Import::ImportedNetlist& netlist) {
@@ -83,7 +83,8 @@ void CheckImport(const Import::ImportedNetlist& netlist) {
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     Fuzz::Bytes bytes(data, size);
-    const Import::ImportRules rules = PickRules(bytes);
+    const Import::CellLibrary library;
+    const Import::ImportRules rules = PickRules(bytes, library);
     const bool keepAttributes = bytes.Choose(2) == 0;
     try {
         const std::unique_ptr<Import::ImportedDesign> design =
@@ -92,7 +93,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         Import::Warnings warnings;
         CheckImport(Import::MakeNetlist(*design, top, rules, warnings));
     } catch (const Import::Error&) {
-        // What is no netlist, or cannot be imported, is told.
+        // The input is no netlist, or cannot be imported.
     }
     return 0;
 }

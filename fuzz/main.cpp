@@ -17,7 +17,7 @@ void RunFile(const std::filesystem::path& path) {
     std::ifstream file(path, std::ios::binary);
     const std::vector<char> bytes((std::istreambuf_iterator<char>(file)),
                                   std::istreambuf_iterator<char>());
-    // A copy on the heap of just this size: reading beyond it is then seen.
+    // A copy of exactly this size on the heap, so that a sanitizer finds a read beyond its end.
     const std::vector<std::uint8_t> data(bytes.begin(), bytes.end());
     std::printf("%s\n", path.c_str());
     std::fflush(stdout);

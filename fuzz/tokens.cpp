@@ -66,7 +66,7 @@ void CheckLookUp(const StringArray& words) {
     }
 }
 
-/// Splitting only leaves characters out.
+/// Checks that splitting only leaves characters out.
 void CheckWords(std::string_view line, const StringArray& words) {
     std::size_t at = 0;
     for (int i = 0; i < words.GetSize(); ++i) {

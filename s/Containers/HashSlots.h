@@ -35,13 +35,17 @@ public:
         return slots_[Probe(hash, matches)].Get();
     }
 
-    /// Makes room for one more value, so that adding it allocates nothing. At most three quarters
-    /// of the slots are used.
-    void MakeRoom() {
-        if ((count_ + 1) * 4 <= slots_.size() * 3) {
+    /// Makes room for more values, so that adding them allocates nothing. At most three quarters of
+    /// the slots are used.
+    void MakeRoom(std::size_t more = 1) {
+        if ((count_ + more) * 4 <= slots_.size() * 3) {
             return;
         }
-        Slots former(slots_.size() < 16 ? 16 : slots_.size() + slots_.size() / 2);
+        std::size_t size = slots_.size() < 16 ? 16 : slots_.size() + slots_.size() / 2;
+        while ((count_ + more) * 4 > size * 3) {
+            size += size / 2;
+        }
+        Slots former(size);
         former.swap(slots_);
         for (const Slot& slot : former) {
             if (!slot.IsFree()) {

@@ -4,14 +4,11 @@
 
 #include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Commands.h"
-#include "Port/Ascii.h"
 
 #include <memory>
 #include <utility>
 
 namespace Orn_Hdl {
-
-using Port::ViewOf;
 
 struct Model::Implementation {
     bool modified = false;

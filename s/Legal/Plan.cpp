@@ -65,6 +65,13 @@ const Attribute* AttributeOf(const Check::Finding& finding) {
                : nullptr;
 }
 
+bool IsBeyondMending(const Check::Finding& finding) {
+    const bool isFileWithQuote = Is(finding, RuleId::IncludeFile) &&
+                                 finding.cause.first.find_first_not_of("\" ") != std::string::npos;
+    return IsOneOf(finding, Unmendable) || isFileWithQuote ||
+           (Is(finding, RuleId::CharacterInValue) && !CanBeEscaped(*AttributeOf(finding)));
+}
+
 /// Notes the names that are at fault by themselves.
 void NoteName(const Check::Finding& finding, const Netlist& netlist, FaultyNames& faulty) {
     if (IsAttributeKind(finding.cause.kind)) {
@@ -119,8 +126,13 @@ Plan::Plan(const Netlist& netlist, const HdlOptions& options) : netlist_(netlist
     Checking::Context context(netlist, options, Check::Targets::All());
     context.CheckAll();
     std::vector<Check::Finding> findings = context.TakeFindings();
-    const auto isFault = [](const Check::Finding& finding) {
-        return finding.GetSeverity() == Check::Severity::Error || IsOneOf(finding, TwoValues);
+    FindOpen();
+    // A signal named open that is one gets another name, and its aliases are written then.
+    const bool hasOpenSignal =
+        open_ == nullptr && netlist.GetSignal(string_view("open")) != nullptr;
+    const auto isFault = [&](const Check::Finding& finding) {
+        return finding.GetSeverity() == Check::Severity::Error || IsOneOf(finding, TwoValues) ||
+               (hasOpenSignal && Is(finding, RuleId::AliasBits));
     };
     findings.erase(std::remove_if(findings.begin(), findings.end(),
                                   [&](const Check::Finding& f) { return !isFault(f); }),
@@ -135,11 +147,8 @@ Plan::Plan(const Netlist& netlist, const HdlOptions& options) : netlist_(netlist
     }
     NoteOpen();
     FaultyNames faulty;
-    if (open_ == nullptr) {
-        // A signal of that name which is one needs another name.
-        if (const Signal* const open = netlist.GetSignal(string_view("open"))) {
-            faulty.objects.insert(open);
-        }
+    if (hasOpenSignal) {
+        faulty.objects.insert(netlist.GetSignal(string_view("open")));
     }
     for (const Check::Finding& finding : findings) {
         if (IsOneOf(finding, OfNames)) {
@@ -166,12 +175,16 @@ Plan::Plan(const Netlist& netlist, const HdlOptions& options) : netlist_(netlist
 }
 
 /// A signal named open is none unless it is a port, or has a constant or an alias.
-void Plan::NoteOpen() {
+void Plan::FindOpen() {
     const Signal* const open = netlist_.GetSignal(string_view("open"));
     const bool isNone = open != nullptr && open->GetSignalType() == SignalTypeScalar &&
                         !open->IsPort() && open->GetConstantValue().GetValue().IsEmpty() &&
                         open->GetSignalIterator().IsAtEnd();
     open_ = isNone ? open : nullptr;
+}
+
+/// Notes what nothing is wired to.
+void Plan::NoteOpen() {
     for (const Signal* signal : netlist_.GetSignalIterator()) {
         if (signal->GetSignalType() != SignalTypeCompoundBus) {
             continue;
@@ -216,7 +229,7 @@ bool Plan::IsNothing(const Signal& signal) const noexcept {
 }
 
 void Plan::Note(Check::Finding& finding) {
-    if (IsOneOf(finding, Unmendable)) {
+    if (IsBeyondMending(finding)) {
         Refuse(finding);
     } else if (IsAttributeKind(finding.cause.kind) && AttributeOf(finding) != nullptr &&
                (IsOneOf(finding, OfConstants) || Is(finding, RuleId::GenericDigits))) {
@@ -236,17 +249,10 @@ void Plan::Note(Check::Finding& finding) {
         undeclared_.insert(Lower(finding.cause.second));
     } else if (Is(finding, RuleId::UndeclaredGeneric)) {
         NoteGeneric(finding);
-    } else if (Is(finding, RuleId::CharacterInValue)) {
-        if (!CanBeEscaped(*AttributeOf(finding))) {
-            Refuse(finding);
-        }
     } else if (Is(finding, RuleId::DirectiveComment)) {
         hasDirectives_ = true;
     } else if (Is(finding, RuleId::UndeclaredComponent)) {
         options_.vhdl.suppressComponent = false;
-    } else if (Is(finding, RuleId::IncludeFile) &&
-               finding.cause.first.find_first_not_of("\" ") != std::string::npos) {
-        Refuse(finding);
     }
 }
 

@@ -86,6 +86,7 @@ private:
     void NoteConstant(Check::Finding& finding);
     void NoteAttributeDigits(Check::Finding& finding);
     void NoteGeneric(Check::Finding& finding);
+    void FindOpen();
     void NoteOpen();
     void MendClauses();
 

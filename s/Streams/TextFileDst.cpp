@@ -13,12 +13,10 @@ namespace {
 
 constexpr std::string_view IndentStep = "   ";
 constexpr int ContinuationLevels = 2;
-#if defined(FUZZING_BUILD_MODE_UNSAFE_FOR_PRODUCTION)
-// The short texts of a fuzz target fill this buffer too.
-constexpr std::size_t BufferSize = std::size_t(1) << 10;
-#else
-constexpr std::size_t BufferSize = std::size_t(1) << 18;
-#endif
+// The buffer grows with the file: small files need little memory, and large ones few calls of the
+// system.
+constexpr std::size_t FirstBuffer = std::size_t(1) << 10;
+constexpr std::size_t LargeBuffer = std::size_t(1) << 18;
 
 Port::File::Mode FileMode(TextFileOutStream::Mode mode) noexcept {
     switch (mode) {
@@ -114,10 +112,10 @@ void TextFileDst::SendLines() {
 
 void TextFileDst::MakeRoom(std::size_t size) {
     SendLines();
-    if (size <= capacity_ - used_) {
+    if (size <= capacity_ - used_ && capacity_ >= LargeBuffer) {
         return;
     }
-    const std::size_t capacity = std::max({BufferSize, capacity_ * 2, used_ + size});
+    const std::size_t capacity = std::max({FirstBuffer, capacity_ * 2, used_ + size});
     std::unique_ptr<char[]> buffer(new char[capacity]);
     std::copy_n(buffer_.get(), used_, buffer.get());
     buffer_ = std::move(buffer);
@@ -161,7 +159,7 @@ inline void TextFileDst::WritePiece(std::string_view text) {
 
 void TextFileDst::WriteToLineEnd(std::string_view text) {
     BeginLine();
-    if (text.size() < BufferSize) {
+    if (text.size() < std::max(FirstBuffer, capacity_)) {
         Append(text);
         StartLine();
         return;

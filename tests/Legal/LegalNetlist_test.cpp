@@ -209,6 +209,11 @@ TEST_F(LegalNetlistTest, SignalNamedOpenIsASignalWhenItIsUsedAsOne) {
     ExpectInBoth(".I(open_1)", "I=>open_1");
 }
 
+TEST_F(LegalNetlistTest, WidthsOfASignalNamedOpenCount) {
+    Do({"CONNECT SIGNAL open A,A"});
+    EXPECT_EQ(FindErrors(), std::vector<std::string>{"alias-bits"});
+}
+
 TEST_F(LegalNetlistTest, OpenPartsGetSignals) {
     Do({"ADD COMPONENT REG", "ADD PIN REG Q(1:0) output", "ADD INSTANCE REG U2",
         "ADD PORT Q output", "CONNECT SIGNAL open,Q U2.Q(1:0)"});

@@ -177,6 +177,7 @@ template <class Action> void FailInTurn(const Action& action) {
 }
 
 constexpr const char* LongName = "a name that is too long for the object that bears it";
+constexpr const char* LongSignalName = "a_name_that_is_too_long_for_the_object_that_bears_it";
 
 TEST(FailingAllocation, AComponentThatIsNotMadeLeavesNothingBehind) {
     FailInTurn([] { const Orn_Hdl::Component component(LongName); });
@@ -263,6 +264,126 @@ TEST(FailingAllocation, WhatANetlistHoldsIsFound) {
     });
 }
 
+/// A model with a bus, its parts, a scalar and compounds of them, one of which names another. As
+/// many further instances as asked for fill the netlist's index to different degrees.
+std::unique_ptr<Orn_Hdl::Engine> MakeModelToRename(int furtherInstances) {
+    auto engine = std::make_unique<Orn_Hdl::Engine>();
+    engine->CreateAndAddModel("top", "");
+    Orn_Hdl::Model* const model = engine->GetModel("top");
+    for (const char* line : {"ADD COMPONENT C", "ADD PIN C I(3:0) INPUT", "ADD PIN C J(2:0) INPUT",
+                             "ADD INSTANCE C U1", "ADD SIGNAL D(7:0)", "ADD SIGNAL s",
+                             "CONNECT SIGNAL D(3:0) U1.I(3:0)", "ADD INSTANCE C U2",
+                             "CONNECT SIGNAL D(7:6),s,D(0) U2.I(3:0)",
+                             "CONNECT SIGNAL s,D(5:4) U1.J(2:0)", "CONNECT SIGNAL D(1) s"}) {
+        model->ExecuteLine(line);
+    }
+    // The netlist finds these instead of two parts of the bus, which need a place in the index
+    // then.
+    model->GetNetlist()->Add(new Orn_Hdl::ScalarSignal("D(0)"));
+    model->GetNetlist()->Add(new Orn_Hdl::ScalarSignal("D(5:4)"));
+    for (int i = 0; i < furtherInstances; ++i) {
+        model->AddInstance(("F" + std::to_string(i)).c_str(), "C");
+    }
+    model->SetModifiedFlag(false);
+    return engine;
+}
+
+template <class T> void TellEach(std::string& text, const Orn_Hdl::Iterator<T*>& objects) {
+    for (const T* object : objects) {
+        text.append(object->GetNameView()).append(" ");
+    }
+    text += "\n";
+}
+
+/// All names of a model and what its signals are connected to. An object may be
+/// found by its name, or another one, or none.
+std::string Tell(Orn_Hdl::Model& model) {
+    const Orn_Hdl::Netlist& netlist = *model.GetNetlist();
+    std::string text = model.IsModified() ? "modified\n" : "";
+    TellEach(text, netlist.GetSignalIterator());
+    TellEach(text, netlist.GetInstanceIterator());
+    TellEach(text, netlist.GetComponentIterator());
+    for (const Orn_Hdl::Signal* signal : netlist.GetSignalIterator()) {
+        const Orn_Hdl::Signal* const found = netlist.GetSignal(signal->GetNameView());
+        text += found == signal ? "+" : found == nullptr ? "-" : "=";
+        TellEach(text, signal->GetSignalIterator());
+        TellEach(text, signal->GetPinIterator());
+    }
+    for (const Orn_Hdl::Instance* instance : netlist.GetInstanceIterator()) {
+        EXPECT_EQ(netlist.GetInstance(instance->GetNameView()), instance);
+    }
+    for (const Orn_Hdl::Component* component : netlist.GetComponentIterator()) {
+        EXPECT_EQ(netlist.GetComponent(component->GetNameView()), component);
+    }
+    return text;
+}
+
+/// Renames an object of a model while one allocation after the other fails: nothing has changed
+/// then, and renaming it once more succeeds.
+template <class Rename>
+void FailToRename(const Rename& rename, int leastInstances = 0, int mostInstances = 16) {
+    for (int furtherInstances = leastInstances; furtherInstances <= mostInstances;
+         ++furtherInstances) {
+        const auto first = MakeModelToRename(furtherInstances);
+        Orn_Hdl::Model& renamed = *first->GetModel("top");
+        const std::string before = Tell(renamed);
+        rename(renamed);
+        const std::string after = Tell(renamed);
+        ASSERT_NE(after, before);
+        FailInTurn([&] {
+            const long count = allowed.exchange(-1);
+            const auto engine = MakeModelToRename(furtherInstances);
+            Orn_Hdl::Model& model = *engine->GetModel("top");
+            try {
+                allowed = count;
+                rename(model);
+                allowed = -1;
+            } catch (const std::bad_alloc&) {
+                allowed = -1;
+                EXPECT_EQ(Tell(model), before) << "allocation " << count;
+                rename(model);
+                EXPECT_EQ(Tell(model), after) << "allocation " << count;
+                throw;
+            }
+            EXPECT_EQ(Tell(model), after);
+        });
+    }
+}
+
+TEST(FailingAllocation, ASignalThatIsNotRenamedIsWhatItWas) {
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameSignal("s", LongSignalName); });
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameSignal("s", "t"); });
+}
+
+TEST(FailingAllocation, ABusThatIsNotRenamedKeepsItsPartsAndCompounds) {
+    const std::string name = std::string(LongSignalName) + "(7:0)";
+    FailToRename([&](Orn_Hdl::Model& model) { model.RenameSignal("D(7:0)", name.c_str()); });
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameSignal("D(7:0)", "E(7:0)"); });
+}
+
+TEST(FailingAllocation, NoneOfTheNamesOfABusIsExchanged) {
+    // With so many objects the index needs memory from the system for one more: it has room for
+    // that of one of the two hidden parts.
+    constexpr int Fullest = 11'688;
+    const auto engine = MakeModelToRename(0);
+    const Orn_Hdl::Netlist& netlist = *engine->GetModel("top")->GetNetlist();
+    const auto countOf = [](const auto& objects) {
+        return static_cast<int>(std::distance(objects.begin(), objects.end()));
+    };
+    constexpr int Hidden = 2;
+    const int found = countOf(netlist.GetSignalIterator()) +
+                      countOf(netlist.GetInstanceIterator()) +
+                      countOf(netlist.GetComponentIterator()) - Hidden;
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameSignal("D(7:0)", "E(7:0)"); },
+                 Fullest - found - 1, Fullest - found);
+}
+
+TEST(FailingAllocation, AnInstanceOrComponentThatIsNotRenamedIsWhatItWas) {
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameInstance("U1", LongSignalName); });
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameInstance("U1", "V1"); });
+    FailToRename([](Orn_Hdl::Model& model) { model.RenameComponent("C", LongSignalName); });
+}
+
 TEST(FailingAllocation, ADoneCommandThatIsNotKeptEnds) {
     int ended = 0;
     struct Done final : Orn_Hdl::Command {
@@ -281,6 +402,35 @@ TEST(FailingAllocation, ADoneCommandThatIsNotKeptEnds) {
         manager.AddDoneCommand(done);
     });
     EXPECT_EQ(ended, made);
+}
+
+TEST(FailingAllocation, AModelThatIsNotReadStaysAsItWas) {
+    const Support::TemporaryFolder folder;
+    const std::string file = folder / "top.v";
+    Support::WriteWholeFile(
+        file, "`define W [3:0]\nmodule INV #(parameter P = 8'h00)(input I, output O); endmodule\n"
+              "// a comment\nmodule top(input a, output `W y); wire `W \\w.x , W, w;\n"
+              "(* LOC = \"P1\" *) INV #(.P(1)) u(.I(1'b0), .O(y[0])), \\u.1 (y[0], W[0]);\n"
+              "assign {y[3], y[2:1]} = {w[0], 2'b10}; defparam u.P = 8'h0F;\n"
+              "// synthesis attribute P of u is \"0F\"\nendmodule\n");
+    const int openFiles = Support::CountOpenFiles();
+    Orn_Hdl::CommandFactory factory;
+    FailInTurn([&] {
+        Orn_Hdl::Model model(&factory);
+        model.AddSignal("former");
+        Orn_Hdl::VerilogReader reader;
+        reader.KeepComments(true);
+        reader.SetTop("top");
+        try {
+            reader.Read(file.c_str(), model);
+        } catch (const std::bad_alloc&) {
+            EXPECT_NE(model.GetSignal("former"), nullptr);
+            throw;
+        }
+        EXPECT_EQ(model.GetSignal("former"), nullptr);
+        EXPECT_NE(model.GetInstance("u_1"), nullptr);
+    });
+    EXPECT_EQ(Support::CountOpenFiles(), openFiles);
 }
 
 TEST(FailingAllocation, AnyOneMayFail) {

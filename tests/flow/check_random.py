@@ -192,10 +192,15 @@ def main() -> int:
     parser.add_argument("--jobs", type=int, default=os.cpu_count())
     parser.add_argument("--keep", type=Path, help="a folder in which the files stay")
     parser.add_argument("--verbose", action="store_true")
+    parser.add_argument("--legal", action="store_true",
+                        help="write the designs with --legal, as check_legal.py does")
     options = parser.parse_args()
     os.environ["SOURCE_DATE_EPOCH"] = "0"
     first, _, last = options.seeds.partition("-")
     seeds = range(int(first), int(last or first) + 1)
+    if options.legal:
+        from check_legal import check_random
+        return 0 if check_random(options.tool.resolve(), seeds, options.jobs, options.keep) else 1
     sums = Sums()
     with ProcessPoolExecutor(options.jobs) as pool:
         for outcome in pool.map(judge_seed,

@@ -1,7 +1,9 @@
 #include "Import.h"
 
+#include "cells/CellDeclaration.h"
 #include "explain/FileKind.h"
 #include "explain/Syntax.h"
+#include "import/CellLibrary.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
 #include "import/EmitNetlist.h"
@@ -77,14 +79,36 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
-void Report(const ImportOptions& options, Severity severity, std::string message,
-            Reporter& reporter, std::string_view rule = {}) {
+Diagnostic MakeDiagnostic(const std::string& file, Severity severity, std::string message) {
     Diagnostic diagnostic;
     diagnostic.severity = severity;
-    diagnostic.rule = rule;
-    diagnostic.place.file = options.file;
+    diagnostic.place.file = file;
     diagnostic.message = std::move(message);
-    reporter.Report(std::move(diagnostic));
+    return diagnostic;
+}
+
+/// Reads the cell libraries, and reports it if one cannot be read.
+Status ReadLibrary(const std::vector<std::string>& files, CellLibrary& library,
+                   Reporter& reporter) {
+    for (const std::string& file : files) {
+        std::string text;
+        const Status read = ReadFile(file, text);
+        if (read != Status::Success) {
+            return read;
+        }
+        try {
+            library.Add(file, std::move(text));
+        } catch (const Cells::Error& error) {
+            Diagnostic diagnostic = MakeDiagnostic(file, Severity::Error, error.what());
+            diagnostic.place.line = error.GetLine();
+            reporter.Report(std::move(diagnostic));
+            return Status::Failed;
+        } catch (const Import::Error& error) {
+            reporter.Report(MakeDiagnostic(file, Severity::Error, error.what()));
+            return Status::Failed;
+        }
+    }
+    return Status::Success;
 }
 
 Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options,
@@ -103,7 +127,9 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     }
     Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
     for (const Orn_Hdl::Check::Finding& error : legal.GetErrors()) {
-        Report(options, Severity::Error, error.message, reporter, error.rule->name);
+        Diagnostic diagnostic = MakeDiagnostic(options.file, Severity::Error, error.message);
+        diagnostic.rule = error.rule->name;
+        reporter.Report(std::move(diagnostic));
     }
     return legal.GetErrors().empty() ? WriteOutputs(model, options.outputs, progress, &legal)
                                      : Status::Failed;
@@ -158,7 +184,8 @@ Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
 }
 
 /// Imports the text of a file.
-Status ImportText(std::string text, const ImportOptions& options, Reporter& reporter) {
+Status ImportText(std::string text, const ImportOptions& options, const CellLibrary& library,
+                  Reporter& reporter) {
     const std::string beginning = text.substr(0, BeginningSize);
     try {
         const std::unique_ptr<ImportedDesign> design =
@@ -166,11 +193,11 @@ Status ImportText(std::string text, const ImportOptions& options, Reporter& repo
         Module& top = FindTop(*design, options.top);
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
-        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts};
+        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts, library};
         const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
         const Status written = WriteAll(netlist, options, reporter);
         for (std::string& warning : warnings.GetLines()) {
-            Report(options, Severity::Warning, std::move(warning), reporter);
+            reporter.Report(MakeDiagnostic(options.file, Severity::Warning, std::move(warning)));
         }
         return written;
     } catch (const Import::Error& error) {
@@ -179,16 +206,23 @@ Status ImportText(std::string text, const ImportOptions& options, Reporter& repo
     }
 }
 
+Status ImportFile(const ImportOptions& options, Reporter& reporter) {
+    CellLibrary library;
+    Status status = ReadLibrary(options.cells, library, reporter);
+    if (status != Status::Success) {
+        return status;
+    }
+    std::string text;
+    status = ReadFile(options.file, text);
+    return status == Status::Success ? ImportText(std::move(text), options, library, reporter)
+                                     : status;
+}
+
 } // namespace
 
 Status ImportDesign(const ImportOptions& options) {
-    std::string text;
-    const Status read = ReadFile(options.file, text);
-    if (read != Status::Success) {
-        return read;
-    }
     Reporter reporter(options.report);
-    const Status status = ImportText(std::move(text), options, reporter);
+    const Status status = ImportFile(options, reporter);
     reporter.Finish();
     return status;
 }

@@ -8,6 +8,7 @@
 
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace Tool {
 
@@ -21,6 +22,8 @@ struct ImportOptions {
     Outputs outputs;
     /// The replacement of x and z, "0" or "1"; empty to reject them.
     std::string unknownAs;
+    /// The cell libraries.
+    std::vector<std::string> cells;
     /// The languages in which names must be legal; without one, those of the netlists.
     std::optional<Import::NameLanguages> names;
     /// Reject a design whose ports cannot keep their names.

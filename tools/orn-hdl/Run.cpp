@@ -7,6 +7,7 @@
 #include "check/Checker.h"
 #include "check/WriteGate.h"
 #include "explain/FailureExplainer.h"
+#include "warnings/SlipFinder.h"
 
 #include <cstdint>
 #include <string_view>
@@ -26,8 +27,16 @@ constexpr const char* NamelessModel = "HDL_NETLIST";
 /// The replay of one file: its progress, messages and status.
 class Replayer {
 public:
-    Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate)
-        : model_(model), file_(file), gate_(gate), explainer_(model, file.lines) {}
+    Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate,
+             const WarningOptions* warnings)
+        : model_(model), file_(file), gate_(gate), explainer_(model, file.lines),
+          asErrors_(warnings != nullptr && warnings->areErrors) {
+        if (warnings != nullptr && !warnings->dropped.all()) {
+            slips_.emplace(model, *warnings, [this](const FoundSlip& found) { Report(found); });
+        }
+    }
+    Replayer(const Replayer&) = delete;
+    Replayer& operator=(const Replayer&) = delete;
 
     /// Executes one line, which ends at `position` in the file. \return whether it succeeded.
     bool Execute(const Orn_Hdl::StringArray& words, std::uint64_t position) {
@@ -46,13 +55,21 @@ public:
                 Report(words, exception.getLocalized().GetView());
             }
             status_ = Worse(status_, Status::Failed);
+            if (slips_) {
+                slips_->Skip();
+            }
             return false;
+        }
+        if (slips_) {
+            words_ = &words;
+            slips_->Look(words);
         }
         return model_.GetWriteError() == 0 || ReportWriteError(words);
     }
 
     Status GetStatus() const noexcept { return status_; }
     std::uint64_t GetLineCount() const noexcept { return lines_; }
+    std::uint64_t GetSlipCount() const noexcept { return slipCount_; }
 
 private:
     /// Tells what keeps a write command from writing a legal netlist, with the lines that brought
@@ -68,6 +85,20 @@ private:
 
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
         file_.reporter.Report(explainer_.Explain(lines_, words, text));
+    }
+
+    /// Reports a slip in the present line.
+    void Report(const FoundSlip& found) {
+        const Warning& warning = GetWarning(found.slip);
+        ++slipCount_;
+        Diagnostic diagnostic;
+        diagnostic.severity = asErrors_ ? Severity::Error : Severity::Warning;
+        diagnostic.rule = warning.name;
+        diagnostic.place = file_.lines.GetPlace(lines_, *words_, found.mark);
+        diagnostic.message = found.message;
+        diagnostic.notes.push_back(
+            {found.hint.empty() ? "what helps: " + std::string(warning.help) : found.hint});
+        file_.reporter.Report(std::move(diagnostic));
     }
 
     bool ReportWriteError(const Orn_Hdl::StringArray& words) {
@@ -89,6 +120,12 @@ private:
     CommandFile& file_;
     Checking::WriteGate* const gate_;
     FailureExplainer explainer_;
+    const bool asErrors_;
+    /// Without a value if no slips are reported.
+    std::optional<SlipFinder> slips_;
+    /// The line that `slips_` looks at.
+    const Orn_Hdl::StringArray* words_ = nullptr;
+    std::uint64_t slipCount_ = 0;
     std::uint64_t lines_ = 0;
     Status status_ = Status::Success;
 };
@@ -111,7 +148,7 @@ CommandFile::CommandFile(const std::string& fileName, const ReportOptions& repor
       reporter(report, [&shownProgress] { shownProgress.Erase(); }) {}
 
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const WriteRules& rules,
-                Checking::WriteGate* gate) {
+                Checking::WriteGate* gate, const WarningOptions* warnings) {
     Orn_Hdl::CommandReader input(model);
     if (!input.Open(SystemFileName(file.name.c_str()))) {
         return {ComplainUnreadable(file.name, input.GetError()), false, 0};
@@ -122,7 +159,7 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
     } catch (const std::system_error& error) {
         return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false, 0};
     }
-    Replayer replayer(model, file, gate);
+    Replayer replayer(model, file, gate, warnings);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
         if (!replayer.Execute(*words, input.GetPosition()) &&
             (!keepGoing || file.reporter.IsAtLimit())) {
@@ -133,7 +170,7 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
         file.progress.Erase();
         return {ComplainUnreadable(file.name, input.GetError()), false, 0};
     }
-    return {replayer.GetStatus(), true, replayer.GetLineCount()};
+    return {replayer.GetStatus(), true, replayer.GetLineCount(), replayer.GetSlipCount()};
 }
 
 namespace {
@@ -162,10 +199,13 @@ Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOpti
 /// Replays the file of the options and writes its netlists.
 Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
     Checking::WriteGate gate(model, file.lines, file.reporter);
-    const Replayed replayed =
-        Replay(model, file, options.keepGoing, options.writeRules, options.check ? &gate : nullptr);
+    const Replayed replayed = Replay(model, file, options.keepGoing, options.writeRules,
+                                     options.check ? &gate : nullptr, &options.warnings);
     if (!replayed.complete) {
         return replayed.status;
+    }
+    if (options.warnings.areErrors && replayed.slips > 0) {
+        return Worse(replayed.status, Status::Failed);
     }
     Outputs outputs = options.outputs;
     Status status = replayed.status;
@@ -195,7 +235,7 @@ Status Run(const RunOptions& options) {
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";
     const Status status = ReplayAndWrite(model, file, options);
-    file.reporter.Finish();
+    file.reporter.Finish(GetWarningRules());
     return status;
 }
 

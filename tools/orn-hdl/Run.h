@@ -6,6 +6,7 @@
 #include "WriteRules.h"
 #include "diagnostics/CommandLines.h"
 #include "diagnostics/Reporter.h"
+#include "warnings/Table.h"
 
 #include <cstdint>
 #include <optional>
@@ -42,6 +43,7 @@ struct RunOptions {
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
     ReportOptions report;
+    WarningOptions warnings;
 };
 
 Status Run(const RunOptions& options);
@@ -57,6 +59,8 @@ struct Replayed {
     bool complete = false;
     /// How many lines were replayed.
     std::uint64_t lines = 0;
+    /// How many slips were found.
+    std::uint64_t slips = 0;
 };
 
 /// A command file, and where messages about it go.
@@ -73,7 +77,9 @@ struct CommandFile {
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
 /// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
 /// \param gate decides which lines may write; null when all may.
+/// \param warnings the slips that are reported; null for none.
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing,
-                const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr);
+                const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr,
+                const WarningOptions* warnings = nullptr);
 
 } // namespace Tool

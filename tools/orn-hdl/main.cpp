@@ -9,6 +9,7 @@
 #include "diagnostics/Nearest.h"
 #include "explain/Syntax.h"
 #include "stats/Stats.h"
+#include "warnings/WarningsPage.h"
 
 #include "Orn_Hdl/Language.h"
 #include "Port/String.h"
@@ -125,6 +126,36 @@ void AddReport(CLI::App& command, Tool::ReportOptions& report) {
     AddColor(command, report);
 }
 
+/// Drops the warnings of a list of names with commas between them. \return what is wrong with it.
+std::string DropWarnings(const std::string& list, Tool::WarningOptions& warnings) {
+    std::istringstream rest(list);
+    for (std::string name; std::getline(rest, name, ',');) {
+        if (!warnings.Drop(name)) {
+            const std::string meant = Tool::GetNearest(name, Tool::GetWarningNames());
+            return "there is no warning " + name +
+                   (meant.empty() ? "; orn-hdl warnings lists them"
+                                  : "; did you mean " + meant + "?");
+        }
+    }
+    return "";
+}
+
+void AddWarnings(CLI::App& command, Tool::WarningOptions& warnings) {
+    command
+        .add_option_function<std::string>(
+            "--no-warn", [&warnings](const std::string& list) { DropWarnings(list, warnings); },
+            "Do not print these warnings, or all; orn-hdl warnings lists them")
+        ->type_name("NAMES")
+        ->check([](const std::string& list) {
+            Tool::WarningOptions tried;
+            return DropWarnings(list, tried);
+        })
+        // Of several lists, all count.
+        ->join(',');
+    command.add_flag("--werror", warnings.areErrors,
+                     "Make warnings errors: --verilog and --vhdl then write nothing");
+}
+
 /// The command line: its options, and the command to run.
 class CommandLine {
 public:
@@ -139,6 +170,7 @@ public:
         AddDraw();
         AddStats();
         AddCommands();
+        AddWarningsPage();
         app_.footer("\"orn-hdl help COMMAND\" prints the help of a command.");
     }
 
@@ -261,6 +293,7 @@ private:
             ->check(CLI::PositiveNumber)
             ->needs(keepGoing);
         AddReport(command, run_.report);
+        AddWarnings(command, run_.warnings);
         CLI::Option* check = command.add_flag("--check", run_.check,
                                               "Write nothing that has errors for its language");
         CLI::Option* legal =
@@ -282,6 +315,13 @@ private:
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
+        const auto addCells = [this](const std::string& file) { import_.cells.push_back(file); };
+        command
+            .add_option_function<std::string>(
+                "--cells", addCells, "Read cell types: Verilog, JSON or Liberty; may be repeated")
+            ->type_name("FILE")
+            ->trigger_on_parse()
+            ->check(CheckFileName);
         const auto setNames = [this](const std::string& word) {
             import_.names = GetNameLanguages().at(word);
         };
@@ -364,6 +404,13 @@ private:
             command.add_option("WORDS", words_, "Print only commands that begin with these words");
         command.add_flag("--markdown", markdown_, "Print the page for the documentation")
             ->excludes(words);
+    }
+
+    void AddWarningsPage() {
+        CLI::App& command = AddCommand("warnings", "Print the warnings of run", [this] {
+            return markdown_ ? Tool::PrintWarningsPage() : Tool::PrintWarnings();
+        });
+        command.add_flag("--markdown", markdown_, "Print the table of the documentation");
     }
 
     static constexpr const char* Help = "help";

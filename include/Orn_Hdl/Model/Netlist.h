@@ -170,9 +170,11 @@ private:
     void Swap(Netlist& other) noexcept;
     /// Whether this netlist owns a component, an instance or a signal.
     bool Holds(const AttributeHolder& object) const noexcept;
-    /// Gives a held object another name, under which it is found from then on. If allocation
-    /// fails, nothing changes.
-    void Rename(Object& object, ObjectName& name);
+    /// Makes room for new names of that many objects.
+    ORN_HDL_LOCAL void MakeRoomForNames(std::size_t count);
+    /// Gives a held object another name, under which it is found from then on. There must be room
+    /// for it.
+    void Rename(Object& object, ObjectName& name) noexcept;
     /// Who is told of a new name; not owned, null for nobody.
     void SetNameListener(NameListener* listener) noexcept;
 

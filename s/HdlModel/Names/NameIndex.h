@@ -99,8 +99,8 @@ public:
         return slots_.Find(key.GetHash(), IsNamed{key, NameKey::NameBits}) != nullptr;
     }
 
-    /// Makes room, so that adding the next object allocates nothing.
-    void MakeRoom() { slots_.MakeRoom(); }
+    /// Makes room, so that adding the next objects allocates nothing.
+    void MakeRoom(std::size_t count = 1) { slots_.MakeRoom(count); }
 
     /// Adds an object, or replaces another one of its name and group.
     void Add(T* object, unsigned group = 0) {

@@ -113,24 +113,8 @@ struct Netlist::Implementation {
         Enter(object);
     }
 
-    /// Whether an object is found by its key name and is therefore in the index.
-    bool IsFound(const Component* object) const noexcept {
-        return byName.Find(NameKey(ObjectKey::Get(*object), ComponentGroup)) == object;
-    }
-    bool IsFound(const Instance* object) const noexcept {
-        return byName.Find(NameKey(ObjectKey::Get(*object), InstanceGroup)) == object;
-    }
-    bool IsFound(const Signal* object) const noexcept {
-        const Bus* const bus = As<Bus>(object);
-        return byName.Find(NameKey(ObjectKey::Get(*object), SignalGroup)) == object &&
-               (bus == nullptr || busesByBaseName.Find(NameKey(KeyBaseName()(bus))) == bus);
-    }
-
-    /// Gives an object another name, under which it is found.
-    template <class T> void Rename(T* object, ObjectName& name) {
-        if (!IsFound(object)) {
-            MakeRoomFor(object);
-        }
+    /// Gives an object another name, under which it is found. There is room for it.
+    template <class T> void Rename(T* object, ObjectName& name) noexcept {
         ForgetBaseName(object);
         byName.Remove(object, GroupOf(object));
         ObjectKey::Replace(*object, name);
@@ -295,7 +279,12 @@ bool Netlist::Holds(const AttributeHolder& object) const noexcept {
     return OwnerLink::Get<void>(object) == implementation_.get();
 }
 
-void Netlist::Rename(Object& object, ObjectName& name) {
+void Netlist::MakeRoomForNames(std::size_t count) {
+    implementation_->byName.MakeRoom(count);
+    implementation_->busesByBaseName.MakeRoom(count);
+}
+
+void Netlist::Rename(Object& object, ObjectName& name) noexcept {
     switch (object.GetObjectType()) {
     case ObjectTypeSignal:
         implementation_->Rename(static_cast<Signal*>(&object), name);

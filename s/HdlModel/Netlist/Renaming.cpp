@@ -82,25 +82,15 @@ const std::string* Renaming::FindTaken() const {
 }
 
 void Renaming::Apply() {
-    std::size_t done = 0;
-    try {
-        for (; done < entries_.size(); ++done) {
-            Exchange(entries_[done]);
+    // All allocation comes first: an exchange that fails could not be undone, since an object that
+    // was hidden by another one of its name would be found afterwards.
+    netlist_.MakeRoomForNames(entries_.size());
+    for (Entry& entry : entries_) {
+        if (entry.isHeld) {
+            netlist_.Rename(*entry.object, entry.stored);
+        } else {
+            ObjectKey::Replace(*entry.object, entry.stored);
         }
-    } catch (...) {
-        // Undoing allocates nothing: each name returns to where it was.
-        while (done > 0) {
-            Exchange(entries_[--done]);
-        }
-        throw;
-    }
-}
-
-void Renaming::Exchange(Entry& entry) {
-    if (entry.isHeld) {
-        netlist_.Rename(*entry.object, entry.stored);
-    } else {
-        ObjectKey::Replace(*entry.object, entry.stored);
     }
 }
 

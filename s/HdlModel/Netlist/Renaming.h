@@ -42,7 +42,6 @@ private:
     void Add(Object& object, bool isHeld, std::string_view name);
     void AddCompounds(const Signal& signal);
     std::string NewCompoundName(std::string_view name) const;
-    void Exchange(Entry& entry);
 
     Netlist& netlist_;
     std::vector<Entry> entries_;

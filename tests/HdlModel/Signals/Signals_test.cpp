@@ -621,6 +621,25 @@ TEST_F(NestedCompounds, FromTheOutermostIn) {
     EXPECT_EQ(outer->GetSize(), 2);
 }
 
+TEST_F(NestedCompounds, AliasesOfACompoundDoNotHoldIt) {
+    CompoundBus* inner = &AddCompound();
+    inner->AddBusMember(&leaf_);
+    for (int level = 1; level < CompoundBus::MostLevels; ++level) {
+        CompoundBus& outer = AddCompound();
+        outer.AddBusMember(inner);
+        inner = &outer;
+    }
+    CompoundBus& compound = AddCompound();
+    CompoundBus& compoundAlias = AddCompound();
+    ScalarSignal scalarAlias("s");
+    compoundAlias.Connect(&compound);
+    scalarAlias.Connect(&compound);
+    compound.AddBusMember(inner);
+    EXPECT_EQ(compound.GetSize(), 0) << "too deep, whatever the compound is connected to";
+    compound.AddBusMember(compounds_.front().get());
+    EXPECT_EQ(compound.GetSize(), 1);
+}
+
 TEST_F(NestedCompounds, OfManyOccurrencesAreRefused) {
     CompoundBus* inner = &AddCompound();
     inner->AddBusMember(&leaf_);

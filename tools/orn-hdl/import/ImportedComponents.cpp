@@ -65,6 +65,11 @@ public:
 
 private:
     void CountParameters(ComponentUse& use, const Cell& cell) const;
+    /// Whether a cell sets a parameter that others lack.
+    bool IsPartial(const TypeUse& type, std::uint32_t parameter, const Value& value) const {
+        const TypeUse::Parameter& use = type.parameters[parameter];
+        return type.IsPartial(use) && !(use.hasDefault && MeansAny(value, unknown_));
+    }
     Variant GetVariant(const TypeUse& type, const Cell& cell) const;
     void Add(std::uint32_t index, const Variant& variant, const Cell& cell);
     void AddPins(ImportedComponent& component, std::uint32_t type, const Variant& variant);
@@ -108,9 +113,9 @@ void ComponentFinder::CountParameters(ComponentUse& use, const Cell& cell) const
     const TypeUse& type = types_[cell.type];
     ++use.cells;
     for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
-        const std::string_view name = top_.values[cell.parameters.start + i].name;
-        const std::uint32_t index = type.parameterIndex.find(name)->second;
-        if (type.IsPartial(type.parameters[index])) {
+        const NamedValue& value = top_.values[cell.parameters.start + i];
+        const std::uint32_t index = type.parameterIndex.find(value.name)->second;
+        if (IsPartial(type, index, value.value)) {
             ++use.partialParameters[index];
         }
     }
@@ -134,9 +139,9 @@ Variant ComponentFinder::GetVariant(const TypeUse& type, const Cell& cell) const
         }
     }
     for (std::uint32_t i = 0; type.splitsByParameters && i < cell.parameters.count; ++i) {
-        const std::string_view name = top_.values[cell.parameters.start + i].name;
-        const std::uint32_t index = type.parameterIndex.find(name)->second;
-        if (type.IsPartial(type.parameters[index])) {
+        const NamedValue& value = top_.values[cell.parameters.start + i];
+        const std::uint32_t index = type.parameterIndex.find(value.name)->second;
+        if (IsPartial(type, index, value.value)) {
             variant.push_back(ParameterKey(index));
         }
     }
@@ -225,7 +230,7 @@ ImportedGeneric& ComponentFinder::AddGeneric(ImportedComponent& component,
                                    static_cast<std::uint32_t>(component.generics.size()));
     ImportedGeneric& generic = component.generics.emplace_back();
     generic.oldName = parameter.name;
-    generic.hasDefault = parameter.defaultValue != nullptr;
+    generic.hasDefault = parameter.hasDefault;
     return generic;
 }
 
@@ -235,7 +240,10 @@ void ComponentFinder::SetCommonValue(ImportedGeneric& generic, const ImportedCom
         SetFirstValue(generic, component, parameter);
         return;
     }
-    const Place place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
+    const Place place =
+        type.leaf->isLibraryCell
+            ? top_.GetPlace(*component.firstCell, "parameters", parameter.name)
+            : Place{type.leaf->name, "parameter_default_values", "", "", parameter.name};
     CheckParameter(*parameter.defaultValue, place, unknown_, warnings_);
     if (MeansAny(*parameter.defaultValue, unknown_)) {
         WarnOfAny(place, warnings_);
@@ -361,9 +369,9 @@ const ImportedGeneric* ImportedComponent::FindGeneric(const NamedValue& paramete
 }
 
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
-                                  const UnknownValues& unknown, UniqueNames& names,
-                                  Warnings& warnings) {
-    const std::vector<TypeUse> types = CountTypeUses(design, top, unknown, warnings);
+                                  const CellLibrary& library, const UnknownValues& unknown,
+                                  UniqueNames& names, Warnings& warnings) {
+    const std::vector<TypeUse> types = CountTypeUses(design, top, library, unknown, warnings);
     ComponentFinder finder(design, top, types, unknown, names.GetRules(), warnings);
     std::vector<std::uint32_t> componentOf;
     componentOf.reserve(top.cells.size());

@@ -83,12 +83,12 @@ private:
     std::vector<std::uint32_t> componentOf_;
 };
 
-/// Checks the cells of the top module against the leaf modules of the design, and makes and names
-/// their components.
+/// Checks the cells of the top module against the leaf modules of the library and the design, and
+/// makes and names their components.
 /// \param names the scope that components share with instances and signals.
 /// \throws Error if a cell has contents, or does not match its leaf module.
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
-                                  const UnknownValues& unknown, UniqueNames& names,
-                                  Warnings& warnings);
+                                  const CellLibrary& library, const UnknownValues& unknown,
+                                  UniqueNames& names, Warnings& warnings);
 
 } // namespace Tool::Import

@@ -42,7 +42,13 @@ struct BitRange {
 
 /// The value of a parameter or attribute.
 struct Value {
-    enum Kind : std::uint8_t { Bits, Text, Integer };
+    enum Kind : std::uint8_t {
+        Bits,
+        Text,
+        Integer,
+        /// A default in a cell library that is not a plain literal.
+        Expression
+    };
 
     Kind kind = Text;
     /// The digits 0, 1, x and z of `Bits`, leftmost first, or the text.
@@ -60,6 +66,8 @@ struct ModulePort {
     Direction direction = Direction::Unspecified;
     BitRange range;
     Span bits;
+    /// Whether cells may do without the pin: it is a power pin of a cell library.
+    bool isPower = false;
 };
 
 struct Net {
@@ -94,6 +102,8 @@ struct Module {
     /// Whether the module is marked as the top of the design.
     bool top = false;
     bool hasMemories = false;
+    /// Whether the module comes from a cell library, where ports may have an unknown width of 0.
+    bool isLibraryCell = false;
     std::vector<ModulePort> ports;
     /// The default values of parameters.
     std::vector<NamedValue> defaults;

@@ -78,7 +78,8 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     const UnknownValues& unknown = rules.unknown;
     UniqueNames names(rules.names);
     const std::vector<std::string> portNames = ClaimPortNames(top, names);
-    ImportedComponents components = FindComponents(design, top, unknown, names, warnings);
+    ImportedComponents components =
+        FindComponents(design, top, rules.library, unknown, names, warnings);
     OpenConstantOutputs(top, components, warnings);
     const BitUses uses = BitUses::Count(top, components, unknown, portNames);
     BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);

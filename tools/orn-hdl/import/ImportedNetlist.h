@@ -2,6 +2,7 @@
 #pragma once
 
 #include "import/BitOwners.h"
+#include "import/CellLibrary.h"
 #include "import/ImportedComponents.h"
 #include "import/ImportedDesign.h"
 #include "import/NameRules.h"
@@ -25,6 +26,7 @@ struct ImportRules {
     NameRules names;
     /// Whether renaming a port is an error.
     bool keepPorts = false;
+    const CellLibrary& library;
 };
 
 /// The design must outlive it.

@@ -36,8 +36,10 @@ void AppendName(std::string& list, std::string_view name) {
 
 class TypeUseCounter {
 public:
-    TypeUseCounter(ImportedDesign& design, const Module& top, const UnknownValues& unknown)
-        : design_(design), top_(top), unknown_(unknown), uses_(design.types.size()) {
+    TypeUseCounter(ImportedDesign& design, const Module& top, const CellLibrary& library,
+                   const UnknownValues& unknown)
+        : design_(design), top_(top), library_(library), unknown_(unknown),
+          uses_(design.types.size()) {
         for (const Module& module : design.modules) {
             modules_.emplace(module.name, &module);
         }
@@ -54,6 +56,7 @@ private:
 
     ImportedDesign& design_;
     const Module& top_;
+    const CellLibrary& library_;
     const UnknownValues& unknown_;
     std::vector<TypeUse> uses_;
     std::unordered_map<std::string_view, const Module*> modules_;
@@ -74,22 +77,29 @@ void TypeUseCounter::FindLeaf(std::uint32_t index, const Cell& firstCell) {
     CellType& cellType = design_.types[index];
     type.firstCell = &firstCell;
     const auto module = modules_.find(cellType.name);
-    if (module == modules_.end()) {
-        return;
-    }
-    if (!IsLeaf(*module->second)) {
+    if (module != modules_.end() && !IsLeaf(*module->second)) {
         Fail(top_.GetPath("cells", firstCell.name).AddKey("type"),
              "\"" + std::string(cellType.name) +
                  "\" is a module with contents; flatten the design first");
     }
-    AddLeaf(type, cellType, *module->second);
+    if (const Module* cell = library_.Find(cellType.name)) {
+        AddLeaf(type, cellType, *cell);
+    } else if (module != modules_.end()) {
+        AddLeaf(type, cellType, *module->second);
+    }
 }
 
 void TypeUseCounter::AddLeaf(TypeUse& type, CellType& cellType, const Module& leaf) {
     type.leaf = &leaf;
     for (const ModulePort& port : leaf.ports) {
+        if (port.isPower && cellType.pinIndex.count(port.name) == 0) {
+            continue;
+        }
         const std::uint32_t pin = cellType.GetOrAddPin(port.name);
-        cellType.pins[pin].direction = port.direction;
+        Direction& direction = cellType.pins[pin].direction;
+        const bool isKnown = port.isPower ? direction != Direction::Unspecified
+                                          : port.direction == Direction::Unspecified;
+        direction = isKnown ? direction : port.direction;
         type.pins.resize(cellType.pins.size());
         type.pins[pin].port = &port;
         type.pins[pin].width = port.bits.count;
@@ -97,7 +107,10 @@ void TypeUseCounter::AddLeaf(TypeUse& type, CellType& cellType, const Module& le
     for (const NamedValue& value : leaf.defaults) {
         TypeUse::Parameter& parameter = type.parameters.emplace_back();
         parameter.name = value.name;
-        parameter.defaultValue = &value.value;
+        parameter.hasDefault = true;
+        if (value.value.kind != Value::Expression) {
+            parameter.defaultValue = value.value;
+        }
         type.parameterIndex.emplace(value.name,
                                     static_cast<std::uint32_t>(type.parameters.size() - 1));
     }
@@ -129,7 +142,7 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
             type.parameters.emplace_back().name = value.name;
         }
         TypeUse::Parameter& parameter = type.parameters[place->second];
-        if (parameter.defaultValue != nullptr && MeansAny(value.value, unknown_)) {
+        if (parameter.hasDefault && MeansAny(value.value, unknown_)) {
             continue;
         }
         ++parameter.cells;
@@ -137,6 +150,28 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
             parameter.first = &value.value;
         }
         parameter.kindVaries |= parameter.first->kind != value.value.kind;
+    }
+}
+
+/// Gives the defaults of a library the kind of the cells' values: the cells have integers as bits.
+/// A default of another kind is unknown.
+void AdaptDefaults(TypeUse& type, ImportedDesign& design) {
+    if (type.leaf == nullptr || !type.leaf->isLibraryCell) {
+        return;
+    }
+    for (TypeUse::Parameter& parameter : type.parameters) {
+        if (parameter.first == nullptr || !parameter.defaultValue ||
+            parameter.first->kind == parameter.defaultValue->kind) {
+            continue;
+        }
+        if (parameter.first->kind == Value::Bits &&
+            parameter.defaultValue->kind == Value::Integer) {
+            const std::string bits =
+                MakeIntegerBits(parameter.defaultValue->integer, parameter.first->text.size());
+            parameter.defaultValue = Value{Value::Bits, design.Keep(bits), 0};
+        } else {
+            parameter.defaultValue.reset();
+        }
     }
 }
 
@@ -200,12 +235,14 @@ void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& war
 } // namespace
 
 std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
-                                   const UnknownValues& unknown, Warnings& warnings) {
-    TypeUseCounter counter(design, top, unknown);
+                                   const CellLibrary& library, const UnknownValues& unknown,
+                                   Warnings& warnings) {
+    TypeUseCounter counter(design, top, library, unknown);
     for (const Cell& cell : top.cells) {
         counter.CountCell(cell);
     }
     for (TypeUse& type : counter.GetUses()) {
+        AdaptDefaults(type, design);
         CompareCells(type);
         if (type.cells > 0) {
             WarnOfAmbiguousValues(type, top, warnings);

@@ -1,11 +1,13 @@
 // The uses of cell types in the top module: widths of pins, and parameters.
 #pragma once
 
+#include "import/CellLibrary.h"
 #include "import/ImportedDesign.h"
 #include "import/UnknownValues.h"
 #include "import/Warnings.h"
 
 #include <cstdint>
+#include <optional>
 #include <string_view>
 #include <unordered_map>
 #include <vector>
@@ -17,22 +19,25 @@ struct TypeUse {
     struct Pin {
         /// The port of the leaf module; null without a leaf module.
         const ModulePort* port = nullptr;
-        /// The width in the leaf module, otherwise that in the first cell that connects the pin.
+        /// The width in the leaf module if it is known, otherwise that in the first cell that
+        /// connects the pin.
         std::uint32_t width = 0;
     };
     struct Parameter {
         std::string_view name;
         /// The value in the first cell that has the parameter.
         const Value* first = nullptr;
-        /// The default value in the leaf module; null if there is none.
-        const Value* defaultValue = nullptr;
+        /// Whether the leaf module has a default.
+        bool hasDefault = false;
+        /// The default, if it is known.
+        std::optional<Value> defaultValue;
         /// The number of cells that give the parameter a value.
         std::uint32_t cells = 0;
         /// Whether the values of the cells are of different kinds.
         bool kindVaries = false;
     };
 
-    /// The module that describes the type; null if the file has none.
+    /// The module that describes the type; null if there is none.
     const Module* leaf = nullptr;
     const Cell* firstCell = nullptr;
     std::uint32_t cells = 0;
@@ -55,14 +60,16 @@ struct TypeUse {
     bool NeedsDefault(const Parameter& parameter) const noexcept { return parameter.cells < cells; }
     /// Whether some cells take a default that the file does not contain.
     bool IsPartial(const Parameter& parameter) const noexcept {
-        return NeedsDefault(parameter) && parameter.defaultValue == nullptr;
+        return NeedsDefault(parameter) && !parameter.defaultValue;
     }
 };
 
 /// The uses of the types of a design, by the index of the type. Adds the ports of leaf modules to
-/// the pins of their types. Warns of values whose type the file does not contain. \throws Error
-/// if a cell has contents, or does not match its leaf module.
+/// the pins of their types. Warns of values whose type the file does not contain.
+/// \param library its cells take the place of black boxes of the design.
+/// \throws Error if a cell has contents, or does not match its leaf module.
 std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
-                                   const UnknownValues& unknown, Warnings& warnings);
+                                   const CellLibrary& library, const UnknownValues& unknown,
+                                   Warnings& warnings);
 
 } // namespace Tool::Import

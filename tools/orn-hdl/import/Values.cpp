@@ -81,6 +81,15 @@ TypedValue MakeGeneric(const std::string& name, const Value& value, const Unknow
     return TypedValue{name, "BitVector", MakeConstant(digits, false)};
 }
 
+std::string MakeIntegerBits(std::int32_t integer, std::size_t width) {
+    constexpr std::size_t IntegerWidth = 32;
+    std::string bits(width, integer < 0 ? '1' : '0');
+    for (std::size_t i = 0; i < std::min(width, IntegerWidth); ++i) {
+        bits[width - 1 - i] = ((static_cast<std::uint32_t>(integer) >> i) & 1) != 0 ? '1' : '0';
+    }
+    return bits;
+}
+
 TypedValue MakeNeutralGeneric(const Value& value) {
     Value neutral;
     neutral.kind = value.kind;

@@ -6,6 +6,8 @@
 #include "import/UnknownValues.h"
 #include "import/Warnings.h"
 
+#include <cstddef>
+#include <cstdint>
 #include <string>
 
 namespace Tool::Import {
@@ -20,6 +22,8 @@ void CheckParameter(const Value& value, const Place& place, const UnknownValues&
 void WarnOfAny(const Place& place, Warnings& warnings);
 /// A parameter's value as a generic. An x without a replacement becomes 0.
 TypedValue MakeGeneric(const std::string& name, const Value& value, const UnknownValues& unknown);
+/// The bits of an integer, the leftmost first.
+std::string MakeIntegerBits(std::int32_t integer, std::size_t width);
 /// A generic without a name, with the type of a value, that is 0 or empty.
 TypedValue MakeNeutralGeneric(const Value& value);
 

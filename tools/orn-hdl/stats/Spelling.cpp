@@ -3,6 +3,7 @@
 #include "diagnostics/JsonWriter.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdio>
 #include <string_view>
 #include <utility>
@@ -188,7 +189,7 @@ void WriteAllNets(JsonWriter& json, const DesignCounts& counts) {
 }
 
 std::uint64_t ToMilliseconds(double seconds) {
-    return static_cast<std::uint64_t>(seconds * 1000 + 0.5);
+    return static_cast<std::uint64_t>(std::lround(seconds * 1000));
 }
 
 } // namespace

@@ -1,0 +1,107 @@
+/// \file
+/// `VerilogReader`, which reads a structural netlist into a model.
+#pragma once
+
+#include "Port/Export.h"
+
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace Orn_Hdl {
+
+class Model;
+class Netlist;
+
+/// Reads one module of a structural Verilog netlist (IEEE 1364-2005, and what of IEEE 1800 appears
+/// in netlists) into a model.
+///
+/// The module's ports, nets, assignments and instances become the model's design. The other modules
+/// of the file, the library files and black boxes say which pins the components have. Behavioural
+/// text, and what a model cannot hold, is an error; so is a name that is used but declared nowhere.
+///
+/// \code
+/// VerilogReader reader;
+/// reader.AddLibrary("cells.v");
+/// reader.Read("top.v", model);
+/// \endcode
+///
+/// An error throws an `Exception` whose text is `FILE:LINE:COLUMN: error: TEXT`, then the line of
+/// the file and a line with a caret below the place. A file is read twice, piece by piece, so it
+/// has to be one that can be opened again.
+class ORN_HDL_API VerilogReader {
+public:
+    /// What becomes of an `include directive.
+    enum class Includes {
+        /// The file is read where the directive stands.
+        Follow,
+        /// The file is not opened. Its name is added to the include files of the model's options,
+        /// which the Verilog writer names in the same directive; the directive has to stand outside
+        /// of modules.
+        Keep
+    };
+    /// What becomes of a name that is not a letter or "_" followed by letters, digits and "_".
+    enum class Names {
+        /// It is replaced by one that is, as far as possible the same. "$" stays in names that have
+        /// no range.
+        Simple,
+        /// It stays, an escaped name without its backslash, as long as a model can hold it. No
+        /// model can hold brackets, "-", "," and "\" in a name, and in the name of a bus nothing
+        /// but letters, digits and "_".
+        Literal
+    };
+    /// A name of the file that the model does not have.
+    struct Renaming {
+        /// The name in the file, without the backslash of an escaped one.
+        std::string name;
+        /// The name in the model.
+        std::string newName;
+    };
+
+    /// A reader that reads the only module that is not instantiated, keeps attributes and no
+    /// comments, follows include directives and makes names simple.
+    VerilogReader();
+    VerilogReader(const VerilogReader&) = delete;
+    VerilogReader& operator=(const VerilogReader&) = delete;
+    ~VerilogReader();
+
+    /// Chooses the module to read.
+    /// \param name null and "" choose the only module of the file that no other one instantiates.
+    void SetTop(const char* name);
+    /// Adds a file whose modules are components. A module of the netlist's own file, and of a file
+    /// added before, takes precedence. What their bodies do is passed over.
+    /// \param fileName opened by `Read`.
+    void AddLibrary(const char* fileName);
+    /// Adds the components of a netlist. A module of a file takes precedence.
+    /// \param netlist its components' names and pins are copied.
+    void AddLibrary(const Netlist& netlist);
+    /// Adds a folder in which included files are looked for, after the folder of the file that
+    /// includes them.
+    void AddIncludeFolder(const char* folder);
+    /// Defines a macro without arguments, as a `define directive in front of each file would do.
+    void Define(const char* name, const char* text);
+    /// Sets what becomes of include directives.
+    void SetIncludes(Includes includes) noexcept;
+    /// Sets what becomes of names that are not simple.
+    void SetNames(Names names) noexcept;
+    /// Whether comments in front of the module, a declaration or an instance become comments of the
+    /// objects.
+    void KeepComments(bool keep) noexcept;
+    /// Whether attributes become attributes of the objects: (* *) attributes, and those that are
+    /// comments in the dialect of a synthesis tool.
+    void KeepAttributes(bool keep) noexcept;
+
+    /// Reads a file. What the model's netlist held before is destroyed. The model's name becomes
+    /// the module's and its source file the file.
+    /// \throws Exception, the model unchanged, when the file cannot be read or holds an error.
+    void Read(const char* fileName, Model& model);
+    /// The names that the last successful `Read` has replaced, in the order of their declarations.
+    const std::vector<Renaming>& GetRenamings() const noexcept;
+
+private:
+    struct Implementation;
+
+    std::unique_ptr<Implementation> implementation_;
+};
+
+} // namespace Orn_Hdl

@@ -1,0 +1,89 @@
+/// \file
+/// `NameScope`: the names of one scope, and names for what needs another one.
+#pragma once
+
+#include "Port/Ascii.h"
+
+#include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <memory_resource>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <unordered_set>
+
+namespace Port {
+
+/// The names of one scope. Names that differ only in letter case are the same. Millions of names
+/// are stored in a few blocks of memory.
+class NameScope {
+public:
+    /// A scope without names.
+    NameScope() = default;
+    NameScope(const NameScope&) = delete;
+    NameScope& operator=(const NameScope&) = delete;
+
+    /// Makes room for a number of names.
+    void Reserve(std::size_t count) { taken_.reserve(count); }
+    /// Claims a name. \return false if it is claimed already.
+    bool Claim(std::string_view name) { return !IsTaken(name) && taken_.insert(Keep(name)).second; }
+    /// Whether a name is claimed.
+    bool IsTaken(std::string_view name) const { return taken_.count(name) != 0; }
+    /// How a claimed name is spelled; empty for any other name.
+    std::string_view GetSpelling(std::string_view name) const {
+        const auto taken = taken_.find(name);
+        return taken == taken_.end() ? std::string_view() : *taken;
+    }
+
+    /// Claims the wanted name, or else the first of it with _1, _2 and so on that is free.
+    /// \param isAllowed whether the wanted name itself may be had.
+    /// \param isFree asked of each name that is free here: whether it may be had.
+    template <class IsFree>
+    std::string ClaimNumbered(const std::string& wanted, bool isAllowed, const IsFree& isFree) {
+        if (isAllowed && !IsTaken(wanted) && isFree(wanted)) {
+            taken_.insert(Keep(wanted));
+            return wanted;
+        }
+        auto number = numbers_.find(wanted);
+        if (number == numbers_.end()) {
+            number = numbers_.emplace(Keep(wanted), 0).first;
+        }
+        std::string numbered;
+        do {
+            numbered = wanted + "_" + std::to_string(++number->second);
+        } while (IsTaken(numbered) || !isFree(numbered));
+        taken_.insert(Keep(numbered));
+        return numbered;
+    }
+
+private:
+    struct Hash {
+        std::size_t operator()(std::string_view name) const noexcept {
+            // FNV-1a over the letters in one case.
+            std::uint64_t hash = 14695981039346656037U;
+            for (const char c : name) {
+                hash = (hash ^ static_cast<unsigned char>(ToUpper(c))) * 1099511628211U;
+            }
+            return static_cast<std::size_t>(hash);
+        }
+    };
+    struct Equal {
+        bool operator()(std::string_view a, std::string_view b) const noexcept {
+            return EqualIgnoringCase(a, b);
+        }
+    };
+
+    std::string_view Keep(std::string_view name) {
+        char* const copy = static_cast<char*>(memory_.allocate(name.size(), 1));
+        std::copy(name.begin(), name.end(), copy);
+        return std::string_view(copy, name.size());
+    }
+
+    std::pmr::monotonic_buffer_resource memory_;
+    std::pmr::unordered_set<std::string_view, Hash, Equal> taken_{&memory_};
+    /// The last number of each numbered name.
+    std::pmr::unordered_map<std::string_view, std::size_t, Hash, Equal> numbers_{&memory_};
+};
+
+} // namespace Port

@@ -1,0 +1,95 @@
+#include "Readers/Heads.h"
+
+#include "Orn_Hdl/Model/Netlist.h"
+
+#include <algorithm>
+#include <charconv>
+
+namespace Orn_Hdl::Readers {
+
+namespace {
+
+/// Takes an integer off the front of a text, and the character behind it.
+int TakeInteger(std::string_view& text) {
+    int value = 0;
+    text.remove_prefix(!text.empty() && text.front() == '+' ? 1 : 0);
+    const auto result = std::from_chars(text.data(), text.data() + text.size(), value);
+    const auto length = static_cast<std::size_t>(result.ptr - text.data());
+    text.remove_prefix(std::min(length + 1, text.size()));
+    return value;
+}
+
+PortHead MakePort(const Pin& pin) {
+    PortHead port;
+    std::string_view name = pin.GetNameView();
+    port.direction = pin.GetPolarity().GetValue();
+    const std::size_t parenthesis = name.find('(');
+    port.name = name.substr(0, parenthesis);
+    if (pin.GetPinType() == PinTypeBus) {
+        name.remove_prefix(parenthesis + 1);
+        const int left = TakeInteger(name);
+        port.range = Range{left, TakeInteger(name)};
+    } else if (pin.GetPinType() == PinTypeBusIndex) {
+        port.problem = "it is one bit of several that are pins of their own";
+    }
+    return port;
+}
+
+} // namespace
+
+PortHead* ModuleHead::FindPort(std::string_view portName) noexcept {
+    const std::size_t index = FindPort(portName, 0);
+    return index < ports.size() ? &ports[index] : nullptr;
+}
+
+std::size_t ModuleHead::FindPort(std::string_view portName, std::size_t hint) const noexcept {
+    if (hint < ports.size() && ports[hint].name == portName) {
+        return hint;
+    }
+    const auto found = std::find_if(ports.begin(), ports.end(), [portName](const PortHead& port) {
+        return port.name == portName;
+    });
+    return static_cast<std::size_t>(found - ports.begin());
+}
+
+const ParameterHead* ModuleHead::FindParameter(std::string_view parameterName) const noexcept {
+    const auto found = std::find_if(parameters.begin(), parameters.end(),
+                                    [parameterName](const ParameterHead& parameter) {
+                                        return parameter.name == parameterName;
+                                    });
+    return found == parameters.end() ? nullptr : &*found;
+}
+
+ModuleHead* Heads::Find(std::string_view name) const {
+    const auto found = byName_.find(name);
+    return found == byName_.end() ? nullptr : found->second;
+}
+
+ModuleHead* Heads::Add(std::string_view name, const Place& place) {
+    if (Find(name) != nullptr) {
+        return nullptr;
+    }
+    auto head = std::make_unique<ModuleHead>();
+    head->name = name;
+    head->place = place;
+    heads_.push_back(std::move(head));
+    ModuleHead* const added = heads_.back().get();
+    byName_.emplace(added->name, added);
+    return added;
+}
+
+void Heads::Add(const Netlist& netlist) {
+    for (const Component* component : netlist.GetComponentIterator()) {
+        ModuleHead* const head =
+            component == nullptr ? nullptr : Add(component->GetNameView(), Place());
+        if (head == nullptr) {
+            continue;
+        }
+        head->hasParameters = false;
+        for (const Pin* pin : component->GetPinIterator()) {
+            head->ports.push_back(MakePort(*pin));
+        }
+    }
+}
+
+} // namespace Orn_Hdl::Readers

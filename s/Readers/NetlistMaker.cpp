@@ -1,0 +1,354 @@
+#include "Readers/NetlistMaker.h"
+
+#include "HdlModel/Objects/MakePacked.h"
+#include "Port/Ascii.h"
+
+#include <charconv>
+#include <memory>
+#include <utility>
+
+namespace Orn_Hdl::Readers {
+
+namespace {
+
+/// What a netlist takes for something else than a part of a name.
+constexpr std::string_view Meaningful = "()[]{}<>-:,\\\"";
+
+void AppendNumber(std::string& text, int number) {
+    char digits[16];
+    const auto result = std::to_chars(digits, digits + sizeof digits, number);
+    text.append(digits, result.ptr);
+}
+
+void AppendRange(std::string& text, const Range& range) {
+    text += '(';
+    AppendNumber(text, range.left);
+    text += ':';
+    AppendNumber(text, range.right);
+    text += ')';
+}
+
+bool IsSimple(std::string_view name) {
+    if (name.empty() || Port::IsDigit(name.front())) {
+        return false;
+    }
+    for (const char c : name) {
+        if (!Port::IsLetter(c) && !Port::IsDigit(c) && c != '_') {
+            return false;
+        }
+    }
+    return true;
+}
+
+std::string MakeSimple(std::string_view name) {
+    std::string result;
+    for (const char c : name) {
+        if (Port::IsLetter(c) || Port::IsDigit(c)) {
+            result += c;
+        } else if (!result.empty() && result.back() != '_') {
+            result += '_';
+        }
+    }
+    while (!result.empty() && result.back() == '_') {
+        result.pop_back();
+    }
+    if (result.empty() || Port::IsDigit(result.front())) {
+        result.insert(0, "n");
+    }
+    return result;
+}
+
+/// Whether a bus has this base name.
+bool HasBase(std::string_view busName, std::string_view base) {
+    return busName.size() > base.size() && busName[base.size()] == '(' &&
+           busName.substr(0, base.size()) == base;
+}
+
+} // namespace
+
+bool NetlistMaker::IsOpenWord(std::string_view name) noexcept {
+    return Port::EqualIgnoringCase(name, "open");
+}
+
+NetlistMaker::NetlistMaker(Netlist& netlist, VerilogReader::Names names,
+                           bool (*isReserved)(std::string_view name))
+    : netlist_(netlist), names_(names), isReserved_(isReserved),
+      renamed_(0, RenamingHash{&renamings_}, RenamingEqual{&renamings_}) {}
+
+void NetlistMaker::SetName(const std::string& name) {
+    const bool isKept = names_ == VerilogReader::Names::Literal || IsSimple(name);
+    const std::string newName = isKept ? name : MakeSimple(name);
+    if (!isKept) {
+        renamings_.push_back({name, newName});
+    }
+    netlist_.SetName(newName.c_str());
+}
+
+/// Whether a netlist can have an object of that name and tell it from others.
+bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
+    const bool isLiteral = names_ == VerilogReader::Names::Literal;
+    if (!isLiteral && IsOpenWord(name)) {
+        return false;
+    }
+    if (IsSimple(name)) {
+        return isLiteral || !isReserved_(name);
+    }
+    if (name.empty() || isBus) {
+        return false;
+    }
+    if (isLiteral) {
+        return name.find_first_of(Meaningful) == std::string_view::npos && name.front() != '\'';
+    }
+    // A Verilog name of letters, digits, "_" and "$".
+    bool hasOther = Port::IsDigit(name.front()) || name.front() == '$';
+    for (const char c : name) {
+        hasOther = hasOther || !(Port::IsLetter(c) || Port::IsDigit(c) || c == '_' || c == '$');
+    }
+    return !hasOther;
+}
+
+bool NetlistMaker::IsTaken(const std::string& name) const {
+    return netlist_.IsNameUsed(name) || netlist_.GetParentBus(name.c_str()) != nullptr;
+}
+
+const std::string* NetlistMaker::FindRenamed(std::string_view name) const {
+    if (renamed_.empty()) {
+        return nullptr;
+    }
+    const auto found = renamed_.find(name);
+    return found == renamed_.end() ? nullptr : &renamings_[*found].newName;
+}
+
+std::string NetlistMaker::MakeUnique(const std::string& name) {
+    unsigned& suffix = lastSuffixes_.try_emplace(name, 1).first->second;
+    for (;;) {
+        std::string unique = name + "_" + std::to_string(++suffix);
+        if (!IsTaken(unique)) {
+            return unique;
+        }
+    }
+}
+
+const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus) {
+    if (CanKeep(name, isBus) && !IsTaken(name)) {
+        return name;
+    }
+    newName_ = IsSimple(name) ? name : MakeSimple(name);
+    if (!CanKeep(newName_, isBus) || IsTaken(newName_)) {
+        newName_ = MakeUnique(newName_);
+    }
+    renamings_.push_back({name, newName_});
+    renamed_.insert(static_cast<std::uint32_t>(renamings_.size() - 1));
+    return newName_;
+}
+
+Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional<Range>& range) {
+    if (FindSignal(name) != nullptr || FindInstance(name) != nullptr) {
+        return nullptr;
+    }
+    const std::string& newName = MakeName(name, range.has_value());
+    Signal* signal = nullptr;
+    if (range) {
+        text_ = newName;
+        AppendRange(text_, *range);
+        signal = new Bus(text_.c_str());
+    } else {
+        signal = MakePacked<ScalarSignal>(newName.c_str()).release();
+    }
+    netlist_.Add(signal);
+    return signal;
+}
+
+Instance* NetlistMaker::AddInstance(const std::string& name, const Component& component) {
+    if (FindSignal(name) != nullptr || FindInstance(name) != nullptr) {
+        return nullptr;
+    }
+    auto instance = MakePacked<Instance>(MakeName(name, false).c_str(), &component);
+    Instance* const added = instance.get();
+    netlist_.Add(instance.release());
+    return added;
+}
+
+Signal* NetlistMaker::FindByNewName(const std::string& name) const {
+    Signal* const signal = netlist_.GetSignal(std::string_view(name));
+    if (signal != nullptr && signal->GetNameView() == name) {
+        return signal;
+    }
+    Bus* const bus = netlist_.GetParentBus(name.c_str());
+    return bus != nullptr && HasBase(bus->GetNameView(), name) ? bus : nullptr;
+}
+
+Signal* NetlistMaker::FindSignal(const std::string& name) const {
+    if (const std::string* const renamed = FindRenamed(name)) {
+        return FindByNewName(*renamed);
+    }
+    if (!IsSimple(name) && !CanKeep(name, false)) {
+        return nullptr;
+    }
+    Signal* const signal = FindByNewName(name);
+    return signal == nullptr || made_.empty() || made_.find(signal) == made_.end() ? signal
+                                                                                   : nullptr;
+}
+
+Instance* NetlistMaker::FindInstance(const std::string& name) const {
+    if (const std::string* const renamed = FindRenamed(name)) {
+        return netlist_.GetInstance(std::string_view(*renamed));
+    }
+    if (!IsSimple(name) && !CanKeep(name, false)) {
+        return nullptr;
+    }
+    Instance* const instance = netlist_.GetInstance(std::string_view(name));
+    return instance != nullptr && instance->GetNameView() == name ? instance : nullptr;
+}
+
+Range NetlistMaker::GetRange(const Bus& bus) {
+    Range range;
+    bus.GetIndex(range.left, range.right);
+    return range;
+}
+
+Signal* NetlistMaker::GetBit(Bus& bus, int index) {
+    const std::string_view name = bus.GetNameView();
+    text_ = name.substr(0, name.find('(') + 1);
+    AppendNumber(text_, index);
+    text_ += ')';
+    Signal* bit = netlist_.GetSignal(std::string_view(text_));
+    if (bit == nullptr) {
+        bit = new BusIndex(text_.c_str(), &bus);
+        netlist_.Add(bit);
+    }
+    return bit;
+}
+
+Signal* NetlistMaker::GetSlice(Bus& bus, const Range& range) {
+    if (range == GetRange(bus)) {
+        return &bus;
+    }
+    const std::string_view name = bus.GetNameView();
+    text_ = name.substr(0, name.find('('));
+    AppendRange(text_, range);
+    Signal* slice = netlist_.GetSignal(std::string_view(text_));
+    if (slice == nullptr) {
+        slice = new BusSlice(text_.c_str(), &bus);
+        netlist_.Add(slice);
+    }
+    return slice;
+}
+
+Signal* NetlistMaker::GetConcatenation(const std::vector<Signal*>& members) {
+    text_.clear();
+    for (const Signal* member : members) {
+        text_.append(text_.empty() ? "" : ",").append(member->GetNameView());
+    }
+    if (Signal* const present = netlist_.GetSignal(std::string_view(text_))) {
+        return present;
+    }
+    auto compound = std::make_unique<CompoundBus>(text_.c_str());
+    for (Signal* member : members) {
+        compound->AddBusMember(member);
+    }
+    Signal* const added = compound.get();
+    netlist_.Add(compound.release());
+    return added;
+}
+
+Signal* NetlistMaker::GetConstantNet(bool value) {
+    Signal*& net = constantNets_[value ? 1 : 0];
+    if (net == nullptr) {
+        std::string name = value ? "const_1" : "const_0";
+        if (IsTaken(name)) {
+            name = MakeUnique(name);
+        }
+        auto signal = MakePacked<ScalarSignal>(name.c_str());
+        signal->AssignConstantValue(value ? "1" : "0");
+        made_.insert(signal.get());
+        net = signal.get();
+        netlist_.Add(signal.release());
+    }
+    return net;
+}
+
+void NetlistMaker::ConnectConstant(const Instance& instance, Pin& pin,
+                                   const std::string& constant) {
+    std::string owner(instance.GetNameView());
+    Port::String name;
+    for (unsigned suffix = 2;; ++suffix) {
+        PinConstantSignalVisitor visitor(owner.c_str());
+        pin.AcceptPin(visitor);
+        name = visitor.GetName();
+        const std::string_view view = name;
+        if (!IsTaken(std::string(view.substr(0, view.find('('))))) {
+            break;
+        }
+        owner.assign(instance.GetNameView()).append("_").append(std::to_string(suffix));
+    }
+    std::unique_ptr<Signal> signal;
+    if (pin.GetPinType() == PinTypeBus) {
+        signal = std::make_unique<Bus>(name.CStr());
+    } else {
+        signal = MakePacked<ScalarSignal>(name.CStr());
+    }
+    signal->AssignConstantValue(constant.c_str());
+    made_.insert(signal.get());
+    Signal* const added = signal.get();
+    netlist_.Add(signal.release());
+    pin.Connect(added);
+}
+
+std::string NetlistMaker::MakeComponent(ModuleHead& head) {
+    if (head.component != nullptr) {
+        return "";
+    }
+    if (head.isPrimitive) {
+        return "it is a primitive, whose ports have no names";
+    }
+    const bool canKeep = CanKeep(head.name, false);
+    if (canKeep && netlist_.GetComponent(std::string_view(head.name)) != nullptr) {
+        return "a model does not tell it from another component, whose name differs in letter case "
+               "alone";
+    }
+    std::string name = canKeep ? head.name : MakeSimple(head.name);
+    if (!CanKeep(name, false) || IsTaken(name)) {
+        name = MakeUnique(name);
+    }
+    auto component = std::make_unique<Component>(name.c_str());
+    std::string problem = MakePins(head, *component);
+    if (!problem.empty()) {
+        return problem;
+    }
+    if (name != head.name) {
+        renamings_.push_back({head.name, name});
+    }
+    head.component = component.get();
+    netlist_.Add(component.release());
+    return "";
+}
+
+std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component) {
+    for (const PortHead& port : head.ports) {
+        if (!port.problem.empty()) {
+            return "of its port " + Quoted(port.name) + ": " + port.problem;
+        }
+        if (!Polarity::IsValidValue(port.direction)) {
+            return "its port " + Quoted(port.name) + " has no direction";
+        }
+        std::string name =
+            CanKeep(port.name, port.range.has_value()) ? port.name : MakeSimple(port.name);
+        const std::string base = name;
+        if (port.range) {
+            AppendRange(name, *port.range);
+        }
+        // Long lists of pins have an index.
+        if (component.GetPin(name.c_str()) != nullptr) {
+            return "its port " + Quoted(port.name) +
+                   " is one that a model does not tell from another one";
+        }
+        if (base != port.name) {
+            renamings_.push_back({port.name, base});
+        }
+        component.AddPin(name.c_str(), Polarity(port.direction), "");
+    }
+    return "";
+}
+
+} // namespace Orn_Hdl::Readers

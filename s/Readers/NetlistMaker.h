@@ -1,0 +1,113 @@
+// Makes the objects of a netlist by the names that they have in a file.
+#pragma once
+
+#include "Orn_Hdl/Model/Netlist.h"
+#include "Orn_Hdl/Readers.h"
+#include "Readers/Heads.h"
+#include "Readers/Range.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <unordered_set>
+#include <vector>
+
+namespace Orn_Hdl::Readers {
+
+/// Names are compared exactly. A name that the netlist cannot have, because of its characters or of
+/// another name that differs in letter case alone, is replaced, and found by the one of the file.
+class NetlistMaker {
+public:
+    /// \param netlist an empty one, not owned.
+    /// \param isReserved tells which names need an escape in the language of the file.
+    NetlistMaker(Netlist& netlist, VerilogReader::Names names,
+                 bool (*isReserved)(std::string_view name));
+    NetlistMaker(const NetlistMaker&) = delete;
+    NetlistMaker& operator=(const NetlistMaker&) = delete;
+
+    /// Whether the writers leave a pin open that is connected to a signal of this name.
+    static bool IsOpenWord(std::string_view name) noexcept;
+
+    Netlist& GetNetlist() noexcept { return netlist_; }
+    void SetName(const std::string& name);
+    /// Makes a component with the ports of a module, unless there is one.
+    /// \return an empty text, or why no component can be made.
+    std::string MakeComponent(ModuleHead& head);
+    /// Declares a signal or a bus. \return null when the name is declared already.
+    Signal* DeclareSignal(const std::string& name, const std::optional<Range>& range);
+    /// Adds an instance. \return null when the name is declared already.
+    Instance* AddInstance(const std::string& name, const Component& component);
+
+    /// The signal or bus of that name in the file; null when there is none.
+    Signal* FindSignal(const std::string& name) const;
+    /// The instance of that name in the file; null when there is none.
+    Instance* FindInstance(const std::string& name) const;
+    /// The range of a bus.
+    static Range GetRange(const Bus& bus);
+
+    /// A bit of a bus, which has it.
+    Signal* GetBit(Bus& bus, int index);
+    /// A part of a bus, which has it and runs in its direction; the bus itself when it is all of
+    /// it.
+    Signal* GetSlice(Bus& bus, const Range& range);
+    /// The concatenation of two or more signals.
+    Signal* GetConcatenation(const std::vector<Signal*>& members);
+    /// A net of one bit that carries a constant.
+    Signal* GetConstantNet(bool value);
+    /// Connects a pin to a signal of its own that carries a constant.
+    void ConnectConstant(const Instance& instance, Pin& pin, const std::string& constant);
+
+    std::vector<VerilogReader::Renaming>& GetRenamings() noexcept { return renamings_; }
+
+private:
+    /// The renamings by the name in the file.
+    struct RenamingHash {
+        using is_transparent = void; // NOLINT(readability-identifier-naming)
+        const std::vector<VerilogReader::Renaming>* renamings;
+        std::size_t operator()(std::string_view name) const noexcept {
+            return std::hash<std::string_view>()(name);
+        }
+        std::size_t operator()(std::uint32_t index) const noexcept {
+            return (*this)((*renamings)[index].name);
+        }
+    };
+    struct RenamingEqual {
+        using is_transparent = void; // NOLINT(readability-identifier-naming)
+        const std::vector<VerilogReader::Renaming>* renamings;
+        bool operator()(std::uint32_t a, std::uint32_t b) const noexcept { return a == b; }
+        bool operator()(std::string_view name, std::uint32_t index) const noexcept {
+            return (*renamings)[index].name == name;
+        }
+        bool operator()(std::uint32_t index, std::string_view name) const noexcept {
+            return (*this)(name, index);
+        }
+    };
+
+    bool CanKeep(std::string_view name, bool isBus) const;
+    bool IsTaken(const std::string& name) const;
+    const std::string* FindRenamed(std::string_view name) const;
+    std::string MakeUnique(const std::string& name);
+    /// The name in the netlist for an object that is about to be declared.
+    const std::string& MakeName(const std::string& name, bool isBus);
+    Signal* FindByNewName(const std::string& name) const;
+    std::string MakePins(const ModuleHead& head, Component& component);
+
+    Netlist& netlist_;
+    const VerilogReader::Names names_;
+    bool (*const isReserved_)(std::string_view name);
+    std::vector<VerilogReader::Renaming> renamings_;
+    std::unordered_set<std::uint32_t, RenamingHash, RenamingEqual> renamed_;
+    std::unordered_map<std::string, unsigned> lastSuffixes_;
+    /// The signals that the file does not have.
+    std::unordered_set<const Signal*> made_;
+    Signal* constantNets_[2] = {nullptr, nullptr};
+    /// Room for names, kept so that most objects cost no allocation.
+    std::string newName_;
+    std::string text_;
+};
+
+} // namespace Orn_Hdl::Readers

@@ -1,0 +1,193 @@
+#include "Orn_Hdl/Readers.h"
+
+#include "Orn_Hdl/Model.h"
+#include "Port/Ascii.h"
+#include "Readers/Heads.h"
+#include "Readers/NetlistMaker.h"
+#include "Readers/Verilog/HeadReader.h"
+#include "Readers/Verilog/ModuleReader.h"
+
+#include <set>
+#include <utility>
+
+namespace Orn_Hdl {
+
+using Port::ViewOf;
+
+struct VerilogReader::Implementation {
+    Readers::VerilogSetup setup;
+    Readers::Heads components;
+    std::vector<Renaming> renamings;
+};
+
+namespace {
+
+using Readers::FailAt;
+using Readers::Quoted;
+
+/// One reading of one file.
+class Reading {
+public:
+    Reading(const char* fileName, const Readers::VerilogSetup& setup,
+            const Readers::Heads& components)
+        : fileName_(ViewOf(fileName)), setup_(setup) {
+        files_.Add(fileName_);
+        ReadHeads();
+        AddComponents(components);
+    }
+
+    /// \return the names that were replaced.
+    std::vector<VerilogReader::Renaming> FillNetlist(Netlist& netlist);
+    const std::vector<std::string>& GetKeptIncludes() const noexcept { return keptIncludes_; }
+    const std::string& GetFileName() const noexcept { return fileName_; }
+
+private:
+    void ReadHeads();
+    void ReadHeads(const std::string& fileName, bool isLibrary);
+    void AddComponents(const Readers::Heads& components);
+    const Readers::ModuleHead& FindTop() const;
+    const Readers::ModuleHead& FindOnlyTop() const;
+
+    std::string fileName_;
+    const Readers::VerilogSetup& setup_;
+    Readers::Files files_;
+    Readers::Heads heads_;
+    std::vector<std::string> keptIncludes_;
+};
+
+void Reading::ReadHeads() {
+    ReadHeads(fileName_, false);
+    for (const std::string& library : setup_.libraries) {
+        ReadHeads(library, true);
+    }
+}
+
+void Reading::ReadHeads(const std::string& fileName, bool isLibrary) {
+    Readers::Scanner scanner(files_, setup_);
+    scanner.Open(fileName);
+    Readers::HeadReader(scanner, heads_, isLibrary).Read();
+    if (!isLibrary) {
+        keptIncludes_ = scanner.GetKeptIncludes();
+    }
+}
+
+void Reading::AddComponents(const Readers::Heads& components) {
+    for (const auto& component : components.GetAll()) {
+        if (Readers::ModuleHead* const head = heads_.Add(component->name, component->place)) {
+            head->ports = component->ports;
+            head->hasParameters = false;
+        }
+    }
+}
+
+const Readers::ModuleHead& Reading::FindOnlyTop() const {
+    std::set<std::string_view> used;
+    for (const auto& head : heads_.GetAll()) {
+        for (const Readers::ModuleHead::Use& use : head->uses) {
+            used.insert(use.name);
+        }
+    }
+    const Readers::ModuleHead* top = nullptr;
+    std::string names;
+    for (const auto& head : heads_.GetAll()) {
+        if (head->canBeTop && used.find(head->name) == used.end()) {
+            names.append(names.empty() ? "" : ", ").append(Quoted(head->name));
+            top = top == nullptr ? head.get() : top;
+        }
+    }
+    const Readers::Place whole{0, 0, 0};
+    if (top == nullptr) {
+        FailAt(files_, whole, "there is no module that no other one instantiates");
+    }
+    if (names != Quoted(top->name)) {
+        FailAt(files_, whole, "no module instantiates " + names + ": say which one to read");
+    }
+    return *top;
+}
+
+const Readers::ModuleHead& Reading::FindTop() const {
+    if (setup_.top.empty()) {
+        return FindOnlyTop();
+    }
+    const Readers::ModuleHead* const top = heads_.Find(setup_.top);
+    if (top == nullptr || top->isPrimitive) {
+        FailAt(files_, {0, 0, 0}, "there is no module " + Quoted(setup_.top));
+    }
+    return *top;
+}
+
+std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
+    const Readers::ModuleHead& top = FindTop();
+    const Readers::ModuleHead* const unfinished = heads_.GetUnfinished();
+    if (unfinished != nullptr && unfinished != &top) {
+        FailAt(files_, heads_.GetUnfinishedPlace(), "\"endmodule\" does not follow this");
+    }
+    Readers::NetlistMaker maker(netlist, setup_.names, Readers::IsVerilogKeyword);
+    Readers::Scanner scanner(files_, setup_);
+    scanner.Open(files_.GetName(top.source));
+    Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
+    return std::move(maker.GetRenamings());
+}
+
+} // namespace
+
+VerilogReader::VerilogReader() : implementation_(std::make_unique<Implementation>()) {}
+
+VerilogReader::~VerilogReader() = default;
+
+void VerilogReader::SetTop(const char* name) {
+    implementation_->setup.top = ViewOf(name);
+}
+
+void VerilogReader::AddLibrary(const char* fileName) {
+    implementation_->setup.libraries.emplace_back(ViewOf(fileName));
+}
+
+void VerilogReader::AddLibrary(const Netlist& netlist) {
+    implementation_->components.Add(netlist);
+}
+
+void VerilogReader::AddIncludeFolder(const char* folder) {
+    implementation_->setup.includeFolders.emplace_back(ViewOf(folder));
+}
+
+void VerilogReader::Define(const char* name, const char* text) {
+    implementation_->setup.macros.emplace_back(ViewOf(name), ViewOf(text));
+}
+
+void VerilogReader::SetIncludes(Includes includes) noexcept {
+    implementation_->setup.includes = includes;
+}
+
+void VerilogReader::SetNames(Names names) noexcept {
+    implementation_->setup.names = names;
+}
+
+void VerilogReader::KeepComments(bool keep) noexcept {
+    implementation_->setup.keepsComments = keep;
+}
+
+void VerilogReader::KeepAttributes(bool keep) noexcept {
+    implementation_->setup.keepsAttributes = keep;
+}
+
+void VerilogReader::Read(const char* fileName, Model& model) {
+    Reading reading(fileName, implementation_->setup, implementation_->components);
+    Netlist netlist;
+    netlist.SetSourceFileName(reading.GetFileName().c_str());
+    std::vector<Renaming> renamings = reading.FillNetlist(netlist);
+    StringArray includes(model.GetOptions()->verilog.includePaths);
+    for (const std::string& include : reading.GetKeptIncludes()) {
+        includes.Add(include.c_str());
+    }
+    *model.GetNetlist() = std::move(netlist);
+    model.GetOptions()->verilog.includePaths = std::move(includes);
+    implementation_->renamings = std::move(renamings);
+    model.SetModifiedFlag(true);
+}
+
+const std::vector<VerilogReader::Renaming>& VerilogReader::GetRenamings() const noexcept {
+    return implementation_->renamings;
+}
+
+} // namespace Orn_Hdl
