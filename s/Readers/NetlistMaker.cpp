@@ -76,7 +76,7 @@ NetlistMaker::NetlistMaker(Netlist& netlist, VerilogReader::Names names,
       renamed_(0, RenamingHash{&renamings_}, RenamingEqual{&renamings_}) {}
 
 void NetlistMaker::SetName(const std::string& name) {
-    const bool isKept = names_ == VerilogReader::Names::Literal || IsSimple(name);
+    const bool isKept = names_ == VerilogReader::Names::Literal || CanKeep(name, false);
     const std::string newName = isKept ? name : MakeSimple(name);
     if (!isKept) {
         renamings_.push_back({name, newName});
@@ -129,8 +129,14 @@ std::string NetlistMaker::MakeUnique(const std::string& name) {
     }
 }
 
-const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus) {
-    if (CanKeep(name, isBus) && !IsTaken(name)) {
+/// Whether an object of the file has that name. \param isTaken whether one of the netlist has it.
+bool NetlistMaker::IsDeclared(const std::string& name, bool isTaken) const {
+    return FindRenamed(name) != nullptr ||
+           (isTaken && (FindSignal(name) != nullptr || FindInstance(name) != nullptr));
+}
+
+const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken) {
+    if (!isTaken && CanKeep(name, isBus)) {
         return name;
     }
     newName_ = IsSimple(name) ? name : MakeSimple(name);
@@ -143,10 +149,11 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus) {
 }
 
 Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional<Range>& range) {
-    if (FindSignal(name) != nullptr || FindInstance(name) != nullptr) {
+    const bool isTaken = IsTaken(name);
+    if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
-    const std::string& newName = MakeName(name, range.has_value());
+    const std::string& newName = MakeName(name, range.has_value(), isTaken);
     Signal* signal = nullptr;
     if (range) {
         text_ = newName;
@@ -160,10 +167,11 @@ Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional
 }
 
 Instance* NetlistMaker::AddInstance(const std::string& name, const Component& component) {
-    if (FindSignal(name) != nullptr || FindInstance(name) != nullptr) {
+    const bool isTaken = IsTaken(name);
+    if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
-    auto instance = MakePacked<Instance>(MakeName(name, false).c_str(), &component);
+    auto instance = MakePacked<Instance>(MakeName(name, false, isTaken).c_str(), &component);
     Instance* const added = instance.get();
     netlist_.Add(instance.release());
     return added;

@@ -89,10 +89,11 @@ private:
 
     bool CanKeep(std::string_view name, bool isBus) const;
     bool IsTaken(const std::string& name) const;
+    bool IsDeclared(const std::string& name, bool isTaken) const;
     const std::string* FindRenamed(std::string_view name) const;
     std::string MakeUnique(const std::string& name);
     /// The name in the netlist for an object that is about to be declared.
-    const std::string& MakeName(const std::string& name, bool isBus);
+    const std::string& MakeName(const std::string& name, bool isBus, bool isTaken);
     Signal* FindByNewName(const std::string& name) const;
     std::string MakePins(const ModuleHead& head, Component& component);
 

@@ -120,10 +120,6 @@ void FailAt(const Files& files, const Place& place, std::string_view text) {
     Fail(ReaderUnit, __LINE__, "%s: error: %s\n%s", {TextOf(files, place), text, line});
 }
 
-void FailWithout(std::string_view text) {
-    Fail(ReaderUnit, __LINE__, "error: %s\n", {text});
-}
-
 std::string Quoted(std::string_view name) {
     std::string text("\"");
     text.append(name.substr(0, LongestShownName));

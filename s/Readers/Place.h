@@ -32,9 +32,6 @@ std::string TextOf(const Files& files, const Place& place);
 /// Throws an Orn_Hdl::Exception: the place, the text, the line of the file and a caret.
 [[noreturn]] void FailAt(const Files& files, const Place& place, std::string_view text);
 
-/// Throws an Orn_Hdl::Exception for an error that has no place.
-[[noreturn]] void FailWithout(std::string_view text);
-
 /// A name as messages show it, in double quotes and shortened when it is very long.
 std::string Quoted(std::string_view name);
 
