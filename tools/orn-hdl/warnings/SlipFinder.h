@@ -104,9 +104,9 @@ private:
         if (base.empty()) {
             return 0;
         }
-        const auto first = static_cast<unsigned>(base.front() | SmallLetter);
-        const auto last = static_cast<unsigned>(base.back() | SmallLetter);
-        return (base.size() * 769 + first * 37U + last) % 4096;
+        const auto first = static_cast<std::size_t>(base.front() | SmallLetter);
+        const auto last = static_cast<std::size_t>(base.back() | SmallLetter);
+        return (base.size() * 769 + first * 37 + last) % 4096;
     }
 
     Orn_Hdl::Model& model_;

@@ -58,6 +58,7 @@ const Warning& GetWarning(Slip slip) {
 
 std::vector<RuleTexts> GetWarningRules() {
     std::vector<RuleTexts> rules;
+    rules.reserve(Warnings.size());
     for (const Warning& warning : Warnings) {
         rules.push_back({warning.name, warning.what, warning.why, warning.help});
     }
@@ -80,6 +81,7 @@ bool WarningOptions::Drop(std::string_view name) {
 
 std::vector<std::string> GetWarningNames() {
     std::vector<std::string> names;
+    names.reserve(Warnings.size());
     for (const Warning& warning : Warnings) {
         names.emplace_back(warning.name);
     }
