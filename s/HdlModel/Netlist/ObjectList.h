@@ -117,7 +117,7 @@ private:
         for (int first = first_, last = end; first <= last; ++first, --last) {
             const bool isFirst = objects_.GetAt(first) == object;
             if (isFirst || objects_.GetAt(last) == object) {
-                searched_ += 2 * (end - last);
+                searched_ += std::int64_t(2) * (end - last);
                 return isFirst ? first : last;
             }
         }
