@@ -168,6 +168,17 @@ TEST(VerilogComments, AreDroppedUnlessTheyAreWanted) {
     EXPECT_EQ(CommentOf(text.model.GetSignal("w")), "");
 }
 
+TEST(VerilogComments, OfWhatIsPassedOverAreDropped) {
+    TextReader text;
+    text.reader.KeepComments(true);
+    text.Read("// other\nmodule other; // inside\n// synopsys translate_off\nINV u();\nendmodule\n"
+              "// of m\nmodule m #(parameter P = 1)();\nspecify // timing\nendspecify\n// net\n"
+              "wire w; other o();\nendmodule");
+    EXPECT_EQ(CommentOf(text.model.GetNetlist()), "of m\n");
+    EXPECT_EQ(CommentOf(text.model.GetSignal("w")), "net\n");
+    EXPECT_EQ(AttributesOf(text.model.GetNetlist()), "P Integer 1 SYN NONE\n");
+}
+
 TEST(VerilogComments, AreNoneInABanner) {
     TextReader text;
     text.reader.KeepComments(true);

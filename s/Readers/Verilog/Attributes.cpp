@@ -147,6 +147,15 @@ AttributeReader::AttributeReader(Parser& parser, Scanner& scanner, NetlistMaker&
     scanner_.SetCommentFilter(setup.keepsComments ? IsAny : IsDialect);
 }
 
+void AttributeReader::SkipBehind(std::string_view word, const Place& begin) {
+    scanner_.SetCommentFilter(nullptr);
+    parser_.SkipToWord(word, begin);
+    Drop();
+    scanner_.GetComments().clear();
+    scanner_.SetCommentFilter(setup_.keepsComments ? IsAny : IsDialect);
+    parser_.Next();
+}
+
 void AttributeReader::ReadAttributes() {
     while (parser_.Get().kind == TokenKind::AttributesBegin) {
         parser_.Next();

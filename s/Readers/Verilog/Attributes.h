@@ -45,6 +45,8 @@ public:
     void EndStatement();
     /// Drops what was read in front of a statement that declares nothing.
     void Drop();
+    /// Skips to a word and over it, with everything that stands before the word.
+    void SkipBehind(std::string_view word, const Place& begin);
 
     /// Whether what follows is hidden from synthesis ("translate_off").
     bool IsHidden() const noexcept { return isHidden_; }

@@ -51,15 +51,14 @@ void ModuleReader::SkipToModule() {
                 parser_.Next();
                 return;
             }
-            parser_.SkipBehind("endmodule", begin);
+            attributes_.SkipBehind("endmodule", begin);
         } else if (keyword == Keyword::Primitive) {
-            parser_.SkipBehind("endprimitive", begin);
+            attributes_.SkipBehind("endprimitive", begin);
         } else if (parser_.IsWord("config")) {
-            parser_.SkipBehind("endconfig", begin);
+            attributes_.SkipBehind("endconfig", begin);
         } else if (!parser_.Accept(';')) {
             parser_.FailExpected("a module");
         }
-        attributes_.Drop();
     }
 }
 
@@ -221,8 +220,7 @@ void ModuleReader::ReadStatement() {
         ReadDefparams();
         break;
     case Keyword::Specify:
-        parser_.SkipBehind("endspecify", parser_.Get().place);
-        attributes_.Drop();
+        attributes_.SkipBehind("endspecify", parser_.Get().place);
         return;
     case Keyword::Specparam:
         scanner_.SkipToSemicolon();

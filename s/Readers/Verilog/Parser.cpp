@@ -60,13 +60,17 @@ void Parser::TakeName(std::string& name, std::string_view what) {
     Next();
 }
 
-void Parser::SkipBehind(std::string_view word, const Place& begin) {
+void Parser::SkipToWord(std::string_view word, const Place& begin) {
     while (!IsWord(word)) {
         if (Get().kind == TokenKind::End) {
             Fail(begin, "\"" + std::string(word) + "\" does not follow this");
         }
         Next();
     }
+}
+
+void Parser::SkipBehind(std::string_view word, const Place& begin) {
+    SkipToWord(word, begin);
     Next();
 }
 

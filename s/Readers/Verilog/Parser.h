@@ -54,6 +54,8 @@ public:
     /// Takes a name that is no keyword.
     void TakeName(std::string& name, std::string_view what);
 
+    /// Skips to a word.
+    void SkipToWord(std::string_view word, const Place& begin);
     /// Skips to a word, and over it.
     void SkipBehind(std::string_view word, const Place& begin);
     /// Skips to a sign that is in no parentheses, brackets or braces opened behind this place, or
