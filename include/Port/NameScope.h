@@ -4,7 +4,6 @@
 
 #include "Port/Ascii.h"
 
-#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <memory_resource>
@@ -76,7 +75,7 @@ private:
 
     std::string_view Keep(std::string_view name) {
         char* const copy = static_cast<char*>(memory_.allocate(name.size(), 1));
-        std::copy(name.begin(), name.end(), copy);
+        name.copy(copy, name.size());
         return std::string_view(copy, name.size());
     }
 

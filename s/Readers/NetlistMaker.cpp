@@ -297,9 +297,9 @@ void NetlistMaker::ConnectConstant(const Instance& instance, Pin& pin,
         signal = MakePacked<ScalarSignal>(name.CStr());
     }
     signal->AssignConstantValue(constant.c_str());
-    made_.insert(signal.get());
     Signal* const added = signal.get();
     netlist_.Add(signal.release());
+    made_.insert(added);
     pin.Connect(added);
 }
 
