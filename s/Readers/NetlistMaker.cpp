@@ -297,8 +297,8 @@ void NetlistMaker::ConnectConstant(const Instance& instance, Pin& pin,
         signal = MakePacked<ScalarSignal>(name.CStr());
     }
     signal->AssignConstantValue(constant.c_str());
-    Signal* const added = signal.get();
-    netlist_.Add(signal.release());
+    Signal* const added = signal.release();
+    netlist_.Add(added);
     made_.insert(added);
     pin.Connect(added);
 }
