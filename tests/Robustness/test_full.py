@@ -53,7 +53,9 @@ class FullFileSystem(unittest.TestCase):
         done = self.on_disk(f"printf '{FORMER}' >o.v && {TOOL} run ../append.cmd; "
                             "status=$?; head -n 1 o.v; ls -A; exit $status")
         self.assertEqual(done.stderr, "../append.cmd:5001: error: cannot write o.v: "
-                                      "No space left on device\n")
+                                      "No space left on device\n"
+                                      " 5001 | WRITE VERILOG -APPEND -NOHEADER o.v\n"
+                                      "      |                                 ^~~\n")
         self.assertEqual((done.returncode, done.stdout), (FILE_FAILED, FORMER + "o.v\n"))
 
     def test_what_fits_is_written_afterwards(self) -> None:
