@@ -39,7 +39,7 @@ NOT_COMPARED = {"alias-loop"}
 def write_legally(tool: Path, work: Path, *options: str) -> tuple[int, str]:
     """Writes X.v, X.vhd and the table X.names from X.cmd."""
     done = subprocess.run([tool, "run", "--quiet", "--no-header", "--legal", "--no-write", "--keep-going",
-                           "--name-map", "X.names", "--verilog", "X.v", "--vhdl", "X.vhd", *options,
+                           "--no-warn", "all", "--name-map", "X.names", "--verilog", "X.v", "--vhdl", "X.vhd", *options,
                            "X.cmd"], cwd=work, capture_output=True, timeout=120)
     return done.returncode, done.stderr.decode("latin-1")
 

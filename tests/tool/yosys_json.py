@@ -157,10 +157,12 @@ class ImportTest(ToolTest):
                 others = other["connections"].get(new_pin.partition("(")[0])
                 wiring.meet_pin(f"{name}.{pin}", bits, others)
 
-    def refuse(self, contents: Json | str | bytes, message: str, *options: str, place: str = "") -> None:
+    def refuse(self, contents: Json | str | bytes, message: str, *options: str, line: int = 1,
+               place: str = "") -> None:
         """Expects an import to fail with a message behind the file's name, and to write nothing.
 
-        If the contents are no JSON, `place` is the mark under their only line.
+        If the contents are no JSON, `line` is the line that the message names, and `place` the mark
+        under it.
         """
         path = self.folder / "d.json"
         if isinstance(contents, bytes):
@@ -171,7 +173,8 @@ class ImportTest(ToolTest):
         outcome = self.run_tool("import", "d.json", "-o", "x.cmd", "--verilog", "x.v", "--vhdl",
                                 "x.vhd", "--name-map", "x.map", *options)
         if place:
-            self.expect(outcome, 1, f"d.json:1: error: {message}\n    1 | {self.read('d.json')}\n"
+            source = self.read("d.json").splitlines()[line - 1]
+            self.expect(outcome, 1, f"d.json:{line}: error: {message}\n{line:5} | {source}\n"
                                     f"      | {place}\n")
         else:
             self.expect(outcome, 1, f"d.json: error: {message}\n")
