@@ -165,19 +165,21 @@ void ExpressionReader::ReadNumber(bool isWhole) {
 void ExpressionReader::ReadConcatenation() {
     const Place place = parser_.Get().place;
     const std::size_t first = expression_->pieces.size();
-    std::optional<std::int64_t> count;
+    bool isRepetition = false;
+    std::int64_t count = 0;
     if (parser_.Get().kind == TokenKind::Number) {
         Number number;
         try {
             number = Number::Read(parser_.Get().text);
-            count = number.GetValue();
+            const std::optional<std::int64_t> value = number.GetValue();
+            count = value.value_or(0);
             parser_.Next();
+            isRepetition = value && parser_.IsSign('{');
             if (!parser_.IsSign('{')) {
                 if (number.size == 0 || number.kind != Number::Integer) {
                     parser_.Fail(place, "a constant in a concatenation needs a size");
                 }
                 AddBits(number.GetBits(number.size), place);
-                count.reset();
             }
         } catch (const LiteralProblem& problem) {
             parser_.Fail(place, problem.text);
@@ -186,12 +188,13 @@ void ExpressionReader::ReadConcatenation() {
         name_ = parser_.Get().text;
         if (maker_.FindSignal(name_) == nullptr && head_.FindParameter(name_) != nullptr) {
             count = ReadConstant("the number of repetitions");
+            isRepetition = true;
         }
     }
-    if (count) {
+    if (isRepetition) {
         parser_.Expect('{');
         ReadItems();
-        Repeat(first, *count, place);
+        Repeat(first, count, place);
         parser_.Expect('}');
         return;
     }
