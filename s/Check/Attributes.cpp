@@ -254,7 +254,7 @@ void AttributeWalk::CheckModule() {
 /// Ports declare their attributes one after the other, so their order decides what is declared.
 void AttributeWalk::CheckSignals(bool ports) {
     std::vector<const Signal*> signals;
-    for (const Signal* signal : context_.netlist.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (signal->HasAttrs() && signal->IsNeededToDeclared() && signal->IsPort() == ports &&
             !Writers::IsOpen(signal->GetNameView())) {
             signals.push_back(signal);
@@ -302,7 +302,7 @@ void AttributeWalk::DeclareAll(const Holder& holder) {
 /// which type is declared, and matters only where types do.
 void AttributeWalk::DeclareOfInstances() {
     std::vector<const Instance*> instances;
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         const Component* const component = instance->GetComponent();
         if (instance->HasAttrs() || (component != nullptr && component->HasAttrs())) {
             instances.push_back(instance);
@@ -344,7 +344,7 @@ void AttributeWalk::CheckComponents() {
 }
 
 void AttributeWalk::CheckInstances() {
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         if (instance->HasAttrs()) {
             CheckHolder({instance, instance, Kind::InstanceAttribute});
             CheckGenericMap(*instance);
@@ -390,7 +390,7 @@ bool AttributeWalk::IsHidden(const Holder& component, const Attribute& attribute
     if (context_.used.at(used).hasPlainInstance) {
         return false;
     }
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         if (instance->GetComponent() == used &&
             instance->GetAttr(attribute.GetName().CStr()) == nullptr) {
             return false;

@@ -145,7 +145,7 @@ void Scopes::ReportClash(const Declared& one, const Declared& other, string_view
 }
 
 void Scopes::CheckBuses() {
-    for (const Signal* signal : netlist_.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (signal->GetSignalType() != SignalTypeBus) {
             continue;
         }
@@ -420,12 +420,12 @@ void Scopes::CheckHiddenBy(const Declared& declared) {
 
 void Scopes::CheckComments() {
     CheckComment(netlist_.GetCommentView());
-    for (const Signal* signal : netlist_.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (signal->IsNeededToDeclared()) {
             CheckComment(signal->GetCommentView());
         }
     }
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         CheckComment(instance->GetCommentView());
     }
     for (const auto& [component, used] : context_.used) {
