@@ -204,7 +204,7 @@ void ValueCheck::CheckUser() {
     if (!CanBeValueOf(type, value.GetView())) {
         if (Finding* finding = Add(RuleId::UserValue, GetRule(RuleId::UserValue).verdicts)) {
             finding->message = "the value " + Quoted(value.GetView()) + " of " +
-                               holder_.Describe(attribute_) + " is none of the type " + type;
+                               holder_.Describe(attribute_) + " is no value of the type " + type;
         }
     }
 }
