@@ -4,6 +4,7 @@
 #include "Check/Context.h"
 #include "HdlModel/Names/Names.h"
 #include "Orn_Hdl/Attributes.h"
+#include "Writers/Generics.h"
 
 #include <string>
 #include <string_view>
@@ -32,9 +33,7 @@ struct Holder {
     }
 };
 
-inline bool IsGeneric(const Attribute& attribute) {
-    return attribute.GetGenericOption() != Attribute::GenericNone;
-}
+using Writers::IsGeneric;
 
 inline bool IsSynthesis(const Attribute& attribute) {
     return attribute.GetSynAttrOption() != Attribute::SynAttrNone;

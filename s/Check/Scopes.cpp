@@ -3,6 +3,7 @@
 #include "Check/Context.h"
 #include "HdlModel/Names/Names.h"
 #include "Port/Ascii.h"
+#include "Writers/Generics.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
@@ -223,7 +224,7 @@ void Scopes::CheckOpenPin(const Instance& instance, const Pin& pin) {
 
 void Scopes::CheckGenerics() {
     for (const Attribute* attribute : netlist_.GetAttrIterator()) {
-        if (attribute->GetGenericOption() == Attribute::GenericNone) {
+        if (!Writers::IsGeneric(*attribute)) {
             continue;
         }
         const string_view name = attribute->GetNameView();
@@ -293,7 +294,7 @@ void Scopes::CheckComponents() {
             }
         }
         for (const Attribute* attribute : component->GetAttrIterator()) {
-            if (attribute->GetGenericOption() == Attribute::GenericNone) {
+            if (!Writers::IsGeneric(*attribute)) {
                 continue;
             }
             for (const Pin* pin : component->GetPinIterator()) {
