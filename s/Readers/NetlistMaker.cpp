@@ -101,9 +101,14 @@ const std::string& NetlistMaker::Plain(const std::string& name) const {
     return plain_;
 }
 
+/// Whether the file may have had to escape a name.
+bool NetlistMaker::MayBeEscaped(std::string_view name) const noexcept {
+    return !rules_.ignoresCase || IsExtended(name);
+}
+
 void NetlistMaker::SetName(const std::string& name) {
     const std::string& plain = Plain(name);
-    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false);
+    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false, MayBeEscaped(name));
     const std::string newName = isKept ? plain : MakeSimple(plain);
     if (!isKept) {
         renamings_.push_back({name, newName});
@@ -112,13 +117,14 @@ void NetlistMaker::SetName(const std::string& name) {
 }
 
 /// Whether a netlist can have an object of that name and tell it from others.
-bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
+/// \param isEscaped whether the file may have had to escape it.
+bool NetlistMaker::CanKeep(std::string_view name, bool isBus, bool isEscaped) const {
     const bool isLiteral = names_ == ReaderNames::Literal;
     if (!isLiteral && IsOpenWord(name)) {
         return false;
     }
     if (IsSimple(name)) {
-        return isLiteral || !rules_.isReserved(name);
+        return isLiteral || !isEscaped || !rules_.isReserved(name);
     }
     if (name.empty() || isBus) {
         return false;
@@ -176,7 +182,7 @@ bool NetlistMaker::IsRenamedTo(std::string_view newName) const {
 const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken) {
     const std::string& plain = Plain(name);
     const bool isBasic = &plain == &name;
-    if (!isTaken && CanKeep(plain, isBus)) {
+    if (!isTaken && CanKeep(plain, isBus, MayBeEscaped(name))) {
         if (isBasic) {
             return name;
         }
@@ -385,7 +391,7 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         return "it is a primitive, whose ports have no names";
     }
     const std::string plain = Plain(head.name);
-    const bool canKeep = CanKeep(plain, false);
+    const bool canKeep = CanKeep(plain, false, MayBeEscaped(head.name));
     if (canKeep && netlist_.GetComponent(std::string_view(plain)) != nullptr) {
         return "a model does not tell it from another component, whose name differs in letter case "
                "alone";
@@ -416,7 +422,8 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
             return "its port " + Quoted(port.name) + " has no direction";
         }
         const std::string& plain = Plain(port.name);
-        std::string name = CanKeep(plain, port.range.has_value()) ? plain : MakeSimple(plain);
+        const bool canKeep = CanKeep(plain, port.range.has_value(), MayBeEscaped(port.name));
+        std::string name = canKeep ? plain : MakeSimple(plain);
         const std::string base = name;
         if (port.range) {
             AppendRange(name, *port.range);
