@@ -50,6 +50,17 @@ public:
         /// but letters, digits and "_".
         Literal
     };
+    /// What becomes of an instance of a module that no file declares.
+    enum class Undeclared {
+        /// It is an error.
+        Refuse,
+        /// The module gets the ports that its instances connect by name, as wide as what is
+        /// connected to them. A net that has a driver makes a port an input; a net that has none,
+        /// and that something reads, makes the only port of unknown direction an output. It is an
+        /// error when directions are left, or contradict each other: the message lists the modules
+        /// that a library has to declare.
+        Infer
+    };
     /// A name of the file that the model does not have.
     struct Renaming {
         /// The name in the file, without the backslash of an escaped one.
@@ -59,7 +70,7 @@ public:
     };
 
     /// A reader that reads the only module that is not instantiated, keeps attributes and no
-    /// comments, follows include directives and makes names simple.
+    /// comments, follows include directives, makes names simple and refuses undeclared modules.
     VerilogReader();
     VerilogReader(const VerilogReader&) = delete;
     VerilogReader& operator=(const VerilogReader&) = delete;
@@ -84,6 +95,8 @@ public:
     void SetIncludes(Includes includes) noexcept;
     /// Sets what becomes of names that are not simple.
     void SetNames(Names names) noexcept;
+    /// Sets what becomes of instances of modules that no file declares.
+    void SetUndeclared(Undeclared undeclared) noexcept;
     /// Whether comments in front of the module, a declaration or an instance become comments of the
     /// objects.
     void KeepComments(bool keep) noexcept;

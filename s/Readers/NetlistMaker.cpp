@@ -337,7 +337,7 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
         if (!port.problem.empty()) {
             return "of its port " + Quoted(port.name) + ": " + port.problem;
         }
-        if (!Polarity::IsValidValue(port.direction)) {
+        if (head.isDeclared && !Polarity::IsValidValue(port.direction)) {
             return "its port " + Quoted(port.name) + " has no direction";
         }
         std::string name =

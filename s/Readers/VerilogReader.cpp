@@ -4,9 +4,12 @@
 #include "Port/Ascii.h"
 #include "Readers/Heads.h"
 #include "Readers/NetlistMaker.h"
+#include "Readers/Undeclared.h"
 #include "Readers/Verilog/HeadReader.h"
 #include "Readers/Verilog/ModuleReader.h"
+#include "Readers/Verilog/UndeclaredReader.h"
 
+#include <algorithm>
 #include <set>
 #include <utility>
 
@@ -47,6 +50,7 @@ private:
     void AddComponents(const Readers::Heads& components);
     const Readers::ModuleHead& FindTop() const;
     const Readers::ModuleHead& FindOnlyTop() const;
+    void AddUndeclared(const Readers::ModuleHead& top);
 
     std::string fileName_;
     const Readers::VerilogSetup& setup_;
@@ -116,16 +120,33 @@ const Readers::ModuleHead& Reading::FindTop() const {
     return *top;
 }
 
+/// Adds heads of the modules that only the connections of their instances tell of.
+void Reading::AddUndeclared(const Readers::ModuleHead& top) {
+    const bool isComplete =
+        std::all_of(top.uses.begin(), top.uses.end(), [this](const Readers::ModuleHead::Use& use) {
+            return heads_.Find(use.name) != nullptr;
+        });
+    if (!isComplete) {
+        Readers::Scanner scanner(files_, setup_);
+        scanner.Open(files_.GetName(top.source));
+        Readers::UndeclaredReader(scanner, heads_, top).Read();
+    }
+}
+
 std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
     const Readers::ModuleHead& top = FindTop();
     const Readers::ModuleHead* const unfinished = heads_.GetUnfinished();
     if (unfinished != nullptr && unfinished != &top) {
         FailAt(files_, heads_.GetUnfinishedPlace(), "\"endmodule\" does not follow this");
     }
+    if (setup_.undeclared == VerilogReader::Undeclared::Infer) {
+        AddUndeclared(top);
+    }
     Readers::NetlistMaker maker(netlist, setup_.names, Readers::IsVerilogKeyword);
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
+    Readers::SettleUndeclared(files_, heads_, netlist);
     return std::move(maker.GetRenamings());
 }
 
@@ -161,6 +182,10 @@ void VerilogReader::SetIncludes(Includes includes) noexcept {
 
 void VerilogReader::SetNames(Names names) noexcept {
     implementation_->setup.names = names;
+}
+
+void VerilogReader::SetUndeclared(Undeclared undeclared) noexcept {
+    implementation_->setup.undeclared = undeclared;
 }
 
 void VerilogReader::KeepComments(bool keep) noexcept {

@@ -60,6 +60,8 @@ struct Value {
     static Value Of(const Number& number, bool isNegative);
     static Value OfString(std::string_view text);
     static Value OfBits(const std::string& bits);
+    /// A value of the same type and width: 0, or an empty string.
+    Value GetZero() const;
 
     /// Makes an attribute of the type that has the value.
     std::unique_ptr<Attribute> MakeAttribute(const char* name) const;

@@ -555,16 +555,18 @@ void ModuleReader::SetParameter(Instance& instance, const ModuleHead& head,
         parser_.Fail(override.place, "the parameter " + Quoted(override.name) + ": " + problem);
     }
     if (parameter != nullptr && parameter->value) {
-        DeclareGeneric(head, override.name, isHidden);
+        DeclareGeneric(head, override.name, *parameter->value, isHidden);
+    } else if (!head.hasParameters) {
+        DeclareGeneric(head, override.name, override.value.GetZero(), isHidden);
     }
 }
 
 /// Gives the component a parameter that one of its instances sets, with the value that it has in
 /// the others: a VHDL component has to declare its generics.
-void ModuleReader::DeclareGeneric(const ModuleHead& head, const std::string& name, bool isHidden) {
+void ModuleReader::DeclareGeneric(const ModuleHead& head, const std::string& name,
+                                  const Value& value, bool isHidden) {
     if (head.component->GetAttr(name.c_str()) == nullptr) {
-        SetAttribute(*head.component, name, *head.FindParameter(name)->value,
-                     isHidden ? Hidden : Seen, nullptr);
+        SetAttribute(*head.component, name, value, isHidden ? Hidden : Seen, nullptr);
     }
 }
 
@@ -750,10 +752,11 @@ void ModuleReader::Connect(const ModuleHead& head, const Instance& instance, std
         return;
     }
     if (value_.width != width) {
-        parser_.Fail(value_.place, "the port " + Quoted(head.ports[port].name) + " of " +
-                                       Quoted(head.name) + " has " + std::to_string(width) +
-                                       (width == 1 ? " bit" : " bits") + ", and " +
-                                       std::to_string(value_.width) + " are connected to it");
+        parser_.Fail(value_.place,
+                     "the port " + Quoted(head.ports[port].name) + " of " + Quoted(head.name) +
+                         " has " + std::to_string(width) + (width == 1 ? " bit" : " bits") +
+                         (head.isDeclared ? "" : " in an earlier connection") + ", and " +
+                         std::to_string(value_.width) + " are connected to it");
     }
     Signal* const signal = expressions_.MakeSignal(value_);
     if (NetlistMaker::IsOpenWord(signal->GetNameView())) {

@@ -74,7 +74,8 @@ private:
     void Connect(const ModuleHead& head, const Instance& instance, std::size_t port);
     void SetParameter(Instance& instance, const ModuleHead& head, const Override& override,
                       bool isHidden);
-    void DeclareGeneric(const ModuleHead& head, const std::string& name, bool isHidden);
+    void DeclareGeneric(const ModuleHead& head, const std::string& name, const Value& value,
+                        bool isHidden);
     ModuleHead* FindHead(const Instance& instance) const;
     void SetEarlyOverrides();
 

@@ -16,6 +16,7 @@ struct VerilogSetup {
     std::vector<std::pair<std::string, std::string>> macros;
     VerilogReader::Includes includes = VerilogReader::Includes::Follow;
     VerilogReader::Names names = VerilogReader::Names::Simple;
+    VerilogReader::Undeclared undeclared = VerilogReader::Undeclared::Refuse;
     bool keepsComments = false;
     bool keepsAttributes = true;
 };
