@@ -13,6 +13,36 @@ namespace Orn_Hdl {
 class Model;
 class Netlist;
 
+/// What becomes of a name that is not a letter or "_" followed by letters, digits and "_".
+enum class ReaderNames {
+    /// It is replaced by one that is, as far as possible the same.
+    Simple,
+    /// It stays, an escaped name without its backslashes, as long as a model can hold it. No model
+    /// can hold brackets, "-", "," and "\" in a name, and in the name of a bus nothing but letters,
+    /// digits and "_".
+    Literal
+};
+
+/// What becomes of an instance of a module that no file declares.
+enum class ReaderUndeclared {
+    /// It is an error.
+    Refuse,
+    /// The module gets the ports that its instances connect by name, as wide as what is connected
+    /// to them. A net that has a driver makes a port an input; a net that has none, and that
+    /// something reads, makes the only port of unknown direction an output. It is an error when
+    /// directions are left, or contradict each other: the message lists the modules that a library
+    /// has to declare.
+    Infer
+};
+
+/// A name of a file that the model does not have.
+struct ReaderRenaming {
+    /// The name in the file.
+    std::string name;
+    /// The name in the model.
+    std::string newName;
+};
+
 /// Reads one module of a structural Verilog netlist (IEEE 1364-2005, and what of IEEE 1800 appears
 /// in netlists) into a model.
 ///
@@ -40,34 +70,13 @@ public:
         /// of modules.
         Keep
     };
-    /// What becomes of a name that is not a letter or "_" followed by letters, digits and "_".
-    enum class Names {
-        /// It is replaced by one that is, as far as possible the same. "$" stays in names that have
-        /// no range.
-        Simple,
-        /// It stays, an escaped name without its backslash, as long as a model can hold it. No
-        /// model can hold brackets, "-", "," and "\" in a name, and in the name of a bus nothing
-        /// but letters, digits and "_".
-        Literal
-    };
-    /// What becomes of an instance of a module that no file declares.
-    enum class Undeclared {
-        /// It is an error.
-        Refuse,
-        /// The module gets the ports that its instances connect by name, as wide as what is
-        /// connected to them. A net that has a driver makes a port an input; a net that has none,
-        /// and that something reads, makes the only port of unknown direction an output. It is an
-        /// error when directions are left, or contradict each other: the message lists the modules
-        /// that a library has to declare.
-        Infer
-    };
-    /// A name of the file that the model does not have.
-    struct Renaming {
-        /// The name in the file, without the backslash of an escaped one.
-        std::string name;
-        /// The name in the model.
-        std::string newName;
-    };
+    /// What becomes of names that are not simple. With `ReaderNames::Simple`, "$" stays in names
+    /// that have no range.
+    using Names = ReaderNames;
+    /// A name of the file that the model does not have, without the backslash of an escaped one.
+    using Renaming = ReaderRenaming;
+    /// What becomes of instances of modules that no file declares.
+    using Undeclared = ReaderUndeclared;
 
     /// A reader that reads the only module that is not instantiated, keeps attributes and no
     /// comments, follows include directives, makes names simple and refuses undeclared modules.

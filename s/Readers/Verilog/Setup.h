@@ -15,8 +15,8 @@ struct VerilogSetup {
     std::vector<std::string> includeFolders;
     std::vector<std::pair<std::string, std::string>> macros;
     VerilogReader::Includes includes = VerilogReader::Includes::Follow;
-    VerilogReader::Names names = VerilogReader::Names::Simple;
-    VerilogReader::Undeclared undeclared = VerilogReader::Undeclared::Refuse;
+    ReaderNames names = ReaderNames::Simple;
+    ReaderUndeclared undeclared = ReaderUndeclared::Refuse;
     bool keepsComments = false;
     bool keepsAttributes = true;
 };

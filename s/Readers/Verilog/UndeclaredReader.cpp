@@ -1,5 +1,7 @@
 #include "Readers/Verilog/UndeclaredReader.h"
 
+#include "Readers/Verilog/Literals.h"
+
 #include <cstdlib>
 #include <utility>
 
