@@ -4,8 +4,10 @@
 
 #include "Port/Export.h"
 
+#include <functional>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -37,10 +39,17 @@ enum class ReaderUndeclared {
 
 /// A name of a file that the model does not have.
 struct ReaderRenaming {
+    /// What has the name. A port is a signal.
+    enum class Kind { Module, Component, Pin, Signal, Instance };
+
     /// The name in the file.
     std::string name;
     /// The name in the model.
     std::string newName;
+    /// What has the name.
+    Kind kind = Kind::Signal;
+    /// Of a pin, the name of its component in the model.
+    std::string component = {};
 };
 
 /// Reads one module of a structural Verilog netlist (IEEE 1364-2005, and what of IEEE 1800 appears
@@ -104,6 +113,10 @@ public:
     void SetIncludes(Includes includes) noexcept;
     /// Sets what becomes of names that are not simple.
     void SetNames(Names names) noexcept;
+    /// Sets which simple names stay; the others are replaced too, by names with a number, so that a
+    /// design can keep clear of the reserved words of another language.
+    /// \param keeps called with names of modules, ports, nets and instances; empty for all.
+    void SetKeptNames(std::function<bool(std::string_view name)> keeps);
     /// Sets what becomes of instances of modules that no file declares.
     void SetUndeclared(Undeclared undeclared) noexcept;
     /// Whether comments in front of the module, a declaration or an instance become comments of the

@@ -104,9 +104,12 @@ const std::string& NetlistMaker::Plain(const std::string& name) const {
 void NetlistMaker::SetName(const std::string& name) {
     const std::string& plain = Plain(name);
     const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false);
-    const std::string newName = isKept ? plain : MakeSimple(plain);
+    std::string newName = isKept ? plain : MakeSimple(plain);
+    if (!isKept && !CanKeep(newName, false)) {
+        newName = MakeUnique(newName);
+    }
     if (!isKept) {
-        renamings_.push_back({name, newName});
+        renamings_.push_back({name, newName, ReaderRenaming::Kind::Module});
     }
     netlist_.SetName(newName.c_str());
 }
@@ -115,6 +118,9 @@ void NetlistMaker::SetName(const std::string& name) {
 bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
     const bool isLiteral = names_ == ReaderNames::Literal;
     if (!isLiteral && IsOpenWord(name)) {
+        return false;
+    }
+    if (!isLiteral && rules_.keeps && !rules_.keeps(name)) {
         return false;
     }
     if (IsSimple(name)) {
@@ -149,9 +155,14 @@ const std::string* NetlistMaker::FindRenamed(std::string_view name) const {
 
 std::string NetlistMaker::MakeUnique(const std::string& name) {
     unsigned& suffix = lastSuffixes_.try_emplace(name, 1).first->second;
-    for (;;) {
+    // A caller that keeps no name at all gets one that it would not keep.
+    constexpr int MostRefused = 100;
+    for (int refused = 0;;) {
         std::string unique = name + "_" + std::to_string(++suffix);
-        if (!IsTaken(unique)) {
+        if (IsTaken(unique)) {
+            continue;
+        }
+        if (refused++ >= MostRefused || CanKeep(unique, false)) {
             return unique;
         }
     }
@@ -163,8 +174,9 @@ bool NetlistMaker::IsDeclared(const std::string& name, bool isTaken) const {
            (isTaken && (FindSignal(name) != nullptr || FindInstance(name) != nullptr));
 }
 
-void NetlistMaker::AddRenaming(const std::string& name, const std::string& newName) {
-    renamings_.push_back({name, newName});
+void NetlistMaker::AddRenaming(const std::string& name, const std::string& newName,
+                               ReaderRenaming::Kind kind) {
+    renamings_.push_back({name, newName, kind});
     renamed_.insert(static_cast<std::uint32_t>(renamings_.size() - 1));
     newNames_.insert(InSmallLetters(newName));
 }
@@ -173,7 +185,8 @@ bool NetlistMaker::IsRenamedTo(std::string_view newName) const {
     return !newNames_.empty() && newNames_.find(InSmallLetters(newName)) != newNames_.end();
 }
 
-const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken) {
+const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken,
+                                          ReaderRenaming::Kind kind) {
     const std::string& plain = Plain(name);
     const bool isBasic = &plain == &name;
     if (!isTaken && CanKeep(plain, isBus)) {
@@ -183,7 +196,7 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
         newName_ = plain;
         if (IsSimple(plain)) {
             // The file may have this name without backslashes too, and mean another object.
-            AddRenaming(name, newName_);
+            AddRenaming(name, newName_, kind);
         }
         return newName_;
     }
@@ -191,7 +204,7 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
     if (!CanKeep(newName_, isBus) || IsTaken(newName_)) {
         newName_ = MakeUnique(newName_);
     }
-    AddRenaming(name, newName_);
+    AddRenaming(name, newName_, kind);
     return newName_;
 }
 
@@ -200,7 +213,8 @@ Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional
     if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
-    const std::string& newName = MakeName(name, range.has_value(), isTaken);
+    const std::string& newName =
+        MakeName(name, range.has_value(), isTaken, ReaderRenaming::Kind::Signal);
     Signal* signal = nullptr;
     if (range) {
         text_ = newName;
@@ -218,7 +232,8 @@ Instance* NetlistMaker::AddInstance(const std::string& name, const Component& co
     if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
-    auto instance = MakePacked<Instance>(MakeName(name, false, isTaken).c_str(), &component);
+    auto instance = MakePacked<Instance>(
+        MakeName(name, false, isTaken, ReaderRenaming::Kind::Instance).c_str(), &component);
     Instance* const added = instance.get();
     netlist_.Add(instance.release());
     return added;
@@ -400,11 +415,29 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         return problem;
     }
     if (name != head.name) {
-        renamings_.push_back({head.name, name});
+        renamings_.push_back({head.name, name, ReaderRenaming::Kind::Component});
     }
     head.component = component.get();
     netlist_.Add(component.release());
     return "";
+}
+
+/// The name without a range of the pin that is made of a port.
+std::string NetlistMaker::MakePinName(const PortHead& port, const Component& component) const {
+    const bool isBus = port.range.has_value();
+    const std::string& plain = Plain(port.name);
+    std::string name = CanKeep(plain, isBus) ? plain : MakeSimple(plain);
+    if (CanKeep(name, isBus) || names_ == ReaderNames::Literal) {
+        return name;
+    }
+    constexpr unsigned Most = 100;
+    for (unsigned suffix = 2; suffix < Most; ++suffix) {
+        const std::string numbered = name + "_" + std::to_string(suffix);
+        if (CanKeep(numbered, isBus) && component.GetPin(numbered.c_str()) == nullptr) {
+            return numbered;
+        }
+    }
+    return name;
 }
 
 std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component) {
@@ -415,8 +448,7 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
         if (head.isDeclared && !Polarity::IsValidValue(port.direction)) {
             return "its port " + Quoted(port.name) + " has no direction";
         }
-        const std::string& plain = Plain(port.name);
-        std::string name = CanKeep(plain, port.range.has_value()) ? plain : MakeSimple(plain);
+        std::string name = MakePinName(port, component);
         const std::string base = name;
         if (port.range) {
             AppendRange(name, *port.range);
@@ -427,7 +459,8 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
                    " is one that a model does not tell from another one";
         }
         if (base != port.name) {
-            renamings_.push_back({port.name, base});
+            renamings_.push_back(
+                {port.name, base, ReaderRenaming::Kind::Pin, std::string(component.GetNameView())});
         }
         component.AddPin(name.c_str(), Polarity(port.direction), "");
     }

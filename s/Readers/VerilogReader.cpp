@@ -103,7 +103,8 @@ std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
     if (setup_.undeclared == ReaderUndeclared::Infer) {
         AddUndeclared(top);
     }
-    Readers::NetlistMaker maker(netlist, setup_.names, {false, true, Readers::IsVerilogKeyword});
+    Readers::NetlistMaker maker(netlist, setup_.names,
+                                {false, true, Readers::IsVerilogKeyword, setup_.keepsName});
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
@@ -143,6 +144,10 @@ void VerilogReader::SetIncludes(Includes includes) noexcept {
 
 void VerilogReader::SetNames(Names names) noexcept {
     implementation_->setup.names = names;
+}
+
+void VerilogReader::SetKeptNames(std::function<bool(std::string_view name)> keeps) {
+    implementation_->setup.keepsName = std::move(keeps);
 }
 
 void VerilogReader::SetUndeclared(Undeclared undeclared) noexcept {
