@@ -200,7 +200,7 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
         }
         return newName_;
     }
-    newName_ = IsSimple(plain) ? plain : MakeSimple(plain);
+    newName_ = IsSimple(plain) && CanKeep(plain, isBus) ? plain : MakeSimple(plain);
     if (!CanKeep(newName_, isBus) || IsTaken(newName_)) {
         newName_ = MakeUnique(newName_);
     }
@@ -423,21 +423,26 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
 }
 
 /// The name without a range of the pin that is made of a port.
-std::string NetlistMaker::MakePinName(const PortHead& port, const Component& component) const {
+std::string NetlistMaker::MakePinName(const PortHead& port, const ModuleHead& head,
+                                      const Component& component) const {
     const bool isBus = port.range.has_value();
     const std::string& plain = Plain(port.name);
-    std::string name = CanKeep(plain, isBus) ? plain : MakeSimple(plain);
-    if (CanKeep(name, isBus) || names_ == ReaderNames::Literal) {
-        return name;
+    if (CanKeep(plain, isBus)) {
+        return plain;
     }
+    const std::string similar = MakeSimple(plain);
+    std::string name = similar;
     constexpr unsigned Most = 100;
     for (unsigned suffix = 2; suffix < Most; ++suffix) {
-        const std::string numbered = name + "_" + std::to_string(suffix);
-        if (CanKeep(numbered, isBus) && component.GetPin(numbered.c_str()) == nullptr) {
-            return numbered;
+        // Those that follow keep their names.
+        const std::size_t same = head.FindPort(name, 0);
+        if (CanKeep(name, isBus) && component.GetPin(name.c_str()) == nullptr &&
+            (same == head.ports.size() || &head.ports[same] == &port)) {
+            return name;
         }
+        name = similar + "_" + std::to_string(suffix);
     }
-    return name;
+    return similar;
 }
 
 std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component) {
@@ -448,7 +453,7 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
         if (head.isDeclared && !Polarity::IsValidValue(port.direction)) {
             return "its port " + Quoted(port.name) + " has no direction";
         }
-        std::string name = MakePinName(port, component);
+        std::string name = MakePinName(port, head, component);
         const std::string base = name;
         if (port.range) {
             AppendRange(name, *port.range);

@@ -117,7 +117,8 @@ private:
     /// The name in the netlist for an object that is about to be declared.
     const std::string& MakeName(const std::string& name, bool isBus, bool isTaken,
                                 ReaderRenaming::Kind kind);
-    std::string MakePinName(const PortHead& port, const Component& component) const;
+    std::string MakePinName(const PortHead& port, const ModuleHead& head,
+                            const Component& component) const;
     void AddRenaming(const std::string& name, const std::string& newName,
                      ReaderRenaming::Kind kind);
     Signal* FindByNewName(const std::string& name, bool isExact) const;

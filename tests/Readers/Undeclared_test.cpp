@@ -149,6 +149,13 @@ TEST_F(Undeclared, DeclareTheirParameters) {
     EXPECT_EQ(component.GetAttr("B")->GetValueString(), "0000");
 }
 
+TEST_F(Undeclared, LeaveParametersToTheirModulesWhereNothingSetsThem) {
+    reader_.Read("module m(input a); G #(.N(3)) u(.I(a)); G v(.I(a)); endmodule");
+    const std::string text = reader_.Write();
+    EXPECT_NE(text.find("defparam u.N = 3;"), std::string::npos) << text;
+    EXPECT_EQ(text.find("defparam v"), std::string::npos) << text;
+}
+
 TEST_F(Undeclared, LeaveOtherMistakesToTheirPlaces) {
     EXPECT_EQ(reader_.GetFailure("module m(input a); G u(.I(a[9:])); endmodule").substr(0, 36),
               "top.v:1:27: error: \"a\" is a net of o");
