@@ -91,6 +91,8 @@ std::unique_ptr<Attribute> Value::MakeAttribute(const char* name) const {
         return std::make_unique<AttributeInteger>(name, text.c_str());
     case Attribute::Float:
         return std::make_unique<AttributeFloat>(name, text.c_str());
+    case Attribute::Boolean:
+        return std::make_unique<AttributeBoolean>(name, text.c_str());
     case Attribute::Bit:
         return std::make_unique<AttributeBit>(name, text.c_str());
     case Attribute::BitVector:
