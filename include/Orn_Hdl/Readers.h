@@ -186,12 +186,21 @@ public:
     void AddLibrary(const Netlist& netlist);
     /// Sets what becomes of names that are not simple.
     void SetNames(Names names) noexcept;
+    /// Sets which simple names stay; the others are replaced too, by names with a number, so that a
+    /// design can keep clear of the reserved words of another language.
+    /// \param keeps called with names of entities, ports, signals and instances; empty for all.
+    void SetKeptNames(std::function<bool(std::string_view name)> keeps);
     /// Whether comments in front of the entity, a declaration or an instance become comments of the
     /// objects.
     void KeepComments(bool keep) noexcept;
     /// Whether attribute specifications become attributes of the objects.
     void KeepAttributes(bool keep) noexcept;
 
+    /// Adds the components that a file declares to a netlist, as a library for a reader: its
+    /// entities, and the component declarations in its packages. What no netlist can have, and what
+    /// the netlist has already, is left out.
+    /// \throws Exception, the netlist unchanged, when the file cannot be read or holds an error.
+    static void ReadComponents(const char* fileName, Netlist& netlist);
     /// Reads a file. What the model's netlist held before is destroyed. The model's name becomes
     /// the entity's and its source file the file. The VHDL options of the model become those with
     /// which the file could have been written: its library and use clauses, whether it declares

@@ -41,7 +41,8 @@ bool IsSimple(std::string_view name) {
     return true;
 }
 
-std::string MakeSimple(std::string_view name) {
+/// \param initial stands in front of a name that would begin with a digit or be empty.
+std::string MakeSimple(std::string_view name, char initial) {
     std::string result;
     for (const char c : name) {
         if (Port::IsLetter(c) || Port::IsDigit(c)) {
@@ -54,7 +55,7 @@ std::string MakeSimple(std::string_view name) {
         result.pop_back();
     }
     if (result.empty() || Port::IsDigit(result.front())) {
-        result.insert(0, "n");
+        result.insert(result.begin(), initial);
     }
     return result;
 }
@@ -104,7 +105,7 @@ const std::string& NetlistMaker::Plain(const std::string& name) const {
 void NetlistMaker::SetName(const std::string& name) {
     const std::string& plain = Plain(name);
     const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false);
-    std::string newName = isKept ? plain : MakeSimple(plain);
+    std::string newName = isKept ? plain : MakeSimple(plain, 'm');
     if (!isKept && !CanKeep(newName, false)) {
         newName = MakeUnique(newName);
     }
@@ -200,7 +201,9 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
         }
         return newName_;
     }
-    newName_ = IsSimple(plain) && CanKeep(plain, isBus) ? plain : MakeSimple(plain);
+    newName_ = IsSimple(plain) && CanKeep(plain, isBus)
+                   ? plain
+                   : MakeSimple(plain, kind == ReaderRenaming::Kind::Instance ? 'u' : 'n');
     if (!CanKeep(newName_, isBus) || IsTaken(newName_)) {
         newName_ = MakeUnique(newName_);
     }
@@ -405,7 +408,7 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         return "a model does not tell it from another component, whose name differs in letter case "
                "alone";
     }
-    std::string name = canKeep ? plain : MakeSimple(plain);
+    std::string name = canKeep ? plain : MakeSimple(plain, 'c');
     if (!CanKeep(name, false) || IsTaken(name)) {
         name = MakeUnique(name);
     }
@@ -430,7 +433,7 @@ std::string NetlistMaker::MakePinName(const PortHead& port, const ModuleHead& he
     if (CanKeep(plain, isBus)) {
         return plain;
     }
-    const std::string similar = MakeSimple(plain);
+    const std::string similar = MakeSimple(plain, 'p');
     std::string name = similar;
     constexpr unsigned Most = 100;
     for (unsigned suffix = 2; suffix < Most; ++suffix) {

@@ -30,6 +30,9 @@ using Orn_Hdl::ReaderRenaming;
 using Orn_Hdl::ReaderUndeclared;
 using std::string_view;
 
+/// What stands behind the place in the message of a reader.
+constexpr string_view Separator = ": error: ";
+
 /// Takes ":NUMBER" off the end of a text. \return 0 if it does not end so.
 std::uint32_t TakeNumber(string_view& text) {
     const std::size_t colon = text.rfind(':');
@@ -59,10 +62,9 @@ std::size_t GetWordLength(string_view line, std::size_t column) {
 
 /// The message of a reader, "FILE:LINE:COLUMN: error: TEXT" and lines that show the place.
 Diagnostic ReadMessage(string_view message) {
-    constexpr string_view Separator = ": error: ";
-    const std::size_t separator = std::min(message.find(Separator), message.size());
+    const std::size_t separator = message.find(Separator);
     string_view file = message.substr(0, separator);
-    const std::size_t begin = std::min(separator + Separator.size(), message.size());
+    const std::size_t begin = separator + Separator.size();
     const string_view text = message.substr(begin, message.find('\n', begin) - begin);
     const std::uint32_t column = TakeNumber(file);
     const std::uint32_t line = column == 0 ? 0 : TakeNumber(file);
@@ -119,10 +121,14 @@ Status CheckReadable(const std::string& name) {
     return Status::File;
 }
 
-/// Whether a reader of the library reads a file of cells by itself.
-bool IsNetlist(const std::string& library) {
-    return !HasExtension(library, ".lib") && !HasExtension(library, ".liberty") &&
-           !HasExtension(library, ".json");
+/// The language of a library of cells; nothing for what no reader of the library reads.
+std::optional<ImportFormat> GetFormat(const std::string& library) {
+    if (HasExtension(library, ".vhd") || HasExtension(library, ".vhdl")) {
+        return ImportFormat::Vhdl;
+    }
+    const bool isOther = HasExtension(library, ".lib") || HasExtension(library, ".liberty") ||
+                         HasExtension(library, ".json");
+    return isOther ? std::nullopt : std::optional<ImportFormat>(ImportFormat::Verilog);
 }
 
 /// The import of one netlist.
@@ -135,10 +141,11 @@ public:
     Status Run();
 
 private:
+    Status ReadAndWrite();
     Status ReadLibraries();
     template <class Reader> Status Read(Reader& reader);
     template <class Reader> void SetUp(Reader& reader);
-    void SetUpDirectives(Orn_Hdl::VerilogReader& reader);
+    void SetUpVerilog(Orn_Hdl::VerilogReader& reader);
     bool KeepsName(string_view name) const;
     Status TellRenamedPorts(const std::vector<ReaderRenaming>& renamings);
     void TellUnknownDefaults();
@@ -157,10 +164,13 @@ private:
 Status Importer::ReadLibraries() {
     std::vector<std::string> others;
     for (const std::string& library : options_.libraries) {
-        if (!IsNetlist(library)) {
+        const std::optional<ImportFormat> format = GetFormat(library);
+        if (format != format_ && format != ImportFormat::Vhdl) {
             others.push_back(library);
         } else if (const Status status = CheckReadable(library); status != Status::Success) {
             return status;
+        } else if (format != format_) {
+            Orn_Hdl::VhdlReader::ReadComponents(library.c_str(), cells_);
         }
     }
     Import::CellLibrary library;
@@ -186,16 +196,16 @@ template <class Reader> void Importer::SetUp(Reader& reader) {
     reader.KeepAttributes(options_.attributes);
     reader.KeepComments(options_.comments);
     reader.SetKeptNames([this](string_view name) { return KeepsName(name); });
-    reader.SetUndeclared(ReaderUndeclared::Infer);
     for (const std::string& library : options_.libraries) {
-        if (IsNetlist(library)) {
+        if (GetFormat(library) == format_) {
             reader.AddLibrary(library.c_str());
         }
     }
     reader.AddLibrary(cells_);
 }
 
-void Importer::SetUpDirectives(Orn_Hdl::VerilogReader& reader) {
+void Importer::SetUpVerilog(Orn_Hdl::VerilogReader& reader) {
+    reader.SetUndeclared(ReaderUndeclared::Infer);
     for (const std::string& folder : options_.includeFolders) {
         reader.AddIncludeFolder(folder.c_str());
     }
@@ -281,14 +291,7 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
 
 template <class Reader> Status Importer::Read(Reader& reader) {
     SetUp(reader);
-    try {
-        reader.Read(options_.file.c_str(), *model_);
-    } catch (const Orn_Hdl::Exception& exception) {
-        Diagnostic diagnostic = ReadMessage(exception.getLocalized().GetView());
-        AddNotes(diagnostic);
-        reporter_.Report(std::move(diagnostic));
-        return Status::Failed;
-    }
+    reader.Read(options_.file.c_str(), *model_);
     const Status status = TellRenamedPorts(reader.GetRenamings());
     if (status == Status::Success && names_.HasVhdl()) {
         TellUnknownDefaults();
@@ -297,10 +300,21 @@ template <class Reader> Status Importer::Read(Reader& reader) {
 }
 
 Status Importer::Run() {
-    if (format_ == ImportFormat::Vhdl) {
-        Complain("netlists in VHDL cannot be imported yet");
+    try {
+        return ReadAndWrite();
+    } catch (const Orn_Hdl::Exception& exception) {
+        const string_view message = exception.getLocalized().GetView();
+        if (message.find(Separator) == string_view::npos) {
+            throw;
+        }
+        Diagnostic diagnostic = ReadMessage(message);
+        AddNotes(diagnostic);
+        reporter_.Report(std::move(diagnostic));
         return Status::Failed;
     }
+}
+
+Status Importer::ReadAndWrite() {
     Status status = CheckReadable(options_.file);
     if (status == Status::Success) {
         status = ReadLibraries();
@@ -310,8 +324,12 @@ Status Importer::Run() {
     }
     engine_.CreateAndAddModel("import", options_.file.c_str());
     model_ = engine_.GetModel("import");
+    if (format_ == ImportFormat::Vhdl) {
+        Orn_Hdl::VhdlReader reader;
+        return Read(reader);
+    }
     Orn_Hdl::VerilogReader reader;
-    SetUpDirectives(reader);
+    SetUpVerilog(reader);
     return Read(reader);
 }
 
