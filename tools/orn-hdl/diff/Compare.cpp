@@ -81,6 +81,7 @@ private:
         return graphs_[design].GetInstances()[row];
     }
 
+    bool ComparesNetNames() const noexcept { return rules_.names && !rules_.mergesNets; }
     void CompareModule();
     void CompareComponents();
     void CompareComponent(const PairedComponent& pair);
@@ -90,7 +91,8 @@ private:
     void CompareSignals(bool byNames);
     void CompareSignal(const SignalPairs::Pair& pair);
     void CompareShape(const SignalRow& a, const SignalRow& b);
-    void CompareTies(const SignalRow& a, const SignalRow& b);
+    void CompareTies(const SignalRow& a, const SignalRow& b, bool isRenamed);
+    bool IsLost(Design design, const SignalPairs::Part& part) const;
     void AddPart(Design design, const SignalPairs::Part& part);
     void AddBitPair(const SignalPairs::BitPair& bits);
     void CompareInstances();
@@ -120,7 +122,7 @@ private:
 
 Differences Comparison::Run(bool byNames) {
     found_ = Differences(most_);
-    matching_ = Match(graphs_[A], graphs_[B], likeness_, byNames);
+    matching_ = Match(graphs_[A], graphs_[B], likeness_, byNames, rules_.mergesNets);
     CompareModule();
     CompareComponents();
     CompareSignals(byNames);
@@ -410,7 +412,7 @@ void Comparison::AddBitPair(const SignalPairs::BitPair& bits) {
         side.name = Graph::GetBitName(*rows[design], bits.parts[design].index);
         side.cause = MakeCause(Kind::Signal, NameOf(*rows[design]->signal));
     };
-    if (rules_.names && found_.Count(Change::Renamed)) {
+    if (ComparesNetNames() && found_.Count(Change::Renamed)) {
         difference.change = Change::Renamed;
         describe(A, difference.a);
         describe(B, difference.b);
@@ -430,6 +432,21 @@ void Comparison::AddBitPair(const SignalPairs::BitPair& bits) {
     }
 }
 
+/// Whether a signal is a port, or has a net that the other design does not have.
+bool Comparison::IsLost(Design design, const SignalPairs::Part& part) const {
+    const Graph& graph = graphs_[design];
+    const SignalRow& row = graph.GetSignals()[part.row];
+    const bool isWhole = part.index == SignalPairs::Part::Whole;
+    for (std::uint32_t i = isWhole ? 0 : part.index; i < (isWhole ? row.count : part.index + 1);
+         ++i) {
+        const std::uint32_t net = graph.GetNet(row.first + i);
+        if (net != Open && graph.IsWired(net) && matching_.nets[design][net] == None) {
+            return true;
+        }
+    }
+    return row.isPort;
+}
+
 void Comparison::CompareSignals(bool byNames) {
     const SignalPairs pairs =
         PairSignals(graphs_[A], graphs_[B], matching_, byNames, rules_.mergesNets);
@@ -441,10 +458,12 @@ void Comparison::CompareSignals(bool byNames) {
     }
     for (const Design design : {A, B}) {
         for (const SignalPairs::Part& part : pairs.left[design]) {
-            AddPart(design, part);
+            if (!rules_.mergesNets || IsLost(design, part)) {
+                AddPart(design, part);
+            }
         }
     }
-    if (rules_.order) {
+    if (rules_.order && rules_.hasPortOrder) {
         ComparePortOrder(pairs);
     }
 }
@@ -452,7 +471,7 @@ void Comparison::CompareSignals(bool byNames) {
 void Comparison::CompareSignal(const SignalPairs::Pair& pair) {
     const SignalRow& a = graphs_[A].GetSignals()[pair.rows[A]];
     const SignalRow& b = graphs_[B].GetSignals()[pair.rows[B]];
-    if (pair.isRenamed && rules_.names && found_.Count(Change::Renamed)) {
+    if (pair.isRenamed && ComparesNetNames() && found_.Count(Change::Renamed)) {
         Difference difference;
         difference.change = Change::Renamed;
         difference.thing = Thing::Signal;
@@ -461,7 +480,7 @@ void Comparison::CompareSignal(const SignalPairs::Pair& pair) {
         found_.Keep(std::move(difference));
     }
     CompareShape(a, b);
-    CompareTies(a, b);
+    CompareTies(a, b, pair.isRenamed);
     const char* const thing = a.isPort ? "port " : "signal ";
     const bool hasAttributes = a.signal->HasAttrs() || b.signal->HasAttrs();
     const bool hasComment =
@@ -498,7 +517,8 @@ void Comparison::CompareShape(const SignalRow& a, const SignalRow& b) {
             DescribeDirection(b.signal->GetPortPolarity()));
     }
     const bool isPort = a.isPort || b.isPort;
-    if ((isPort || rules_.names) &&
+    const bool hasOneBit = !rules_.hasPinRanges && a.count == 1 && b.count == 1;
+    if ((isPort || ComparesNetNames()) && !hasOneBit &&
         (a.isBus != b.isBus || a.left != b.left || a.right != b.right)) {
         const auto describe = [](const SignalRow& row) {
             return row.isBus
@@ -509,18 +529,18 @@ void Comparison::CompareShape(const SignalRow& a, const SignalRow& b) {
     }
 }
 
-void Comparison::CompareTies(const SignalRow& a, const SignalRow& b) {
+void Comparison::CompareTies(const SignalRow& a, const SignalRow& b, bool isRenamed) {
     const auto tieOf = [&](Design design, const SignalRow& row, std::uint32_t i) {
         const std::uint32_t net = graphs_[design].GetNet(row.first + i);
         return net == Open ? Graph::Untied : graphs_[design].GetTie(net);
     };
-    // Bits of the same index, or of the same place from the right.
-    std::uint32_t differing = 0;
-    const std::uint32_t count = std::min(a.count, b.count);
-    for (std::uint32_t i = 1; i <= count; ++i) {
-        differing += tieOf(A, a, a.count - i) != tieOf(B, b, b.count - i) ? 1 : 0;
+    // A renamed signal has the same bits at the same places.
+    bool areEqual = true;
+    for (std::uint32_t i = 0; i < a.count; ++i) {
+        const std::uint32_t bit = isRenamed ? b.first + i : Graph::FindBit(a, i, b);
+        areEqual = areEqual && (bit == None || tieOf(A, a, i) == tieOf(B, b, bit - b.first));
     }
-    if (differing == 0 || !found_.Count(Change::Retied)) {
+    if (areEqual || !found_.Count(Change::Retied)) {
         return;
     }
     const auto describe = [&](Design design, const SignalRow& row) {

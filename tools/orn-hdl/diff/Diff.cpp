@@ -61,6 +61,7 @@ Diff::Rules MakeRules(const DiffOptions& options, const Designs& designs) {
     rules.hasSynthesisAttributes = !isAnyJson;
     rules.hasUnusedParts = !isAnyJson && !isAnyVerilog;
     rules.hasPinRanges = !isAnyJson;
+    rules.hasPortOrder = !areCommands;
     rules.hasDesignName = designs.a.HasName() && designs.b.HasName();
     return rules;
 }

@@ -348,7 +348,7 @@ void Graph::JoinAliases(const Signal& target) {
 
 /// Whether a tied net is no net but the constant itself.
 bool Graph::IsConstantNet(const SignalRow& row, std::uint32_t tie) const {
-    return !row.isPort && (row.isGenerated || rules_.mergesNets) &&
+    return (row.isGenerated || rules_.mergesNets) &&
            (tie == TiedToZero || tie == TiedToOne);
 }
 
@@ -373,7 +373,8 @@ void Graph::MakeNets() {
             if (net == None && isOpen) {
                 continue;
             }
-            if (net == None && hasPort[root] == 0 && IsConstantNet(row, ties_[root])) {
+            if (net == None && (hasPort[root] == 0 || rules_.mergesNets) &&
+                IsConstantNet(row, ties_[root])) {
                 net = ties_[root] == TiedToOne ? OneNet : ZeroNet;
             } else if (net == None) {
                 net = static_cast<std::uint32_t>(ties.size());
@@ -445,6 +446,16 @@ void Graph::AddAlias(const Signal& target, const Signal& source) {
         instances_.push_back(row);
         aliases_.push_back({&target, &source});
     }
+}
+
+std::uint32_t Graph::FindBit(const SignalRow& from, std::uint32_t index,
+                             const SignalRow& to) noexcept {
+    if (from.count == 1 && to.count == 1) {
+        return to.first;
+    }
+    const std::int64_t bit = from.left < from.right ? from.left + index : from.left - index;
+    const std::int64_t at = to.left < to.right ? bit - to.left : to.left - bit;
+    return at >= 0 && at < to.count ? to.first + static_cast<std::uint32_t>(at) : None;
 }
 
 const SignalRow& Graph::GetSignalOfBit(std::uint32_t bit) const noexcept {

@@ -105,6 +105,10 @@ public:
     bool IsWired(std::uint32_t net) const noexcept { return isWired_[net] != 0; }
     /// The name of a bit of a signal.
     static std::string GetBitName(const SignalRow& row, std::uint32_t index);
+    /// The bit of a signal that has the same index as a bit of another signal; None if there is
+    /// none.
+    static std::uint32_t FindBit(const SignalRow& from, std::uint32_t index,
+                                 const SignalRow& to) noexcept;
     /// The signal that has a bit.
     const SignalRow& GetSignalOfBit(std::uint32_t bit) const noexcept;
     /// A bit of a net; None for the nets of constants.

@@ -66,19 +66,10 @@ void PairSignals(const Graph& a, const Graph& b, Matching& matching) {
     PairByName(matching.signals, rowsA.size(), base(rowsA), rowsB.size(), base(rowsB));
 }
 
-/// The bit of a row that has the index which a bit of another row has; None if there is none.
-std::uint32_t FindBit(const SignalRow& from, std::uint32_t index, const SignalRow& to) noexcept {
-    if (from.count == 1 && to.count == 1) {
-        return to.first;
-    }
-    const std::int64_t bit = from.left < from.right ? from.left + index : from.left - index;
-    const std::int64_t at = to.left < to.right ? bit - to.left : to.left - bit;
-    return at >= 0 && at < to.count ? to.first + static_cast<std::uint32_t>(at) : None;
-}
-
 /// Matches the nets of signals of the same name, bit by bit. \param isPort whether of ports or of
-/// others.
-void MatchNets(const Graph& a, const Graph& b, bool isPort, Matching& matching) {
+/// others. \param onlyWired whether to match only nets to which something is wired: where nets have
+/// several names, some of these may stand for nothing.
+void MatchNets(const Graph& a, const Graph& b, bool isPort, bool onlyWired, Matching& matching) {
     for (std::uint32_t row = 0; row < a.GetSignals().size(); ++row) {
         const std::uint32_t other = matching.signals[A][row];
         if (other == None) {
@@ -90,11 +81,12 @@ void MatchNets(const Graph& a, const Graph& b, bool isPort, Matching& matching) 
             continue;
         }
         for (std::uint32_t i = 0; i < inA.count; ++i) {
-            const std::uint32_t bit = FindBit(inA, i, inB);
+            const std::uint32_t bit = Graph::FindBit(inA, i, inB);
             const std::uint32_t netA = a.GetNet(inA.first + i);
             const std::uint32_t netB = bit == None ? Open : b.GetNet(bit);
             if (netA != Open && netB != Open && matching.nets[A][netA] == None &&
-                matching.nets[B][netB] == None) {
+                matching.nets[B][netB] == None &&
+                (!onlyWired || (a.IsWired(netA) && b.IsWired(netB)))) {
                 matching.MatchNets(netA, netB);
             }
         }
@@ -150,14 +142,15 @@ Matching::Matching(const Graph& a, const Graph& b) {
     }
 }
 
-Matching Match(const Graph& a, const Graph& b, const Likeness (&likeness)[2], bool byNames) {
+Matching Match(const Graph& a, const Graph& b, const Likeness (&likeness)[2], bool byNames,
+               bool mergesNets) {
     Matching matching(a, b);
     PairSignals(a, b, matching);
-    MatchNets(a, b, true, matching);
+    MatchNets(a, b, true, false, matching);
     if (!byNames) {
         Structure(a, b, likeness, matching).Run();
     }
-    MatchNets(a, b, false, matching);
+    MatchNets(a, b, false, mergesNets, matching);
     MatchInstances(a, b, matching);
     MatchAliases(a, b, matching);
     Structure(a, b, likeness, matching).Run();

@@ -41,6 +41,8 @@ using Likeness = std::vector<std::uint64_t>;
 /// By connections means: from what is matched to its only neighbours of their kind. What has
 /// several such neighbours is told apart by numbers that describe its surroundings, refined in a
 /// bounded number of rounds. What is alike then is matched in its order.
-Matching Match(const Graph& a, const Graph& b, const Likeness (&likeness)[2], bool byNames);
+/// \param mergesNets as in `Rules`.
+Matching Match(const Graph& a, const Graph& b, const Likeness (&likeness)[2], bool byNames,
+               bool mergesNets);
 
 } // namespace Tool::Diff
