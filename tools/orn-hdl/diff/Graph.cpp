@@ -348,8 +348,7 @@ void Graph::JoinAliases(const Signal& target) {
 
 /// Whether a tied net is no net but the constant itself.
 bool Graph::IsConstantNet(const SignalRow& row, std::uint32_t tie) const {
-    return (row.isGenerated || rules_.mergesNets) &&
-           (tie == TiedToZero || tie == TiedToOne);
+    return (row.isGenerated || rules_.mergesNets) && (tie == TiedToZero || tie == TiedToOne);
 }
 
 void Graph::MakeNets() {

@@ -1,10 +1,15 @@
 #include "diff/Places.h"
 
 #include "check/Located.h"
+#include "diagnostics/NameKey.h"
+#include "diff/Names.h"
+#include "diff/PlaceFinder.h"
 #include "load/Load.h"
 
 #include <cstdint>
 #include <limits>
+#include <string>
+#include <unordered_map>
 
 namespace Tool::Diff {
 
@@ -23,9 +28,43 @@ void FindCommandLines(const std::vector<Side*>& sides, const LoadedDesign& desig
     }
 }
 
-void FindLines(std::vector<Side*> sides, const LoadedDesign& design) {
-    if (!sides.empty() && design.GetFormat() == DesignFormat::Commands) {
+/// Gives the names of causes back what reading has changed of them.
+void RestoreNames(const std::vector<Side*>& sides, const LoadedDesign& design) {
+    std::unordered_map<std::string, std::string> names;
+    for (const auto& renaming : design.GetRenamings()) {
+        names.emplace(GetNameKey(renaming.newName), renaming.name);
+    }
+    const auto restore = [&](std::string& name) {
+        const auto found = names.find(GetNameKey(GetBase(name)));
+        if (found != names.end()) {
+            name = found->second;
+        }
+    };
+    for (Side* side : sides) {
+        restore(side->cause.first);
+        restore(side->cause.second);
+    }
+}
+
+void FindLines(const std::vector<Side*>& sides, const LoadedDesign& design) {
+    if (sides.empty()) {
+        return;
+    }
+    if (design.GetFormat() == DesignFormat::Commands) {
         FindCommandLines(sides, design);
+        return;
+    }
+    if (!design.GetRenamings().empty()) {
+        RestoreNames(sides, design);
+    }
+    PlaceFinder finder(sides, std::string(WithoutEscape(design.GetNetlist().GetNameView())));
+    switch (design.GetFormat()) {
+    case DesignFormat::Verilog:
+        return FindVerilogPlaces(design.GetSystemName(), finder);
+    case DesignFormat::Vhdl:
+        return FindVhdlPlaces(design.GetSystemName(), finder);
+    default:
+        return FindJsonPlaces(design.GetSystemName(), finder);
     }
 }
 
@@ -42,8 +81,8 @@ void FindLines(std::vector<Difference>& differences, const LoadedDesign& a, cons
             inB.push_back(&difference.b);
         }
     }
-    FindLines(std::move(inA), a);
-    FindLines(std::move(inB), b);
+    FindLines(inA, a);
+    FindLines(inB, b);
 }
 
 } // namespace Tool::Diff

@@ -14,8 +14,8 @@ struct Rules {
 
     /// \{
     /// What the formats of both files tell.
-    /// Whether an alias makes one net of two, a constant is no net, and internal nets have names that
-    /// say nothing: they are compared by what is wired to them.
+    /// Whether an alias makes one net of two, a constant is no net, and internal nets have names
+    /// that say nothing: they are compared by what is wired to them.
     bool mergesNets = false;
     /// Whether attributes are compared with type and options, and on all objects. Otherwise only
     /// what a netlist states is: generics and synthesis attributes of ports, signals and instances.
