@@ -397,7 +397,7 @@ void ModuleReader::ReadAssignments() {
 }
 
 void ModuleReader::Assign(const Expression& target, const Expression& value) {
-    Signal& signal = *expressions_.MakeSignal(target);
+    Signal& signal = *maker_.GetSignal(target.pieces);
     if (value.IsConstant()) {
         Tie(signal, value);
         return;
@@ -406,7 +406,7 @@ void ModuleReader::Assign(const Expression& target, const Expression& value) {
         parser_.Fail(value.place, std::to_string(value.width) + " bits are assigned to " +
                                       std::to_string(target.width));
     }
-    Signal& source = *expressions_.MakeSignal(value);
+    Signal& source = *maker_.GetSignal(value.pieces);
     if (&signal == &source) {
         parser_.Fail(value.place, Quoted(signal.GetNameView()) + " is assigned to itself");
     }
@@ -473,12 +473,12 @@ Value ModuleReader::ReadValue(std::string_view parameter) {
     Value value;
     try {
         if (parser_.Get().kind == TokenKind::Number) {
-            value = Value::Of(Number::Read(parser_.Get().text), isNegative);
+            value = ValueOf(Number::Read(parser_.Get().text), isNegative);
             parser_.Next();
         } else if (isNegative) {
             parser_.FailExpected("a number");
         } else if (parser_.Get().kind == TokenKind::String) {
-            value = Value::OfString(parser_.Get().text);
+            value = ValueOfString(parser_.Get().text);
             parser_.Next();
         } else if (parser_.IsSign('{')) {
             value = ReadBitsValue();
@@ -755,7 +755,7 @@ void ModuleReader::Connect(const ModuleHead& head, const Instance& instance, std
                                        (width == 1 ? " bit" : " bits") + ", and " +
                                        std::to_string(value_.width) + " are connected to it");
     }
-    Signal* const signal = expressions_.MakeSignal(value_);
+    Signal* const signal = maker_.GetSignal(value_.pieces);
     if (NetlistMaker::IsOpenWord(signal->GetNameView())) {
         parser_.Fail(value_.place, "a net of this name, which stands for an open pin in a model");
     }
