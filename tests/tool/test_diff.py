@@ -367,6 +367,36 @@ class Formats(DiffTest):
         self.assertEqual(self.run_tool("diff", "a.cmd", "netlist.txt", "--from-b", "verilog").status,
                          EQUAL)
 
+    def test_lines_of_netlists(self) -> None:
+        self.write("a.cmd", DESIGN)
+        self.run_tool("run", "a.cmd", "--verilog", "a.v", "--vhdl", "a.vhd")
+        self.write("b.cmd", DESIGN.replace("ADD INSTANCE INV U2", "ADD INSTANCE INV G7")
+                   .replace("U2.", "G7.").replace("d(0) U1.I", "d(1) U1.I")
+                   .replace("one 1", "one 0").replace("y output", "y bidirectional"))
+        for netlist, texts in (("a.v", {"G7": "INV U2 (", "U1.I": ".I(d[0])", "one": "assign one =",
+                                        "y": "output y;"}),
+                               ("a.vhd", {"G7": "U2 : INV", "U1.I": "port map (I=>d(0)",
+                                          "one": "one <= ", "y": "y : out"})):
+            lines = [" ".join(line.split()) for line in self.read(netlist).splitlines()]
+            found = self.diff_files(netlist, "b.cmd")["differences"]
+            told = {each["b"]["name"]: lines[each["a"]["line"] - 1] for each in found
+                    if each["object"] != "module"}
+            for name, text in texts.items():
+                with self.subTest(netlist=netlist, name=name):
+                    self.assertIn(text, told[name])
+
+    def test_lines_of_json(self) -> None:
+        cell = {"type": "INV", "port_directions": {"I": "input", "O": "output"},
+                "connections": {"I": [2], "O": [3]}}
+        ports = {"a": {"direction": "input", "bits": [2]}, "y": {"direction": "output", "bits": [3]}}
+        for name, instance in (("a.json", "U1"), ("b.json", "U2")):
+            modules = {"m": {"attributes": {"top": "1"}, "ports": ports, "cells": {instance: cell},
+                             "netnames": {}}}
+            self.write(name, json.dumps({"modules": modules}, indent=1))
+        (difference,) = self.diff_files("a.json", "b.json")["differences"]
+        lines = self.read("a.json").splitlines()
+        self.assertIn('"U1"', lines[difference["a"]["line"] - 1])
+
     def test_library(self) -> None:
         self.write("cells.v", "module INV(input I, output O); endmodule\n")
         for name, instance in (("a.v", "U1"), ("b.v", "U2")):

@@ -814,9 +814,33 @@ void Comparison::CompareAliases() {
     }
 }
 
-} // namespace
+std::uint64_t HashNames(const Netlist& netlist, bool withPins) {
+    std::uint64_t hash = 0;
+    const auto add = [&hash](const Object* object) {
+        hash = Mix(hash, object == nullptr ? 0 : HashName(object->GetNameView()));
+    };
+    for (const Component* component : netlist.GetComponentIterator()) {
+        add(component);
+    }
+    for (const Signal* signal : netlist.GetSignalIterator()) {
+        add(signal);
+        for (const Signal* source : signal->GetSignalIterator()) {
+            add(source);
+        }
+    }
+    for (const Instance* instance : netlist.GetInstanceIterator()) {
+        add(instance);
+        for (const Pin* pin : instance->GetPinIterator()) {
+            if (withPins) {
+                add(pin->GetSignal());
+            }
+        }
+    }
+    return hash;
+}
 
-Differences Compare(const Netlist& a, const Netlist& b, const Rules& rules, std::size_t most) {
+Differences CompareInOrder(const Netlist& a, const Netlist& b, const Rules& rules,
+                           std::size_t most) {
     Comparison comparison(a, b, rules, most);
     Differences byNames = comparison.Run(true);
     if (rules.names || byNames.GetTotal() == 0) {
@@ -824,6 +848,19 @@ Differences Compare(const Netlist& a, const Netlist& b, const Rules& rules, std:
     }
     Differences byNets = comparison.Run(false);
     return byNets.GetTotal() < byNames.GetTotal() ? std::move(byNets) : std::move(byNames);
+}
+
+} // namespace
+
+/// What cannot be told apart is matched in its order, so the order of the designs could show. They
+/// are therefore compared in an order that depends on nothing but them.
+Differences Compare(const Netlist& a, const Netlist& b, const Rules& rules, std::size_t most) {
+    if (HashNames(a, !rules.names) <= HashNames(b, !rules.names)) {
+        return CompareInOrder(a, b, rules, most);
+    }
+    Differences found = CompareInOrder(b, a, rules, most);
+    found.Flip();
+    return found;
 }
 
 } // namespace Tool::Diff

@@ -49,7 +49,6 @@ Diff::Rules MakeRules(const DiffOptions& options, const Designs& designs) {
     const DesignFormat b = designs.b.GetFormat();
     const bool areCommands = a == DesignFormat::Commands && b == DesignFormat::Commands;
     const bool isAnyJson = a == DesignFormat::Json || b == DesignFormat::Json;
-    const bool isAnyVerilog = a == DesignFormat::Verilog || b == DesignFormat::Verilog;
     Diff::Rules rules;
     rules.names = !Ignores(options, "names");
     rules.attributes = !Ignores(options, "attributes");
@@ -59,7 +58,7 @@ Diff::Rules MakeRules(const DiffOptions& options, const Designs& designs) {
     rules.mergesNets = isAnyJson;
     rules.hasExactAttributes = areCommands;
     rules.hasSynthesisAttributes = !isAnyJson;
-    rules.hasUnusedParts = !isAnyJson && !isAnyVerilog;
+    rules.hasUnusedParts = areCommands || (a == DesignFormat::Vhdl && b == DesignFormat::Vhdl);
     rules.hasPinRanges = !isAnyJson;
     rules.hasPortOrder = !areCommands;
     rules.hasDesignName = designs.a.HasName() && designs.b.HasName();

@@ -22,6 +22,19 @@ std::size_t Differences::GetTotal() const noexcept {
     return std::accumulate(counts_.begin(), counts_.end(), std::size_t(0));
 }
 
+void Differences::Flip() {
+    constexpr auto Removed = static_cast<std::size_t>(Change::Removed);
+    constexpr auto Added = static_cast<std::size_t>(Change::Added);
+    std::swap(counts_[Removed], counts_[Added]);
+    std::swap(kept_[Removed], kept_[Added]);
+    for (std::size_t i = 0; i < ChangeCount; ++i) {
+        for (Difference& difference : kept_[i]) {
+            difference.change = static_cast<Change>(i);
+            std::swap(difference.a, difference.b);
+        }
+    }
+}
+
 std::vector<Difference> Differences::Take() {
     std::vector<Difference> all;
     for (std::vector<Difference>& group : kept_) {

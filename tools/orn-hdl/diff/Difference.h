@@ -76,6 +76,8 @@ public:
         return counts_[static_cast<std::size_t>(change)];
     }
     std::size_t GetTotal() const noexcept;
+    /// Makes them the differences of the designs in the other order.
+    void Flip();
     /// The kept differences: what was removed first, then what was added, as `Change` has them.
     /// At most as many as are kept of each kind.
     std::vector<Difference> Take();

@@ -106,19 +106,6 @@ LoadedDesign::LoadedDesign(const DesignFile& file) : file_(file), source_(file.n
     model_ = engine_.GetModel(Unnamed);
 }
 
-Status LoadedDesign::Load(const Libraries& libraries, Reporter& reporter, bool quiet) {
-    switch (GetFormat()) {
-    case DesignFormat::Verilog:
-        return ReadVerilog(libraries, reporter);
-    case DesignFormat::Vhdl:
-        return ReadVhdl(libraries, reporter);
-    case DesignFormat::Json:
-        return ReadJson(libraries, reporter);
-    default:
-        return Replay(reporter, quiet);
-    }
-}
-
 Status LoadedDesign::Replay(Reporter& reporter, bool quiet) {
     DropWrites(*model_->GetCommandFactory());
     Progress progress(quiet, GetSystemName());
@@ -178,16 +165,19 @@ void LoadedDesign::ReportReadError(std::string text, Reporter& reporter) const {
     reporter.Report(std::move(diagnostic));
 }
 
-Status LoadedDesign::ReadVerilog(const Libraries& libraries, Reporter& reporter) {
-    Orn_Hdl::VerilogReader reader;
+template <class Reader>
+Status LoadedDesign::ReadNetlist(const Libraries& libraries, Reporter& reporter) {
+    Reader reader;
     for (const std::string& library : libraries.files) {
-        reader.AddLibrary(library.c_str());
+        if ((GetFormatOf(library) == DesignFormat::Vhdl) == (GetFormat() == DesignFormat::Vhdl)) {
+            reader.AddLibrary(library.c_str());
+        }
     }
     if (libraries.components != nullptr) {
         reader.AddLibrary(*libraries.components);
     }
     reader.KeepComments(true);
-    reader.SetNames(Orn_Hdl::VerilogReader::Names::Literal);
+    reader.SetNames(Orn_Hdl::ReaderNames::Literal);
     try {
         reader.Read(GetSystemName(), *model_);
     } catch (const Orn_Hdl::Exception& exception) {
@@ -198,14 +188,12 @@ Status LoadedDesign::ReadVerilog(const Libraries& libraries, Reporter& reporter)
     return Status::Success;
 }
 
-Status LoadedDesign::ReadVhdl(const Libraries& /*libraries*/, Reporter& reporter) {
-    reporter.Report(MakeDiagnostic(file_.name, "VHDL cannot be read yet"));
-    return Status::Failed;
-}
-
 Status LoadedDesign::ReadJson(const Libraries& libraries, Reporter& reporter) {
     Import::CellLibrary library;
     for (const std::string& name : libraries.files) {
+        if (GetFormatOf(name) == DesignFormat::Vhdl) {
+            continue;
+        }
         std::string text;
         const Status status = ReadWhole(name.c_str(), name, text);
         if (status != Status::Success) {
@@ -244,6 +232,19 @@ Status LoadedDesign::ReadJson(const Libraries& libraries, Reporter& reporter) {
         return Status::Failed;
     }
     return Status::Success;
+}
+
+Status LoadedDesign::Load(const Libraries& libraries, Reporter& reporter, bool quiet) {
+    switch (GetFormat()) {
+    case DesignFormat::Verilog:
+        return ReadNetlist<Orn_Hdl::VerilogReader>(libraries, reporter);
+    case DesignFormat::Vhdl:
+        return ReadNetlist<Orn_Hdl::VhdlReader>(libraries, reporter);
+    case DesignFormat::Json:
+        return ReadJson(libraries, reporter);
+    default:
+        return Replay(reporter, quiet);
+    }
 }
 
 } // namespace Tool

@@ -32,7 +32,8 @@ struct DesignFile {
 
 /// What a netlist needs besides its own file.
 struct Libraries {
-    /// Files that declare components.
+    /// Files that declare components. A VHDL file is one for VHDL netlists, any other one for the
+    /// others.
     std::vector<std::string> files;
     /// A design with components that no file declares; null for none.
     const Orn_Hdl::Netlist* components = nullptr;
@@ -59,14 +60,11 @@ public:
     /// The name under which the system opens the file once more.
     const char* GetSystemName() const noexcept { return source_.GetName(); }
     /// The names that the file has otherwise than the design.
-    const std::vector<Orn_Hdl::VerilogReader::Renaming>& GetRenamings() const noexcept {
-        return renamings_;
-    }
+    const std::vector<Orn_Hdl::ReaderRenaming>& GetRenamings() const noexcept { return renamings_; }
 
 private:
     Status Replay(Reporter& reporter, bool quiet);
-    Status ReadVerilog(const Libraries& libraries, Reporter& reporter);
-    Status ReadVhdl(const Libraries& libraries, Reporter& reporter);
+    template <class Reader> Status ReadNetlist(const Libraries& libraries, Reporter& reporter);
     Status ReadJson(const Libraries& libraries, Reporter& reporter);
     void ReportReadError(std::string text, Reporter& reporter) const;
 
@@ -75,7 +73,7 @@ private:
     Orn_Hdl::Engine engine_;
     Orn_Hdl::Model* model_ = nullptr;
     bool hasName_ = true;
-    std::vector<Orn_Hdl::VerilogReader::Renaming> renamings_;
+    std::vector<Orn_Hdl::ReaderRenaming> renamings_;
 };
 
 } // namespace Tool
