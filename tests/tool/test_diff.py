@@ -127,8 +127,8 @@ class Kinds(DiffTest):
         bits = DESIGN.replace("ADD SIGNAL t(3:0)\n", "".join(f"ADD SIGNAL t{i}\n" for i in range(4)))
         bits = bits.replace("t(3:0)", "t3,t2,t1,t0")
         found = self.diff(DESIGN, bits)
-        self.assertEqual([(each["a"]["name"], each["b"]["name"]) for each in found["differences"]],
-                         [(f"t({i})", f"t{i}") for i in (3, 2, 1, 0)])
+        self.assertEqual({(each["a"]["name"], each["b"]["name"]) for each in found["differences"]},
+                         {(f"t({i})", f"t{i}") for i in range(4)})
         self.assertEqual({each["change"] for each in found["differences"]}, {"renamed"})
         self.diff(DESIGN, bits, "--ignore", "names", status=EQUAL)
 
@@ -325,6 +325,13 @@ retied:
             self.assertTrue(out.endswith(more + last), out)
         found = self.diff_files("a.cmd", "b.cmd", "--limit", "3")
         self.assertEqual((found["counts"]["added"], len(found["differences"])), (150, 3))
+
+    def test_in_the_order_of_the_lines(self) -> None:
+        for new in ("G", "A"):
+            other = DESIGN.replace("U1", f"{new}1").replace("U2", f"{new}2")
+            found = self.diff(DESIGN, other.replace("t(3:0)", "v(3:0)"))
+            lines = [each["a"]["line"] for each in found["differences"]]
+            self.assertEqual(lines, sorted(lines))
 
     def test_same_output_every_time(self) -> None:
         self.write("a.cmd", DESIGN)

@@ -65,6 +65,17 @@ Diff::Rules MakeRules(const DiffOptions& options, const Designs& designs) {
     return rules;
 }
 
+/// Sorts what changed alike by the lines of the first file, or else of the second one.
+void SortByLine(std::vector<Diff::Difference>& differences) {
+    const auto lineOf = [](const Diff::Difference& difference) {
+        return difference.a.line != 0 ? difference.a.line : difference.b.line;
+    };
+    std::stable_sort(differences.begin(), differences.end(),
+                     [&](const Diff::Difference& a, const Diff::Difference& b) {
+                         return a.change != b.change ? a.change < b.change : lineOf(a) < lineOf(b);
+                     });
+}
+
 Status Run(const DiffOptions& options, Reporter& reporter) {
     static Designs* designs = nullptr;
     delete std::exchange(designs, nullptr); // From an earlier run.
@@ -76,6 +87,7 @@ Status Run(const DiffOptions& options, Reporter& reporter) {
                                             MakeRules(options, *designs), options.limit);
     std::vector<Diff::Difference> shown = found.Take();
     Diff::FindLines(shown, designs->a, designs->b);
+    SortByLine(shown);
     const Diff::Report report{designs->a.GetFile().name, designs->b.GetFile().name, found, shown};
     if (Print(options.format == DiffFormat::Json ? Diff::SpellAsJson(report)
                                                  : Diff::SpellAsText(report)) != Status::Success) {
