@@ -145,6 +145,9 @@ std::uint32_t Number::GetWidth() const {
     if (size > 0) {
         return size;
     }
+    if (kind == Real) {
+        return UnsizedWidth;
+    }
     const std::string bits = DigitBits(digits, base);
     const std::size_t first = std::min(bits.find('1'), bits.size());
     return static_cast<std::uint32_t>(std::max<std::size_t>(UnsizedWidth, bits.size() - first));
