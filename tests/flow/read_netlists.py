@@ -1,9 +1,11 @@
 #!/usr/bin/env python3
 """Netlists read by the library's own reader.
 
-Random designs: what is written is read and written again, and is the same. RTL: the netlist that
-Yosys writes is read and written, with and without Yosys' attributes; the result has the same cells,
-wired alike, and is equivalent.
+Random designs: what is written in either language is read and written again, and is the same. RTL:
+the netlist that Yosys writes is read and written, with and without Yosys' attributes; the result has
+the same cells, wired alike, and is equivalent. So is what is written as VHDL, which GHDL analyses,
+read and written as Verilog; and what GHDL makes of that netlist and writes as VHDL. GHDL's netlists
+of the RTL itself hold processes and functions, so the netlist of cells is what it is given.
 """
 
 from __future__ import annotations
@@ -36,23 +38,57 @@ def synthesise(design: Design, options: str, target: Path) -> None:
               f"script to_cells.ys; check -assert; write_verilog {options} {quoted(target)}", CELLS)
 
 
+def rewrite(program: Path, library: Path | str, source: Path, target: Path) -> dict[str, str]:
+    """The new names that netlists read and written have, with the old ones."""
+    printed = run_tool([program, "rewrite", library, source, target], source.parent).stdout
+    pairs = [line.split("\t") for line in printed.splitlines()]
+    old_names = {new: old for old, new in pairs}
+    if len(old_names) < len(pairs):
+        raise Rejected("two names became one")
+    return old_names
+
+
 def compare(program: Path, design: Design, options: str, work: Path) -> None:
     """The netlist that Yosys writes and what the library writes of it are the same circuit."""
     source, target = work / "yosys.v", work / "written.v"
     synthesise(design, options, source)
-    printed = run_tool([program, "rewrite", CELL_BLACK_BOXES, source, target], work).stdout
-    pairs_of_names = [line.split("\t") for line in printed.splitlines()]
-    old_names = {new: old for old, new in pairs_of_names}
-    if len(old_names) < len(pairs_of_names):
-        raise Rejected("two names became one")
+    old_names = rewrite(program, CELL_BLACK_BOXES, source, target)
+    prove_same(source, target, design.name, work, old_names)
 
+
+def prove_same(source: Path, target: Path, top: str, work: Path, old_names: dict[str, str]) -> None:
     def old_name(name: str) -> str:
         return old_names.get(name, name)
 
-    pairs = same_structure(Netlist.read(source, design.name, work, BLACK_BOXES),
-                           Netlist.read(target, design.name, work, BLACK_BOXES, old_name))
-    prove_equivalent(Netlist.read(source, design.name, work),
-                     Netlist.read(target, design.name, work, port_names=old_name), pairs, work)
+    pairs = same_structure(Netlist.read(source, top, work, BLACK_BOXES),
+                           Netlist.read(target, top, work, BLACK_BOXES, old_name))
+    prove_equivalent(Netlist.read(source, top, work),
+                     Netlist.read(target, top, work, port_names=old_name), pairs, work)
+
+
+def compare_vhdl(program: Path, design: Design, work: Path) -> None:
+    """The netlist that Yosys writes, as VHDL that is read back, is the same circuit."""
+    source, vhdl, target = work / "yosys.v", work / "written.vhd", work / "back.v"
+    synthesise(design, "-noattr", source)
+    old_names = rewrite(program, CELL_BLACK_BOXES, source, vhdl)
+    run_tool(["ghdl", "-a", "--std=93c", vhdl], work)
+    if rewrite(program, "-", vhdl, target):
+        raise Rejected("names that were written are not read")
+    prove_same(source, target, design.name, work, old_names)
+
+
+def compare_ghdl(program: Path, design: Design, work: Path) -> None:
+    """A netlist that GHDL writes of such a one is the same circuit."""
+    source, vhdl, target = work / "yosys.v", work / "written.vhd", work / "back.v"
+    synthesise(design, "-noattr", source)
+    old_names = rewrite(program, CELL_BLACK_BOXES, source, vhdl)
+    run_tool(["ghdl", "-a", "--std=93c", vhdl], work)
+    synthesised = work / "ghdl.vhd"
+    synthesised.write_text(run_tool(["ghdl", "--synth", "--std=93c", "--out=vhdl", design.name],
+                                    work).stdout)
+    rewrite(program, vhdl, synthesised, target)
+    # GHDL writes no wire twice, so only the function and the ports are the same.
+    prove_same(source, target, design.name, work, old_names)
 
 
 def main() -> int:
@@ -74,6 +110,8 @@ def main() -> int:
                 for form in ("", "-noattr"):
                     tally.check(f"{design.name} {form}: equivalent to Yosys' netlist", compare,
                                 program, design, form, work)
+                tally.check(f"{design.name}: equivalent as VHDL that is read", compare_vhdl,
+                            program, design, work)
     return tally.close()
 
 
