@@ -137,6 +137,13 @@ int Rewrite(const std::string& library, const std::string& input, const std::str
     CommandFactory factory;
     Model model(&factory);
     model.GetOptions()->writeHeader = false;
+    // Names that are words of VHDL.
+    model.GetOptions()->legal = IsVhdl(output);
+    auto& vhdl = model.GetOptions()->vhdl;
+    vhdl.useDefaultLibrary = false;
+    vhdl.suppressConfiguration = true;
+    vhdl.libraries.Add("ieee");
+    vhdl.useClauses.Add("ieee.std_logic_1164.all");
     Reader reader;
     if (library != "-") {
         reader.AddLibrary(library.c_str());

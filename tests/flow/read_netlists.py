@@ -17,7 +17,7 @@ from pathlib import Path
 
 from judging import Design, Tally
 from designs import RTL_DESIGNS
-from equivalence import BLACK_BOXES, Netlist, prove_equivalent, same_structure
+from equivalence import BLACK_BOXES, Netlist, prove_equivalent, same_names, same_structure
 from judges import CELL_BLACK_BOXES, CELLS, Rejected, quoted, run_tool, run_yosys
 from random_designs import RandomDesign, random_leaves
 from roundtrip import BATCH, batches, parse_seeds
@@ -32,10 +32,20 @@ def read_back(program: Path, seeds: list[int], work: Path) -> None:
     run_tool([program, "back", *files], work)
 
 
-def synthesise(design: Design, options: str, target: Path) -> None:
+def synthesise(design: Design, options: str, target: Path, passes: str = "") -> None:
     run_yosys(f"read_verilog -lib {quoted(CELL_BLACK_BOXES)}; "
               f"read_verilog {quoted(design.source)}; hierarchy -check -top {design.name}; "
-              f"script to_cells.ys; check -assert; write_verilog {options} {quoted(target)}", CELLS)
+              f"script to_cells.ys; {passes} check -assert; write_verilog {options} {quoted(target)}", CELLS)
+
+
+# Names of Yosys' own that VHDL can have.
+VHDL_NAMES = "rename -enumerate -pattern auto%"
+
+
+# Designs with ports whose names VHDL does not have.
+NOT_VHDL = ["names", "feedback", "wires"]
+# GHDL ties the open bits of this design to "ZZZ", which no model has.
+NOT_FROM_GHDL = ["fifo"]
 
 
 def rewrite(program: Path, library: Path | str, source: Path, target: Path) -> dict[str, str]:
@@ -67,28 +77,32 @@ def prove_same(source: Path, target: Path, top: str, work: Path, old_names: dict
 
 
 def compare_vhdl(program: Path, design: Design, work: Path) -> None:
-    """The netlist that Yosys writes, as VHDL that is read back, is the same circuit."""
+    """The netlist that Yosys writes, as VHDL that is read back, is the same circuit; so is the
+    netlist that GHDL writes of that VHDL."""
     source, vhdl, target = work / "yosys.v", work / "written.vhd", work / "back.v"
-    synthesise(design, "-noattr", source)
+    synthesise(design, "-noattr", source, f"{VHDL_NAMES};")
     old_names = rewrite(program, CELL_BLACK_BOXES, source, vhdl)
     run_tool(["ghdl", "-a", "--std=93c", vhdl], work)
     if rewrite(program, "-", vhdl, target):
         raise Rejected("names that were written are not read")
     prove_same(source, target, design.name, work, old_names)
-
-
-def compare_ghdl(program: Path, design: Design, work: Path) -> None:
-    """A netlist that GHDL writes of such a one is the same circuit."""
-    source, vhdl, target = work / "yosys.v", work / "written.vhd", work / "back.v"
-    synthesise(design, "-noattr", source)
-    old_names = rewrite(program, CELL_BLACK_BOXES, source, vhdl)
-    run_tool(["ghdl", "-a", "--std=93c", vhdl], work)
-    synthesised = work / "ghdl.vhd"
+    if design.name in NOT_FROM_GHDL:
+        return
+    synthesised, again = work / "ghdl.vhd", work / "again.v"
     synthesised.write_text(run_tool(["ghdl", "--synth", "--std=93c", "--out=vhdl", design.name],
                                     work).stdout)
-    rewrite(program, vhdl, synthesised, target)
-    # GHDL writes no wire twice, so only the function and the ports are the same.
-    prove_same(source, target, design.name, work, old_names)
+    cells = work / "cells.vhd"
+    cells.write_text(package_of_components(vhdl.read_text()))
+    rewrite(program, cells, synthesised, again)
+    gold, gate = (Netlist.read(file, design.name, work) for file in (target, again))
+    prove_equivalent(gold, gate, same_names(gold, gate), work)
+
+
+def package_of_components(vhdl: str) -> str:
+    """The component declarations of an architecture as a library: GHDL drops them."""
+    first = vhdl.index("   component ")
+    last = vhdl.rindex("end component;") + len("end component;")
+    return f"package cells is\n{vhdl[first:last]}\nend cells;\n"
 
 
 def main() -> int:
@@ -110,8 +124,9 @@ def main() -> int:
                 for form in ("", "-noattr"):
                     tally.check(f"{design.name} {form}: equivalent to Yosys' netlist", compare,
                                 program, design, form, work)
-                tally.check(f"{design.name}: equivalent as VHDL that is read", compare_vhdl,
-                            program, design, work)
+                if design.name not in NOT_VHDL:
+                    tally.check(f"{design.name}: equivalent as VHDL that is read", compare_vhdl,
+                                program, design, work)
     return tally.close()
 
 
