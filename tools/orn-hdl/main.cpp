@@ -290,6 +290,8 @@ private:
         AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
+        AddFile(command, "--output-commands", run_.commandFile,
+                "Write the commands of the final design; - is standard output");
         AddWriteRules(command, run_.writeRules);
         CLI::Option* keepGoing =
             command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
