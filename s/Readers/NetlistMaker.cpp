@@ -102,11 +102,17 @@ const std::string& NetlistMaker::Plain(const std::string& name) const {
     return plain_;
 }
 
+/// Whether the file may have had to escape a name.
+bool NetlistMaker::MayBeEscaped(std::string_view name) const noexcept {
+    return !rules_.ignoresCase || IsExtended(name);
+}
+
 void NetlistMaker::SetName(const std::string& name) {
     const std::string& plain = Plain(name);
-    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false);
+    const bool isEscaped = MayBeEscaped(name);
+    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false, isEscaped);
     std::string newName = isKept ? plain : MakeSimple(plain, 'm');
-    if (!isKept && !CanKeep(newName, false)) {
+    if (!isKept && !CanKeep(newName, false, isEscaped)) {
         newName = MakeUnique(newName);
     }
     if (!isKept) {
@@ -116,7 +122,8 @@ void NetlistMaker::SetName(const std::string& name) {
 }
 
 /// Whether a netlist can have an object of that name and tell it from others.
-bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
+/// \param isEscaped whether the file may have had to escape it.
+bool NetlistMaker::CanKeep(std::string_view name, bool isBus, bool isEscaped) const {
     const bool isLiteral = names_ == ReaderNames::Literal;
     if (!isLiteral && IsOpenWord(name)) {
         return false;
@@ -125,7 +132,7 @@ bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
         return false;
     }
     if (IsSimple(name)) {
-        return isLiteral || !rules_.isReserved(name);
+        return isLiteral || !isEscaped || !rules_.isReserved(name);
     }
     if (name.empty() || isBus) {
         return false;
@@ -190,7 +197,7 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
                                           ReaderRenaming::Kind kind) {
     const std::string& plain = Plain(name);
     const bool isBasic = &plain == &name;
-    if (!isTaken && CanKeep(plain, isBus)) {
+    if (!isTaken && CanKeep(plain, isBus, MayBeEscaped(name))) {
         if (isBasic) {
             return name;
         }
@@ -403,7 +410,7 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         return "it is a primitive, whose ports have no names";
     }
     const std::string plain = Plain(head.name);
-    const bool canKeep = CanKeep(plain, false);
+    const bool canKeep = CanKeep(plain, false, MayBeEscaped(head.name));
     if (canKeep && netlist_.GetComponent(std::string_view(plain)) != nullptr) {
         return "a model does not tell it from another component, whose name differs in letter case "
                "alone";
@@ -430,7 +437,7 @@ std::string NetlistMaker::MakePinName(const PortHead& port, const ModuleHead& he
                                       const Component& component) const {
     const bool isBus = port.range.has_value();
     const std::string& plain = Plain(port.name);
-    if (CanKeep(plain, isBus)) {
+    if (CanKeep(plain, isBus, MayBeEscaped(port.name))) {
         return plain;
     }
     const std::string similar = MakeSimple(plain, 'p');

@@ -109,7 +109,8 @@ private:
     };
 
     const std::string& Plain(const std::string& name) const;
-    bool CanKeep(std::string_view name, bool isBus) const;
+    bool MayBeEscaped(std::string_view name) const noexcept;
+    bool CanKeep(std::string_view name, bool isBus, bool isEscaped = true) const;
     bool IsTaken(const std::string& name) const;
     bool IsDeclared(const std::string& name, bool isTaken) const;
     const std::string* FindRenamed(std::string_view name) const;

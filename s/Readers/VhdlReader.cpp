@@ -30,8 +30,6 @@ using Readers::FailAt;
 using Readers::ModuleHead;
 using Readers::Quoted;
 
-constexpr Readers::Place Whole{0, 0, 0};
-
 /// One reading of one file.
 class Reading {
 public:

@@ -7,6 +7,7 @@
 #include "Tool.h"
 #include "check/Check.h"
 #include "diagnostics/Nearest.h"
+#include "diff/Diff.h"
 #include "explain/Syntax.h"
 #include "stats/Stats.h"
 #include "warnings/WarningsPage.h"
@@ -21,6 +22,7 @@
 #include <exception>
 #include <functional>
 #include <new>
+#include <optional>
 #include <sstream>
 #include <string>
 #include <utility>
@@ -163,6 +165,30 @@ void AddWarnings(CLI::App& command, Tool::WarningOptions& warnings) {
                      "Make warnings errors: --verilog and --vhdl then write nothing");
 }
 
+/// Adds the words of a list with commas between them. \return what is wrong with the list.
+std::string TakeIgnored(const std::string& list, std::vector<std::string>& ignored) {
+    const std::vector<std::string>& words = Tool::GetIgnorable();
+    std::istringstream rest(list);
+    for (std::string word; std::getline(rest, word, ',');) {
+        if (std::find(words.begin(), words.end(), word) == words.end()) {
+            return "\"" + word + "\" is none of " + Tool::Explain::JoinChoices(words, "and");
+        }
+        ignored.push_back(word);
+    }
+    return "";
+}
+
+/// An option for the format of a file whose extension does not tell it.
+void AddDesignFormat(CLI::App& command, const std::string& option,
+                     std::optional<Tool::DesignFormat>& format, const std::string& help) {
+    AddChoice<std::optional<Tool::DesignFormat>>(command, option, format,
+                                                 {{"commands", Tool::DesignFormat::Commands},
+                                                  {"verilog", Tool::DesignFormat::Verilog},
+                                                  {"vhdl", Tool::DesignFormat::Vhdl},
+                                                  {"json", Tool::DesignFormat::Json}},
+                                                 help);
+}
+
 /// The command line: its options, and the command to run.
 class CommandLine {
 public:
@@ -174,6 +200,7 @@ public:
         AddRun();
         AddImport();
         AddCheck();
+        AddDiff();
         AddDraw();
         AddStats();
         AddCommands();
@@ -382,6 +409,49 @@ private:
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
     }
 
+    void AddDiff() {
+        CLI::App& command = AddCommand("diff", "Tell in what two designs differ",
+                                       [this] { return Tool::PrintDiff(diff_); });
+        AddFile(command, "A", diff_.a.name, "The first file; - is standard input")
+            ->type_name("")
+            ->required();
+        AddFile(command, "B", diff_.b.name, "The second file; - is standard input")
+            ->type_name("")
+            ->required();
+        const auto addLibrary = [this](const std::string& file) {
+            diff_.libraries.push_back(file);
+        };
+        command
+            .add_option_function<std::string>("-l", addLibrary,
+                                              "Read the components of netlists; may be repeated")
+            ->type_name("FILE")
+            ->trigger_on_parse()
+            ->check(CheckFileName);
+        command
+            .add_option_function<std::string>(
+                "--ignore", [this](const std::string& list) { TakeIgnored(list, diff_.ignored); },
+                "Do not compare names, attributes, comments or order, with commas between them")
+            ->type_name("LIST")
+            ->check([](const std::string& list) {
+                std::vector<std::string> tried;
+                return TakeIgnored(list, tried);
+            })
+            // Of several lists, all count.
+            ->join(',');
+        AddDesignFormat(command, "--from-a", diff_.a.format, "The format of A");
+        AddDesignFormat(command, "--from-b", diff_.b.format, "The format of B");
+        AddChoice<Tool::DiffFormat>(
+            command, "--format", diff_.format,
+            {{"text", Tool::DiffFormat::Text}, {"json", Tool::DiffFormat::Json}},
+            "Print the differences as text or JSON");
+        command.add_option("--limit", diff_.limit, "Show N differences; 0 shows all")
+            ->type_name("N");
+        AddReport(command, diff_.report);
+        command.add_flag("--quiet", diff_.quiet, "Do not show progress");
+        command.footer("The exit status is 0 for equal designs, 1 for different ones, 2 for "
+                       "trouble.");
+    }
+
     void AddDraw() {
         CLI::App& command = AddCommand("draw", "Draw the design of a command file",
                                        [this] { return Tool::Draw(draw_); });
@@ -441,6 +511,7 @@ private:
     Tool::ImportOptions import_;
     Tool::DrawOptions draw_;
     Tool::CheckOptions check_;
+    Tool::DiffOptions diff_;
     Tool::StatsOptions stats_;
     std::vector<std::string> words_;
     bool markdown_ = false;

@@ -12,10 +12,6 @@ constexpr std::string_view InitName = "INIT";
 /// How many parameters may be left out of instances: a short text can ask for any number.
 constexpr std::size_t MostLeftOut = std::size_t(1) << 20;
 
-bool IsDirection(Keyword keyword) {
-    return keyword == Keyword::Input || keyword == Keyword::Output || keyword == Keyword::Inout;
-}
-
 } // namespace
 
 bool IsVerilogKeyword(std::string_view name) {

@@ -1,6 +1,7 @@
 #include "Readers/Vhdl/Types.h"
 
 #include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Vhdl/Literals.h"
 
 #include <algorithm>
@@ -10,8 +11,6 @@
 namespace Orn_Hdl::Readers::Vhdl {
 
 namespace {
-
-constexpr std::int64_t LargestIndex = std::numeric_limits<int>::max();
 
 template <std::size_t Count>
 bool IsOneOf(std::string_view name, const std::string_view (&words)[Count]) noexcept {
@@ -176,6 +175,10 @@ bool IsVectorType(std::string_view name) noexcept {
 
 bool IsBitType(std::string_view name) noexcept {
     return IsOneOf(name, BitTypes);
+}
+
+bool IsKnownType(std::string_view name) {
+    return TypeOf(name).has_value();
 }
 
 std::string GetTypeName(const Attribute& attribute) {
