@@ -278,6 +278,8 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
             return Status::Failed;
         }
     }
+    // The name of the netlist that was read is in no output.
+    model_->SetSourceFileName("");
     // A write changes the design, so the commands come first.
     CommandsOutput commands(options_.commandFile);
     OutputFile nameMap(options_.nameMap);
