@@ -1,5 +1,6 @@
 #include "Readers/Value.h"
 
+#include "HdlModel/Objects/AttributeTable.h"
 #include "Port/Ascii.h"
 #include "Readers/Limits.h"
 #include "Readers/Place.h"
@@ -12,22 +13,6 @@
 #include <vector>
 
 namespace Orn_Hdl::Readers {
-
-namespace {
-
-/// Puts an attribute in the place of another one of its holder, the order kept.
-void Replace(AttributeHolder& holder, Attribute* present, std::unique_ptr<Attribute> attribute) {
-    std::vector<Attribute*> all;
-    for (Attribute* each : holder.GetAttrIterator()) {
-        all.push_back(each);
-    }
-    for (Attribute* each : all) {
-        std::unique_ptr<Attribute> detached = holder.DetachAttr(each);
-        holder.AddAttr(each == present ? attribute.release() : detached.release());
-    }
-}
-
-} // namespace
 
 std::string DecimalBits(std::string digits) {
     if (digits.size() > MostDecimalDigits) {
@@ -171,7 +156,7 @@ std::string SetAttribute(AttributeHolder& holder, const std::string& name, const
         present->SetSynAttr(attribute->GetSynAttr().CStr());
         return "";
     }
-    Replace(holder, present, std::move(attribute));
+    AttributeTable::Replace(*present, std::move(attribute));
     return "";
 }
 

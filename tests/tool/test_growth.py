@@ -56,6 +56,33 @@ def box_with_pins(size: int) -> str:
     return "".join(["ADD COMPONENT W\n", *pins, "ADD INSTANCE W u\n", *wires])
 
 
+def undeclared_gates(size: int) -> str:
+    """Buses cut into bits; the direction of each pin follows from the gate before."""
+    gates = [f"  G u{i}(.A(n[{i}]), .B(a), .Y(n[{i + 1}]));\n" for i in range(size)]
+    return (f"module t(input a, output y);\n  wire [{size}:0] n;\n  assign n[0] = a, y = n[{size}];\n"
+            + "".join(gates) + "endmodule\n")
+
+
+def undeclared_cell_with_pins(size: int) -> str:
+    pins = ", ".join(f".p{i}(a)" for i in range(size))
+    others = ", ".join(f".p{i}(a)" for i in reversed(range(size)))
+    return f"module t(input a);\n  G u({pins});\n  G v({others});\nendmodule\n"
+
+
+def undeclared_cells_of_each_kind(size: int) -> str:
+    cells = [f"  wire n{i + 1};\n  G{i} u{i}(.A(n{i}), .Y(n{i + 1}));\n  G{i} v{i}(.A(a));\n"
+             for i in range(size)]
+    return ("module t(input a, output y);\n  wire n0 = a;\n" + "".join(cells) +
+            f"  assign y = n{size};\nendmodule\n")
+
+
+def attributes_set_again(size: int) -> str:
+    """Attributes of one instance, each of which is a parameter of another type too."""
+    first = ", ".join(f"P{i} = \"5\"" for i in range(size))
+    again = ", ".join(f".P{i}(5)" for i in range(size))
+    return f"module t(input a);\n  (* {first} *) G #({again}) u(.I(a));\nendmodule\n"
+
+
 class Growth(ToolTest):
     def setUp(self) -> None:
         super().setUp()
@@ -101,6 +128,15 @@ class Growth(ToolTest):
 
     def test_bit_numbers_far_apart_in_many_modules(self) -> None:
         self.check_import(modules_with_distant_bits, 1000)
+
+    def test_netlists_of_cells_that_nothing_declares(self) -> None:
+        for make, size in ((undeclared_gates, 4000), (undeclared_cell_with_pins, 2000),
+                           (undeclared_cells_of_each_kind, 1000)):
+            with self.subTest(make.__name__):
+                self.check(make, size, "import", "--from", "verilog")
+
+    def test_attributes_that_are_parameters_too(self) -> None:
+        self.check(attributes_set_again, 2000, "import", "--from", "verilog", "--attributes")
 
     def test_a_drawn_box_with_many_pins(self) -> None:
         self.check(box_with_pins, 2000, "draw", "-o", "o.svg")

@@ -63,6 +63,19 @@ class Verilog(ToolTest):
                       "Y : out std_logic);", text)
         self.assertIn("u3 : AND2 port map (A=>a(1), B=>n, Y=>q(1));", text)
 
+    def test_command_file(self) -> None:
+        self.write("d.v", DESIGN)
+        done = self.run_tool("import", "d.v", "-o", "d.cmd", "--verilog", "d1.v", "--vhdl", "d1.vhd")
+        self.assertEqual(done.status, SUCCESS, done.err)
+        self.expect(self.run_tool("run", "d.cmd", "--verilog", "d2.v", "--vhdl", "d2.vhd"), SUCCESS)
+        for extension in ("v", "vhd"):
+            first, second = (self.read(f"d{number}.{extension}") for number in (1, 2))
+            self.assertEqual(first, second.replace("d2.", "d1."))
+        # Commands that no command file can say are refused.
+        self.write("e.v", DESIGN.replace("u2(", "\\u.2 ("))
+        self.run_tool("import", "e.v", "-o", "e.cmd")
+        self.expect(self.run_tool("run", "e.cmd", "--verilog", "e1.v"), SUCCESS)
+
     def test_other_extension(self) -> None:
         self.write("d.txt", DESIGN)
         self.expect(self.run_tool("import", "d.txt", "--from", "verilog", "--names", "verilog"),

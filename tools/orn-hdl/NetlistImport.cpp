@@ -1,6 +1,7 @@
 #include "NetlistImport.h"
 
 #include "CellFiles.h"
+#include "CommandsOutput.h"
 #include "NetlistNames.h"
 #include "Output.h"
 #include "Progress.h"
@@ -277,16 +278,20 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
             return Status::Failed;
         }
     }
+    // The name of the netlist that was read is in no output.
+    model_->SetSourceFileName("");
+    // A write changes the design, so the commands come first.
+    CommandsOutput commands(options_.commandFile);
     OutputFile nameMap(options_.nameMap);
     if (Port::Stream* out = nameMap.GetStream()) {
         WriteNetlistNames(*model_->GetNetlist(), renamings, legal ? &*legal : nullptr, *out);
     }
-    Status status = nameMap.Flush();
+    Status status = Worse(commands.Write(*model_), nameMap.Flush());
     if (status == Status::Success) {
         Progress progress(false, options_.file);
         status = WriteOutputs(*model_, options_.outputs, progress, legal ? &*legal : nullptr);
     }
-    return status == Status::Success ? nameMap.Commit() : status;
+    return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
 
 template <class Reader> Status Importer::Read(Reader& reader) {

@@ -723,6 +723,24 @@ void ModuleReader::ReadConnections(const ModuleHead& head, Instance& instance) {
     parser_.Expect(')');
 }
 
+/// The index of a port; `hint` is tried first. Long lists get an index.
+std::size_t ModuleReader::FindPort(const ModuleHead& head, std::string_view name,
+                                   std::size_t hint) {
+    constexpr std::size_t Few = 16;
+    const bool isAtHint = hint < head.ports.size() && head.ports[hint].name == name;
+    if (isAtHint || head.ports.size() <= Few) {
+        return head.FindPort(name, hint);
+    }
+    std::unordered_map<std::string_view, std::size_t>& places = portPlaces_[&head];
+    if (places.empty()) {
+        for (std::size_t i = 0; i < head.ports.size(); ++i) {
+            places.emplace(head.ports[i].name, i);
+        }
+    }
+    const auto found = places.find(name);
+    return found == places.end() ? head.ports.size() : found->second;
+}
+
 /// ".PORT(expression)". \param port where the port is looked for first; becomes where it is.
 void ModuleReader::ReadNamedConnection(const ModuleHead& head, const Instance& instance,
                                        std::size_t& port) {
@@ -735,7 +753,7 @@ void ModuleReader::ReadNamedConnection(const ModuleHead& head, const Instance& i
     if (!parser_.IsName()) {
         parser_.FailExpected("the name of a port");
     }
-    port = head.FindPort(parser_.Get().text, port);
+    port = FindPort(head, parser_.Get().text, port);
     if (port >= pins_.size()) {
         parser_.Fail("the module " + Quoted(head.name) + " has no port " + parser_.Show());
     }

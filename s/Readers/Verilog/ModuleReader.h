@@ -75,6 +75,7 @@ private:
     void ReadOverrides(const ModuleHead& head);
     void ReadOneInstance(ModuleHead& head);
     void ReadConnections(const ModuleHead& head, Instance& instance);
+    std::size_t FindPort(const ModuleHead& head, std::string_view name, std::size_t hint);
     void ReadNamedConnection(const ModuleHead& head, const Instance& instance, std::size_t& port);
     void ReadImplicitConnection(const ModuleHead& head, const Instance& instance, std::size_t port);
     void Connect(const ModuleHead& head, const Instance& instance, std::size_t port);
@@ -96,6 +97,8 @@ private:
     std::vector<EarlyOverride> earlyOverrides_;
     std::map<const Component*, ModuleHead*> headsOfComponents_;
     std::unordered_map<const Component*, std::vector<Assumed>> assumed_;
+    std::unordered_map<const ModuleHead*, std::unordered_map<std::string_view, std::size_t>>
+        portPlaces_;
     /// Room that is kept between statements.
     std::vector<Override> overrides_;
     std::vector<Pin*> pins_;

@@ -1,5 +1,6 @@
 #include "Readers/Verilog/UndeclaredReader.h"
 
+#include "Readers/Limits.h"
 #include "Readers/Verilog/Literals.h"
 
 #include <cstdlib>
@@ -8,10 +9,6 @@
 namespace Orn_Hdl::Readers {
 
 namespace {
-
-constexpr std::size_t DeepestExpression = 500;
-/// The widest port that connections can give.
-constexpr std::uint64_t MostBits = 1'048'576;
 
 /// Nothing for a width that no port gets from a connection.
 std::optional<std::uint64_t> Limited(std::uint64_t width) {
