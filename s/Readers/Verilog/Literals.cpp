@@ -1,5 +1,6 @@
 #include "Readers/Verilog/Literals.h"
 
+#include "Readers/Limits.h"
 #include "Readers/Verilog/Characters.h"
 
 #include <algorithm>
@@ -10,8 +11,6 @@ namespace Orn_Hdl::Readers {
 
 namespace {
 
-constexpr std::uint32_t MostBits = 1'048'576;
-constexpr std::size_t MostDecimalDigits = 300;
 constexpr std::uint32_t UnsizedWidth = 32;
 
 std::string WithoutBlanks(std::string_view text) {

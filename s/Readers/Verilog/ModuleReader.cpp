@@ -10,10 +10,6 @@ constexpr const char* Seen = "SYN";
 constexpr const char* Hidden = "NOSYN";
 constexpr std::string_view InitName = "INIT";
 
-bool IsDirection(Keyword keyword) {
-    return keyword == Keyword::Input || keyword == Keyword::Output || keyword == Keyword::Inout;
-}
-
 } // namespace
 
 bool IsVerilogKeyword(std::string_view name) {

@@ -1,6 +1,7 @@
 #include "Readers/Vhdl/Literals.h"
 
 #include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Place.h"
 
 #include <algorithm>
@@ -10,9 +11,6 @@
 namespace Orn_Hdl::Readers::Vhdl {
 
 namespace {
-
-constexpr std::size_t MostBits = 1'048'576;
-constexpr std::size_t MostDecimalDigits = 300;
 
 std::string WithoutUnderscores(std::string_view text) {
     std::string result(text);
