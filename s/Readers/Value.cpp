@@ -69,6 +69,22 @@ Value Value::OfBits(const std::string& bits) {
     return {Attribute::BitVector, MakeConstant(bits, false), {}};
 }
 
+Value Value::GetZero() const {
+    switch (type) {
+    case Attribute::Integer:
+    case Attribute::Bit:
+        return {type, "0", {}};
+    case Attribute::Float:
+        return {type, "0.0", {}};
+    case Attribute::BitVector: {
+        const int length = BitVectorValue(text.c_str()).GetLength();
+        return OfBits(std::string(static_cast<std::size_t>(length), '0'));
+    }
+    default:
+        return {type, "", {}};
+    }
+}
+
 std::unique_ptr<Attribute> Value::MakeAttribute(const char* name) const {
     switch (type) {
     case Attribute::Integer:

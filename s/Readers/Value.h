@@ -23,6 +23,8 @@ struct Value {
     std::string userType;
 
     static Value OfBits(const std::string& bits);
+    /// A value of the same type and width: 0, or an empty string.
+    Value GetZero() const;
 
     /// Makes an attribute of the type that has the value.
     std::unique_ptr<Attribute> MakeAttribute(const char* name) const;

@@ -175,4 +175,11 @@ TEST(VerilogNames, OfNetsThatConstantsMakeGiveWay) {
     }
 }
 
+TEST(VerilogNames, ANameThatAnotherOneWasReplacedByCanBeDeclared) {
+    TextReader text;
+    text.Read("module m; wire \\a.b ; wire a_b; assign a_b = \\a.b ; endmodule");
+    EXPECT_NE(text.Write().find("assign a_b_2 = a_b;"), std::string::npos);
+    EXPECT_NE(text.GetFailure("module m; wire \\a.b , c; assign c = a_b; endmodule"), "");
+}
+
 } // namespace

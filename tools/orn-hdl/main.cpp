@@ -82,6 +82,13 @@ void AddWriteRules(CLI::App& command, Tool::WriteRules& rules) {
         ->excludes(folder);
 }
 
+/// An option that may be repeated, with one value each time.
+CLI::Option* AddRepeated(CLI::App& command, const std::string& option,
+                         std::vector<std::string>& values, const std::string& help) {
+    const auto add = [&values](const std::string& value) { values.push_back(value); };
+    return command.add_option_function<std::string>(option, add, help)->trigger_on_parse();
+}
+
 /// An option whose value is one of a few words.
 template <class Value>
 void AddChoice(CLI::App& command, const std::string& option, Value& value,
@@ -310,6 +317,8 @@ private:
         AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
+        AddFile(command, "--output-commands", run_.commandFile,
+                "Write the commands of the final design; - is standard output");
         AddWriteRules(command, run_.writeRules);
         CLI::Option* keepGoing =
             command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
@@ -336,19 +345,28 @@ private:
     }
 
     void AddImport() {
-        CLI::App& command = AddCommand("import", "Import a JSON netlist written by Yosys",
+        CLI::App& command = AddCommand("import", "Import a netlist in Verilog, VHDL or JSON",
                                        [this] { return Tool::ImportDesign(import_); });
-        AddFile(command, "FILE", import_.file, "The JSON file; - is standard input")->required();
+        AddFile(command, "FILE", import_.file, "The netlist; - is standard input")->required();
+        AddChoice<std::optional<Tool::ImportFormat>>(
+            command, "--from", import_.format,
+            {{"verilog", Tool::ImportFormat::Verilog},
+             {"vhdl", Tool::ImportFormat::Vhdl},
+             {"json", Tool::ImportFormat::Json}},
+            "What the netlist is written in; the default is what its extension says");
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
-        const auto addCells = [this](const std::string& file) { import_.cells.push_back(file); };
-        command
-            .add_option_function<std::string>(
-                "--cells", addCells, "Read cell types: Verilog, JSON or Liberty; may be repeated")
+        AddRepeated(command, "-l,--library,--cells", import_.libraries,
+                    "Read cell types: Verilog, VHDL, Liberty or JSON; may be repeated")
             ->type_name("FILE")
-            ->trigger_on_parse()
             ->check(CheckFileName);
+        AddRepeated(command, "-I", import_.includeFolders,
+                    "Look for files that Verilog includes; may be repeated")
+            ->type_name("DIR")
+            ->check(CheckFileName);
+        AddRepeated(command, "-D", import_.macros, "Define a macro for Verilog; may be repeated")
+            ->type_name("NAME[=TEXT]");
         const auto setNames = [this](const std::string& word) {
             import_.names = GetNameLanguages().at(word);
         };
@@ -363,6 +381,7 @@ private:
             ->check(CheckDigit);
         command.add_flag("--attributes", import_.attributes,
                          "Import the attributes of cells and nets");
+        command.add_flag("--comments", import_.comments, "Import the comments of objects");
         command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddReport(command, import_.report);

@@ -11,6 +11,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace Orn_Hdl::Readers {
@@ -32,6 +33,11 @@ private:
         std::string name;
         Value value;
         Place place;
+    };
+    /// A parameter of a component whose default is not known, and the one that is declared.
+    struct Assumed {
+        std::string name;
+        Value value;
     };
     /// A defparam statement in front of its instance.
     struct EarlyOverride {
@@ -74,7 +80,9 @@ private:
     void Connect(const ModuleHead& head, const Instance& instance, std::size_t port);
     void SetParameter(Instance& instance, const ModuleHead& head, const Override& override,
                       bool isHidden);
-    void DeclareGeneric(const ModuleHead& head, const std::string& name, bool isHidden);
+    bool DeclareGeneric(const ModuleHead& head, const std::string& name, const Value& value,
+                        bool isHidden);
+    void LeaveOutAssumed();
     ModuleHead* FindHead(const Instance& instance) const;
     void SetEarlyOverrides();
 
@@ -87,6 +95,7 @@ private:
     ExpressionReader expressions_;
     std::vector<EarlyOverride> earlyOverrides_;
     std::map<const Component*, ModuleHead*> headsOfComponents_;
+    std::unordered_map<const Component*, std::vector<Assumed>> assumed_;
     /// Room that is kept between statements.
     std::vector<Override> overrides_;
     std::vector<Pin*> pins_;

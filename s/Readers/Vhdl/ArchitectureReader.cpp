@@ -347,10 +347,9 @@ void ArchitectureReader::ReadNamedAssignment(const std::string& name, const Plac
         parser_.Fail(place, "the procedure " + Quoted(name) + std::string(SynthesiseFirst));
     }
     if (parser_.IsSign('(')) {
-        const Place selectionPlace = parser_.Get().place;
         selection = expressions_.ReadSelection();
         if (!selection) {
-            parser_.Fail(selectionPlace, "an index whose value cannot be told");
+            expressions_.RefuseIndex(name, place);
         }
     }
     expressions_.ReadBehind(target_, name, selection ? &*selection : nullptr, place);

@@ -387,12 +387,19 @@ bool ExpressionReader::ReadName(const Shape* shape) {
     if (parser_.IsSign('(')) {
         selection = ReadSelection();
         if (!selection) {
-            parser_.Fail(place, "the function " + Quoted(name) + std::string(SynthesiseFirst));
+            RefuseIndex(name, place);
         }
     }
     const bool isVector = AddNamed(name, selection ? &*selection : nullptr, place);
     name_.swap(name);
     return isVector;
+}
+
+void ExpressionReader::RefuseIndex(const std::string& name, const Place& place) const {
+    if (maker_.FindSignal(name) != nullptr || IsDeclared(name)) {
+        parser_.Fail(place, "an index of " + Quoted(name) + " whose value cannot be told");
+    }
+    parser_.Fail(place, "the function " + Quoted(name) + std::string(SynthesiseFirst));
 }
 
 std::optional<ExpressionReader::Selection> ExpressionReader::ReadSelection() {

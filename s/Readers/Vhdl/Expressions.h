@@ -80,6 +80,8 @@ public:
     /// Reads the parentheses behind a name.
     /// \return nothing when they hold something else than indices.
     std::optional<Selection> ReadSelection();
+    /// Refuses what stands in the parentheses behind a name, which is no index.
+    [[noreturn]] void RefuseIndex(const std::string& name, const Place& place) const;
     /// The range that is selected of a whole one, which has to have it.
     Range CheckSelection(const Selection& selection, const Range& whole,
                          std::string_view name) const;

@@ -302,6 +302,9 @@ std::optional<std::int64_t> HeadReader::Resolve(const ModuleHead& head, std::str
 void HeadReader::ReadPorts(ModuleHead& head) {
     parser_.Next();
     parser_.Expect('(');
+    if (parser_.IsSign(')')) {
+        parser_.Fail("an empty list of ports, which VHDL does not have: leave it out");
+    }
     do {
         ReadPort(head);
     } while (parser_.Accept(';'));

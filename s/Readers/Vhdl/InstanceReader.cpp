@@ -16,6 +16,11 @@ constexpr const char* Hidden = "NOSYN";
 constexpr std::string_view InitName = "INIT";
 constexpr std::string_view InitMark = "MHALVEX";
 
+/// Whether a name can be a value of the type.
+bool IsEnumeration(std::string_view typeName) {
+    return !IsKnownType(typeName) || Port::EqualIgnoringCase(typeName, "boolean");
+}
+
 const char* OptionOf(bool isHidden) noexcept {
     return isHidden ? Hidden : Seen;
 }
@@ -217,6 +222,11 @@ void InstanceReader::ReadGenericMap(ModuleHead& head, Instance& instance) {
                                         " has no further generic that this could be the value of");
             }
             parameter = &head.parameters[position++];
+            if (!name.empty() && entity_.FindParameter(name) == nullptr &&
+                !expressions_.IsDeclared(name) && !IsEnumeration(parameter->typeName)) {
+                parser_.Fail(place, "the component " + Quoted(head.name) + " has no generic " +
+                                        Quoted(name));
+            }
             name = parameter->name;
         }
         if (!parser_.Accept(Keyword::Open)) {

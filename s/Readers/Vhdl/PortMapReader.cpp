@@ -58,8 +58,7 @@ void PortMapReader::ReadAssociation() {
         if (parser_.IsSign('(')) {
             selection = expressions_.ReadSelection();
             if (!selection) {
-                parser_.Fail(place, "a conversion or function that begins with " + Quoted(name_) +
-                                        ": a model's pins are connected to signals");
+                expressions_.RefuseIndex(name_, place);
             }
         }
         if (parser_.Accept(Arrow)) {
@@ -167,19 +166,19 @@ void PortMapReader::EndPort() {
     const auto positionOf = [&whole](const Part& part) {
         return std::abs(std::int64_t(part.range.left) - whole.left);
     };
-    std::sort(parts_.begin(), parts_.end(), [&positionOf](const Part& a, const Part& b) {
+    std::stable_sort(parts_.begin(), parts_.end(), [&positionOf](const Part& a, const Part& b) {
         return positionOf(a) < positionOf(b);
     });
     value_.Clear(parts_.front().place);
     value_.isVector = true;
+    std::uint64_t end = 0;
     for (Part& part : parts_) {
-        if (static_cast<std::uint64_t>(positionOf(part)) < value_.width) {
+        const auto begin = static_cast<std::uint64_t>(positionOf(part));
+        if (begin < end) {
             parser_.Fail(part.place,
                          "a part of the port " + Quoted(port.name) + " is connected twice");
         }
-        if (static_cast<std::uint64_t>(positionOf(part)) > value_.width) {
-            break;
-        }
+        end = begin + part.range.GetWidth();
         value_.width += part.range.GetWidth();
         std::move(part.pieces.begin(), part.pieces.end(), std::back_inserter(value_.pieces));
     }

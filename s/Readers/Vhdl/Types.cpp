@@ -177,6 +177,10 @@ bool IsBitType(std::string_view name) noexcept {
     return IsOneOf(name, BitTypes);
 }
 
+bool IsKnownType(std::string_view name) {
+    return TypeOf(name).has_value();
+}
+
 std::string GetTypeName(const Attribute& attribute) {
     switch (attribute.GetValueType()) {
     case Attribute::String:

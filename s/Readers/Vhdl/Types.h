@@ -25,6 +25,8 @@ bool IsVectorType(std::string_view name) noexcept;
 /// Whether a name is that of a type of one bit.
 bool IsBitType(std::string_view name) noexcept;
 
+/// Whether an attribute of a model has the type of that name.
+bool IsKnownType(std::string_view name);
 /// The name of the type of a generic that an attribute is.
 std::string GetTypeName(const Attribute& attribute);
 

@@ -34,9 +34,8 @@ constexpr Signature Signatures[] = {
 };
 
 constexpr string_view IsVerilog =
-    "this looks like Verilog; orn-hdl import reads what Yosys makes of it (write_json)";
-constexpr string_view IsVhdl =
-    "this looks like VHDL; orn-hdl import reads what Yosys makes of it (write_json)";
+    "this looks like Verilog; orn-hdl import --from verilog reads netlists";
+constexpr string_view IsVhdl = "this looks like VHDL; orn-hdl import --from vhdl reads netlists";
 constexpr string_view IsJson = "this looks like JSON; use orn-hdl import";
 
 /// The first words of files in other languages.
