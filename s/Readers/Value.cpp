@@ -1,5 +1,7 @@
 #include "Readers/Value.h"
 
+#include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Place.h"
 
 #include <algorithm>
@@ -26,6 +28,33 @@ void Replace(AttributeHolder& holder, Attribute* present, std::unique_ptr<Attrib
 }
 
 } // namespace
+
+std::string DecimalBits(std::string digits) {
+    if (digits.size() > MostDecimalDigits) {
+        throw LiteralProblem{"a decimal number of more than " + std::to_string(MostDecimalDigits) +
+                             " digits"};
+    }
+    std::string bits;
+    while (!digits.empty()) {
+        int remainder = 0;
+        std::string half;
+        for (const char digit : digits) {
+            if (!Port::IsDigit(digit)) {
+                throw LiteralProblem{std::string("the digit ") + digit + " in a decimal number"};
+            }
+            const int present = remainder * 10 + (digit - '0');
+            remainder = present % 2;
+            if (!half.empty() || present > 1) {
+                half += static_cast<char>('0' + present / 2);
+            }
+        }
+        bits += static_cast<char>('0' + remainder);
+        digits = std::move(half);
+    }
+    std::reverse(bits.begin(), bits.end());
+    bits.erase(0, std::min(bits.find('1'), bits.size()));
+    return bits;
+}
 
 std::string WithoutExponent(const std::string& text) {
     const std::size_t e = text.find_first_of("eE");

@@ -33,6 +33,10 @@ struct Value {
 /// The constant of a model with these bits: "4:B:1010", or "1" for one bit when `isBare`.
 std::string MakeConstant(const std::string& bits, bool isBare);
 
+/// The bits of a decimal number, leftmost first, without zeros in front.
+/// \throws LiteralProblem for a character that is no digit, and for too many.
+std::string DecimalBits(std::string digits);
+
 /// A real number without an exponent: a model keeps as many decimals as the text has.
 /// \throws LiteralProblem.
 std::string WithoutExponent(const std::string& text);
