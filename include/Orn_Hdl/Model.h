@@ -30,6 +30,7 @@ namespace Orn_Hdl {
 class CommandFactory;
 class CommandManager;
 class Engine;
+class OutStream;
 
 /// Decides which files the write commands of a model may write, for programs that run command files
 /// they do not trust.
@@ -116,6 +117,25 @@ public:
     /// \return false when the file cannot be opened or read; otherwise true, since no line fails
     ///         without an exception.
     bool Read(const Port::TextArgument& fileName);
+    /// Writes the commands from which the design and its options come, one a line. The lines depend
+    /// on the state of the model alone, not on how it came to it. A fresh model that executes them
+    /// writes the same Verilog and VHDL as this one, and these lines again.
+    ///
+    /// No command makes the dummy signals of a write, so these are declared as signals like any
+    /// others, and have in the lines what the next write would hand over to them. Where a compound
+    /// has them as members, or a bus has new slices or bits since, the netlists of both models have
+    /// the same assignments, but may have them in another order.
+    ///
+    /// Options that no command sets, such as `HdlOptions::legal`, are not in the lines.
+    /// \param out must be at indent level 0.
+    /// \throws Exception "No command can express ...\n" for what only calls can make, such as an
+    ///         instance without a component, and for names that the lines of commands cannot have,
+    ///         such as one with a line feed. Nothing is written then.
+    void WriteCommands(OutStream& out) const;
+    /// Writes the commands to a file, which takes the place of an existing one when it is complete.
+    /// \return false when the file cannot be written.
+    /// \throws Exception as the overload for a stream does; the file is not touched then.
+    bool WriteCommands(const Port::TextArgument& fileName) const;
     /// Clears the modified flag and returns true; done commands are kept in memory only.
     bool Write(const Port::TextArgument& fileName);
 

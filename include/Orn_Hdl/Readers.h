@@ -4,8 +4,10 @@
 
 #include "Port/Export.h"
 
+#include <functional>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -23,12 +25,31 @@ enum class ReaderNames {
     Literal
 };
 
+/// What becomes of an instance of a module that no file declares.
+enum class ReaderUndeclared {
+    /// It is an error.
+    Refuse,
+    /// The module gets the ports that its instances connect by name, as wide as what is connected
+    /// to them. A net that has a driver makes a port an input; a net that has none, and that
+    /// something reads, makes the only port of unknown direction an output. It is an error when
+    /// directions are left, or contradict each other: the message lists the modules that a library
+    /// has to declare.
+    Infer
+};
+
 /// A name of a file that the model does not have.
 struct ReaderRenaming {
+    /// What has the name. A port is a signal.
+    enum class Kind { Module, Component, Pin, Signal, Instance };
+
     /// The name in the file.
     std::string name;
     /// The name in the model.
     std::string newName;
+    /// What has the name.
+    Kind kind = Kind::Signal;
+    /// Of a pin, the name of its component in the model.
+    std::string component = {};
 };
 
 /// Reads one module of a structural Verilog netlist (IEEE 1364-2005, and what of IEEE 1800 appears
@@ -63,9 +84,11 @@ public:
     using Names = ReaderNames;
     /// A name of the file that the model does not have, without the backslash of an escaped one.
     using Renaming = ReaderRenaming;
+    /// What becomes of instances of modules that no file declares.
+    using Undeclared = ReaderUndeclared;
 
     /// A reader that reads the only module that is not instantiated, keeps attributes and no
-    /// comments, follows include directives and makes names simple.
+    /// comments, follows include directives, makes names simple and refuses undeclared modules.
     VerilogReader();
     VerilogReader(const VerilogReader&) = delete;
     VerilogReader& operator=(const VerilogReader&) = delete;
@@ -90,6 +113,12 @@ public:
     void SetIncludes(Includes includes) noexcept;
     /// Sets what becomes of names that are not simple.
     void SetNames(Names names) noexcept;
+    /// Sets which simple names stay; the others are replaced too, by names with a number, so that a
+    /// design can keep clear of the reserved words of another language.
+    /// \param keeps called with names of modules, ports, nets and instances; empty for all.
+    void SetKeptNames(std::function<bool(std::string_view name)> keeps);
+    /// Sets what becomes of instances of modules that no file declares.
+    void SetUndeclared(Undeclared undeclared) noexcept;
     /// Whether comments in front of the module, a declaration or an instance become comments of the
     /// objects.
     void KeepComments(bool keep) noexcept;
@@ -157,12 +186,21 @@ public:
     void AddLibrary(const Netlist& netlist);
     /// Sets what becomes of names that are not simple.
     void SetNames(Names names) noexcept;
+    /// Sets which simple names stay; the others are replaced too, by names with a number, so that a
+    /// design can keep clear of the reserved words of another language.
+    /// \param keeps called with names of entities, ports, signals and instances; empty for all.
+    void SetKeptNames(std::function<bool(std::string_view name)> keeps);
     /// Whether comments in front of the entity, a declaration or an instance become comments of the
     /// objects.
     void KeepComments(bool keep) noexcept;
     /// Whether attribute specifications become attributes of the objects.
     void KeepAttributes(bool keep) noexcept;
 
+    /// Adds the components that a file declares to a netlist, as a library for a reader: its
+    /// entities, and the component declarations in its packages. What no netlist can have, and what
+    /// the netlist has already, is left out.
+    /// \throws Exception, the netlist unchanged, when the file cannot be read or holds an error.
+    static void ReadComponents(const char* fileName, Netlist& netlist);
     /// Reads a file. What the model's netlist held before is destroyed. The model's name becomes
     /// the entity's and its source file the file. The VHDL options of the model become those with
     /// which the file could have been written: its library and use clauses, whether it declares

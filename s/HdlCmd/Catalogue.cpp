@@ -189,6 +189,15 @@ std::span<const RegisteredCommand> GetRegisteredCommands() noexcept {
     return RegisteredCommandsOf<Catalogue>;
 }
 
+std::string_view GetPhrase(CommandExecution execute) noexcept {
+    for (const CommandEntry& entry : Catalogue) {
+        if (entry.execute == execute) {
+            return entry.info.phrase;
+        }
+    }
+    return {};
+}
+
 Model& RequireModel(Model* model) {
     if (model == nullptr) {
         Fail(CommandUnit, __LINE__, "Missing Model.\n");

@@ -41,11 +41,11 @@ std::optional<string_view> GetOptionValue(string_view text, string_view prefix) 
 
 bool ParseNameKind(string_view text, string_view signalWord, Arguments& arguments) {
     arguments.Set({});
-    if (Port::EqualIgnoringCase(text, "instance")) {
+    if (Port::EqualIgnoringCase(text, NameKindWords::Instance)) {
         arguments.Raise(NameKind::Instance);
     } else if (Port::EqualIgnoringCase(text, signalWord)) {
         arguments.Raise(NameKind::Signal);
-    } else if (Port::EqualIgnoringCase(text, "component")) {
+    } else if (Port::EqualIgnoringCase(text, NameKindWords::Component)) {
         arguments.Raise(NameKind::Component);
     } else {
         return false;
@@ -156,12 +156,11 @@ bool ParseWrite(const StringArray& tokens, Arguments& arguments) {
 }
 
 bool ParseUppercase(const StringArray& tokens, Arguments& arguments) {
-    // The misspelling is part of the command language.
-    return ParseNameKind(tokens.GetView(1), "siganl", arguments);
+    return ParseNameKind(tokens.GetView(1), NameKindWords::SignalInUppercase, arguments);
 }
 
 bool ParseLowercase(const StringArray& tokens, Arguments& arguments) {
-    return ParseNameKind(tokens.GetView(1), "signal", arguments);
+    return ParseNameKind(tokens.GetView(1), NameKindWords::SignalInLowercase, arguments);
 }
 
 bool ParseOwnerComment(const StringArray& tokens, Arguments& arguments) {
@@ -186,7 +185,7 @@ bool ParseFlagAt(const StringArray& tokens, int position, Arguments& arguments) 
 bool ParseAddAttributeOf(const StringArray& tokens, AttributeOwner owner, Arguments& arguments) {
     const OwnerNames names(tokens, owner, OwnerPosition(owner, 1));
     int position = AttributePosition(owner, 1);
-    const auto type = GetOptionValue(tokens.GetView(position), "-TYPE=");
+    const auto type = GetOptionValue(tokens.GetView(position), AttributeOptionPrefixes::Type);
     if (type) {
         ++position;
     }
@@ -213,9 +212,10 @@ bool ParseAttributeOptionsOf(const StringArray& tokens, AttributeOwner owner,
     std::optional<string_view> synAttr;
     const int last = tokens.GetSize() - 1;
     for (int i = position + 1; i <= position + 2 && i <= last; ++i) {
-        if (const auto value = GetOptionValue(tokens.GetView(i), "-GENERIC=")) {
+        const string_view option = tokens.GetView(i);
+        if (const auto value = GetOptionValue(option, AttributeOptionPrefixes::Generic)) {
             generic = value;
-        } else if (const auto other = GetOptionValue(tokens.GetView(i), "-SYNATTR=")) {
+        } else if (const auto other = GetOptionValue(option, AttributeOptionPrefixes::SynAttr)) {
             synAttr = other;
         } else {
             return false;

@@ -26,6 +26,22 @@ enum class AttributeOptionFlag { Generic, SynAttr };
 /// The kinds of names whose letter case UPPERCASE and LOWERCASE choose.
 enum class NameKind { Instance, Signal, Component };
 
+/// The words of UPPERCASE and LOWERCASE for the kinds of names. The misspelling is part of the
+/// command language.
+namespace NameKindWords {
+constexpr std::string_view Instance = "instance";
+constexpr std::string_view Component = "component";
+constexpr std::string_view SignalInUppercase = "siganl";
+constexpr std::string_view SignalInLowercase = "signal";
+} // namespace NameKindWords
+
+/// What the options of the attribute commands begin with.
+namespace AttributeOptionPrefixes {
+constexpr std::string_view Type = "-TYPE=";
+constexpr std::string_view Generic = "-GENERIC=";
+constexpr std::string_view SynAttr = "-SYNATTR=";
+} // namespace AttributeOptionPrefixes
+
 /// What has the attributes that a command is about: the module, which takes no name, an object with
 /// a name of its own, or a pin, which its line names as "owner.pin".
 enum class AttributeOwner { Module, Object, Pin };

@@ -2,8 +2,10 @@
 // files beside this one.
 #include "Orn_Hdl/Model.h"
 
+#include "HdlCmd/Script/CommandScript.h"
 #include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/Commands.h"
+#include "Orn_Hdl/Streams.h"
 
 #include <memory>
 #include <utility>
@@ -128,6 +130,20 @@ bool Model::Read(const Port::TextArgument& fileName) {
     }
     SetModifiedFlag(false);
     return reader.GetError() == 0;
+}
+
+void Model::WriteCommands(OutStream& out) const {
+    WriteCommandScript(implementation_->netlist, implementation_->options, out);
+}
+
+bool Model::WriteCommands(const Port::TextArgument& fileName) const {
+    TextFileOutStream out(fileName.Get(), TextFileOutStream::Replace);
+    if (!out.IsOpen()) {
+        return false;
+    }
+    WriteCommands(out);
+    out.Close();
+    return out.GetError() == 0;
 }
 
 bool Model::Write(const Port::TextArgument& /*fileName*/) {

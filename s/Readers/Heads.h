@@ -27,6 +27,8 @@ struct PortHead {
     int direction = Polarity::Invalid;
     /// Nothing for a port of one bit.
     std::optional<Range> range;
+    /// Whether the range is known. That of a port of an undeclared module may not be.
+    bool hasWidth = true;
     /// Whether the port has a value of its own when nothing is connected to it.
     bool hasDefault = false;
     /// Why no model can have the port; empty when one can.
@@ -73,6 +75,8 @@ struct ModuleHead {
     bool isPrimitive = false;
     /// Whether the module may be the one to read when none is named.
     bool canBeTop = false;
+    /// Whether a file declares the module. Otherwise its ports are those that connections name.
+    bool isDeclared = true;
     /// Whether all parameters are known.
     bool hasParameters = true;
     std::vector<PortHead> ports;

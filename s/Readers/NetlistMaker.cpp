@@ -41,7 +41,8 @@ bool IsSimple(std::string_view name) {
     return true;
 }
 
-std::string MakeSimple(std::string_view name) {
+/// \param initial stands in front of a name that would begin with a digit or be empty.
+std::string MakeSimple(std::string_view name, char initial) {
     std::string result;
     for (const char c : name) {
         if (Port::IsLetter(c) || Port::IsDigit(c)) {
@@ -54,7 +55,7 @@ std::string MakeSimple(std::string_view name) {
         result.pop_back();
     }
     if (result.empty() || Port::IsDigit(result.front())) {
-        result.insert(0, "n");
+        result.insert(result.begin(), initial);
     }
     return result;
 }
@@ -108,10 +109,14 @@ bool NetlistMaker::MayBeEscaped(std::string_view name) const noexcept {
 
 void NetlistMaker::SetName(const std::string& name) {
     const std::string& plain = Plain(name);
-    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false, MayBeEscaped(name));
-    const std::string newName = isKept ? plain : MakeSimple(plain);
+    const bool isEscaped = MayBeEscaped(name);
+    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false, isEscaped);
+    std::string newName = isKept ? plain : MakeSimple(plain, 'm');
+    if (!isKept && !CanKeep(newName, false, isEscaped)) {
+        newName = MakeUnique(newName);
+    }
     if (!isKept) {
-        renamings_.push_back({name, newName});
+        renamings_.push_back({name, newName, ReaderRenaming::Kind::Module});
     }
     netlist_.SetName(newName.c_str());
 }
@@ -121,6 +126,9 @@ void NetlistMaker::SetName(const std::string& name) {
 bool NetlistMaker::CanKeep(std::string_view name, bool isBus, bool isEscaped) const {
     const bool isLiteral = names_ == ReaderNames::Literal;
     if (!isLiteral && IsOpenWord(name)) {
+        return false;
+    }
+    if (!isLiteral && rules_.keeps && !rules_.keeps(name)) {
         return false;
     }
     if (IsSimple(name)) {
@@ -155,9 +163,14 @@ const std::string* NetlistMaker::FindRenamed(std::string_view name) const {
 
 std::string NetlistMaker::MakeUnique(const std::string& name) {
     unsigned& suffix = lastSuffixes_.try_emplace(name, 1).first->second;
-    for (;;) {
+    // A caller that keeps no name at all gets one that it would not keep.
+    constexpr int MostRefused = 100;
+    for (int refused = 0;;) {
         std::string unique = name + "_" + std::to_string(++suffix);
-        if (!IsTaken(unique)) {
+        if (IsTaken(unique)) {
+            continue;
+        }
+        if (refused++ >= MostRefused || CanKeep(unique, false)) {
             return unique;
         }
     }
@@ -169,8 +182,9 @@ bool NetlistMaker::IsDeclared(const std::string& name, bool isTaken) const {
            (isTaken && (FindSignal(name) != nullptr || FindInstance(name) != nullptr));
 }
 
-void NetlistMaker::AddRenaming(const std::string& name, const std::string& newName) {
-    renamings_.push_back({name, newName});
+void NetlistMaker::AddRenaming(const std::string& name, const std::string& newName,
+                               ReaderRenaming::Kind kind) {
+    renamings_.push_back({name, newName, kind});
     renamed_.insert(static_cast<std::uint32_t>(renamings_.size() - 1));
     newNames_.insert(InSmallLetters(newName));
 }
@@ -179,7 +193,8 @@ bool NetlistMaker::IsRenamedTo(std::string_view newName) const {
     return !newNames_.empty() && newNames_.find(InSmallLetters(newName)) != newNames_.end();
 }
 
-const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken) {
+const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken,
+                                          ReaderRenaming::Kind kind) {
     const std::string& plain = Plain(name);
     const bool isBasic = &plain == &name;
     if (!isTaken && CanKeep(plain, isBus, MayBeEscaped(name))) {
@@ -189,15 +204,17 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
         newName_ = plain;
         if (IsSimple(plain)) {
             // The file may have this name without backslashes too, and mean another object.
-            AddRenaming(name, newName_);
+            AddRenaming(name, newName_, kind);
         }
         return newName_;
     }
-    newName_ = IsSimple(plain) ? plain : MakeSimple(plain);
+    newName_ = IsSimple(plain) && CanKeep(plain, isBus)
+                   ? plain
+                   : MakeSimple(plain, kind == ReaderRenaming::Kind::Instance ? 'u' : 'n');
     if (!CanKeep(newName_, isBus) || IsTaken(newName_)) {
         newName_ = MakeUnique(newName_);
     }
-    AddRenaming(name, newName_);
+    AddRenaming(name, newName_, kind);
     return newName_;
 }
 
@@ -206,7 +223,8 @@ Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional
     if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
-    const std::string& newName = MakeName(name, range.has_value(), isTaken);
+    const std::string& newName =
+        MakeName(name, range.has_value(), isTaken, ReaderRenaming::Kind::Signal);
     Signal* signal = nullptr;
     if (range) {
         text_ = newName;
@@ -224,7 +242,8 @@ Instance* NetlistMaker::AddInstance(const std::string& name, const Component& co
     if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
-    auto instance = MakePacked<Instance>(MakeName(name, false, isTaken).c_str(), &component);
+    auto instance = MakePacked<Instance>(
+        MakeName(name, false, isTaken, ReaderRenaming::Kind::Instance).c_str(), &component);
     Instance* const added = instance.get();
     netlist_.Add(instance.release());
     return added;
@@ -396,7 +415,7 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         return "a model does not tell it from another component, whose name differs in letter case "
                "alone";
     }
-    std::string name = canKeep ? plain : MakeSimple(plain);
+    std::string name = canKeep ? plain : MakeSimple(plain, 'c');
     if (!CanKeep(name, false) || IsTaken(name)) {
         name = MakeUnique(name);
     }
@@ -406,11 +425,34 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
         return problem;
     }
     if (name != head.name) {
-        renamings_.push_back({head.name, name});
+        renamings_.push_back({head.name, name, ReaderRenaming::Kind::Component});
     }
     head.component = component.get();
     netlist_.Add(component.release());
     return "";
+}
+
+/// The name without a range of the pin that is made of a port.
+std::string NetlistMaker::MakePinName(const PortHead& port, const ModuleHead& head,
+                                      const Component& component) const {
+    const bool isBus = port.range.has_value();
+    const std::string& plain = Plain(port.name);
+    if (CanKeep(plain, isBus, MayBeEscaped(port.name))) {
+        return plain;
+    }
+    const std::string similar = MakeSimple(plain, 'p');
+    std::string name = similar;
+    constexpr unsigned Most = 100;
+    for (unsigned suffix = 2; suffix < Most; ++suffix) {
+        // Those that follow keep their names.
+        const std::size_t same = head.FindPort(name, 0);
+        if (CanKeep(name, isBus) && component.GetPin(name.c_str()) == nullptr &&
+            (same == head.ports.size() || &head.ports[same] == &port)) {
+            return name;
+        }
+        name = similar + "_" + std::to_string(suffix);
+    }
+    return similar;
 }
 
 std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component) {
@@ -418,12 +460,10 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
         if (!port.problem.empty()) {
             return "of its port " + Quoted(port.name) + ": " + port.problem;
         }
-        if (!Polarity::IsValidValue(port.direction)) {
+        if (head.isDeclared && !Polarity::IsValidValue(port.direction)) {
             return "its port " + Quoted(port.name) + " has no direction";
         }
-        const std::string& plain = Plain(port.name);
-        const bool canKeep = CanKeep(plain, port.range.has_value(), MayBeEscaped(port.name));
-        std::string name = canKeep ? plain : MakeSimple(plain);
+        std::string name = MakePinName(port, head, component);
         const std::string base = name;
         if (port.range) {
             AppendRange(name, *port.range);
@@ -434,7 +474,8 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
                    " is one that a model does not tell from another one";
         }
         if (base != port.name) {
-            renamings_.push_back({port.name, base});
+            renamings_.push_back(
+                {port.name, base, ReaderRenaming::Kind::Pin, std::string(component.GetNameView())});
         }
         component.AddPin(name.c_str(), Polarity(port.direction), "");
     }

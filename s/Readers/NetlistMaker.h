@@ -27,6 +27,8 @@ struct NameRules {
     bool allowsDollar = true;
     /// Tells which names need an escape.
     bool (*isReserved)(std::string_view name) = nullptr;
+    /// Tells which simple names stay; empty when all do.
+    std::function<bool(std::string_view name)> keeps = {};
 };
 
 /// A net, a part of one, or constant bits.
@@ -114,8 +116,12 @@ private:
     const std::string* FindRenamed(std::string_view name) const;
     std::string MakeUnique(const std::string& name);
     /// The name in the netlist for an object that is about to be declared.
-    const std::string& MakeName(const std::string& name, bool isBus, bool isTaken);
-    void AddRenaming(const std::string& name, const std::string& newName);
+    const std::string& MakeName(const std::string& name, bool isBus, bool isTaken,
+                                ReaderRenaming::Kind kind);
+    std::string MakePinName(const PortHead& port, const ModuleHead& head,
+                            const Component& component) const;
+    void AddRenaming(const std::string& name, const std::string& newName,
+                     ReaderRenaming::Kind kind);
     Signal* FindByNewName(const std::string& name, bool isExact) const;
     /// Whether an object that was not renamed can have the name.
     bool CanBeFound(std::string_view plain, bool isBasic) const;

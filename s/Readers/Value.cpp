@@ -1,5 +1,8 @@
 #include "Readers/Value.h"
 
+#include "HdlModel/Objects/AttributeTable.h"
+#include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Place.h"
 
 #include <algorithm>
@@ -11,21 +14,32 @@
 
 namespace Orn_Hdl::Readers {
 
-namespace {
-
-/// Puts an attribute in the place of another one of its holder, the order kept.
-void Replace(AttributeHolder& holder, Attribute* present, std::unique_ptr<Attribute> attribute) {
-    std::vector<Attribute*> all;
-    for (Attribute* each : holder.GetAttrIterator()) {
-        all.push_back(each);
+std::string DecimalBits(std::string digits) {
+    if (digits.size() > MostDecimalDigits) {
+        throw LiteralProblem{"a decimal number of more than " + std::to_string(MostDecimalDigits) +
+                             " digits"};
     }
-    for (Attribute* each : all) {
-        std::unique_ptr<Attribute> detached = holder.DetachAttr(each);
-        holder.AddAttr(each == present ? attribute.release() : detached.release());
+    std::string bits;
+    while (!digits.empty()) {
+        int remainder = 0;
+        std::string half;
+        for (const char digit : digits) {
+            if (!Port::IsDigit(digit)) {
+                throw LiteralProblem{std::string("the digit ") + digit + " in a decimal number"};
+            }
+            const int present = remainder * 10 + (digit - '0');
+            remainder = present % 2;
+            if (!half.empty() || present > 1) {
+                half += static_cast<char>('0' + present / 2);
+            }
+        }
+        bits += static_cast<char>('0' + remainder);
+        digits = std::move(half);
     }
+    std::reverse(bits.begin(), bits.end());
+    bits.erase(0, std::min(bits.find('1'), bits.size()));
+    return bits;
 }
-
-} // namespace
 
 std::string WithoutExponent(const std::string& text) {
     const std::size_t e = text.find_first_of("eE");
@@ -67,6 +81,22 @@ std::string MakeConstant(const std::string& bits, bool isBare) {
 
 Value Value::OfBits(const std::string& bits) {
     return {Attribute::BitVector, MakeConstant(bits, false), {}};
+}
+
+Value Value::GetZero() const {
+    switch (type) {
+    case Attribute::Integer:
+    case Attribute::Bit:
+        return {type, "0", {}};
+    case Attribute::Float:
+        return {type, "0.0", {}};
+    case Attribute::BitVector: {
+        const int length = BitVectorValue(text.c_str()).GetLength();
+        return OfBits(std::string(static_cast<std::size_t>(length), '0'));
+    }
+    default:
+        return {type, "", {}};
+    }
 }
 
 std::unique_ptr<Attribute> Value::MakeAttribute(const char* name) const {
@@ -126,7 +156,7 @@ std::string SetAttribute(AttributeHolder& holder, const std::string& name, const
         present->SetSynAttr(attribute->GetSynAttr().CStr());
         return "";
     }
-    Replace(holder, present, std::move(attribute));
+    AttributeTable::Replace(*present, std::move(attribute));
     return "";
 }
 

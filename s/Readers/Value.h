@@ -23,6 +23,8 @@ struct Value {
     std::string userType;
 
     static Value OfBits(const std::string& bits);
+    /// A value of the same type and width: 0, or an empty string.
+    Value GetZero() const;
 
     /// Makes an attribute of the type that has the value.
     std::unique_ptr<Attribute> MakeAttribute(const char* name) const;
@@ -30,6 +32,10 @@ struct Value {
 
 /// The constant of a model with these bits: "4:B:1010", or "1" for one bit when `isBare`.
 std::string MakeConstant(const std::string& bits, bool isBare);
+
+/// The bits of a decimal number, leftmost first, without zeros in front.
+/// \throws LiteralProblem for a character that is no digit, and for too many.
+std::string DecimalBits(std::string digits);
 
 /// A real number without an exponent: a model keeps as many decimals as the text has.
 /// \throws LiteralProblem.

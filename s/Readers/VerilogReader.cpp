@@ -5,9 +5,12 @@
 #include "Readers/Heads.h"
 #include "Readers/NetlistMaker.h"
 #include "Readers/Top.h"
+#include "Readers/Undeclared.h"
 #include "Readers/Verilog/HeadReader.h"
 #include "Readers/Verilog/ModuleReader.h"
+#include "Readers/Verilog/UndeclaredReader.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace Orn_Hdl {
@@ -44,6 +47,7 @@ private:
     void ReadHeads();
     void ReadHeads(const std::string& fileName, bool isLibrary);
     void AddComponents(const Readers::Heads& components);
+    void AddUndeclared(const Readers::ModuleHead& top);
 
     std::string fileName_;
     const Readers::VerilogSetup& setup_;
@@ -77,16 +81,34 @@ void Reading::AddComponents(const Readers::Heads& components) {
     }
 }
 
+/// Adds heads of the modules that only the connections of their instances tell of.
+void Reading::AddUndeclared(const Readers::ModuleHead& top) {
+    const bool isComplete =
+        std::all_of(top.uses.begin(), top.uses.end(), [this](const Readers::ModuleHead::Use& use) {
+            return heads_.Find(use.name) != nullptr;
+        });
+    if (!isComplete) {
+        Readers::Scanner scanner(files_, setup_);
+        scanner.Open(files_.GetName(top.source));
+        Readers::UndeclaredReader(scanner, heads_, top).Read();
+    }
+}
+
 std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
     const Readers::ModuleHead& top = Readers::FindTop(heads_, setup_.top, "module", files_);
     const Readers::ModuleHead* const unfinished = heads_.GetUnfinished();
     if (unfinished != nullptr && unfinished != &top) {
         FailAt(files_, heads_.GetUnfinishedPlace(), "\"endmodule\" does not follow this");
     }
-    Readers::NetlistMaker maker(netlist, setup_.names, {false, true, Readers::IsVerilogKeyword});
+    if (setup_.undeclared == ReaderUndeclared::Infer) {
+        AddUndeclared(top);
+    }
+    Readers::NetlistMaker maker(netlist, setup_.names,
+                                {false, true, Readers::IsVerilogKeyword, setup_.keepsName});
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
+    Readers::SettleUndeclared(files_, heads_, netlist);
     return std::move(maker.GetRenamings());
 }
 
@@ -122,6 +144,14 @@ void VerilogReader::SetIncludes(Includes includes) noexcept {
 
 void VerilogReader::SetNames(Names names) noexcept {
     implementation_->setup.names = names;
+}
+
+void VerilogReader::SetKeptNames(std::function<bool(std::string_view name)> keeps) {
+    implementation_->setup.keepsName = std::move(keeps);
+}
+
+void VerilogReader::SetUndeclared(Undeclared undeclared) noexcept {
+    implementation_->setup.undeclared = undeclared;
 }
 
 void VerilogReader::KeepComments(bool keep) noexcept {

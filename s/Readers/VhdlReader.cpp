@@ -30,8 +30,6 @@ using Readers::FailAt;
 using Readers::ModuleHead;
 using Readers::Quoted;
 
-constexpr Readers::Place Whole{0, 0, 0};
-
 /// One reading of one file.
 class Reading {
 public:
@@ -112,7 +110,8 @@ std::vector<ReaderRenaming> Reading::FillNetlist(Netlist& netlist,
     }
     const ModuleHead& entity = Readers::FindTop(design_.entities, top, "entity", files_);
     const Vhdl::Architecture& architecture = FindArchitecture(entity, architectureName);
-    Readers::NetlistMaker maker(netlist, setup_.names, {true, false, Vhdl::IsReserved});
+    Readers::NetlistMaker maker(netlist, setup_.names,
+                                {true, false, Vhdl::IsReserved, setup_.keepsName});
     Vhdl::Scanner scanner(files_);
     scanner.Open(fileName_);
     Vhdl::ArchitectureReader reader(scanner, design_, entity, architecture, maker, setup_);
@@ -164,6 +163,21 @@ void Reading::SetOptions(const ModuleHead& entity, const Vhdl::Architecture& arc
     options.useAttrType = reader.HasTypedAttributes();
 }
 
+/// Adds the components that heads describe, with the defaults of their generics.
+void AddComponents(const Readers::Heads& heads, Readers::NetlistMaker& maker) {
+    for (const auto& head : heads.GetAll()) {
+        if (!maker.MakeComponent(*head).empty()) {
+            continue;
+        }
+        for (const Readers::ParameterHead& parameter : head->parameters) {
+            if (parameter.value) {
+                Readers::SetAttribute(*head->component, parameter.name, *parameter.value, "SYN",
+                                      nullptr);
+            }
+        }
+    }
+}
+
 /// Adds the types of the generics of a netlist's components.
 void AddGenerics(const Netlist& netlist, Readers::Heads& heads) {
     for (const Component* component : netlist.GetComponentIterator()) {
@@ -207,12 +221,29 @@ void VhdlReader::SetNames(Names names) noexcept {
     implementation_->setup.names = names;
 }
 
+void VhdlReader::SetKeptNames(std::function<bool(std::string_view name)> keeps) {
+    implementation_->setup.keepsName = std::move(keeps);
+}
+
 void VhdlReader::KeepComments(bool keep) noexcept {
     implementation_->setup.keepsComments = keep;
 }
 
 void VhdlReader::KeepAttributes(bool keep) noexcept {
     implementation_->setup.keepsAttributes = keep;
+}
+
+void VhdlReader::ReadComponents(const char* fileName, Netlist& netlist) {
+    const std::string name(ViewOf(fileName));
+    Readers::Files files;
+    files.Add(name);
+    Vhdl::Design design;
+    Vhdl::Scanner scanner(files);
+    scanner.Open(name);
+    Vhdl::HeadReader(scanner, design, true).Read();
+    Readers::NetlistMaker maker(netlist, ReaderNames::Literal, {true, false, Vhdl::IsReserved});
+    AddComponents(design.components, maker);
+    AddComponents(design.entities, maker);
 }
 
 void VhdlReader::Read(const char* fileName, Model& model) {

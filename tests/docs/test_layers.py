@@ -27,6 +27,7 @@ LAYERS = layers()
 
 # What the page names as its exceptions.
 UPWARDS = {
+    ("HdlModel/Model.cpp", "HdlCmd/Script/CommandScript.h"),
     ("HdlModel/Model.cpp", "Orn_Hdl/Commands.h"),
     ("Options/HdlUtilities.cpp", "Orn_Hdl/Writers/NetlistHeader.h"),
     ("Verilog/VerilogNetlister.cpp", "Orn_Hdl/LegalNetlist.h"),

@@ -78,7 +78,7 @@ def build_embedded(work: Path) -> Path:
     """A client that takes the library in as a folder, and lets it be installed."""
     build = work / "embedded"
     configure(FOLDER / "embedded", build, f"-DORN_HDL_SOURCE={SOURCE}", "-DBUILD_SHARED_LIBS=OFF",
-              "-DORN_HDL_INSTALL=ON", "-DCMAKE_BUILD_TYPE=Debug")
+              "-DORN_HDL_INSTALL=ON", "-DCMAKE_BUILD_TYPE=Debug", "-DCMAKE_UNITY_BUILD=ON")
     run("cmake", "--build", build)
     expect_client(build / "client17", "static", "17", build)
     return build

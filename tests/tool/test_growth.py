@@ -56,6 +56,45 @@ def box_with_pins(size: int) -> str:
     return "".join(["ADD COMPONENT W\n", *pins, "ADD INSTANCE W u\n", *wires])
 
 
+def undeclared_gates(size: int) -> str:
+    """Buses cut into bits; the direction of each pin follows from the gate before."""
+    gates = [f"  G u{i}(.A(n[{i}]), .B(a), .Y(n[{i + 1}]));\n" for i in range(size)]
+    return (f"module t(input a, output y);\n  wire [{size}:0] n;\n  assign n[0] = a, y = n[{size}];\n"
+            + "".join(gates) + "endmodule\n")
+
+
+def undeclared_cell_with_pins(size: int) -> str:
+    pins = ", ".join(f".p{i}(a)" for i in range(size))
+    others = ", ".join(f".p{i}(a)" for i in reversed(range(size)))
+    return f"module t(input a);\n  G u({pins});\n  G v({others});\nendmodule\n"
+
+
+def undeclared_cells_of_each_kind(size: int) -> str:
+    cells = [f"  wire n{i + 1};\n  G{i} u{i}(.A(n{i}), .Y(n{i + 1}));\n  G{i} v{i}(.A(a));\n"
+             for i in range(size)]
+    return ("module t(input a, output y);\n  wire n0 = a;\n" + "".join(cells) +
+            f"  assign y = n{size};\nendmodule\n")
+
+
+def attributes_set_again(size: int) -> str:
+    """Attributes of one instance, each of which is a parameter of another type too."""
+    first = ", ".join(f"P{i} = \"5\"" for i in range(size))
+    again = ", ".join(f".P{i}(5)" for i in range(size))
+    return f"module t(input a);\n  (* {first} *) G #({again}) u(.I(a));\nendmodule\n"
+
+
+def rows_of_gates(size: int, name: str) -> str:
+    """Gates in rows that are alike; a net drives all of them, and only the ends of a row are ports."""
+    row = 50
+    lines = ["ADD COMPONENT G", "ADD PIN G C input", "ADD PIN G I input", "ADD PIN G O output",
+             "ADD PORT c input", f"ADD PORT a({size // row}:0) input"]
+    for i in range(size):
+        source = f"a({i // row})" if i % row == 0 else f"{name}n{i - 1}"
+        lines += [f"ADD INSTANCE G {name}{i}", f"CONNECT SIGNAL c {name}{i}.C",
+                  f"CONNECT SIGNAL {source} {name}{i}.I", f"CONNECT SIGNAL {name}n{i} {name}{i}.O"]
+    return "\n".join(lines) + "\n"
+
+
 class Growth(ToolTest):
     def setUp(self) -> None:
         super().setUp()
@@ -71,7 +110,8 @@ class Growth(ToolTest):
         seconds, peaks = [], []
         for _ in range(RUNS):
             with subprocess.Popen([TOOL, *map(str, arguments)], cwd=self.folder,
-                                  env=self.environment, stderr=subprocess.DEVNULL) as process:
+                                  env=self.environment, stdout=subprocess.DEVNULL,
+                                  stderr=subprocess.DEVNULL) as process:
                 _, status, usage = os.wait4(process.pid, 0)
                 process.returncode = os.waitstatus_to_exitcode(status)
             self.assertEqual(process.returncode, 0)
@@ -101,6 +141,25 @@ class Growth(ToolTest):
 
     def test_bit_numbers_far_apart_in_many_modules(self) -> None:
         self.check_import(modules_with_distant_bits, 1000)
+
+    def test_netlists_of_cells_that_nothing_declares(self) -> None:
+        for make, size in ((undeclared_gates, 4000), (undeclared_cell_with_pins, 2000),
+                           (undeclared_cells_of_each_kind, 1000)):
+            with self.subTest(make.__name__):
+                self.check(make, size, "import", "--from", "verilog")
+
+    def test_attributes_that_are_parameters_too(self) -> None:
+        self.check(attributes_set_again, 2000, "import", "--from", "verilog", "--attributes")
+
+    def test_designs_with_other_names(self) -> None:
+        costs = []
+        for size in (4000, FACTOR * 4000):
+            self.write("a.cmd", rows_of_gates(size, "a"))
+            self.write("b.cmd", rows_of_gates(size, "b"))
+            costs.append(self.measure(["diff", "--ignore", "names", "a.cmd", "b.cmd"]))
+        (small, small_peak), (large, large_peak) = costs
+        self.assertLess(large, MOST * max(small, LEAST_SECONDS))
+        self.assertLess(large_peak, MOST * small_peak)
 
     def test_a_drawn_box_with_many_pins(self) -> None:
         self.check(box_with_pins, 2000, "draw", "-o", "o.svg")

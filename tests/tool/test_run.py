@@ -293,6 +293,57 @@ class Outputs(ToolTest):
                            check=True)
             self.assertIn(b"entity d is", ours.recv(65536))
 
+    def test_commands_of_the_final_design(self) -> None:
+        self.write("w.cmd", INVERTER + "WRITE VERILOG w.v\nADD SIGNAL N\n")
+        self.expect(self.run_tool("run", "w.cmd", "--output-commands", "c.cmd", "--verilog", "a.v"), SUCCESS)
+        self.assertTrue(self.read("c.cmd").startswith("SET NETLIST NAME w\nADD COMPONENT INV\n"))
+        self.assertIn("ADD SIGNAL N\n", self.read("c.cmd"))
+        self.assertTrue((self.folder / "w.v").exists())
+        self.expect(self.run_tool("run", "c.cmd", "--output-commands", "-", "--verilog", "b.v"), SUCCESS,
+                    out=self.read("c.cmd"))
+        self.assertEqual(self.read("a.v").replace("a.v", ""), self.read("b.v").replace("b.v", ""))
+
+    def test_commands_come_before_what_outputs_change(self) -> None:
+        self.write("w.cmd", INVERTER + "CONNECT SIGNAL Y U1.I\n")
+        self.expect(self.run_tool("run", "w.cmd", "--output-commands", "c.cmd", "--verilog", "a.v"), SUCCESS)
+        self.assertIn("Y_DUMMY", self.read("a.v"))
+        self.assertNotIn("Y_DUMMY", self.read("c.cmd"))
+
+    def test_commands_name_the_source_that_a_line_names(self) -> None:
+        self.write("w.cmd", "NOOP\n")
+        self.expect(self.run_tool("run", "w.cmd", "--output-commands", "-"), SUCCESS,
+                    out="SET NETLIST NAME w\n")
+        self.write("w.cmd", "SET SOURCE FILE w.src\n")
+        self.expect(self.run_tool("run", "w.cmd", "--output-commands", "-", "--no-warn", "all"), SUCCESS,
+                    out="SET NETLIST NAME w\nSET SOURCE FILE w.src\n")
+
+    def test_commands_need_a_complete_replay(self) -> None:
+        self.write("c.cmd", "former\n")
+        self.write("w.cmd", "ADD SIGNAL A\nADD\n")
+        outcome = self.run_tool("run", "w.cmd", "--output-commands", "c.cmd")
+        self.assertEqual((outcome.status, self.read("c.cmd")), (FAILED, "former\n"))
+        outcome = self.run_tool("run", "w.cmd", "--output-commands", "c.cmd", "--keep-going")
+        self.assertEqual((outcome.status, self.read("c.cmd")),
+                         (FAILED, "SET NETLIST NAME w\nADD SIGNAL A\n"))
+
+    def test_commands_that_cannot_be_written(self) -> None:
+        self.expect(self.run_tool("run", "d.cmd", "--output-commands", "no/c.cmd"), FILE,
+                    "orn-hdl: cannot write no/c.cmd: No such file or directory\n")
+        self.expect(self.run_tool("run", "d.cmd", "--output-commands", "/dev/full"), FILE,
+                    "orn-hdl: cannot write /dev/full: No space left on device\n")
+        # They are replaced only when the netlists have been written.
+        self.write("c.cmd", "former\n")
+        outcome = self.run_tool("run", "d.cmd", "--output-commands", "c.cmd", "--verilog", "no/a.v")
+        self.assertEqual((outcome.status, self.read("c.cmd")), (FILE, "former\n"))
+
+    def test_a_design_that_commands_cannot_express(self) -> None:
+        self.write("w.cmd", "Set Open Pin false\nADD COMPONENT C\nADD PIN C I(1:0) in\n"
+                            "ADD INSTANCE C U-1\nWRITE VHDL w.vhd\n")
+        self.expect(self.run_tool("run", "w.cmd", "--output-commands", "c.cmd"), FAILED,
+                    "orn-hdl: No command can express signal \"U:1_I_openSignal(1:0)\": its name is of "
+                    "another form.\n")
+        self.assertFalse((self.folder / "c.cmd").exists())
+
     def test_messages_stay_off_standard_output(self) -> None:
         self.write("w.cmd", "ADD\n" + INVERTER)
         outcome = self.run_tool("run", "w.cmd", "--keep-going", "--verilog", "-", "--no-header")

@@ -1,4 +1,4 @@
-// `orn-hdl import`: converts a JSON netlist written by Yosys to a command file or a netlist.
+// `orn-hdl import`: converts a netlist to a command file or to a netlist in another language.
 #pragma once
 
 #include "Output.h"
@@ -8,14 +8,25 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
+
+namespace Orn_Hdl {
+class LegalNetlist;
+}
 
 namespace Tool {
 
+/// What a netlist is written in.
+enum class ImportFormat { Json, Verilog, Vhdl };
+
 struct ImportOptions {
-    /// The JSON file; "-" is standard input.
+    /// The netlist; "-" is standard input, which only a JSON netlist can come from.
     std::string file;
-    /// The module to import; empty for the one marked as top.
+    /// What the netlist is written in; without a value, its extension tells.
+    std::optional<ImportFormat> format;
+    /// The module to import; empty for the one marked as top in JSON, and for the only one that no
+    /// other instantiates in the languages.
     std::string top;
     /// The command file to write; empty for none.
     std::string commandFile;
@@ -23,13 +34,19 @@ struct ImportOptions {
     /// The replacement of x and z, "0" or "1"; empty to reject them.
     std::string unknownAs;
     /// The cell libraries.
-    std::vector<std::string> cells;
+    std::vector<std::string> libraries;
+    /// The folders in which included files are looked for.
+    std::vector<std::string> includeFolders;
+    /// Macros, each NAME or NAME=TEXT.
+    std::vector<std::string> macros;
     /// The languages in which names must be legal; without one, those of the netlists.
     std::optional<Import::NameLanguages> names;
     /// Reject a design whose ports cannot keep their names.
     bool keepPorts = false;
     /// Import the attributes of cells and nets.
     bool attributes = false;
+    /// Import the comments of objects.
+    bool comments = false;
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
     /// Write legal netlists, or nothing.
@@ -39,5 +56,19 @@ struct ImportOptions {
 
 /// Imports a file. If no output is given, the file is only checked.
 Status ImportDesign(const ImportOptions& options);
+
+/// The languages in which the names of an import must be legal: those asked for, or else those of
+/// the netlists. A command file can be written in both.
+Import::NameLanguages GetNameLanguages(const ImportOptions& options);
+/// Reports what keeps a netlist from being legal. \return whether anything does.
+bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file,
+                     Reporter& reporter);
+/// What a file that is no JSON is, by its beginning; empty if that is not known, or if it may be
+/// JSON.
+std::string DescribeOtherFile(const std::string& beginning);
+/// Whether a file's name ends so, letter case ignored.
+bool HasExtension(std::string_view file, std::string_view extension) noexcept;
+/// A message about a file as a whole.
+Diagnostic MakeFileDiagnostic(const std::string& file, Severity severity, std::string message);
 
 } // namespace Tool

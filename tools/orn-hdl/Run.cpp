@@ -1,5 +1,6 @@
 #include "Run.h"
 
+#include "CommandsOutput.h"
 #include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
@@ -196,6 +197,17 @@ Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOpti
     return status == Status::Success ? nameMap.Commit() : status;
 }
 
+/// Writes the commands of the model. The name of the file in hand is not the design's own.
+Status WriteCommands(Orn_Hdl::Model& model, const std::string& file, CommandsOutput& commands) {
+    const Port::String source = model.GetSourceFileName();
+    if (source.GetView() == file) {
+        model.SetSourceFileName("");
+    }
+    const Status status = commands.Write(model);
+    model.SetSourceFileName(source);
+    return status;
+}
+
 /// Replays the file of the options and writes its netlists.
 Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
     Checking::WriteGate gate(model, file.lines, file.reporter);
@@ -207,6 +219,12 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
     if (options.warnings.areErrors && replayed.slips > 0) {
         return Worse(replayed.status, Status::Failed);
     }
+    // A write changes the design, so the commands come first. Their file is replaced last.
+    CommandsOutput commands(options.commandFile);
+    const Status saved = WriteCommands(model, options.file, commands);
+    if (saved != Status::Success) {
+        return Worse(replayed.status, saved);
+    }
     Outputs outputs = options.outputs;
     Status status = replayed.status;
     for (auto& [language, name] : outputs.files) {
@@ -215,8 +233,11 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
             status = Worse(status, Status::Failed);
         }
     }
-    return Worse(status, options.legal ? WriteLegally(model, outputs, options, replayed.lines, file)
-                                       : WriteOutputs(model, outputs, file.progress));
+    const Status written = options.legal
+                               ? WriteLegally(model, outputs, options, replayed.lines, file)
+                               : WriteOutputs(model, outputs, file.progress);
+    status = Worse(status, written);
+    return written == Status::Success ? Worse(status, commands.Commit()) : status;
 }
 
 } // namespace

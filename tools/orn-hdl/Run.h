@@ -38,6 +38,9 @@ struct RunOptions {
     bool check = false;
     /// Write legal netlists, or nothing.
     bool legal = false;
+    /// The file for the commands of the design in which the replay ends; "-" is standard output,
+    /// and an empty name is none.
+    std::string commandFile;
     /// How a legal netlist changes names: "rename" or "escape".
     std::string names = "rename";
     /// The file for the table of old and new names; empty for none.

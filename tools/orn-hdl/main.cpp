@@ -7,6 +7,7 @@
 #include "Tool.h"
 #include "check/Check.h"
 #include "diagnostics/Nearest.h"
+#include "diff/Diff.h"
 #include "explain/Syntax.h"
 #include "stats/Stats.h"
 #include "warnings/WarningsPage.h"
@@ -21,6 +22,7 @@
 #include <exception>
 #include <functional>
 #include <new>
+#include <optional>
 #include <sstream>
 #include <string>
 #include <utility>
@@ -78,6 +80,13 @@ void AddWriteRules(CLI::App& command, Tool::WriteRules& rules) {
             ->check(CheckFileName);
     command.add_flag("--no-write", rules.noWrite, "Make every WRITE command fail")
         ->excludes(folder);
+}
+
+/// An option that may be repeated, with one value each time.
+CLI::Option* AddRepeated(CLI::App& command, const std::string& option,
+                         std::vector<std::string>& values, const std::string& help) {
+    const auto add = [&values](const std::string& value) { values.push_back(value); };
+    return command.add_option_function<std::string>(option, add, help)->trigger_on_parse();
 }
 
 /// An option whose value is one of a few words.
@@ -156,6 +165,30 @@ void AddWarnings(CLI::App& command, Tool::WarningOptions& warnings) {
                      "Make warnings errors: --verilog and --vhdl then write nothing");
 }
 
+/// Adds the words of a list with commas between them. \return what is wrong with the list.
+std::string TakeIgnored(const std::string& list, std::vector<std::string>& ignored) {
+    const std::vector<std::string>& words = Tool::GetIgnorable();
+    std::istringstream rest(list);
+    for (std::string word; std::getline(rest, word, ',');) {
+        if (std::find(words.begin(), words.end(), word) == words.end()) {
+            return "\"" + word + "\" is none of " + Tool::Explain::JoinChoices(words, "and");
+        }
+        ignored.push_back(word);
+    }
+    return "";
+}
+
+/// An option for the format of a file whose extension does not tell it.
+void AddDesignFormat(CLI::App& command, const std::string& option,
+                     std::optional<Tool::DesignFormat>& format, const std::string& help) {
+    AddChoice<std::optional<Tool::DesignFormat>>(command, option, format,
+                                                 {{"commands", Tool::DesignFormat::Commands},
+                                                  {"verilog", Tool::DesignFormat::Verilog},
+                                                  {"vhdl", Tool::DesignFormat::Vhdl},
+                                                  {"json", Tool::DesignFormat::Json}},
+                                                 help);
+}
+
 /// The command line: its options, and the command to run.
 class CommandLine {
 public:
@@ -167,6 +200,7 @@ public:
         AddRun();
         AddImport();
         AddCheck();
+        AddDiff();
         AddDraw();
         AddStats();
         AddCommands();
@@ -283,6 +317,8 @@ private:
         AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
+        AddFile(command, "--output-commands", run_.commandFile,
+                "Write the commands of the final design; - is standard output");
         AddWriteRules(command, run_.writeRules);
         CLI::Option* keepGoing =
             command.add_flag("--keep-going", run_.keepGoing, "Continue after an error");
@@ -309,19 +345,28 @@ private:
     }
 
     void AddImport() {
-        CLI::App& command = AddCommand("import", "Import a JSON netlist written by Yosys",
+        CLI::App& command = AddCommand("import", "Import a netlist in Verilog, VHDL or JSON",
                                        [this] { return Tool::ImportDesign(import_); });
-        AddFile(command, "FILE", import_.file, "The JSON file; - is standard input")->required();
+        AddFile(command, "FILE", import_.file, "The netlist; - is standard input")->required();
+        AddChoice<std::optional<Tool::ImportFormat>>(
+            command, "--from", import_.format,
+            {{"verilog", Tool::ImportFormat::Verilog},
+             {"vhdl", Tool::ImportFormat::Vhdl},
+             {"json", Tool::ImportFormat::Json}},
+            "What the netlist is written in; the default is what its extension says");
         command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
         AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
         AddOutputs(command, import_.outputs);
-        const auto addCells = [this](const std::string& file) { import_.cells.push_back(file); };
-        command
-            .add_option_function<std::string>(
-                "--cells", addCells, "Read cell types: Verilog, JSON or Liberty; may be repeated")
+        AddRepeated(command, "-l,--library,--cells", import_.libraries,
+                    "Read cell types: Verilog, VHDL, Liberty or JSON; may be repeated")
             ->type_name("FILE")
-            ->trigger_on_parse()
             ->check(CheckFileName);
+        AddRepeated(command, "-I", import_.includeFolders,
+                    "Look for files that Verilog includes; may be repeated")
+            ->type_name("DIR")
+            ->check(CheckFileName);
+        AddRepeated(command, "-D", import_.macros, "Define a macro for Verilog; may be repeated")
+            ->type_name("NAME[=TEXT]");
         const auto setNames = [this](const std::string& word) {
             import_.names = GetNameLanguages().at(word);
         };
@@ -336,6 +381,7 @@ private:
             ->check(CheckDigit);
         command.add_flag("--attributes", import_.attributes,
                          "Import the attributes of cells and nets");
+        command.add_flag("--comments", import_.comments, "Import the comments of objects");
         command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddReport(command, import_.report);
@@ -361,6 +407,49 @@ private:
         command.add_flag("--list", check_.list, "List the rules");
         command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
+    }
+
+    void AddDiff() {
+        CLI::App& command = AddCommand("diff", "Tell in what two designs differ",
+                                       [this] { return Tool::PrintDiff(diff_); });
+        AddFile(command, "A", diff_.a.name, "The first file; - is standard input")
+            ->type_name("")
+            ->required();
+        AddFile(command, "B", diff_.b.name, "The second file; - is standard input")
+            ->type_name("")
+            ->required();
+        const auto addLibrary = [this](const std::string& file) {
+            diff_.libraries.push_back(file);
+        };
+        command
+            .add_option_function<std::string>("-l", addLibrary,
+                                              "Read the components of netlists; may be repeated")
+            ->type_name("FILE")
+            ->trigger_on_parse()
+            ->check(CheckFileName);
+        command
+            .add_option_function<std::string>(
+                "--ignore", [this](const std::string& list) { TakeIgnored(list, diff_.ignored); },
+                "Do not compare names, attributes, comments or order, with commas between them")
+            ->type_name("LIST")
+            ->check([](const std::string& list) {
+                std::vector<std::string> tried;
+                return TakeIgnored(list, tried);
+            })
+            // Of several lists, all count.
+            ->join(',');
+        AddDesignFormat(command, "--from-a", diff_.a.format, "The format of A");
+        AddDesignFormat(command, "--from-b", diff_.b.format, "The format of B");
+        AddChoice<Tool::DiffFormat>(
+            command, "--format", diff_.format,
+            {{"text", Tool::DiffFormat::Text}, {"json", Tool::DiffFormat::Json}},
+            "Print the differences as text or JSON");
+        command.add_option("--limit", diff_.limit, "Show N differences; 0 shows all")
+            ->type_name("N");
+        AddReport(command, diff_.report);
+        command.add_flag("--quiet", diff_.quiet, "Do not show progress");
+        command.footer("The exit status is 0 for equal designs, 1 for different ones, 2 for "
+                       "trouble.");
     }
 
     void AddDraw() {
@@ -422,6 +511,7 @@ private:
     Tool::ImportOptions import_;
     Tool::DrawOptions draw_;
     Tool::CheckOptions check_;
+    Tool::DiffOptions diff_;
     Tool::StatsOptions stats_;
     std::vector<std::string> words_;
     bool markdown_ = false;

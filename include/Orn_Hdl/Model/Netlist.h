@@ -164,6 +164,7 @@ private:
     friend class Renaming;
     friend class ModelRegistry;
     friend class ReadAhead;
+    friend class RememberedDummies;
     struct Implementation;
 
     /// Exchanges everything with another netlist but who is told of a new name.

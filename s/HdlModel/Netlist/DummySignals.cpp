@@ -42,6 +42,22 @@ Signal* DummySignals::Find(const Signal* original) const noexcept {
     return entry == nullptr ? nullptr : entry->dummy;
 }
 
+const DummySignals::Entry* DummySignals::FindByOriginal(const Signal* original) const noexcept {
+    return FindBy(byOriginal_, &Entry::original, original);
+}
+
+const DummySignals::Entry* DummySignals::FindByDummy(const Signal* dummy) const noexcept {
+    return FindBy(byDummy_, &Entry::dummy, dummy);
+}
+
+const DummySignals::Entry* DummySignals::FindPending(const Netlist& netlist,
+                                                     const Signal& part) const {
+    const BusPart* const known = As<BusPart>(&part);
+    const Bus* const bus = known == nullptr ? nullptr : known->GetParentBus();
+    const Entry* const entry = bus == nullptr ? nullptr : FindByOriginal(bus);
+    return entry == nullptr || !CanMakeForPart(netlist, part) ? nullptr : entry;
+}
+
 /// Whether the signal already has a dummy, here or in another netlist.
 bool DummySignals::IsKeptAsOriginal(const Signal& signal) const noexcept {
     const DummySignals* const keeper = References::GetKeeper(signal);
@@ -181,10 +197,13 @@ void DummySignals::MakeForScalar(Netlist& netlist, ScalarSignal& signal, bool fo
     Link(entries_.back());
 }
 
+bool DummySignals::CanMakeForPart(const Netlist& netlist, const Signal& part) const {
+    return !IsKeptAsOriginal(part) && !IsNameTaken(netlist, part);
+}
+
 void DummySignals::MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool forOutputs) {
     for (Signal* part : bus.GetBusSliceIterator()) {
-        if (As<BusPart>(part) == nullptr || IsKeptAsOriginal(*part) ||
-            IsNameTaken(netlist, *part)) {
+        if (As<BusPart>(part) == nullptr || !CanMakeForPart(netlist, *part)) {
             continue;
         }
         Signal* partDummy = nullptr;

@@ -17,6 +17,14 @@ namespace Orn_Hdl {
 /// but for slices and bits of its buses that were never added to it.
 class DummySignals {
 public:
+    /// A signal and the dummy that was created for it.
+    struct Entry {
+        Signal* original;
+        Signal* dummy;
+        /// Whether the signal is an output port, or a part of one, which its dummy drives.
+        bool forOutputs;
+    };
+
     DummySignals() = default;
     DummySignals(const DummySignals&) = delete;
     DummySignals& operator=(const DummySignals&) = delete;
@@ -29,24 +37,30 @@ public:
     void Make(Netlist& netlist, const StringSet& names, bool forOutputs);
     /// The dummy that was created for a signal; null if there is none.
     Signal* Find(const Signal* original) const noexcept;
+    /// The entry of the signal for which a dummy was created; null if there is none. It is valid
+    /// until a dummy is created or forgotten.
+    const Entry* FindByOriginal(const Signal* original) const noexcept;
+    /// The entry of a dummy; null if the signal is none. It is valid until a dummy is created or
+    /// forgotten.
+    const Entry* FindByDummy(const Signal* dummy) const noexcept;
+    /// Whether there is no entry.
+    bool IsEmpty() const noexcept { return entries_.size() == emptyPlaces_; }
+    /// The entry of the bus for whose slice or bit `Refresh` is going to make a dummy; null if it
+    /// makes none.
+    const Entry* FindPending(const Netlist& netlist, const Signal& part) const;
     /// Drops the entries of a signal that is about to be destroyed, whether or not it is a dummy.
     void Forget(const Signal* signal) noexcept;
     /// Drops all entries, before the signals of the netlist are destroyed.
     void Clear() noexcept;
 
 private:
-    struct Entry {
-        Signal* original;
-        Signal* dummy;
-        bool forOutputs;
-    };
-
     void MakeForScalar(Netlist& netlist, ScalarSignal& signal, bool forOutputs);
     void MakeForBus(Netlist& netlist, Bus& bus, bool forOutputs);
     void MakeForParts(Netlist& netlist, Bus& bus, Bus& dummy, bool forOutputs);
     void MakeForCompound(Netlist& netlist, CompoundBus& compound, bool forOutputs);
     /// Adds a dummy to the netlist and to the memory, and lets it take over for the first time.
     void Adopt(Netlist& netlist, Signal& original, Signal* dummy, bool forOutputs);
+    bool CanMakeForPart(const Netlist& netlist, const Signal& part) const;
     bool IsKeptAsOriginal(const Signal& signal) const noexcept;
     static void TakeOver(const Entry& entry);
     static void Link(const Entry& entry);

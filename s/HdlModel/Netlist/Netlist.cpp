@@ -11,6 +11,7 @@
 #include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Netlist/ReadAhead.h"
+#include "HdlModel/Netlist/RememberedDummies.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "HdlModel/Objects/ObjectKey.h"
 #include "HdlModel/Objects/OwnerLink.h"
@@ -329,6 +330,10 @@ bool Netlist::IsNameUsed(std::string_view name) const noexcept {
 
 void ReadAhead::Note(Netlist& netlist, const StringArray& words) noexcept {
     netlist.implementation_->foresight.Note(netlist.implementation_->byName, words);
+}
+
+const DummySignals& RememberedDummies::Of(const Netlist& netlist) noexcept {
+    return netlist.implementation_->dummies;
 }
 
 Bus* Netlist::GetParentBus(const char* name) const {

@@ -6,6 +6,7 @@
 #include "Orn_Hdl/Attributes.h"
 #include "Port/Ascii.h"
 
+#include <algorithm>
 #include <utility>
 
 namespace Orn_Hdl {
@@ -55,6 +56,36 @@ void AttributeTable::LetGo(Attribute& attribute) noexcept {
     attribute.table_ = nullptr;
     OwnedFlag::Clear(attribute);
     ObjectKey::Drop(attribute);
+}
+
+/// Where an attribute of this table is; looks from the last place on in both directions.
+int AttributeTable::FindPlace(const Attribute& attribute) const noexcept {
+    int below = std::min(lastPlace, attributes.GetSize() - 1);
+    for (int above = below + 1; attributes.GetAt(below) != &attribute; ++above, --below) {
+        if (attributes.GetAt(above) == &attribute) {
+            return above;
+        }
+    }
+    return below;
+}
+
+void AttributeTable::Replace(Attribute& present, std::unique_ptr<Attribute> attribute) {
+    AttributeTable& table = *present.table_;
+    const std::string_view name = ObjectKey::Get(present);
+    const bool isFound = table.byName.Get(name) == &present;
+    const int place = table.FindPlace(present);
+    if (isFound) {
+        // The name exists already, so nothing is allocated.
+        table.byName.Add(name, attribute.get());
+    }
+    table.attributes.SetAt(place, attribute.get());
+    table.lastPlace = place;
+    Attribute* const added = attribute.release();
+    added->table_ = &table;
+    OwnedFlag::Set(*added);
+    present.table_ = nullptr;
+    OwnedFlag::Clear(present);
+    delete &present;
 }
 
 AttributeHolder::AttributeHolder() noexcept = default;

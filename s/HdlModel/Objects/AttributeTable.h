@@ -16,6 +16,8 @@ struct AttributeTable {
     void* owner = nullptr;
     /// Whether two attributes of one name have been held.
     bool hasNamesakes = false;
+    /// Where an attribute was replaced last: the next one is often beside it.
+    int lastPlace = 0;
 
     AttributeTable() = default;
     AttributeTable(const AttributeTable&) = delete;
@@ -28,6 +30,10 @@ struct AttributeTable {
     bool Holds(const Attribute& attribute) const noexcept { return attribute.table_ == this; }
     /// Takes an attribute out without destroying it.
     static void LetGo(Attribute& attribute) noexcept;
+    /// Puts an attribute in the place of another one of the same name, which is destroyed.
+    /// \param present one that a table holds.
+    /// \param attribute one that has no owner.
+    static void Replace(Attribute& present, std::unique_ptr<Attribute> attribute);
     /// Lets its table drop an attribute that is about to be destroyed.
     static void Leave(Attribute& attribute) noexcept {
         if (attribute.table_ != nullptr) {
@@ -36,6 +42,7 @@ struct AttributeTable {
     }
 
 private:
+    int FindPlace(const Attribute& attribute) const noexcept;
     Attribute* FindNamesake(const Attribute& attribute) const noexcept;
 };
 

@@ -183,4 +183,13 @@ bool PinLinks::HasPinOf(const Signal& signal, int polarity) noexcept {
                                                    signal.links_->unlistedPins.end(), matches);
 }
 
+bool PinLinks::IsListed(const Pin& pin) noexcept {
+    return pin.signal_ != nullptr && pin.HasFlag(Pin::ListedFlag);
+}
+
+const std::vector<Pin*>& PinLinks::GetUnlisted(const Signal& signal) noexcept {
+    static const std::vector<Pin*> none;
+    return signal.links_ == nullptr ? none : signal.links_->unlistedPins;
+}
+
 } // namespace Orn_Hdl

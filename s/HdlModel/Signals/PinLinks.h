@@ -26,6 +26,8 @@
 #include "Orn_Hdl/Model/Pins.h"
 #include "Orn_Hdl/Model/Signals/Signal.h"
 
+#include <vector>
+
 namespace Orn_Hdl {
 
 /// The operations on the links between pins and signals. If allocation fails, nothing changes.
@@ -46,6 +48,10 @@ public:
 
     /// Whether a pin of that polarity, or a bidirectional one, points at a signal, listed or not.
     static bool HasPinOf(const Signal& signal, int polarity) noexcept;
+    /// Whether the signal at which a pin points lists it; false for an open pin.
+    static bool IsListed(const Pin& pin) noexcept;
+    /// The pins that point at a signal without being listed.
+    static const std::vector<Pin*>& GetUnlisted(const Signal& signal) noexcept;
 
 private:
     enum class State { Apart, Unlisted, Listed, Former };

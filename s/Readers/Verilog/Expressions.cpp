@@ -1,17 +1,14 @@
 #include "Readers/Verilog/Expressions.h"
+#include "Readers/Limits.h"
 
-#include <limits>
 #include <utility>
 
 namespace Orn_Hdl::Readers {
 
 namespace {
 
-constexpr std::size_t DeepestExpression = 500;
-constexpr std::uint64_t MostBits = 1'048'576;
 /// How much repetitions may make of one file: a short text can ask for any number of pieces.
 constexpr std::uint64_t MostRepeated = std::uint64_t(1) << 24;
-constexpr std::int64_t LargestIndex = std::numeric_limits<int>::max();
 
 constexpr std::string_view SayWhatToDo = ": synthesise the design first";
 

@@ -1,24 +1,18 @@
 #include "Readers/Verilog/HeadReader.h"
 
+#include "Readers/Limits.h"
 #include "Readers/Verilog/Literals.h"
 
-#include <limits>
 #include <utility>
 
 namespace Orn_Hdl::Readers {
 
 namespace {
 
-constexpr std::int64_t LargestIndex = std::numeric_limits<int>::max();
-
 int DirectionOf(Keyword keyword) {
     return keyword == Keyword::Input    ? Polarity::Input
            : keyword == Keyword::Output ? Polarity::Output
                                         : Polarity::BiDirectional;
-}
-
-bool IsDirection(Keyword keyword) {
-    return keyword == Keyword::Input || keyword == Keyword::Output || keyword == Keyword::Inout;
 }
 
 } // namespace

@@ -174,4 +174,8 @@ Keyword FindKeyword(std::string_view word) noexcept {
     return found != std::end(Entries) && found->word == word ? found->keyword : Keyword::None;
 }
 
+bool IsDirection(Keyword keyword) noexcept {
+    return keyword == Keyword::Input || keyword == Keyword::Output || keyword == Keyword::Inout;
+}
+
 } // namespace Orn_Hdl::Readers

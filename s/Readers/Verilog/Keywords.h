@@ -49,5 +49,7 @@ enum class Keyword : std::uint8_t {
 
 /// The keyword of IEEE 1364-2005, or of IEEE 1800 where a netlist may have it.
 Keyword FindKeyword(std::string_view word) noexcept;
+/// Whether a keyword begins the declaration of a port.
+bool IsDirection(Keyword keyword) noexcept;
 
 } // namespace Orn_Hdl::Readers

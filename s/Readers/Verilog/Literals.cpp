@@ -1,5 +1,6 @@
 #include "Readers/Verilog/Literals.h"
 
+#include "Readers/Limits.h"
 #include "Readers/Verilog/Characters.h"
 
 #include <algorithm>
@@ -10,8 +11,6 @@ namespace Orn_Hdl::Readers {
 
 namespace {
 
-constexpr std::uint32_t MostBits = 1'048'576;
-constexpr std::size_t MostDecimalDigits = 300;
 constexpr std::uint32_t UnsizedWidth = 32;
 
 std::string WithoutBlanks(std::string_view text) {
@@ -80,31 +79,6 @@ std::uint32_t ReadSize(std::string_view text) {
     return size;
 }
 
-/// The bits of decimal digits, leftmost first, without zeros in front.
-std::string DecimalBits(std::string digits) {
-    if (digits.size() > MostDecimalDigits) {
-        throw LiteralProblem{"a decimal number of more than " + std::to_string(MostDecimalDigits) +
-                             " digits"};
-    }
-    std::string bits;
-    while (!digits.empty()) {
-        int remainder = 0;
-        std::string half;
-        for (const char digit : digits) {
-            const int present = remainder * 10 + (digit - '0');
-            remainder = present % 2;
-            if (!half.empty() || present > 1) {
-                half += static_cast<char>('0' + present / 2);
-            }
-        }
-        bits += static_cast<char>('0' + remainder);
-        digits = std::move(half);
-    }
-    std::reverse(bits.begin(), bits.end());
-    bits.erase(0, std::min(bits.find('1'), bits.size()));
-    return bits;
-}
-
 std::string DigitBits(const std::string& digits, int base) {
     const std::uint32_t count = BitsOfDigit(base);
     if (count == 0) {
@@ -170,6 +144,9 @@ std::uint32_t Number::GetWidth() const {
     }
     if (size > 0) {
         return size;
+    }
+    if (kind == Real) {
+        return UnsizedWidth;
     }
     const std::string bits = DigitBits(digits, base);
     const std::size_t first = std::min(bits.find('1'), bits.size());

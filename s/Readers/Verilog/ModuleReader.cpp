@@ -9,10 +9,8 @@ namespace {
 constexpr const char* Seen = "SYN";
 constexpr const char* Hidden = "NOSYN";
 constexpr std::string_view InitName = "INIT";
-
-bool IsDirection(Keyword keyword) {
-    return keyword == Keyword::Input || keyword == Keyword::Output || keyword == Keyword::Inout;
-}
+/// How many parameters may be left out of instances: a short text can ask for any number.
+constexpr std::size_t MostLeftOut = std::size_t(1) << 20;
 
 } // namespace
 
@@ -35,6 +33,7 @@ void ModuleReader::Read() {
     ReadHead();
     ReadBody();
     SetEarlyOverrides();
+    LeaveOutAssumed();
 }
 
 /// Skips to the name of the module that is read.
@@ -555,16 +554,50 @@ void ModuleReader::SetParameter(Instance& instance, const ModuleHead& head,
         parser_.Fail(override.place, "the parameter " + Quoted(override.name) + ": " + problem);
     }
     if (parameter != nullptr && parameter->value) {
-        DeclareGeneric(head, override.name, isHidden);
+        DeclareGeneric(head, override.name, *parameter->value, isHidden);
+    } else if (!head.hasParameters) {
+        const Value value = override.value.GetZero();
+        if (DeclareGeneric(head, override.name, value, isHidden)) {
+            assumed_[head.component].push_back({override.name, value});
+        }
     }
 }
 
 /// Gives the component a parameter that one of its instances sets, with the value that it has in
-/// the others: a VHDL component has to declare its generics.
-void ModuleReader::DeclareGeneric(const ModuleHead& head, const std::string& name, bool isHidden) {
-    if (head.component->GetAttr(name.c_str()) == nullptr) {
-        SetAttribute(*head.component, name, *head.FindParameter(name)->value,
-                     isHidden ? Hidden : Seen, nullptr);
+/// the others: a VHDL component has to declare its generics. \return whether it did not have it.
+bool ModuleReader::DeclareGeneric(const ModuleHead& head, const std::string& name,
+                                  const Value& value, bool isHidden) {
+    if (head.component->GetAttr(name.c_str()) != nullptr) {
+        return false;
+    }
+    SetAttribute(*head.component, name, value, isHidden ? Hidden : Seen, nullptr);
+    return true;
+}
+
+/// Keeps instances that do not set a parameter from being written with a default that is not known:
+/// an attribute of an instance hides that of its component, and without an option it is not
+/// written.
+void ModuleReader::LeaveOutAssumed() {
+    if (assumed_.empty()) {
+        return;
+    }
+    std::size_t leftOut = 0;
+    for (Instance* instance : maker_.GetNetlist().GetInstanceIterator()) {
+        const auto found = assumed_.find(instance->GetComponent());
+        if (found == assumed_.end()) {
+            continue;
+        }
+        for (const Assumed& assumed : found->second) {
+            if (instance->GetAttr(assumed.name.c_str()) == nullptr) {
+                if (++leftOut > MostLeftOut) {
+                    const ModuleHead& head = *FindHead(*instance);
+                    parser_.Fail(head.place, "too many instances of " + Quoted(head.name) +
+                                                 " leave out parameters whose default values are "
+                                                 "not known: a library file has to declare them");
+                }
+                SetAttribute(*instance, assumed.name, assumed.value, nullptr, nullptr);
+            }
+        }
     }
 }
 
@@ -690,6 +723,24 @@ void ModuleReader::ReadConnections(const ModuleHead& head, Instance& instance) {
     parser_.Expect(')');
 }
 
+/// The index of a port; `hint` is tried first. Long lists get an index.
+std::size_t ModuleReader::FindPort(const ModuleHead& head, std::string_view name,
+                                   std::size_t hint) {
+    constexpr std::size_t Few = 16;
+    const bool isAtHint = hint < head.ports.size() && head.ports[hint].name == name;
+    if (isAtHint || head.ports.size() <= Few) {
+        return head.FindPort(name, hint);
+    }
+    std::unordered_map<std::string_view, std::size_t>& places = portPlaces_[&head];
+    if (places.empty()) {
+        for (std::size_t i = 0; i < head.ports.size(); ++i) {
+            places.emplace(head.ports[i].name, i);
+        }
+    }
+    const auto found = places.find(name);
+    return found == places.end() ? head.ports.size() : found->second;
+}
+
 /// ".PORT(expression)". \param port where the port is looked for first; becomes where it is.
 void ModuleReader::ReadNamedConnection(const ModuleHead& head, const Instance& instance,
                                        std::size_t& port) {
@@ -702,7 +753,7 @@ void ModuleReader::ReadNamedConnection(const ModuleHead& head, const Instance& i
     if (!parser_.IsName()) {
         parser_.FailExpected("the name of a port");
     }
-    port = head.FindPort(parser_.Get().text, port);
+    port = FindPort(head, parser_.Get().text, port);
     if (port >= pins_.size()) {
         parser_.Fail("the module " + Quoted(head.name) + " has no port " + parser_.Show());
     }
@@ -750,10 +801,11 @@ void ModuleReader::Connect(const ModuleHead& head, const Instance& instance, std
         return;
     }
     if (value_.width != width) {
-        parser_.Fail(value_.place, "the port " + Quoted(head.ports[port].name) + " of " +
-                                       Quoted(head.name) + " has " + std::to_string(width) +
-                                       (width == 1 ? " bit" : " bits") + ", and " +
-                                       std::to_string(value_.width) + " are connected to it");
+        parser_.Fail(value_.place,
+                     "the port " + Quoted(head.ports[port].name) + " of " + Quoted(head.name) +
+                         " has " + std::to_string(width) + (width == 1 ? " bit" : " bits") +
+                         (head.isDeclared ? "" : " in an earlier connection") + ", and " +
+                         std::to_string(value_.width) + " are connected to it");
     }
     Signal* const signal = maker_.GetSignal(value_.pieces);
     if (NetlistMaker::IsOpenWord(signal->GetNameView())) {

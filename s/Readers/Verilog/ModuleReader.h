@@ -11,6 +11,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace Orn_Hdl::Readers {
@@ -32,6 +33,11 @@ private:
         std::string name;
         Value value;
         Place place;
+    };
+    /// A parameter of a component whose default is not known, and the one that is declared.
+    struct Assumed {
+        std::string name;
+        Value value;
     };
     /// A defparam statement in front of its instance.
     struct EarlyOverride {
@@ -69,12 +75,15 @@ private:
     void ReadOverrides(const ModuleHead& head);
     void ReadOneInstance(ModuleHead& head);
     void ReadConnections(const ModuleHead& head, Instance& instance);
+    std::size_t FindPort(const ModuleHead& head, std::string_view name, std::size_t hint);
     void ReadNamedConnection(const ModuleHead& head, const Instance& instance, std::size_t& port);
     void ReadImplicitConnection(const ModuleHead& head, const Instance& instance, std::size_t port);
     void Connect(const ModuleHead& head, const Instance& instance, std::size_t port);
     void SetParameter(Instance& instance, const ModuleHead& head, const Override& override,
                       bool isHidden);
-    void DeclareGeneric(const ModuleHead& head, const std::string& name, bool isHidden);
+    bool DeclareGeneric(const ModuleHead& head, const std::string& name, const Value& value,
+                        bool isHidden);
+    void LeaveOutAssumed();
     ModuleHead* FindHead(const Instance& instance) const;
     void SetEarlyOverrides();
 
@@ -87,6 +96,9 @@ private:
     ExpressionReader expressions_;
     std::vector<EarlyOverride> earlyOverrides_;
     std::map<const Component*, ModuleHead*> headsOfComponents_;
+    std::unordered_map<const Component*, std::vector<Assumed>> assumed_;
+    std::unordered_map<const ModuleHead*, std::unordered_map<std::string_view, std::size_t>>
+        portPlaces_;
     /// Room that is kept between statements.
     std::vector<Override> overrides_;
     std::vector<Pin*> pins_;

@@ -1,12 +1,12 @@
 #include "Readers/Verilog/Parser.h"
 
+#include "Readers/Limits.h"
 #include "Readers/Verilog/Literals.h"
 
 namespace Orn_Hdl::Readers {
 
 namespace {
 
-constexpr std::size_t DeepestExpression = 500;
 /// Keeps sums and products within 64 bits.
 constexpr std::int64_t LargestInteger = std::int64_t(1) << 31;
 

@@ -3,7 +3,9 @@
 
 #include "Orn_Hdl/Readers.h"
 
+#include <functional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -16,6 +18,8 @@ struct VerilogSetup {
     std::vector<std::pair<std::string, std::string>> macros;
     VerilogReader::Includes includes = VerilogReader::Includes::Follow;
     ReaderNames names = ReaderNames::Simple;
+    std::function<bool(std::string_view name)> keepsName;
+    ReaderUndeclared undeclared = ReaderUndeclared::Refuse;
     bool keepsComments = false;
     bool keepsAttributes = true;
 };

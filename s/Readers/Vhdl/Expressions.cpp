@@ -1,5 +1,6 @@
 #include "Readers/Vhdl/Expressions.h"
 
+#include "Readers/Limits.h"
 #include "Readers/Vhdl/Attributes.h"
 #include "Readers/Vhdl/Literals.h"
 #include "Readers/Vhdl/Types.h"
@@ -12,11 +13,8 @@ namespace Orn_Hdl::Readers::Vhdl {
 
 namespace {
 
-constexpr std::size_t DeepestExpression = 500;
-constexpr std::uint64_t MostBits = 1'048'576;
 /// How much aggregates may make of one file: a short text can ask for any number of pieces.
 constexpr std::uint64_t MostSpent = std::uint64_t(1) << 24;
-constexpr std::int64_t LargestIndex = std::numeric_limits<int>::max();
 
 std::uint64_t WidthOf(const Signal& signal) {
     return static_cast<std::uint64_t>(signal.GetWidth());

@@ -1,6 +1,7 @@
 #include "Readers/Vhdl/Literals.h"
 
 #include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Place.h"
 
 #include <algorithm>
@@ -11,9 +12,6 @@ namespace Orn_Hdl::Readers::Vhdl {
 
 namespace {
 
-constexpr std::size_t MostBits = 1'048'576;
-constexpr std::size_t MostDecimalDigits = 300;
-
 std::string WithoutUnderscores(std::string_view text) {
     std::string result(text);
     result.erase(std::remove(result.begin(), result.end(), '_'), result.end());
@@ -22,34 +20,6 @@ std::string WithoutUnderscores(std::string_view text) {
 
 int ValueOf(char digit) noexcept {
     return Port::IsDigit(digit) ? digit - '0' : Port::ToLower(digit) - 'a' + 10;
-}
-
-/// The bits of decimal digits, leftmost first, without zeros in front.
-std::string DecimalBits(std::string digits) {
-    if (digits.size() > MostDecimalDigits) {
-        throw LiteralProblem{"a decimal number of more than " + std::to_string(MostDecimalDigits) +
-                             " digits"};
-    }
-    std::string bits;
-    while (!digits.empty()) {
-        int remainder = 0;
-        std::string half;
-        for (const char digit : digits) {
-            if (!Port::IsDigit(digit)) {
-                throw LiteralProblem{std::string("the digit ") + digit + " in a decimal number"};
-            }
-            const int present = remainder * 10 + (digit - '0');
-            remainder = present % 2;
-            if (!half.empty() || present > 1) {
-                half += static_cast<char>('0' + present / 2);
-            }
-        }
-        bits += static_cast<char>('0' + remainder);
-        digits = std::move(half);
-    }
-    std::reverse(bits.begin(), bits.end());
-    bits.erase(0, std::min(bits.find('1'), bits.size()));
-    return bits;
 }
 
 [[noreturn]] void RefuseValue(char character) {

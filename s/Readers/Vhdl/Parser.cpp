@@ -1,13 +1,13 @@
 #include "Readers/Vhdl/Parser.h"
 
 #include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Vhdl/Literals.h"
 
 namespace Orn_Hdl::Readers::Vhdl {
 
 namespace {
 
-constexpr std::size_t DeepestExpression = 500;
 /// Keeps sums and products within 64 bits.
 constexpr std::int64_t LargestInteger = std::int64_t(1) << 31;
 

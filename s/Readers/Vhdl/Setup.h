@@ -3,7 +3,9 @@
 
 #include "Orn_Hdl/Readers.h"
 
+#include <functional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Orn_Hdl::Readers {
@@ -12,6 +14,7 @@ struct VhdlSetup {
     std::string top;
     std::vector<std::string> libraries;
     ReaderNames names = ReaderNames::Simple;
+    std::function<bool(std::string_view name)> keepsName;
     bool keepsComments = false;
     bool keepsAttributes = true;
 };

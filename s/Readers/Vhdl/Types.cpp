@@ -1,6 +1,7 @@
 #include "Readers/Vhdl/Types.h"
 
 #include "Port/Ascii.h"
+#include "Readers/Limits.h"
 #include "Readers/Vhdl/Design.h"
 #include "Readers/Vhdl/Literals.h"
 
@@ -11,8 +12,6 @@
 namespace Orn_Hdl::Readers::Vhdl {
 
 namespace {
-
-constexpr std::int64_t LargestIndex = std::numeric_limits<int>::max();
 
 template <std::size_t Count>
 bool IsOneOf(std::string_view name, const std::string_view (&words)[Count]) noexcept {

@@ -9,6 +9,7 @@
 #include "Run.h"
 #include "diagnostics/CommandLines.h"
 #include "explain/FailureExplainer.h"
+#include "load/RereadableFile.h"
 
 #include <algorithm>
 #include <cstdint>
@@ -28,42 +29,6 @@ using Checking::Located;
 using Checking::Reported;
 using Orn_Hdl::Check;
 
-/// A command file that can be read twice: standard input is copied.
-class Source {
-public:
-    explicit Source(const std::string& file) : name_(SystemFileName(file.c_str())) {
-        if (file == "-") {
-            Copy();
-        }
-    }
-    Source(const Source&) = delete;
-    Source& operator=(const Source&) = delete;
-    ~Source() {
-        if (copy_ != nullptr) {
-            std::fclose(copy_);
-        }
-    }
-    const char* GetName() const noexcept { return name_.c_str(); }
-
-private:
-    void Copy() {
-        copy_ = std::tmpfile();
-        if (copy_ == nullptr) {
-            return;
-        }
-        char piece[1 << 16];
-        std::size_t count = 0;
-        while ((count = std::fread(piece, 1, sizeof piece, stdin)) > 0) {
-            std::fwrite(piece, 1, count, copy_);
-        }
-        std::fflush(copy_);
-        name_ = "/dev/fd/" + std::to_string(::fileno(copy_));
-    }
-
-    std::string name_;
-    std::FILE* copy_ = nullptr;
-};
-
 /// The replay of one file, with a check at each line that would write.
 class FileCheck {
 public:
@@ -82,7 +47,7 @@ private:
 
     const CheckOptions& options_;
     const std::string& file_;
-    const Source source_;
+    const RereadableFile source_;
     CommandLines lines_;
     Reporter& reporter_;
     const Check::Targets targets_;

@@ -19,6 +19,16 @@ public:
     /// netlist.
     void Add(const std::string& fileName, std::string text);
 
+    /// Calls `visit` with every cell, in the order of the files.
+    template <class Visit> void ForEach(const Visit& visit) const {
+        for (const std::unique_ptr<ImportedDesign>& design : designs_) {
+            for (const Module& module : design->modules) {
+                if (Find(module.name) == &module) {
+                    visit(module);
+                }
+            }
+        }
+    }
     /// The cell of that name as a leaf module; null if there is none.
     const Module* Find(std::string_view name) const;
 

@@ -1,0 +1,23 @@
+`timescale 1ns / 1ps
+
+module X(A, 
+         B, 
+         Y, 
+         Z);
+
+ input A;
+ input [3:0] B;
+output Y;
+output [3:0] Z;
+
+wire Y_DUMMY;
+wire Y_DUMMY_1;
+
+assign Y = Y_DUMMY_1;
+BUF1 U1 (.I(A), 
+         .O(Y_DUMMY_1));
+REG4 U2 (.D(B[3:0]), 
+         .Q(Z[3:0]));
+BUF1 U3 (.I(Y_DUMMY_1), 
+         .O());
+endmodule

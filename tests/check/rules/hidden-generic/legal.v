@@ -1,0 +1,22 @@
+`timescale 1ns / 1ps
+
+module X(A, 
+         B, 
+         Y, 
+         Z);
+
+// synopsys translate_off
+parameter NOTE = 5;
+// synopsys translate_on
+
+ input A;
+ input [3:0] B;
+output Y;
+output [3:0] Z;
+
+
+BUF1 U1 (.I(A), 
+         .O(Y));
+REG4 U2 (.D(B[3:0]), 
+         .Q(Z[3:0]));
+endmodule

@@ -1,0 +1,8 @@
+`timescale 1ns / 1ps
+
+module X();
+
+
+wire N;
+
+endmodule

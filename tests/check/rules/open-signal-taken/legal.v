@@ -1,0 +1,21 @@
+`timescale 1ns / 1ps
+
+module X(A, 
+         B, 
+         Y, 
+         Z);
+
+ input A;
+ input [3:0] B;
+output Y;
+output [3:0] Z;
+
+wire U1_I_openSignal;
+wire U1_I_openSignal_1;
+
+assign U1_I_openSignal = A;
+BUF1 U1 (.I(U1_I_openSignal_1), 
+         .O(Y));
+REG4 U2 (.D(B[3:0]), 
+         .Q(Z[3:0]));
+endmodule

@@ -1,0 +1,22 @@
+`timescale 1ns / 1ps
+
+module X(A, 
+         B, 
+         std_logic_1, 
+         std_m, 
+         Y, 
+         Z);
+
+ input A;
+ input [3:0] B;
+ input std_logic_1;
+ input std_m;
+output Y;
+output [3:0] Z;
+
+
+BUF1 U1 (.I(A), 
+         .O(Y));
+REG4 U2 (.D(B[3:0]), 
+         .Q(Z[3:0]));
+endmodule

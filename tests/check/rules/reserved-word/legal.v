@@ -1,0 +1,25 @@
+`timescale 1ns / 1ps
+
+module X(A, 
+         B, 
+         wire_1, 
+         Y, 
+         Z);
+
+ input A;
+ input [3:0] B;
+ input wire_1;
+output Y;
+output [3:0] Z;
+
+wire signal_1;
+
+BUF1 U1 (.I(A), 
+         .O(Y));
+REG4 U2 (.D(B[3:0]), 
+         .Q(Z[3:0]));
+BUF1 U3 (.I(A), 
+         .O(signal_1));
+BUF1 U4 (.I(signal_1), 
+         .O());
+endmodule
