@@ -40,12 +40,14 @@ bool IsSameGeneric(const Attribute& attribute, const Value& value, bool isHidden
             (isHidden ? Attribute::GenericNoSyn : Attribute::GenericSyn)) {
         return false;
     }
-    const std::unique_ptr<Attribute> other = value.MakeAttribute("");
-    const auto baseOf = [](const Attribute& vector) {
-        return static_cast<const AttributeBitVector&>(vector).GetBitVectorValue().GetBase();
-    };
-    return attribute.GetValueString() == other->GetValueString() &&
-           (value.type != Attribute::BitVector || baseOf(attribute) == baseOf(*other));
+    // Most generics are bit vectors: no object is made to compare them.
+    if (value.type == Attribute::BitVector) {
+        const BitVectorValue present =
+            static_cast<const AttributeBitVector&>(attribute).GetBitVectorValue();
+        const BitVectorValue other(value.text.c_str());
+        return present.GetValue() == other.GetValue() && present.GetBase() == other.GetBase();
+    }
+    return attribute.GetValueString() == value.MakeAttribute("")->GetValueString();
 }
 
 } // namespace
