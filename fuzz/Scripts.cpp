@@ -1,6 +1,7 @@
 #include "Scripts.h"
 
 #include "Check.h"
+#include "CommandScripts.h"
 #include "Consistency.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
@@ -214,6 +215,9 @@ public:
         }
         if (when_ != When::Never) {
             CheckAll();
+        }
+        if (when_ == When::EveryFewLines) {
+            CheckCommands(*model_);
         }
         return result_;
     }

@@ -3,6 +3,7 @@
 
 #include "Bytes.h"
 #include "Check.h"
+#include "CommandScripts.h"
 #include "Consistency.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
@@ -78,6 +79,9 @@ public:
             if (checks_ == Checks::All && i % CallsPerCheck == 0) {
                 Fuzz::CheckNetlist(GetNetlist(), GetLoose());
             }
+        }
+        if (checks_ == Checks::All) {
+            Fuzz::CheckCommands(model_);
         }
         Write();
         // Loose signals are destroyed before the design or after it.

@@ -628,6 +628,14 @@ constexpr Accepted Table[] = {
      "begin\n"
      "default <= context;\n"
      "end BEHAVIORAL;\n"},
+    {"subtypes, as GHDL declares them", "port (d : in std_logic_vector(1 downto 0));",
+     "subtype typwrap_d is std_logic_vector(1 downto 0); signal wrap_d : TYPWRAP_D;\n"
+     "subtype unused is integer range 0 to 3; subtype b is std_logic; signal s : b;",
+     "wrap_d <= d; s <= wrap_d(0);",
+     "entity m is\nport ( d : in std_logic_vector (1 downto 0));\nend m;\n"
+     "architecture BEHAVIORAL of m is\nsignal s : std_logic;\n"
+     "signal wrap_d : std_logic_vector (1 downto 0);\nbegin\ns <= wrap_d(0);\n"
+     "wrap_d(1 downto 0) <= d(1 downto 0);\nend BEHAVIORAL;\n"},
     {"block comments, and character literals that look like ends", "",
      "signal a : std_logic; /* a ; block \n"
      " comment */ attribute A1 : string; attribute A1 of a : signal is \"; -- "

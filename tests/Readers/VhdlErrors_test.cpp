@@ -291,14 +291,6 @@ constexpr Refused Table[] = {
      "end architecture a;\n",
      "top.vhd:2:24: error: the declaration of a \"type\": a model has bits and vectors of "
      "bits alone"},
-    {"subtype",
-     "entity m is  end entity m;\n"
-     "architecture a of m is subtype t is std_logic_vector(1 downto 0);\n"
-     "begin\n"
-     "\n"
-     "end architecture a;\n",
-     "top.vhd:2:24: error: the declaration of a \"subtype\": a model has bits and vectors "
-     "of bits alone"},
     {"shared variable",
      "entity m is  end entity m;\n"
      "architecture a of m is shared variable x : integer;\n"

@@ -6,7 +6,8 @@
 // statements. Prints what differs.
 //
 // "reading rewrite LIBRARY INPUT OUTPUT": reads a netlist and writes it, as VHDL when the file's
-// name ends in ".vhd" and as Verilog otherwise.
+// name ends in ".vhd" and as Verilog otherwise. The library "-" is none. Prints the names that were
+// replaced.
 #include "Orn_Hdl/Orn_Hdl.h"
 
 #include <algorithm>
@@ -136,8 +137,17 @@ int Rewrite(const std::string& library, const std::string& input, const std::str
     CommandFactory factory;
     Model model(&factory);
     model.GetOptions()->writeHeader = false;
+    // Names that are words of VHDL.
+    model.GetOptions()->legal = IsVhdl(output);
+    auto& vhdl = model.GetOptions()->vhdl;
+    vhdl.useDefaultLibrary = false;
+    vhdl.suppressConfiguration = true;
+    vhdl.libraries.Add("ieee");
+    vhdl.useClauses.Add("ieee.std_logic_1164.all");
     Reader reader;
-    reader.AddLibrary(library.c_str());
+    if (library != "-") {
+        reader.AddLibrary(library.c_str());
+    }
     try {
         reader.Read(input.c_str(), model);
     } catch (const Exception& exception) {

@@ -404,6 +404,14 @@ class Formats(DiffTest):
         lines = self.read("a.json").splitlines()
         self.assertIn('"U1"', lines[difference["a"]["line"] - 1])
 
+    def test_netlists_without_a_library(self) -> None:
+        for name, net in (("a.v", "a"), ("b.v", "b")):
+            self.write(name, "module m(input a, input b, output y);\n"
+                       f"   INV U1(.I({net}), .O(y));\nendmodule\n")
+        (difference,) = self.diff_files("a.v", "b.v")["differences"]
+        self.assertEqual((difference["change"], difference["a"]["text"], difference["b"]["text"]),
+                         ("rewired", "a", "b"))
+
     def test_library(self) -> None:
         self.write("cells.v", "module INV(input I, output O); endmodule\n")
         for name, instance in (("a.v", "U1"), ("b.v", "U2")):

@@ -83,6 +83,18 @@ def attributes_set_again(size: int) -> str:
     return f"module t(input a);\n  (* {first} *) G #({again}) u(.I(a));\nendmodule\n"
 
 
+def rows_of_gates(size: int, name: str) -> str:
+    """Gates in rows that are alike; a net drives all of them, and only the ends of a row are ports."""
+    row = 50
+    lines = ["ADD COMPONENT G", "ADD PIN G C input", "ADD PIN G I input", "ADD PIN G O output",
+             "ADD PORT c input", f"ADD PORT a({size // row}:0) input"]
+    for i in range(size):
+        source = f"a({i // row})" if i % row == 0 else f"{name}n{i - 1}"
+        lines += [f"ADD INSTANCE G {name}{i}", f"CONNECT SIGNAL c {name}{i}.C",
+                  f"CONNECT SIGNAL {source} {name}{i}.I", f"CONNECT SIGNAL {name}n{i} {name}{i}.O"]
+    return "\n".join(lines) + "\n"
+
+
 class Growth(ToolTest):
     def setUp(self) -> None:
         super().setUp()
@@ -98,7 +110,8 @@ class Growth(ToolTest):
         seconds, peaks = [], []
         for _ in range(RUNS):
             with subprocess.Popen([TOOL, *map(str, arguments)], cwd=self.folder,
-                                  env=self.environment, stderr=subprocess.DEVNULL) as process:
+                                  env=self.environment, stdout=subprocess.DEVNULL,
+                                  stderr=subprocess.DEVNULL) as process:
                 _, status, usage = os.wait4(process.pid, 0)
                 process.returncode = os.waitstatus_to_exitcode(status)
             self.assertEqual(process.returncode, 0)
@@ -137,6 +150,16 @@ class Growth(ToolTest):
 
     def test_attributes_that_are_parameters_too(self) -> None:
         self.check(attributes_set_again, 2000, "import", "--from", "verilog", "--attributes")
+
+    def test_designs_with_other_names(self) -> None:
+        costs = []
+        for size in (4000, FACTOR * 4000):
+            self.write("a.cmd", rows_of_gates(size, "a"))
+            self.write("b.cmd", rows_of_gates(size, "b"))
+            costs.append(self.measure(["diff", "--ignore", "names", "a.cmd", "b.cmd"]))
+        (small, small_peak), (large, large_peak) = costs
+        self.assertLess(large, MOST * max(small, LEAST_SECONDS))
+        self.assertLess(large_peak, MOST * small_peak)
 
     def test_a_drawn_box_with_many_pins(self) -> None:
         self.check(box_with_pins, 2000, "draw", "-o", "o.svg")

@@ -69,6 +69,9 @@ void Expressible::CheckName(Kind kind, const Object& object, const Object* found
 }
 
 void Expressible::Check(const Component& component) {
+    if (component.GetNameView().empty()) {
+        FailToExpress("component", "", "it has no name");
+    }
     CheckName(KindComponent, component, netlist_.GetComponent(component.GetNameView()));
     for (const Pin* pin : component.GetPinIterator()) {
         const std::string_view name = pin->GetNameView();

@@ -1,7 +1,6 @@
 #include "Readers/Vhdl/ArchitectureReader.h"
 
 #include "Readers/Vhdl/Configurations.h"
-#include "Readers/Vhdl/Types.h"
 
 #include <cstddef>
 #include <optional>
@@ -201,8 +200,10 @@ void ArchitectureReader::ReadDeclaration() {
     case Keyword::For:
         ReadBinding();
         break;
-    case Keyword::Type:
     case Keyword::Subtype:
+        ReadSubtype();
+        break;
+    case Keyword::Type:
         parser_.Fail("the declaration of a " + parser_.Show() +
                      ": a model has bits and vectors of bits alone");
     case Keyword::None:
@@ -231,7 +232,7 @@ void ArchitectureReader::ReadSignals() {
     } while (parser_.Accept(','));
     parser_.Expect(':');
     const Place typePlace = parser_.Get().place;
-    const SignalType type = ReadSignalType(parser_, expressions_.GetResolve());
+    const SignalType type = ReadSignalType(parser_, expressions_.GetResolve(), &subtypes_);
     if (!type.problem.empty()) {
         parser_.Fail(typePlace, type.problem);
     }
@@ -248,6 +249,18 @@ void ArchitectureReader::ReadSignals() {
                      "statement, or leave it out");
     }
     parser_.Expect(';');
+}
+
+/// "subtype NAME is std_logic_vector(3 downto 0);" What is no type of signals matters only where it
+/// is used.
+void ArchitectureReader::ReadSubtype() {
+    parser_.Next();
+    parser_.TakeName(name_, "name of a subtype");
+    const std::string key = KeyOf(name_);
+    parser_.Expect(Keyword::Is, "is");
+    SignalType type = ReadSignalType(parser_, expressions_.GetResolve(), &subtypes_);
+    subtypes_[key] = std::move(type);
+    parser_.SkipStatement();
 }
 
 /// The component is known; comments in front of it belong to it.

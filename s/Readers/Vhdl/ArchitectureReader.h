@@ -6,6 +6,7 @@
 #include "Readers/Vhdl/InstanceReader.h"
 #include "Readers/Vhdl/Notes.h"
 #include "Readers/Vhdl/Setup.h"
+#include "Readers/Vhdl/Types.h"
 
 #include <string>
 
@@ -34,6 +35,7 @@ private:
     void SkipParentheses();
     void ReadDeclaration();
     void ReadSignals();
+    void ReadSubtype();
     void ReadComponent();
     void ReadBinding();
     void ReadStatement();
@@ -54,6 +56,7 @@ private:
     ExpressionReader expressions_;
     AttributeReader attributes_;
     InstanceReader instances_;
+    Subtypes subtypes_;
     Expression target_;
     Expression value_;
     std::string name_;

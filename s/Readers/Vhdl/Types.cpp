@@ -2,6 +2,7 @@
 
 #include "Port/Ascii.h"
 #include "Readers/Limits.h"
+#include "Readers/Vhdl/Design.h"
 #include "Readers/Vhdl/Literals.h"
 
 #include <algorithm>
@@ -223,10 +224,16 @@ std::optional<Range> ReadBounds(Parser& parser, const Parser::Resolve& resolve,
     return std::nullopt;
 }
 
-SignalType ReadSignalType(Parser& parser, const Parser::Resolve& resolve) {
+SignalType ReadSignalType(Parser& parser, const Parser::Resolve& resolve,
+                          const Subtypes* subtypes) {
     SignalType type;
     std::string name;
     parser.TakeSelectedName(name, "name of a type");
+    const auto subtype =
+        subtypes == nullptr ? Subtypes::const_iterator() : subtypes->find(KeyOf(name));
+    if (subtypes != nullptr && subtype != subtypes->end() && !parser.IsSign('(')) {
+        return subtype->second;
+    }
     if (!IsVectorType(name)) {
         if (!IsBitType(name)) {
             type.problem = "the type " + Quoted(name) +

@@ -6,6 +6,7 @@
 #include "Readers/Vhdl/Parser.h"
 
 #include <cstdint>
+#include <map>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -20,6 +21,9 @@ struct SignalType {
     std::string problem;
 };
 
+/// The subtypes that an architecture declares, as `KeyOf` gives their names.
+using Subtypes = std::map<std::string, SignalType>;
+
 /// Whether a name is that of a type of vectors of bits.
 bool IsVectorType(std::string_view name) noexcept;
 /// Whether a name is that of a type of one bit.
@@ -31,7 +35,9 @@ bool IsKnownType(std::string_view name);
 std::string GetTypeName(const Attribute& attribute);
 
 /// Reads a subtype indication: "std_logic", "std_logic_vector(7 downto 0)".
-SignalType ReadSignalType(Parser& parser, const Parser::Resolve& resolve);
+/// \param subtypes null when none can be declared.
+SignalType ReadSignalType(Parser& parser, const Parser::Resolve& resolve,
+                          const Subtypes* subtypes = nullptr);
 
 /// Reads "7 downto 0". \return nothing when the range cannot be told; why is in `problem`.
 std::optional<Range> ReadBounds(Parser& parser, const Parser::Resolve& resolve,

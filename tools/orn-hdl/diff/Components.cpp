@@ -17,10 +17,6 @@ namespace {
 using Orn_Hdl::Component;
 using Orn_Hdl::Pin;
 
-std::uint64_t HashPointer(const void* pointer) noexcept {
-    return Mix(reinterpret_cast<std::uintptr_t>(pointer));
-}
-
 std::uint32_t GetWidth(const Pin* pin) {
     if (pin == nullptr) {
         return 0;

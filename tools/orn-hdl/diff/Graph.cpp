@@ -81,10 +81,6 @@ bool IsDummyOf(const Signal& signal, const Signal& other) {
            Port::EqualIgnoringCase(other.GetDummySignalName().GetView(), signal.GetNameView());
 }
 
-std::uint64_t HashPointer(const void* pointer) noexcept {
-    return Mix(reinterpret_cast<std::uintptr_t>(pointer));
-}
-
 /// The value of a digit; 99 for any other character.
 unsigned GetDigit(char c) noexcept {
     const char small = Port::ToLower(c);
@@ -121,8 +117,7 @@ std::string Resize(const std::string& bits, std::size_t width) {
 } // namespace
 
 std::vector<std::uint32_t> GetTies(const Orn_Hdl::BitVectorValue& value, std::size_t width) {
-    const Port::String text = value.GetValue();
-    const std::string_view digits = text.GetView();
+    const std::string_view digits = value.GetValue().GetView();
     std::string bits = ReadDigits(digits, static_cast<unsigned>(value.GetBase()));
     if (!value.HasBaseAndLength() && bits.size() != width) {
         bits.clear();
@@ -279,7 +274,7 @@ void Graph::AppendBits(const Signal& signal) {
         return;
     }
     if (const Run* const run = FindRun(signal)) {
-        for (std::uint32_t i = 0; i < run->count && bits_.size() < 2 * MostBits; ++i) {
+        for (std::uint32_t i = 0; i < run->count && bits_.size() < std::size_t(2) * MostBits; ++i) {
             bits_.push_back(run->isReversed ? run->first - i : run->first + i);
         }
     }

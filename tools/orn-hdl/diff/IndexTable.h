@@ -24,6 +24,10 @@ constexpr std::uint64_t Mix(std::uint64_t a, std::uint64_t b) noexcept {
     return Mix(a * 0x9e3779b97f4a7c15U + b + 0x2545f4914f6cdd1dU);
 }
 
+inline std::uint64_t HashPointer(const void* pointer) noexcept {
+    return Mix(reinterpret_cast<std::uintptr_t>(pointer));
+}
+
 /// A hash table of row numbers. It holds no keys: the caller has the hashes and compares.
 class IndexTable {
 public:

@@ -12,7 +12,7 @@ namespace Tool::Diff {
 
 namespace {
 
-std::string_view GetName(const SignalRow& row) noexcept {
+std::string_view PlainName(const SignalRow& row) noexcept {
     return WithoutEscape(row.signal->GetNameView());
 }
 
@@ -38,8 +38,8 @@ private:
 
 /// Pairs the rows of two tables by the same name; what has a pair already stays as it is.
 template <class NameA, class NameB>
-void PairByName(std::vector<std::uint32_t> (&pairs)[2], std::size_t countA, const NameA& nameA,
-                std::size_t countB, const NameB& nameB) {
+void PairByName(std::array<std::vector<std::uint32_t>, 2>& pairs, std::size_t countA,
+                const NameA& nameA, std::size_t countB, const NameB& nameB) {
     const RowsByName<NameB> rows(countB, nameB);
     for (std::uint32_t row = 0; row < countA; ++row) {
         if (pairs[A][row] == None) {
@@ -57,10 +57,10 @@ void PairSignals(const Graph& a, const Graph& b, Matching& matching) {
     const std::vector<SignalRow>& rowsA = a.GetSignals();
     const std::vector<SignalRow>& rowsB = b.GetSignals();
     const auto whole = [](const std::vector<SignalRow>& rows) {
-        return [&rows](std::uint32_t row) { return GetName(rows[row]); };
+        return [&rows](std::uint32_t row) { return PlainName(rows[row]); };
     };
     const auto base = [](const std::vector<SignalRow>& rows) {
-        return [&rows](std::uint32_t row) { return GetBase(GetName(rows[row])); };
+        return [&rows](std::uint32_t row) { return GetBase(PlainName(rows[row])); };
     };
     PairByName(matching.signals, rowsA.size(), whole(rowsA), rowsB.size(), whole(rowsB));
     PairByName(matching.signals, rowsA.size(), base(rowsA), rowsB.size(), base(rowsB));

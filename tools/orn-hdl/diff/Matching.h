@@ -3,6 +3,7 @@
 
 #include "diff/Graph.h"
 
+#include <array>
 #include <cstdint>
 #include <vector>
 
@@ -13,10 +14,10 @@ struct Matching {
     Matching(const Graph& a, const Graph& b);
 
     /// By design and row.
-    std::vector<std::uint32_t> nets[2];
-    std::vector<std::uint32_t> instances[2];
+    std::array<std::vector<std::uint32_t>, 2> nets;
+    std::array<std::vector<std::uint32_t>, 2> instances;
     /// By design and row: the signal of the same name.
-    std::vector<std::uint32_t> signals[2];
+    std::array<std::vector<std::uint32_t>, 2> signals;
 
     bool AreMatched(std::uint32_t netA, std::uint32_t netB) const noexcept {
         return netA == Open || netB == Open ? netA == netB : nets[A][netA] == netB;

@@ -199,11 +199,9 @@ private:
 
     /// Names with commas between them, in front of a colon.
     void TakeDeclared(bool isList) {
-        if (!isList) {
-            names_.clear();
-        } else if (token_.IsName()) {
+        if (isList && token_.IsName()) {
             names_.emplace_back(token_.text, token_.line);
-        } else if (token_.IsSign(':')) {
+        } else if (isList && token_.IsSign(':')) {
             for (const auto& [name, line] : names_) {
                 Found(part_ == Part::Component ? What::Pin : What::Signal,
                       part_ == Part::Component ? owner_ : name,
@@ -211,7 +209,7 @@ private:
             }
             names_.clear();
             isSignal_ = false;
-        } else if (!token_.IsSign(',')) {
+        } else if (!isList || !token_.IsSign(',')) {
             names_.clear();
         }
     }

@@ -3,6 +3,7 @@
 
 #include "diff/Matching.h"
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <vector>
@@ -31,7 +32,7 @@ struct SignalPairs {
     std::vector<Pair> pairs;
     std::vector<BitPair> bits;
     /// What the other design does not have, by design.
-    std::vector<Part> left[2];
+    std::array<std::vector<Part>, 2> left;
 };
 
 /// Ports are paired by name. Other signals are paired by name, too, or, without `byNames`, by their

@@ -240,9 +240,8 @@ void Structure::ResolveNets() {
 void Structure::StartColors() {
     for (const Design design : {A, B}) {
         const Graph& graph = *graphs_[design];
-        const auto matchOf = [&](const std::vector<std::uint32_t>(&rows)[2], std::uint32_t row) {
-            return design == A ? row : rows[B][row];
-        };
+        const auto matchOf = [&](const std::array<std::vector<std::uint32_t>, 2>& rows,
+                                 std::uint32_t row) { return design == A ? row : rows[B][row]; };
         netColors_[design].assign(graph.GetNetCount(), 0);
         for (std::uint32_t net = 0; net < graph.GetNetCount(); ++net) {
             netColors_[design][net] = matching_.nets[design][net] != None

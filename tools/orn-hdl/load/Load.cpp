@@ -1,14 +1,14 @@
 #include "load/Load.h"
 
+#include "CellFiles.h"
 #include "NoWrites.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/Ascii.h"
-#include "Port/File.h"
 #include "Progress.h"
 #include "Run.h"
-#include "cells/CellDeclaration.h"
 #include "diagnostics/CommandLines.h"
 #include "explain/FailureExplainer.h"
+#include "import/CellComponents.h"
 #include "import/CellLibrary.h"
 #include "import/DesignReader.h"
 #include "import/EmitNetlist.h"
@@ -19,6 +19,7 @@
 #include <charconv>
 #include <cstddef>
 #include <string_view>
+#include <type_traits>
 #include <utility>
 
 namespace Tool {
@@ -30,23 +31,6 @@ constexpr std::uint64_t LinesPerUpdate = 4096;
 
 /// The name that a design has until a command names it.
 constexpr const char* Unnamed = "(design without a name)";
-
-Status ReadWhole(const char* systemName, const std::string& name, std::string& text) {
-    constexpr std::size_t Piece = std::size_t(1) << 20;
-    Port::File file;
-    if (!file.open(systemName, Port::File::Read, true)) {
-        return ComplainUnreadable(name, file.GetError());
-    }
-    std::size_t size = 0;
-    std::size_t count = 0;
-    do {
-        text.resize(size + Piece);
-        count = file.read(text.data() + size, Piece);
-        size += count;
-    } while (count > 0);
-    text.resize(size);
-    return file.GetError() == 0 ? Status::Success : ComplainUnreadable(name, file.GetError());
-}
 
 /// Takes a line off a text.
 std::string TakeLine(std::string& text) {
@@ -80,8 +64,7 @@ Diagnostic MakeDiagnostic(const std::string& file, std::string message) {
 
 Diagnostic MakeDiagnostic(const std::string& file, const Import::Error& error) {
     Diagnostic diagnostic = MakeDiagnostic(file, error.what());
-    const Import::TextPlace& place = error.GetPlace();
-    diagnostic.place = Place{file, place.line, place.source, Columns{place.column, 1}};
+    diagnostic.place = MakeJsonPlace(file, error.GetPlace());
     return diagnostic;
 }
 
@@ -165,20 +148,49 @@ void LoadedDesign::ReportReadError(std::string text, Reporter& reporter) const {
     reporter.Report(std::move(diagnostic));
 }
 
+/// Reads the libraries that the reader of the design's format does not read itself.
+Status LoadedDesign::ReadOtherLibraries(const Libraries& libraries, Orn_Hdl::Netlist& components,
+                                        Reporter& reporter) const {
+    std::vector<std::string> others;
+    for (const std::string& name : libraries.files) {
+        const DesignFormat format = GetFormatOf(name);
+        if (format == DesignFormat::Vhdl && format != GetFormat()) {
+            Orn_Hdl::VhdlReader::ReadComponents(name.c_str(), components);
+        } else if (format != GetFormat()) {
+            others.push_back(name);
+        }
+    }
+    Import::CellLibrary library;
+    const Status status = ReadCellFiles(others, library, reporter);
+    if (status == Status::Success) {
+        AddComponents(library, components);
+    }
+    return status;
+}
+
 template <class Reader>
 Status LoadedDesign::ReadNetlist(const Libraries& libraries, Reporter& reporter) {
     Reader reader;
-    for (const std::string& library : libraries.files) {
-        if ((GetFormatOf(library) == DesignFormat::Vhdl) == (GetFormat() == DesignFormat::Vhdl)) {
-            reader.AddLibrary(library.c_str());
-        }
-    }
-    if (libraries.components != nullptr) {
-        reader.AddLibrary(*libraries.components);
-    }
-    reader.KeepComments(true);
-    reader.SetNames(Orn_Hdl::ReaderNames::Literal);
+    Orn_Hdl::Netlist components;
     try {
+        const Status status = ReadOtherLibraries(libraries, components, reporter);
+        if (status != Status::Success) {
+            return status;
+        }
+        for (const std::string& name : libraries.files) {
+            if (GetFormatOf(name) == GetFormat()) {
+                reader.AddLibrary(name.c_str());
+            }
+        }
+        reader.AddLibrary(components);
+        if (libraries.components != nullptr) {
+            reader.AddLibrary(*libraries.components);
+        }
+        reader.KeepComments(true);
+        reader.SetNames(Orn_Hdl::ReaderNames::Literal);
+        if constexpr (std::is_same_v<Reader, Orn_Hdl::VerilogReader>) {
+            reader.SetUndeclared(Orn_Hdl::ReaderUndeclared::Infer);
+        }
         reader.Read(GetSystemName(), *model_);
     } catch (const Orn_Hdl::Exception& exception) {
         ReportReadError(std::string(exception.getLocalized().GetView()), reporter);
@@ -189,30 +201,18 @@ Status LoadedDesign::ReadNetlist(const Libraries& libraries, Reporter& reporter)
 }
 
 Status LoadedDesign::ReadJson(const Libraries& libraries, Reporter& reporter) {
-    Import::CellLibrary library;
+    std::vector<std::string> files;
     for (const std::string& name : libraries.files) {
-        if (GetFormatOf(name) == DesignFormat::Vhdl) {
-            continue;
-        }
-        std::string text;
-        const Status status = ReadWhole(name.c_str(), name, text);
-        if (status != Status::Success) {
-            return status;
-        }
-        try {
-            library.Add(name, std::move(text));
-        } catch (const Cells::Error& error) {
-            Diagnostic diagnostic = MakeDiagnostic(name, error.what());
-            diagnostic.place.line = error.GetLine();
-            reporter.Report(std::move(diagnostic));
-            return Status::Failed;
-        } catch (const Import::Error& error) {
-            reporter.Report(MakeDiagnostic(name, error));
-            return Status::Failed;
+        if (GetFormatOf(name) != DesignFormat::Vhdl) {
+            files.push_back(name);
         }
     }
+    Import::CellLibrary library;
+    Status status = ReadCellFiles(files, library, reporter);
     std::string text;
-    const Status status = ReadWhole(GetSystemName(), file_.name, text);
+    if (status == Status::Success) {
+        status = ReadWholeFile(GetSystemName(), text);
+    }
     if (status != Status::Success) {
         return status;
     }

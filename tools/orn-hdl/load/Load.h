@@ -32,8 +32,8 @@ struct DesignFile {
 
 /// What a netlist needs besides its own file.
 struct Libraries {
-    /// Files that declare components. A VHDL file is one for VHDL netlists, any other one for the
-    /// others.
+    /// Files that declare components: Verilog, VHDL, JSON or Liberty. JSON netlists take nothing of
+    /// VHDL files.
     std::vector<std::string> files;
     /// A design with components that no file declares; null for none.
     const Orn_Hdl::Netlist* components = nullptr;
@@ -64,6 +64,8 @@ public:
 
 private:
     Status Replay(Reporter& reporter, bool quiet);
+    Status ReadOtherLibraries(const Libraries& libraries, Orn_Hdl::Netlist& components,
+                              Reporter& reporter) const;
     template <class Reader> Status ReadNetlist(const Libraries& libraries, Reporter& reporter);
     Status ReadJson(const Libraries& libraries, Reporter& reporter);
     void ReportReadError(std::string text, Reporter& reporter) const;
