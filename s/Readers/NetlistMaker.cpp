@@ -440,7 +440,7 @@ std::string NetlistMaker::MakePinName(const PortHead& port, const ModuleHead& he
     if (CanKeep(plain, isBus, MayBeEscaped(port.name))) {
         return plain;
     }
-    const std::string similar = MakeSimple(plain, 'p');
+    std::string similar = MakeSimple(plain, 'p');
     std::string name = similar;
     constexpr unsigned Most = 100;
     for (unsigned suffix = 2; suffix < Most; ++suffix) {

@@ -53,4 +53,39 @@ TEST(KeptNames, TellTheKindOfEachRenaming) {
                                    "signal a.x a_x;instance u.x u_x;");
 }
 
+TEST(KeptNames, AreAskedForInVhdlToo) {
+    const Support::TemporaryFolder folder;
+    Support::WriteWholeFile(
+        folder / "top.vhd",
+        "entity top is port (reg : in bit); end;\n"
+        "architecture s of top is component C port (I : in bit); end component;\n"
+        "begin u : C port map (I => reg); end;\n");
+    Orn_Hdl::CommandFactory factory;
+    Orn_Hdl::Model model(&factory);
+    Orn_Hdl::VhdlReader reader;
+    reader.SetKeptNames([](std::string_view name) { return name != "reg"; });
+    reader.Read((folder / "top.vhd").c_str(), model);
+    EXPECT_EQ(model.GetSignal("reg"), nullptr);
+    EXPECT_NE(model.GetSignal("reg_2"), nullptr);
+}
+
+TEST(ReadComponents, TakesEntitiesAndThePackagesComponents) {
+    const Support::TemporaryFolder folder;
+    Support::WriteWholeFile(folder / "cells.vhd",
+                            "entity E is generic (N : integer := 3); port (A : inout bit); end;\n"
+                            "package p is component C port (D : in bit_vector(0 to 3)); "
+                            "end component; end;\n");
+    Orn_Hdl::Netlist netlist;
+    Orn_Hdl::VhdlReader::ReadComponents((folder / "cells.vhd").c_str(), netlist);
+    ASSERT_NE(netlist.GetComponent("E"), nullptr);
+    EXPECT_EQ(netlist.GetComponent("E")->GetPin("A")->GetPolarity(),
+              Orn_Hdl::Polarity::BiDirectional);
+    EXPECT_EQ(netlist.GetComponent("E")->GetAttr("N")->GetValueString(), "3");
+    ASSERT_NE(netlist.GetComponent("C"), nullptr);
+    EXPECT_NE(netlist.GetComponent("C")->GetPin("D(0:3)"), nullptr);
+    const std::string missing = Support::FailureOf(
+        [&netlist] { Orn_Hdl::VhdlReader::ReadComponents("/no/such/file.vhd", netlist); });
+    EXPECT_NE(missing, "");
+}
+
 } // namespace
