@@ -72,9 +72,6 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options, Re
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
 
-/// How much of a file tells what it is.
-constexpr std::size_t BeginningSize = 4096;
-
 /// \param beginning the beginning of the file.
 Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
                      const std::string& beginning) {

@@ -81,9 +81,6 @@ Diagnostic ReadMessage(string_view message) {
     return diagnostic;
 }
 
-/// How much of a file tells what it is.
-constexpr std::size_t BeginningSize = 4096;
-
 /// What a file is that no reader could read, if it is no netlist; empty if that is not known.
 std::string DescribeIfOther(const std::string& name) {
     Port::File file;

@@ -22,10 +22,10 @@ string_view WithoutRange(string_view name) {
     return name.substr(0, name.find('('));
 }
 
-class Table {
+class RenamingTable {
 public:
-    Table(const std::vector<ReaderRenaming>& renamings, const Orn_Hdl::LegalNetlist* legal,
-          Port::Stream& out)
+    RenamingTable(const std::vector<ReaderRenaming>& renamings, const Orn_Hdl::LegalNetlist* legal,
+                  Port::Stream& out)
         : legal_(legal), out_(out) {
         for (const ReaderRenaming& renaming : renamings) {
             auto& names =
@@ -62,7 +62,7 @@ private:
     std::map<string_view, Names> pinNames_;
 };
 
-void Table::WriteComponent(const Orn_Hdl::Component& component) {
+void RenamingTable::WriteComponent(const Orn_Hdl::Component& component) {
     Write("component", Kind::Component, component);
     const string_view oldOwner = GetOld(names_[Kind::Component], component.GetNameView());
     const std::string newOwner = GetNew(component);
@@ -73,7 +73,7 @@ void Table::WriteComponent(const Orn_Hdl::Component& component) {
     }
 }
 
-void Table::WriteAll(const Orn_Hdl::Netlist& netlist) {
+void RenamingTable::WriteAll(const Orn_Hdl::Netlist& netlist) {
     Write("module", Kind::Module, netlist);
     for (const Orn_Hdl::Component* component : netlist.GetComponentIterator()) {
         WriteComponent(*component);
@@ -101,7 +101,7 @@ const Orn_Hdl::Signal* FindDeclared(const Orn_Hdl::Netlist& netlist, string_view
 void WriteNetlistNames(const Orn_Hdl::Netlist& netlist,
                        const std::vector<ReaderRenaming>& renamings,
                        const Orn_Hdl::LegalNetlist* legal, Port::Stream& out) {
-    Table(renamings, legal, out).WriteAll(netlist);
+    RenamingTable(renamings, legal, out).WriteAll(netlist);
 }
 
 } // namespace Tool

@@ -2,6 +2,7 @@
 
 #include "HdlCmd/Script/InstanceStages.h"
 #include "HdlCmd/Script/Lines.h"
+#include "HdlCmd/Script/Values.h"
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Objects/OwnerLink.h"
 #include "HdlModel/Signals/SignalCast.h"
@@ -30,12 +31,6 @@ int PinTypeOf(std::string_view name) {
 
 bool IsSame(const Pin& pin, const Pin& other) {
     return pin.GetNameView() == other.GetNameView() && pin.GetPolarity() == other.GetPolarity();
-}
-
-std::string Folded(std::string_view name) {
-    std::string folded(name);
-    std::transform(folded.begin(), folded.end(), folded.begin(), Port::ToUpper);
-    return folded;
 }
 
 bool IsOnPort(const Signal& signal) {

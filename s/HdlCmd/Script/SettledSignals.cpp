@@ -1,5 +1,6 @@
 #include "HdlCmd/Script/SettledSignals.h"
 
+#include "HdlCmd/Script/Values.h"
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/RememberedDummies.h"
 #include "HdlModel/Objects/ObjectDetails.h"
@@ -34,12 +35,6 @@ std::string Join(const std::vector<std::string>& names, std::string_view separat
         joined.append(joined.empty() ? std::string_view() : separator).append(name);
     }
     return joined;
-}
-
-std::string Folded(std::string_view name) {
-    std::string folded(name);
-    std::transform(folded.begin(), folded.end(), folded.begin(), Port::ToUpper);
-    return folded;
 }
 
 } // namespace

@@ -1,7 +1,10 @@
 #include "HdlCmd/Script/Values.h"
 
+#include "Port/Ascii.h"
 #include <charconv>
 #include <string_view>
+
+#include <algorithm>
 
 namespace Orn_Hdl::Script {
 
@@ -83,6 +86,12 @@ std::string GetText(const Attribute& attribute) {
         return GetFloatText(*number);
     }
     return std::string(attribute.GetValueString().GetView());
+}
+
+std::string Folded(std::string_view name) {
+    std::string folded(name);
+    std::transform(folded.begin(), folded.end(), folded.begin(), Port::ToUpper);
+    return folded;
 }
 
 } // namespace Orn_Hdl::Script

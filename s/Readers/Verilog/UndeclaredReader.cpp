@@ -11,7 +11,7 @@ namespace Orn_Hdl::Readers {
 namespace {
 
 /// Nothing for a width that no port gets from a connection.
-std::optional<std::uint64_t> Limited(std::uint64_t width) {
+std::optional<std::uint64_t> LimitedWidth(std::uint64_t width) {
     return width > 0 && width <= MostBits ? std::optional<std::uint64_t>(width) : std::nullopt;
 }
 
@@ -198,7 +198,7 @@ bool UndeclaredReader::ReadConnection(ModuleHead& module, std::size_t& port) {
         }
     } else {
         const auto net = widths_.find(name_);
-        width = net == widths_.end() ? 1 : Limited(net->second);
+        width = net == widths_.end() ? 1 : LimitedWidth(net->second);
     }
     if (width && !head.hasWidth) {
         head.hasWidth = true;
@@ -219,7 +219,7 @@ std::optional<std::uint64_t> UndeclaredReader::ReadWidth() {
         width = ReadNetWidth();
     } else if (parser_.Get().kind == TokenKind::Number) {
         try {
-            width = Limited(Number::Read(parser_.Get().text).size);
+            width = LimitedWidth(Number::Read(parser_.Get().text).size);
         } catch (const LiteralProblem&) {
             // The next walk tells.
         }
@@ -243,7 +243,7 @@ std::optional<std::uint64_t> UndeclaredReader::ReadNetWidth() {
     if (parser_.Accept('[')) {
         return ReadSelectionWidth();
     }
-    return isParameter ? std::nullopt : Limited(width);
+    return isParameter ? std::nullopt : LimitedWidth(width);
 }
 
 /// "3]", "3:0]", "3 -: 2]" or "2 +: 2]"
@@ -261,7 +261,8 @@ std::optional<std::uint64_t> UndeclaredReader::ReadSelectionWidth() {
     if (!right || !parser_.Accept(']')) {
         return std::nullopt;
     }
-    return Limited(static_cast<std::uint64_t>(isCounted ? *right : std::abs(*left - *right) + 1));
+    return LimitedWidth(
+        static_cast<std::uint64_t>(isCounted ? *right : std::abs(*left - *right) + 1));
 }
 
 /// "a, b}" or "2{a}}", the first brace being read.
@@ -283,7 +284,7 @@ std::optional<std::uint64_t> UndeclaredReader::ReadConcatenationWidth() {
                 count = number.GetValue().value_or(0);
                 width = ReadConcatenationWidth();
             } else {
-                width = Limited(number.size);
+                width = LimitedWidth(number.size);
             }
         } else {
             width = ReadWidth();
@@ -298,7 +299,7 @@ std::optional<std::uint64_t> UndeclaredReader::ReadConcatenationWidth() {
         !parser_.Accept('}')) {
         return std::nullopt;
     }
-    return Limited(sum * static_cast<std::uint64_t>(count));
+    return LimitedWidth(sum * static_cast<std::uint64_t>(count));
 }
 
 } // namespace Orn_Hdl::Readers
