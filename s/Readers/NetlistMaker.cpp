@@ -71,11 +71,25 @@ bool NetlistMaker::IsOpenWord(std::string_view name) noexcept {
 }
 
 NetlistMaker::NetlistMaker(Netlist& netlist, VerilogReader::Names names,
-                           bool (*isReserved)(std::string_view name))
+                           bool (*isReserved)(std::string_view name), NetlistSink* sink)
     : netlist_(netlist), names_(names), isReserved_(isReserved),
-      renamed_(0, RenamingHash{&renamings_}, RenamingEqual{&renamings_}) {}
+      renamed_(0, RenamingHash{&renamings_}, RenamingEqual{&renamings_}), sink_(sink) {}
+
+Owner NetlistMaker::GetOwner(const AttributeHolder& holder) const noexcept {
+    if (&holder == &netlist_) {
+        return {};
+    }
+    if (&holder == instance_.get()) {
+        return {Owner::Instance, nullptr, instanceName_};
+    }
+    return {Owner::Signal, static_cast<const Signal*>(&holder), {}};
+}
 
 void NetlistMaker::SetName(const std::string& name) {
+    if (sink_ != nullptr) {
+        sink_->TakeModule(name, place_);
+        return;
+    }
     const bool isKept = names_ == VerilogReader::Names::Literal || CanKeep(name, false);
     const std::string newName = isKept ? name : MakeSimple(name);
     if (!isKept) {
@@ -149,6 +163,9 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
 }
 
 Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional<Range>& range) {
+    if (sink_ != nullptr) {
+        return sink_->Declare(name, range, Polarity::Invalid, place_);
+    }
     const bool isTaken = IsTaken(name);
     if (IsDeclared(name, isTaken)) {
         return nullptr;
@@ -166,7 +183,27 @@ Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional
     return signal;
 }
 
-Instance* NetlistMaker::AddInstance(const std::string& name, const Component& component) {
+Signal* NetlistMaker::DeclarePort(const PortHead& port) {
+    if (sink_ != nullptr) {
+        return sink_->Declare(port.name, port.range, port.direction, port.place);
+    }
+    Signal* const signal = DeclareSignal(port.name, port.range);
+    if (signal != nullptr) {
+        signal->SetPortPolarity(Polarity(port.direction));
+    }
+    return signal;
+}
+
+Instance* NetlistMaker::AddInstance(const std::string& name, const ModuleHead& head) {
+    const Component& component = *head.component;
+    if (sink_ != nullptr) {
+        if (instance_ == nullptr || instance_->GetComponent() != &component) {
+            instance_ = MakePacked<Instance>("", &component);
+        }
+        instanceName_ = name;
+        sink_->BeginInstance(name, head, place_);
+        return instance_.get();
+    }
     const bool isTaken = IsTaken(name);
     if (IsDeclared(name, isTaken)) {
         return nullptr;
@@ -187,6 +224,9 @@ Signal* NetlistMaker::FindByNewName(const std::string& name) const {
 }
 
 Signal* NetlistMaker::FindSignal(const std::string& name) const {
+    if (sink_ != nullptr) {
+        return sink_->FindSignal(name);
+    }
     if (const std::string* const renamed = FindRenamed(name)) {
         return FindByNewName(*renamed);
     }
@@ -199,6 +239,9 @@ Signal* NetlistMaker::FindSignal(const std::string& name) const {
 }
 
 Instance* NetlistMaker::FindInstance(const std::string& name) const {
+    if (sink_ != nullptr) {
+        return instance_ != nullptr && instanceName_ == name ? instance_.get() : nullptr;
+    }
     if (const std::string* const renamed = FindRenamed(name)) {
         return netlist_.GetInstance(std::string_view(*renamed));
     }
@@ -215,14 +258,19 @@ Range NetlistMaker::GetRange(const Bus& bus) {
     return range;
 }
 
+Signal* NetlistMaker::FindPart(const std::string& name) const {
+    Signal* const present = sink_ == nullptr ? nullptr : sink_->FindSignal(name);
+    return present != nullptr ? present : netlist_.GetSignal(std::string_view(name));
+}
+
 Signal* NetlistMaker::GetBit(Bus& bus, int index) {
     const std::string_view name = bus.GetNameView();
     text_ = name.substr(0, name.find('(') + 1);
     AppendNumber(text_, index);
     text_ += ')';
-    Signal* bit = netlist_.GetSignal(std::string_view(text_));
+    Signal* bit = FindPart(text_);
     if (bit == nullptr) {
-        bit = new BusIndex(text_.c_str(), &bus);
+        bit = new BusIndex(text_.c_str(), sink_ == nullptr ? &bus : nullptr);
         netlist_.Add(bit);
     }
     return bit;
@@ -235,9 +283,9 @@ Signal* NetlistMaker::GetSlice(Bus& bus, const Range& range) {
     const std::string_view name = bus.GetNameView();
     text_ = name.substr(0, name.find('('));
     AppendRange(text_, range);
-    Signal* slice = netlist_.GetSignal(std::string_view(text_));
+    Signal* slice = FindPart(text_);
     if (slice == nullptr) {
-        slice = new BusSlice(text_.c_str(), &bus);
+        slice = new BusSlice(text_.c_str(), sink_ == nullptr ? &bus : nullptr);
         netlist_.Add(slice);
     }
     return slice;
@@ -310,6 +358,9 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
     if (head.isPrimitive) {
         return "it is a primitive, whose ports have no names";
     }
+    if (sink_ != nullptr) {
+        return MakeStandIn(head);
+    }
     const bool canKeep = CanKeep(head.name, false);
     if (canKeep && netlist_.GetComponent(std::string_view(head.name)) != nullptr) {
         return "a model does not tell it from another component, whose name differs in letter case "
@@ -327,6 +378,14 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
     if (name != head.name) {
         renamings_.push_back({head.name, name});
     }
+    head.component = component.get();
+    netlist_.Add(component.release());
+    return "";
+}
+
+/// Makes a component that stands for a module, when there is a sink.
+std::string NetlistMaker::MakeStandIn(ModuleHead& head) {
+    auto component = std::make_unique<Component>(head.name.c_str());
     head.component = component.get();
     netlist_.Add(component.release());
     return "";

@@ -6,6 +6,7 @@
 #include "Readers/NetlistMaker.h"
 #include "Readers/Verilog/HeadReader.h"
 #include "Readers/Verilog/ModuleReader.h"
+#include "Readers/Verilog/ReadVerilog.h"
 
 #include <set>
 #include <utility>
@@ -37,7 +38,8 @@ public:
     }
 
     /// \return the names that were replaced.
-    std::vector<VerilogReader::Renaming> FillNetlist(Netlist& netlist);
+    std::vector<VerilogReader::Renaming> FillNetlist(Netlist& netlist,
+                                                     Readers::NetlistSink* sink = nullptr);
     const std::vector<std::string>& GetKeptIncludes() const noexcept { return keptIncludes_; }
     const std::string& GetFileName() const noexcept { return fileName_; }
 
@@ -116,13 +118,14 @@ const Readers::ModuleHead& Reading::FindTop() const {
     return *top;
 }
 
-std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
+std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist,
+                                                          Readers::NetlistSink* sink) {
     const Readers::ModuleHead& top = FindTop();
     const Readers::ModuleHead* const unfinished = heads_.GetUnfinished();
     if (unfinished != nullptr && unfinished != &top) {
         FailAt(files_, heads_.GetUnfinishedPlace(), "\"endmodule\" does not follow this");
     }
-    Readers::NetlistMaker maker(netlist, setup_.names, Readers::IsVerilogKeyword);
+    Readers::NetlistMaker maker(netlist, setup_.names, Readers::IsVerilogKeyword, sink);
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
@@ -130,6 +133,14 @@ std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
 }
 
 } // namespace
+
+std::vector<std::string> Readers::ReadVerilog(const char* fileName, const VerilogSetup& setup,
+                                              const Heads& components, NetlistSink& sink) {
+    Reading reading(fileName, setup, components);
+    Netlist parts;
+    reading.FillNetlist(parts, &sink);
+    return reading.GetKeptIncludes();
+}
 
 VerilogReader::VerilogReader() : implementation_(std::make_unique<Implementation>()) {}
 

@@ -17,6 +17,7 @@
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 #include "Progress.h"
+#include "proof/Differences.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -128,8 +129,13 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     ModelSink sink(model);
     EmitNetlist(netlist, sink);
     Progress progress(false, options.file);
+    model.GetOptions()->verify = options.verify;
+    const auto tell = [&reporter](const std::vector<Orn_Hdl::Proof::Difference>& differences,
+                                  const std::string& file) {
+        return ReportDifferences(differences, file, reporter);
+    };
     if (!options.legal) {
-        return WriteOutputs(model, options.outputs, progress);
+        return WriteOutputs(model, options.outputs, progress, nullptr, tell);
     }
     Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
     for (const Orn_Hdl::Check::Finding& error : legal.GetErrors()) {
@@ -137,7 +143,7 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
         diagnostic.rule = error.rule->name;
         reporter.Report(std::move(diagnostic));
     }
-    return legal.GetErrors().empty() ? WriteOutputs(model, options.outputs, progress, &legal)
+    return legal.GetErrors().empty() ? WriteOutputs(model, options.outputs, progress, &legal, tell)
                                      : Status::Failed;
 }
 

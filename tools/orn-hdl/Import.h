@@ -34,6 +34,8 @@ struct ImportOptions {
     std::string nameMap;
     /// Write legal netlists, or nothing.
     bool legal = false;
+    /// Read each netlist back and compare it with the design before it replaces its file.
+    bool verify = false;
     ReportOptions report;
 };
 

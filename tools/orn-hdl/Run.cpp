@@ -7,6 +7,7 @@
 #include "check/Checker.h"
 #include "check/WriteGate.h"
 #include "explain/FailureExplainer.h"
+#include "proof/Differences.h"
 #include "warnings/SlipFinder.h"
 
 #include <cstdint>
@@ -50,6 +51,11 @@ public:
         }
         try {
             model_.Execute(words);
+        } catch (const Orn_Hdl::ProofException& exception) {
+            const std::string netlist(words.GetView(words.GetSize() - 1));
+            status_ = Worse(status_, ReportDifferences(exception.GetDifferences(), netlist, lines_,
+                                                       file_.lines, file_.reporter));
+            return false;
         } catch (const Orn_Hdl::Exception& exception) {
             if (!TellWhyNotLegal(words)) {
                 Report(words, exception.getLocalized().GetView());
@@ -175,6 +181,14 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
 
 namespace {
 
+/// Reports differences at the lines of a command file, or at its last one.
+TellDifferences TellOf(CommandFile& file, std::uint64_t lines) {
+    return [&file, lines](const std::vector<Orn_Hdl::Proof::Difference>& differences,
+                          const std::string& netlist) {
+        return ReportDifferences(differences, netlist, lines, file.lines, file.reporter);
+    };
+}
+
 /// Writes the outputs and the table of names, or tells why there is no legal netlist.
 Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOptions& options,
                     std::uint64_t lines, CommandFile& file) {
@@ -191,7 +205,7 @@ Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOpti
     }
     Status status = nameMap.Flush();
     if (status == Status::Success) {
-        status = WriteOutputs(model, outputs, file.progress, &legal);
+        status = WriteOutputs(model, outputs, file.progress, &legal, TellOf(file, lines));
     }
     return status == Status::Success ? nameMap.Commit() : status;
 }
@@ -216,7 +230,8 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
         }
     }
     return Worse(status, options.legal ? WriteLegally(model, outputs, options, replayed.lines, file)
-                                       : WriteOutputs(model, outputs, file.progress));
+                                       : WriteOutputs(model, outputs, file.progress, nullptr,
+                                                      TellOf(file, replayed.lines)));
 }
 
 } // namespace
@@ -234,6 +249,7 @@ Status Run(const RunOptions& options) {
     Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";
+    model.GetOptions()->verify = options.verify;
     const Status status = ReplayAndWrite(model, file, options);
     file.reporter.Finish(GetWarningRules());
     return status;

@@ -38,6 +38,8 @@ struct RunOptions {
     bool check = false;
     /// Write legal netlists, or nothing.
     bool legal = false;
+    /// Read each netlist back and compare it with the design before it replaces its file.
+    bool verify = false;
     /// How a legal netlist changes names: "rename" or "escape".
     std::string names = "rename";
     /// The file for the table of old and new names; empty for none.

@@ -299,6 +299,8 @@ private:
         CLI::Option* legal =
             command.add_flag("--legal", run_.legal, "Write netlists that every tool takes")
                 ->excludes(check);
+        command.add_flag("--verify", run_.verify,
+                         "Read each netlist back and compare it with the design");
         command.add_option("--names", run_.names, "How --legal mends names")
             ->check(CLI::IsMember({"rename", "escape"}))
             ->type_name("rename|escape")
@@ -337,6 +339,8 @@ private:
         command.add_flag("--attributes", import_.attributes,
                          "Import the attributes of cells and nets");
         command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
+        command.add_flag("--verify", import_.verify,
+                         "Read each netlist back and compare it with the design");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");

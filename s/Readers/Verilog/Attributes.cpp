@@ -236,6 +236,10 @@ void AttributeReader::GiveNotes() {
 
 void AttributeReader::Set(const Target& target, const std::string& name, const Value& value,
                           const Place& place) {
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        sink->TakeAttribute(maker_.GetOwner(*target.holder), name, value, place);
+        return;
+    }
     const std::string problem = SetAttribute(*target.holder, name, value, nullptr, Assigned);
     if (!problem.empty()) {
         parser_.Fail(place, "the attribute " + Quoted(name) + ": " + problem);
@@ -307,7 +311,12 @@ bool AttributeReader::TakeSwitch(const std::vector<std::string_view>& words) {
     if (words.size() != 2 || (words[1] != "translate_off" && words[1] != "translate_on")) {
         return false;
     }
-    isHidden_ = words[1] == "translate_off";
+    // A sink gets what the library has written, and what the tools of the check make of it: to them
+    // these words of other dialects are a user's comment.
+    const bool isObeyed = words.front() == "synopsys" || words.front() == "synthesis";
+    if (isObeyed || maker_.GetSink() == nullptr) {
+        isHidden_ = words[1] == "translate_off";
+    }
     return true;
 }
 

@@ -99,6 +99,7 @@ void ExpressionReader::ReadNet() {
             parser_.IsSign('[')) {
             parser_.Fail(place, "the net " + Quoted(name_) + " is not declared");
         }
+        maker_.SetPlace(place);
         signal = maker_.DeclareSignal(name_, std::nullopt);
     }
     if (!parser_.IsSign('[')) {
@@ -381,6 +382,10 @@ Signal* ExpressionReader::MakeSignal(const Expression& expression) {
     if (expression.pieces.size() == 1 && expression.pieces.front().signal != nullptr) {
         return expression.pieces.front().signal;
     }
+    return maker_.GetConcatenation(GetMembers(expression));
+}
+
+const Members& ExpressionReader::GetMembers(const Expression& expression) {
     members_.clear();
     for (const Piece& piece : expression.pieces) {
         if (piece.signal != nullptr) {
@@ -390,7 +395,30 @@ Signal* ExpressionReader::MakeSignal(const Expression& expression) {
             members_.push_back(maker_.GetConstantNet(bit == '1'));
         }
     }
-    return maker_.GetConcatenation(members_);
+    return members_;
+}
+
+std::string ExpressionReader::GetBits(const Expression& expression, std::uint64_t width) {
+    if (width > MostBits) {
+        parser_.Fail(expression.place,
+                     "a constant of more than " + std::to_string(MostBits) + " bits");
+    }
+    const auto count = static_cast<std::uint32_t>(width);
+    if (expression.number) {
+        try {
+            return expression.number->GetBits(count);
+        } catch (const LiteralProblem& problem) {
+            parser_.Fail(expression.place, problem.text);
+        }
+    }
+    std::string bits;
+    for (const Piece& piece : expression.pieces) {
+        bits += piece.bits;
+    }
+    if (bits.size() > count) {
+        return bits.substr(bits.size() - count);
+    }
+    return bits.insert(0, count - bits.size(), '0');
 }
 
 std::string ExpressionReader::MakeConstant(const Expression& expression, std::uint64_t width,

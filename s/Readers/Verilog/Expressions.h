@@ -61,6 +61,10 @@ public:
     /// The signal that an expression of nets is; what of it is constant comes from nets that carry
     /// the constants.
     Signal* MakeSignal(const Expression& expression);
+    /// What an expression of nets consists of, for a sink; valid until the next call.
+    const Members& GetMembers(const Expression& expression);
+    /// The bits of a constant expression in so many bits, leftmost first.
+    std::string GetBits(const Expression& expression, std::uint64_t width);
     /// The constant of a model that a constant expression is in so many bits.
     std::string MakeConstant(const Expression& expression, std::uint64_t width, bool isBare);
 
@@ -91,7 +95,7 @@ private:
     /// How much repetitions have made of all expressions.
     std::uint64_t repeated_ = 0;
     std::string name_;
-    std::vector<Signal*> members_;
+    Members members_;
 };
 
 } // namespace Orn_Hdl::Readers
