@@ -2,14 +2,17 @@
 
 #include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
+#include "Port/Ascii.h"
 #include "Port/File.h"
 #include "Progress.h"
 #include "check/Checker.h"
 #include "check/WriteGate.h"
 #include "explain/FailureExplainer.h"
+#include "proof/Certificate.h"
 #include "proof/Differences.h"
 #include "warnings/SlipFinder.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <string_view>
 #include <system_error>
@@ -29,9 +32,9 @@ constexpr const char* NamelessModel = "HDL_NETLIST";
 class Replayer {
 public:
     Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate,
-             const WarningOptions* warnings)
-        : model_(model), file_(file), gate_(gate), explainer_(model, file.lines),
-          asErrors_(warnings != nullptr && warnings->areErrors) {
+             const WarningOptions* warnings, Certificate* certificate)
+        : model_(model), file_(file), gate_(gate), certificate_(certificate),
+          explainer_(model, file.lines), asErrors_(warnings != nullptr && warnings->areErrors) {
         if (warnings != nullptr && !warnings->dropped.all()) {
             slips_.emplace(model, *warnings, [this](const FoundSlip& found) { Report(found); });
         }
@@ -70,7 +73,10 @@ public:
             words_ = &words;
             slips_->Look(words);
         }
-        return model_.GetWriteError() == 0 || ReportWriteError(words);
+        if (model_.GetWriteError() != 0) {
+            return ReportWriteError(words);
+        }
+        return certificate_ == nullptr || !Checking::Checker::IsWrite(words) || Certify(words);
     }
 
     Status GetStatus() const noexcept { return status_; }
@@ -87,6 +93,15 @@ private:
         const Orn_Hdl::LegalNetlist legal(*model_.GetNetlist(), *model_.GetOptions());
         return Checking::WriteGate(model_, file_.lines, file_.reporter)
             .Tell(legal.GetErrors(), lines_);
+    }
+
+    bool Certify(const Orn_Hdl::StringArray& words) {
+        const bool isVerilog = Port::EqualIgnoringCase(words.GetView(1), "VERILOG");
+        const Status status = certificate_->AddNetlist(
+            std::string(model_.GetWrittenFileName().GetView()),
+            isVerilog ? Orn_Hdl::Language::Verilog : Orn_Hdl::Language::Vhdl, *model_.GetNetlist());
+        status_ = Worse(status_, status);
+        return status == Status::Success;
     }
 
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
@@ -125,6 +140,7 @@ private:
     Orn_Hdl::Model& model_;
     CommandFile& file_;
     Checking::WriteGate* const gate_;
+    Certificate* const certificate_;
     FailureExplainer explainer_;
     const bool asErrors_;
     /// Without a value if no slips are reported.
@@ -154,7 +170,8 @@ CommandFile::CommandFile(const std::string& fileName, const ReportOptions& repor
       reporter(report, [&shownProgress] { shownProgress.Erase(); }) {}
 
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const WriteRules& rules,
-                Checking::WriteGate* gate, const WarningOptions* warnings) {
+                Checking::WriteGate* gate, const WarningOptions* warnings,
+                Certificate* certificate) {
     Orn_Hdl::CommandReader input(model);
     if (!input.Open(SystemFileName(file.name.c_str()))) {
         return {ComplainUnreadable(file.name, input.GetError()), false, 0};
@@ -165,7 +182,7 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
     } catch (const std::system_error& error) {
         return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false, 0};
     }
-    Replayer replayer(model, file, gate, warnings);
+    Replayer replayer(model, file, gate, warnings, certificate);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
         if (!replayer.Execute(*words, input.GetPosition()) &&
             (!keepGoing || file.reporter.IsAtLimit())) {
@@ -210,11 +227,25 @@ Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOpti
     return status == Status::Success ? nameMap.Commit() : status;
 }
 
+/// Writes the certificate of the netlists of lines and of the command line.
+Status Certify(Orn_Hdl::Model& model, const Outputs& outputs, CommandFile& file,
+               Certificate& certificate) {
+    Status status = certificate.AddCommands(file.name, file.lines.GetSystemName());
+    for (const auto& [language, name] : outputs.files) {
+        if (!name.empty()) {
+            status = Worse(status, certificate.AddNetlist(name, language, *model.GetNetlist()));
+        }
+    }
+    return status == Status::Success ? certificate.Write() : status;
+}
+
 /// Replays the file of the options and writes its netlists.
 Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
     Checking::WriteGate gate(model, file.lines, file.reporter);
-    const Replayed replayed = Replay(model, file, options.keepGoing, options.writeRules,
-                                     options.check ? &gate : nullptr, &options.warnings);
+    Certificate certificate(options.certificate);
+    const Replayed replayed =
+        Replay(model, file, options.keepGoing, options.writeRules, options.check ? &gate : nullptr,
+               &options.warnings, options.certificate.empty() ? nullptr : &certificate);
     if (!replayed.complete) {
         return replayed.status;
     }
@@ -229,14 +260,25 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
             status = Worse(status, Status::Failed);
         }
     }
-    return Worse(status, options.legal ? WriteLegally(model, outputs, options, replayed.lines, file)
-                                       : WriteOutputs(model, outputs, file.progress, nullptr,
-                                                      TellOf(file, replayed.lines)));
+    status =
+        Worse(status, options.legal ? WriteLegally(model, outputs, options, replayed.lines, file)
+                                    : WriteOutputs(model, outputs, file.progress, nullptr,
+                                                   TellOf(file, replayed.lines)));
+    return status == Status::Success && !options.certificate.empty()
+               ? Certify(model, outputs, file, certificate)
+               : status;
 }
 
 } // namespace
 
 Status Run(const RunOptions& options) {
+    const auto isOut = [](const auto& output) { return output.second == "-"; };
+    if (!options.certificate.empty() &&
+        (options.file == "-" ||
+         std::any_of(options.outputs.files.begin(), options.outputs.files.end(), isOut))) {
+        Complain("a certificate is of files: name the command file and the netlists");
+        return Status::Usage;
+    }
     Progress progress(options.quiet, options.file);
     CommandFile file(options.file, options.report, progress);
     // The design is not destroyed before the process ends: freeing it object by object would take a

@@ -18,6 +18,7 @@ class Model;
 
 namespace Tool {
 
+class Certificate;
 class Progress;
 
 namespace Checking {
@@ -40,6 +41,8 @@ struct RunOptions {
     bool legal = false;
     /// Read each netlist back and compare it with the design before it replaces its file.
     bool verify = false;
+    /// The file for the certificate of the netlists; empty for none.
+    std::string certificate;
     /// How a legal netlist changes names: "rename" or "escape".
     std::string names = "rename";
     /// The file for the table of old and new names; empty for none.
@@ -80,8 +83,9 @@ struct CommandFile {
 /// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
 /// \param gate decides which lines may write; null when all may.
 /// \param warnings the slips that are reported; null for none.
+/// \param certificate gets the netlists that lines have written; null for none.
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing,
                 const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr,
-                const WarningOptions* warnings = nullptr);
+                const WarningOptions* warnings = nullptr, Certificate* certificate = nullptr);
 
 } // namespace Tool
