@@ -37,4 +37,4 @@ step "tests"
 ctest --preset release -j "$jobs"
 
 step "fuzzing"
-fuzz/run 60
+fuzz/run 20

@@ -1,5 +1,5 @@
 /// \file
-/// `VerilogReader`, which reads a structural netlist into a model.
+/// `VerilogReader` and `VhdlReader`, which read structural netlists into models.
 #pragma once
 
 #include "Port/Export.h"
@@ -12,6 +12,24 @@ namespace Orn_Hdl {
 
 class Model;
 class Netlist;
+
+/// What becomes of a name that is not a letter or "_" followed by letters, digits and "_".
+enum class ReaderNames {
+    /// It is replaced by one that is, as far as possible the same.
+    Simple,
+    /// It stays, an escaped name without its backslashes, as long as a model can hold it. No model
+    /// can hold brackets, "-", "," and "\" in a name, and in the name of a bus nothing but letters,
+    /// digits and "_".
+    Literal
+};
+
+/// A name of a file that the model does not have.
+struct ReaderRenaming {
+    /// The name in the file.
+    std::string name;
+    /// The name in the model.
+    std::string newName;
+};
 
 /// Reads one module of a structural Verilog netlist (IEEE 1364-2005, and what of IEEE 1800 appears
 /// in netlists) into a model.
@@ -40,23 +58,11 @@ public:
         /// of modules.
         Keep
     };
-    /// What becomes of a name that is not a letter or "_" followed by letters, digits and "_".
-    enum class Names {
-        /// It is replaced by one that is, as far as possible the same. "$" stays in names that have
-        /// no range.
-        Simple,
-        /// It stays, an escaped name without its backslash, as long as a model can hold it. No
-        /// model can hold brackets, "-", "," and "\" in a name, and in the name of a bus nothing
-        /// but letters, digits and "_".
-        Literal
-    };
-    /// A name of the file that the model does not have.
-    struct Renaming {
-        /// The name in the file, without the backslash of an escaped one.
-        std::string name;
-        /// The name in the model.
-        std::string newName;
-    };
+    /// What becomes of names that are not simple. With `ReaderNames::Simple`, "$" stays in names
+    /// that have no range.
+    using Names = ReaderNames;
+    /// A name of the file that the model does not have, without the backslash of an escaped one.
+    using Renaming = ReaderRenaming;
 
     /// A reader that reads the only module that is not instantiated, keeps attributes and no
     /// comments, follows include directives and makes names simple.
@@ -93,6 +99,74 @@ public:
 
     /// Reads a file. What the model's netlist held before is destroyed. The model's name becomes
     /// the module's and its source file the file.
+    /// \throws Exception, the model unchanged, when the file cannot be read or holds an error.
+    void Read(const char* fileName, Model& model);
+    /// The names that the last successful `Read` has replaced, in the order of their declarations.
+    const std::vector<Renaming>& GetRenamings() const noexcept;
+
+private:
+    struct Implementation;
+
+    std::unique_ptr<Implementation> implementation_;
+};
+
+/// Reads one architecture of a structural VHDL netlist (IEEE 1076-1993, and what of IEEE 1076-2008
+/// appears in netlists) into a model.
+///
+/// The entity's ports, and the signals, assignments and instances of its architecture, become the
+/// model's design. Component declarations, the other entities of the file, the library files and
+/// black boxes say which pins the components have. Behavioural text, and what a model cannot hold,
+/// is an error; so is a name that is used but declared nowhere. Names that differ in letter case
+/// alone are the same, and the model has the one of the declaration.
+///
+/// \code
+/// VhdlReader reader;
+/// reader.AddLibrary("cells.vhd");
+/// reader.Read("top.vhd", model);
+/// \endcode
+///
+/// An error throws an `Exception` whose text is `FILE:LINE:COLUMN: error: TEXT`, then the line of
+/// the file and a line with a caret below the place. A file is read twice, piece by piece, so it
+/// has to be one that can be opened again.
+class ORN_HDL_API VhdlReader {
+public:
+    /// What becomes of names that are not simple: those in backslashes.
+    using Names = ReaderNames;
+    /// A name of the file that the model does not have, with the backslashes around it.
+    using Renaming = ReaderRenaming;
+
+    /// A reader that reads the only entity that is not instantiated, keeps attributes and no
+    /// comments, and makes names simple.
+    VhdlReader();
+    VhdlReader(const VhdlReader&) = delete;
+    VhdlReader& operator=(const VhdlReader&) = delete;
+    ~VhdlReader();
+
+    /// Chooses the entity to read, and its architecture.
+    /// \param name "ENTITY" or "ENTITY(ARCHITECTURE)". Without an architecture, the last one of the
+    ///        file is read. Null and "" choose the only entity of the file that has an architecture
+    ///        and that no other one instantiates.
+    void SetTop(const char* name);
+    /// Adds a file whose entities, and the component declarations in its packages, are components.
+    /// An entity or component of the netlist's own file, and of a file added before, takes
+    /// precedence. Architectures are passed over.
+    /// \param fileName opened by `Read`.
+    void AddLibrary(const char* fileName);
+    /// Adds the components of a netlist. An entity or component of a file takes precedence.
+    /// \param netlist its components' names, pins and the types of their generics are copied.
+    void AddLibrary(const Netlist& netlist);
+    /// Sets what becomes of names that are not simple.
+    void SetNames(Names names) noexcept;
+    /// Whether comments in front of the entity, a declaration or an instance become comments of the
+    /// objects.
+    void KeepComments(bool keep) noexcept;
+    /// Whether attribute specifications become attributes of the objects.
+    void KeepAttributes(bool keep) noexcept;
+
+    /// Reads a file. What the model's netlist held before is destroyed. The model's name becomes
+    /// the entity's and its source file the file. The VHDL options of the model become those with
+    /// which the file could have been written: its library and use clauses, whether it declares
+    /// components and a configuration, and whether attributes have types.
     /// \throws Exception, the model unchanged, when the file cannot be read or holds an error.
     void Read(const char* fileName, Model& model);
     /// The names that the last successful `Read` has replaced, in the order of their declarations.

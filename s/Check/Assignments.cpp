@@ -100,7 +100,7 @@ private:
 };
 
 void Assignments::CheckAll() {
-    for (const Signal* signal : context_.netlist.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         CheckSignal(*signal);
     }
 }

@@ -1,7 +1,7 @@
 // Attributes and generics: their names, declarations, types and values.
 
+#include "Check/AttributeValues.h"
 #include "Check/Context.h"
-#include "Check/Digits.h"
 #include "Check/NameCheck.h"
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Netlist/Primitives.h"
@@ -20,62 +20,6 @@ using std::string_view;
 
 namespace {
 
-bool IsGeneric(const Attribute& attribute) {
-    return attribute.GetGenericOption() != Attribute::GenericNone;
-}
-
-bool IsSynthesis(const Attribute& attribute) {
-    return attribute.GetSynAttrOption() != Attribute::SynAttrNone;
-}
-
-/// The name of the attribute's type in VHDL, in small letters.
-std::string TypeOf(const Attribute& attribute) {
-    switch (attribute.GetValueType()) {
-    case Attribute::Integer:
-        return "integer";
-    case Attribute::Float:
-        return "real";
-    case Attribute::Boolean:
-        return "boolean";
-    case Attribute::Bit:
-        return "bit";
-    case Attribute::BitVector:
-        return "bit_vector";
-    case Attribute::User:
-        return Lower(static_cast<const AttributeUser&>(attribute).GetUserType().GetView());
-    default:
-        return "string";
-    }
-}
-
-template <std::size_t N> bool IsOneOf(const string_view (&words)[N], string_view word) {
-    return std::find(std::begin(words), std::end(words), word) != std::end(words);
-}
-
-/// Types that every netlist can see.
-constexpr string_view VisibleTypes[] = {"bit",
-                                        "bit_vector",
-                                        "boolean",
-                                        "character",
-                                        "integer",
-                                        "natural",
-                                        "positive",
-                                        "real",
-                                        "signed",
-                                        "std_logic",
-                                        "std_logic_vector",
-                                        "std_ulogic",
-                                        "string",
-                                        "time",
-                                        "std_ulogic_vector",
-                                        "unsigned",
-                                        "severity_level",
-                                        "x01",
-                                        "x01z",
-                                        "ux01",
-                                        "ux01z",
-                                        "delay_length"};
-
 /// Attributes of the language, which no design can declare.
 constexpr string_view PredefinedAttributes[] = {
     "active",     "ascending",   "base",   "delayed", "driving",       "driving_value",
@@ -85,77 +29,10 @@ constexpr string_view PredefinedAttributes[] = {
     "rightof",    "simple_name", "stable", "subtype", "succ",          "transaction",
     "val",        "value"};
 
-bool IsNumber(string_view text, bool isReal) {
-    if (!text.empty() && (text.front() == '-' || text.front() == '+')) {
-        text.remove_prefix(1);
-    }
-    const bool hasPoint = text.find('.') != string_view::npos;
-    return !text.empty() && Port::IsDigit(text.front()) && Port::IsDigit(text.back()) &&
-           hasPoint == isReal && std::all_of(text.begin(), text.end(), [](char c) {
-               return Port::IsDigit(c) || c == '.';
-           });
+bool IsPredefined(string_view name) {
+    return std::find(std::begin(PredefinedAttributes), std::end(PredefinedAttributes), name) !=
+           std::end(PredefinedAttributes);
 }
-
-bool IsQuotedBy(string_view text, char quote) {
-    return text.size() >= 2 && text.front() == quote && text.back() == quote;
-}
-
-/// Whether a text can be a value of one of the visible types; of other types any text can.
-bool CanBeValueOf(string_view type, string_view text) {
-    if (type == "integer") {
-        return IsNumber(text, false);
-    }
-    if (type == "natural" || type == "positive") {
-        return IsNumber(text, false) && text.front() != '-' && (type == "natural" || text != "0");
-    }
-    if (type == "real") {
-        return IsNumber(text, true);
-    }
-    if (type == "boolean") {
-        return Port::EqualIgnoringCase(text, "true") || Port::EqualIgnoringCase(text, "false");
-    }
-    if (type == "bit") {
-        return text == "'0'" || text == "'1'";
-    }
-    if (type == "std_logic" || type == "std_ulogic" || type == "character") {
-        return text.size() == 3 && IsQuotedBy(text, '\'');
-    }
-    if (type == "string" || type == "bit_vector" || type == "std_logic_vector") {
-        return text.empty() || (IsQuotedBy(text, '"') &&
-                                text.substr(1, text.size() - 2).find('"') == string_view::npos);
-    }
-    return !text.empty();
-}
-
-/// Where the value of an attribute is written.
-struct Places {
-    bool verilogNumber = false;
-    bool verilogComment = false;
-    bool vhdl = false;
-    /// Whether VHDL gets a literal of the type, otherwise a string.
-    bool typed = false;
-};
-
-/// Who holds an attribute.
-struct Holder {
-    const AttributeHolder* attributes = nullptr;
-    const Object* object = nullptr;
-    Kind kind = Kind::ModuleAttribute;
-
-    string_view GetName() const {
-        return kind == Kind::ModuleAttribute   ? string_view()
-               : kind == Kind::SignalAttribute ? Names::BaseName(object->GetNameView())
-                                               : object->GetNameView();
-    }
-    Cause CauseOf(const Attribute& attribute) const {
-        return Named(kind, kind == Kind::ModuleAttribute ? string_view() : object->GetNameView(),
-                     attribute.GetNameView());
-    }
-    std::string Describe(const Attribute& attribute) const {
-        std::string text = "the attribute " + Quoted(attribute.GetNameView()) + " of ";
-        return text += kind == Kind::ModuleAttribute ? "the design" : Quoted(GetName());
-    }
-};
 
 /// The declaration that VHDL gets for the attributes of one name.
 struct Declaration {
@@ -178,7 +55,7 @@ private:
     void CheckComponents();
     void CheckInstances();
     void CheckHolder(const Holder& holder);
-    bool IsHidden(const Holder& component, const Attribute& attribute) const;
+    bool IsHidden(const Holder& component, const Attribute& attribute);
     void NoteGeneric(const Holder& holder, const Attribute& attribute);
     void CheckGenericMap(const Instance& instance);
     void CheckAgainstPins(const Holder& holder, const Instance& instance,
@@ -187,20 +64,20 @@ private:
     void Declare(const Holder& holder, const Attribute& attribute);
     void CheckDeclared(const Holder& holder, const Attribute& attribute);
     bool IsDeclaredBy(const Holder& holder, const Attribute& attribute) const;
-    void CheckValue(const Holder& holder, const Attribute& attribute, const Places& places);
-    void CheckText(const Holder& holder, const Attribute& attribute, string_view text,
-                   const Places& places);
-    void CheckDigits(const Holder& holder, const Attribute& attribute, const Places& places);
-    void CheckUser(const Holder& holder, const Attribute& attribute);
+    void CheckValueIn(const Holder& holder, const Attribute& attribute, Places places) const;
     Places PlacesOf(const Attribute& attribute) const;
     Finding* Add(RuleId rule, const Verdicts& verdicts, const Holder& holder,
-                 const Attribute& attribute);
+                 const Attribute& attribute) {
+        return AddFinding(context_, rule, verdicts, holder, attribute);
+    }
 
     Context& context_;
     const bool isTyped_;
     const bool isInBlockComment_;
     std::unordered_map<std::string, Declaration> declarations_;
     std::unordered_set<std::string> checkedNames_;
+    /// Made when it is first asked for.
+    std::unordered_map<const Component*, std::vector<const Instance*>> instancesOf_;
     bool hasHidden_ = false;
 };
 
@@ -209,21 +86,6 @@ AttributeWalk::AttributeWalk(Context& context)
       isInBlockComment_(
           context.options.verilog.synthesisType == HdlOptions::VerilogOption::SYNPLICITY ||
           context.options.verilog.synthesisType == HdlOptions::VerilogOption::SYNOPSYS) {}
-
-Finding* AttributeWalk::Add(RuleId rule, const Verdicts& verdicts, const Holder& holder,
-                            const Attribute& attribute) {
-    Verdicts counted = verdicts;
-    if (attribute.GetGenericOption() == Attribute::GenericNoSyn && rule != RuleId::CommentInValue &&
-        rule != RuleId::HiddenGeneric) {
-        // Yosys does not read what is kept from synthesis.
-        counted.Set(Check::Target::Yosys, Check::Verdict::Accepts);
-    }
-    Finding* const finding = context_.Add(rule, counted, holder.CauseOf(attribute));
-    if (finding != nullptr) {
-        finding->objects = {holder.object, &attribute};
-    }
-    return finding;
-}
 
 void AttributeWalk::CheckAll() {
     CheckModule();
@@ -246,7 +108,7 @@ void AttributeWalk::CheckModule() {
             continue;
         }
         CheckNamesOf(holder, *attribute);
-        CheckValue(holder, *attribute, {true, false, true, true});
+        CheckValueIn(holder, *attribute, {true, false, true, true});
         NoteGeneric(holder, *attribute);
     }
 }
@@ -254,7 +116,7 @@ void AttributeWalk::CheckModule() {
 /// Ports declare their attributes one after the other, so their order decides what is declared.
 void AttributeWalk::CheckSignals(bool ports) {
     std::vector<const Signal*> signals;
-    for (const Signal* signal : context_.netlist.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (signal->HasAttrs() && signal->IsNeededToDeclared() && signal->IsPort() == ports &&
             !Writers::IsOpen(signal->GetNameView())) {
             signals.push_back(signal);
@@ -286,7 +148,7 @@ void AttributeWalk::CheckSignals(bool ports) {
             if (IsSynthesis(*attribute)) {
                 CheckNamesOf(holder, *attribute);
                 CheckDeclared(holder, *attribute);
-                CheckValue(holder, *attribute, {false, isInBlockComment_, true, isTyped_});
+                CheckValueIn(holder, *attribute, {false, isInBlockComment_, true, isTyped_});
             }
         }
     }
@@ -302,7 +164,7 @@ void AttributeWalk::DeclareAll(const Holder& holder) {
 /// which type is declared, and matters only where types do.
 void AttributeWalk::DeclareOfInstances() {
     std::vector<const Instance*> instances;
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         const Component* const component = instance->GetComponent();
         if (instance->HasAttrs() || (component != nullptr && component->HasAttrs())) {
             instances.push_back(instance);
@@ -344,7 +206,7 @@ void AttributeWalk::CheckComponents() {
 }
 
 void AttributeWalk::CheckInstances() {
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         if (instance->HasAttrs()) {
             CheckHolder({instance, instance, Kind::InstanceAttribute});
             CheckGenericMap(*instance);
@@ -373,30 +235,32 @@ void AttributeWalk::CheckHolder(const Holder& holder) {
             places.verilogNumber = places.verilogComment = false;
         }
         NoteGeneric(holder, *attribute);
-        CheckValue(holder, *attribute, places);
+        CheckValueIn(holder, *attribute, places);
         if (places.verilogNumber && IsSynthesis(*attribute) && !isTyped_ &&
             attribute->GetValueType() != Attribute::String) {
             // The same value is a string elsewhere.
             places = {false, isInBlockComment_, true, false};
-            CheckValue(holder, *attribute, places);
+            CheckValueIn(holder, *attribute, places);
         }
     }
 }
 
 /// Whether each instance of the component has an attribute of that name in its place. Verilog has
 /// parameters of instances only.
-bool AttributeWalk::IsHidden(const Holder& component, const Attribute& attribute) const {
+bool AttributeWalk::IsHidden(const Holder& component, const Attribute& attribute) {
     const auto* const used = static_cast<const Component*>(component.object);
     if (context_.used.at(used).hasPlainInstance) {
         return false;
     }
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
-        if (instance->GetComponent() == used &&
-            instance->GetAttr(attribute.GetName().CStr()) == nullptr) {
-            return false;
+    if (instancesOf_.empty()) {
+        for (const Instance* instance : context_.survey.GetInstances()) {
+            instancesOf_[instance->GetComponent()].push_back(instance);
         }
     }
-    return true;
+    const std::vector<const Instance*>& instances = instancesOf_[used];
+    return std::all_of(instances.begin(), instances.end(), [&](const Instance* instance) {
+        return instance->GetAttr(attribute.GetName().CStr()) != nullptr;
+    });
 }
 
 /// Tells of the first generic that is kept from synthesis, and of numbers that Yosys cannot hold.
@@ -484,7 +348,7 @@ void AttributeWalk::CheckNamesOf(const Holder& holder, const Attribute& attribut
     use.isInVerilog = isGeneric;
     use.isHiddenFromYosys = isHidden;
     CheckName(context_, use);
-    if (isSynthesis && IsOneOf(PredefinedAttributes, Lower(attribute.GetNameView()))) {
+    if (isSynthesis && IsPredefined(Lower(attribute.GetNameView()))) {
         if (Finding* finding =
                 Add(RuleId::PredefinedAttribute, GetRule(RuleId::PredefinedAttribute).verdicts,
                     holder, attribute)) {
@@ -514,7 +378,7 @@ bool FitsType(const Attribute& attribute, const std::string& type) {
     if (attribute.GetValueType() != Attribute::User) {
         return TypeOf(attribute) == type;
     }
-    return TypeOf(attribute) == type || !IsOneOf(VisibleTypes, type) ||
+    return TypeOf(attribute) == type || !IsVisibleType(type) ||
            CanBeValueOf(type, attribute.GetValueString().GetView());
 }
 
@@ -545,148 +409,11 @@ bool AttributeWalk::IsDeclaredBy(const Holder& holder, const Attribute& attribut
            found->second.cause.first == holder.CauseOf(attribute).first;
 }
 
-void AttributeWalk::CheckValue(const Holder& holder, const Attribute& attribute,
-                               const Places& places) {
-    if (places.vhdl && places.typed) {
-        context_.usedTypes.insert(TypeOf(attribute));
-        if (attribute.GetValueType() == Attribute::Boolean) {
-            context_.usedTypes.insert(Lower(attribute.GetValueString().GetView()));
-        }
-    }
-    switch (attribute.GetValueType()) {
-    case Attribute::String:
-        CheckText(holder, attribute, Writers::GetUnquotedValue(attribute).GetView(), places);
-        break;
-    case Attribute::User: {
-        const Port::String text = attribute.GetValueString();
-        Places asText = places;
-        asText.vhdl = places.vhdl && !places.typed;
-        CheckText(holder, attribute,
-                  places.verilogNumber ? text.GetView()
-                                       : Writers::GetUnquotedValue(attribute).GetView(),
-                  asText);
-        if (places.vhdl && places.typed &&
-            (IsGeneric(attribute) || IsDeclaredBy(holder, attribute))) {
-            CheckUser(holder, attribute);
-        }
-        break;
-    }
-    case Attribute::BitVector:
-        if (places.verilogNumber || places.typed) {
-            CheckDigits(holder, attribute, places);
-        } else {
-            CheckText(holder, attribute, Writers::GetUnquotedValue(attribute).GetView(), places);
-        }
-        break;
-    default:
-        break;
-    }
-}
-
-bool IsControl(char c) {
-    const auto byte = static_cast<unsigned char>(c);
-    return byte < 0x20 || (byte >= 0x7F && byte < 0xA0);
-}
-
-void AttributeWalk::CheckText(const Holder& holder, const Attribute& attribute, string_view text,
-                              const Places& places) {
-    if (context_.isMended) {
-        return;
-    }
-    if (text.find('"') != string_view::npos && (places.verilogNumber || places.vhdl)) {
-        Verdicts verdicts(places.verilogNumber ? "rrr..rrr" : "");
-        verdicts.Worsen(Verdicts(places.vhdl ? "...rr...r" : ""));
-        if (Finding* finding = Add(RuleId::QuoteInValue, verdicts, holder, attribute)) {
-            finding->message =
-                "the value of " + holder.Describe(attribute) + " holds a double quote";
-        }
-    }
-    const bool endsComment = text.find("*/") != string_view::npos ||
-                             attribute.GetNameView().find("*/") != string_view::npos;
-    if (places.verilogComment && endsComment) {
-        if (Finding* finding = Add(RuleId::CommentInValue, GetRule(RuleId::CommentInValue).verdicts,
-                                   holder, attribute)) {
-            finding->message = holder.Describe(attribute) + " holds */, which ends its comment";
-        }
-    }
-    if (places.verilogNumber && text.find('\\') != string_view::npos) {
-        const bool isLast = text.back() == '\\';
-        if (Finding* finding = Add(RuleId::BackslashInValue,
-                                   Verdicts(isLast ? "rrr..rrr" : "mmm..mmm"), holder, attribute)) {
-            finding->message = "the value of " + holder.Describe(attribute) +
-                               (isLast ? " ends in a backslash, which hides the closing quote"
-                                       : " holds a backslash");
-        }
-    }
-    if (places.vhdl && std::any_of(text.begin(), text.end(), IsControl)) {
-        if (Finding* finding = Add(RuleId::CharacterInValue,
-                                   GetRule(RuleId::CharacterInValue).verdicts, holder, attribute)) {
-            finding->message =
-                "the value of " + holder.Describe(attribute) + " holds a control character";
-        }
-    }
-}
-
-void AttributeWalk::CheckDigits(const Holder& holder, const Attribute& attribute,
-                                const Places& places) {
-    const Digits digits(static_cast<const AttributeBitVector&>(attribute).GetBitVectorValue());
-    Verdicts characters(places.vhdl && places.typed && !digits.IsVhdlBitVector() ? "...rr...r"
-                                                                                 : "");
-    const bool isNumber = digits.IsVerilogNumber();
-    characters.Worsen(Verdicts(places.verilogNumber && !isNumber ? "rrr..rrr" : ""));
-    if (Finding* finding = Add(RuleId::ConstantCharacter, characters, holder, attribute)) {
-        finding->message = "the value " + Quoted(digits.digits) + " of " +
-                           holder.Describe(attribute) + " has a character that is no digit";
-    }
-    if (!places.verilogNumber || !isNumber) {
-        return;
-    }
-    Verdicts verdicts;
-    RuleId rule = RuleId::ConstantLength;
-    if (digits.hasLength) {
-        const bool isCut =
-            digits.length > 0 && digits.GetNeededBits() > static_cast<std::size_t>(digits.length);
-        verdicts = Verdicts(digits.length == 0  ? "rrr..r.r"
-                            : digits.length < 0 ? "mmm..mmm"
-                            : isCut             ? "mmm..mrm"
-                                                : "");
-    } else {
-        rule = RuleId::GenericDigits;
-        const BitText read = digits.ReadVerilog(digits.digits.size());
-        const bool isLong = digits.GetNeededBits() > 32;
-        const bool differs = !read || *read != digits.digits || isLong;
-        verdicts = Verdicts(!differs ? "" : isLong ? "mmm..mrm" : "mmm..mmm");
-    }
-    if (Finding* finding = Add(rule, verdicts, holder, attribute)) {
-        finding->message =
-            "the value " + Quoted(digits.digits) + " of " + holder.Describe(attribute) +
-            (digits.hasLength ? " does not fit its length" : " is a decimal number in Verilog");
-    }
-}
-
-void AttributeWalk::CheckUser(const Holder& holder, const Attribute& attribute) {
-    const std::string type = TypeOf(attribute);
-    const bool isVisible = IsOneOf(VisibleTypes, type);
-    if (type.empty() || !isVisible) {
-        const bool mayBeDeclared = !type.empty() && context_.options.vhdl.useClauses.GetSize() > 0;
-        if (Finding* finding =
-                Add(RuleId::UserType, Verdicts(mayBeDeclared ? "...ww...w" : "...rr...r"), holder,
-                    attribute)) {
-            finding->message =
-                holder.Describe(attribute) +
-                (type.empty() ? " has no type's name"
-                              : " has the type " + Quoted(type) + ", which nothing declares");
-        }
-        return;
-    }
-    const Port::String value = attribute.GetValueString();
-    if (!CanBeValueOf(type, value.GetView())) {
-        if (Finding* finding =
-                Add(RuleId::UserValue, GetRule(RuleId::UserValue).verdicts, holder, attribute)) {
-            finding->message = "the value " + Quoted(value.GetView()) + " of " +
-                               holder.Describe(attribute) + " is none of the type " + type;
-        }
-    }
+void AttributeWalk::CheckValueIn(const Holder& holder, const Attribute& attribute,
+                                 Places places) const {
+    places.bound = attribute.GetValueType() == Attribute::User &&
+                   (IsGeneric(attribute) || IsDeclaredBy(holder, attribute));
+    CheckValue(context_, holder, attribute, places);
 }
 
 } // namespace

@@ -85,9 +85,13 @@ Context::Context(const Netlist& design, const HdlOptions& optionsInForce, Check:
                  bool mended)
     : netlist(design), options(optionsInForce),
       verilog(!(wanted & Check::Targets::Verilog()).IsEmpty()),
-      vhdl(!(wanted & Check::Targets::Vhdl()).IsEmpty()), isMended(mended), targets_(wanted) {}
+      vhdl(!(wanted & Check::Targets::Vhdl()).IsEmpty()), isMended(mended), survey(optionsInForce),
+      targets_(wanted) {}
 
 void Context::CheckAll() {
+    for (const Signal* signal : netlist.GetSignalIterator()) {
+        survey.Look(*signal);
+    }
     CheckConnections(*this);
     CheckAssignments(*this);
     CheckNames(*this);

@@ -11,9 +11,8 @@ namespace Orn_Hdl::Checking {
 
 namespace {
 
-/// How many instances ahead their signals are asked for, and what is known of these.
+/// How many instances ahead their signals are asked for.
 constexpr int SignalLead = 6;
-constexpr int UseLead = 3;
 
 /// The pins of an instance some way ahead of the one in hand.
 class Ahead {
@@ -98,16 +97,15 @@ Finding* Walk::Add(RuleId rule, const Verdicts& verdicts, const Instance& instan
 
 void Walk::CheckAll() {
     // The signals of the pins are spread over the memory of a large design.
-    Ahead far(context_.netlist, SignalLead);
-    Ahead near(context_.netlist, UseLead);
+    Ahead ahead(context_.netlist, SignalLead);
     for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
-        far.Step([](const Signal* signal) { Port::Prefetch(signal); });
-        near.Step([this](const Signal* signal) { context_.uses.Prefetch(signal); });
+        ahead.Step([](const Signal* signal) { Port::Prefetch(signal); });
         CheckInstance(*instance);
     }
 }
 
 void Walk::CheckInstance(const Instance& instance) {
+    context_.survey.Look(instance);
     int pinCount = 0;
     for (const Pin* pin : instance.GetPinIterator()) {
         ++pinCount;
@@ -356,7 +354,7 @@ void DummyForesight::ForeseeOne(const Misused& misused, bool isOutput) {
 /// Output ports that several pins drive get a dummy signal too; it can take the name of something
 /// else.
 void DummyForesight::ForeseeWired() {
-    for (const Signal* signal : context_.netlist.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         const bool isOutput = signal->GetPortPolarity().GetValue() == Polarity::Output;
         if (isOutput && signal->HasMultiDriver()) {
             ForEachRun(*signal, [this](const Run& run) { Make(*run.declared); });

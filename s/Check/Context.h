@@ -2,6 +2,7 @@
 #pragma once
 
 #include "Check/Rules.h"
+#include "Check/Survey.h"
 #include "Check/Uses.h"
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Options.h"
@@ -51,6 +52,8 @@ public:
     /// language, and an empty list of ports is left out.
     const bool isMended;
 
+    /// What most topics look at. The walk over the instances completes it.
+    Survey survey;
     /// \{
     /// Gathered by the walk over the instances.
     std::unordered_map<const Component*, UsedComponent> used;

@@ -143,7 +143,7 @@ void NameWalk::CheckSignals() {
     NameUse use;
     use.kind = Kind::Signal;
     use.nameCase = options_.verilog.signalCase;
-    for (const Signal* signal : context_.netlist.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (!signal->IsNeededToDeclared() || signal->GetNameView().empty()) {
             continue;
         }
@@ -194,7 +194,7 @@ void NameWalk::CheckInstances() {
     use.kind = Kind::Instance;
     use.what = "an instance";
     use.nameCase = options_.verilog.instanceCase;
-    for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         use.name = instance->GetNameView();
         use.object = instance;
         CheckName(context_, use);

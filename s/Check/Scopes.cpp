@@ -3,6 +3,7 @@
 #include "Check/Context.h"
 #include "HdlModel/Names/Names.h"
 #include "Port/Ascii.h"
+#include "Writers/Generics.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
@@ -145,7 +146,7 @@ void Scopes::ReportClash(const Declared& one, const Declared& other, string_view
 }
 
 void Scopes::CheckBuses() {
-    for (const Signal* signal : netlist_.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (signal->GetSignalType() != SignalTypeBus) {
             continue;
         }
@@ -223,7 +224,7 @@ void Scopes::CheckOpenPin(const Instance& instance, const Pin& pin) {
 
 void Scopes::CheckGenerics() {
     for (const Attribute* attribute : netlist_.GetAttrIterator()) {
-        if (attribute->GetGenericOption() == Attribute::GenericNone) {
+        if (!Writers::IsGeneric(*attribute)) {
             continue;
         }
         const string_view name = attribute->GetNameView();
@@ -293,7 +294,7 @@ void Scopes::CheckComponents() {
             }
         }
         for (const Attribute* attribute : component->GetAttrIterator()) {
-            if (attribute->GetGenericOption() == Attribute::GenericNone) {
+            if (!Writers::IsGeneric(*attribute)) {
                 continue;
             }
             for (const Pin* pin : component->GetPinIterator()) {
@@ -420,12 +421,12 @@ void Scopes::CheckHiddenBy(const Declared& declared) {
 
 void Scopes::CheckComments() {
     CheckComment(netlist_.GetCommentView());
-    for (const Signal* signal : netlist_.GetSignalIterator()) {
+    for (const Signal* signal : context_.survey.GetSignals()) {
         if (signal->IsNeededToDeclared()) {
             CheckComment(signal->GetCommentView());
         }
     }
-    for (const Instance* instance : netlist_.GetInstanceIterator()) {
+    for (const Instance* instance : context_.survey.GetInstances()) {
         CheckComment(instance->GetCommentView());
     }
     for (const auto& [component, used] : context_.used) {

@@ -1,65 +1,24 @@
 #include "Check/Uses.h"
 
-#include "Port/Prefetch.h"
-
 #include <algorithm>
 
 namespace Orn_Hdl::Checking {
 
-namespace {
-
-constexpr std::size_t FirstSize = 64;
-
-std::size_t Hash(const Signal* signal) noexcept {
-    // Objects lie at multiples of eight; the high half of the product is spread well.
-    const std::uint64_t mixed =
-        (reinterpret_cast<std::uintptr_t>(signal) >> 3U) * std::uint64_t(0x9E3779B97F4A7C15U);
-    return static_cast<std::size_t>(mixed >> 32U);
-}
-
-} // namespace
-
-/// The place of a signal, or the free place where it would stand. The table is never full.
-std::size_t Uses::Find(const Signal* signal) const noexcept {
-    const std::size_t mask = keys_.size() - 1;
-    std::size_t place = Hash(signal) & mask;
-    while (keys_[place] != nullptr && keys_[place] != signal) {
-        place = (place + 1) & mask;
-    }
-    return place;
-}
-
-void Uses::Grow() {
-    Uses larger;
-    larger.keys_.resize(std::max(FirstSize, keys_.size() * 2));
-    larger.values_.resize(larger.keys_.size());
-    for (std::size_t i = 0; i < keys_.size(); ++i) {
-        if (keys_[i] != nullptr) {
-            const std::size_t place = larger.Find(keys_[i]);
-            larger.keys_[place] = keys_[i];
-            larger.values_[place] = values_[i];
-        }
-    }
-    keys_.swap(larger.keys_);
-    values_.swap(larger.values_);
+/// The use of a scalar signal, null when no page has it.
+const Use* Uses::Find(const Signal& scalar) const {
+    static_assert(sizeof(ScalarSignal) > Piece && alignof(ScalarSignal) <= Piece);
+    const std::uintptr_t piece = reinterpret_cast<std::uintptr_t>(&scalar) / Piece;
+    const auto found = pages_.find(piece / PageSize);
+    return found == pages_.end() ? nullptr : &(*found->second)[piece % PageSize];
 }
 
 Use& Uses::OfScalar(const Signal* signal) {
-    if (4 * (count_ + 1) > 3 * keys_.size()) {
-        Grow();
+    const std::uintptr_t piece = reinterpret_cast<std::uintptr_t>(signal) / Piece;
+    std::unique_ptr<Page>& page = pages_[piece / PageSize];
+    if (page == nullptr) {
+        page = std::make_unique<Page>();
     }
-    const std::size_t place = Find(signal);
-    if (keys_[place] == nullptr) {
-        keys_[place] = signal;
-        ++count_;
-    }
-    return values_[place];
-}
-
-void Uses::Prefetch(const Signal* signal) const noexcept {
-    if (!keys_.empty() && signal != nullptr) {
-        Port::Prefetch(&keys_[Hash(signal) & (keys_.size() - 1)]);
-    }
+    return (*page)[piece % PageSize];
 }
 
 std::vector<Use>* Uses::OfBus(const Signal& bus) {
@@ -77,11 +36,8 @@ std::vector<Use>* Uses::OfBus(const Signal& bus) {
 
 template <class Test> bool Uses::Any(const Signal& declared, const Test& test) const {
     if (declared.GetSignalType() == SignalTypeScalar) {
-        if (keys_.empty()) {
-            return false;
-        }
-        const std::size_t place = Find(&declared);
-        return keys_[place] != nullptr && test(values_[place]);
+        const Use* const use = Find(declared);
+        return use != nullptr && test(*use);
     }
     const auto found = buses_.find(&declared);
     return found != buses_.end() && std::any_of(found->second.begin(), found->second.end(), test);
@@ -97,7 +53,7 @@ bool Uses::IsUndriven(const Signal& declared) const {
 
 bool Uses::IsAnyUndriven(const Signal& declared) const {
     const bool isKnown = declared.GetSignalType() == SignalTypeScalar
-                             ? Any(declared, [](const Use&) { return true; })
+                             ? Any(declared, [](const Use& use) { return use.IsKnown(); })
                              : buses_.count(&declared) != 0;
     return !isKnown || Any(declared, [](const Use& use) { return !use.IsDriven(); });
 }

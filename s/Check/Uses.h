@@ -3,8 +3,10 @@
 
 #include "Check/Bits.h"
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
+#include <memory>
 #include <unordered_map>
 #include <vector>
 
@@ -22,6 +24,8 @@ public:
     bool IsDrivenTwice() const noexcept { return (bits_ & Drivers) >= 2; }
     bool IsDriven() const noexcept { return (bits_ & (Drivers | Maybe)) != 0; }
     bool IsUndriven() const noexcept { return !IsDriven() && (bits_ & Read) != 0; }
+    /// Whether anything at all uses the bit.
+    bool IsKnown() const noexcept { return bits_ != 0; }
 
 private:
     static constexpr std::uint8_t Drivers = 3;
@@ -32,8 +36,8 @@ private:
     std::uint8_t bits_ = 0;
 };
 
-/// The uses of the bits of all declared signals. Millions of scalar signals are normal: theirs
-/// stand in an open table of nine bytes a place.
+/// The uses of the bits of all declared signals. Millions of scalar signals are normal, and they
+/// lie close together in memory: theirs stand in pages of bytes, found by the signal's address.
 class Uses {
 public:
     /// Calls `note(use)` for each bit of a run.
@@ -51,8 +55,6 @@ public:
     }
     /// The use of a scalar signal.
     Use& OfScalar(const Signal* signal);
-    /// Asks for the place of a scalar signal early.
-    void Prefetch(const Signal* signal) const noexcept;
 
     /// Whether anything is known of a bus: nothing refers to one of which nothing is.
     bool IsKnown(const Signal& bus) const { return buses_.count(&bus) != 0; }
@@ -65,15 +67,17 @@ public:
     /// \}
 
 private:
+    /// Signals are larger than this, so that no two of them begin in one piece of it.
+    static constexpr std::size_t Piece = 32;
+    static constexpr std::size_t PageSize = 16384;
+    using Page = std::array<Use, PageSize>;
+
     template <class Test> bool Any(const Signal& declared, const Test& test) const;
     /// Null for a bus that is too wide to be looked at bit by bit.
     std::vector<Use>* OfBus(const Signal& bus);
-    std::size_t Find(const Signal* signal) const noexcept;
-    void Grow();
+    const Use* Find(const Signal& scalar) const;
 
-    std::vector<const Signal*> keys_;
-    std::vector<Use> values_;
-    std::size_t count_ = 0;
+    std::unordered_map<std::uintptr_t, std::unique_ptr<Page>> pages_;
     std::unordered_map<const Signal*, std::vector<Use>> buses_;
 };
 

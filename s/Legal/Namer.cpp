@@ -25,10 +25,6 @@ string_view BaseOf(const Object& object) {
     return object.GetObjectType() == ObjectTypeSignal ? Names::BaseName(name) : name;
 }
 
-bool IsGeneric(const Attribute& attribute) {
-    return attribute.GetGenericOption() != Attribute::GenericNone;
-}
-
 /// Whether the language takes the name as it stands.
 bool IsFine(string_view name, Language language) {
     const Checking::Identifier form(name);

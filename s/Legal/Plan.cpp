@@ -53,10 +53,6 @@ bool IsAttributeKind(Kind kind) {
            kind == Kind::InstanceAttribute || kind == Kind::SignalAttribute;
 }
 
-bool IsGeneric(const Attribute& attribute) {
-    return attribute.GetGenericOption() != Attribute::GenericNone;
-}
-
 /// The attribute of a finding of the check of attributes, which comes after its holder.
 const Attribute* AttributeOf(const Check::Finding& finding) {
     const Object* const last = finding.objects.empty() ? nullptr : finding.objects.back();
@@ -116,7 +112,7 @@ const NewName* NewNames::Find(const Object& object) const {
     if (object.GetObjectType() != ObjectTypeAttribute) {
         return nullptr;
     }
-    const bool isGeneric = Legal::IsGeneric(static_cast<const Attribute&>(object));
+    const bool isGeneric = Writers::IsGeneric(static_cast<const Attribute&>(object));
     const auto& names = isGeneric ? generics : attributes;
     const auto found = names.empty() ? names.end() : names.find(Lower(object.GetNameView()));
     return found == names.end() ? nullptr : &found->second;

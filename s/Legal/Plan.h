@@ -6,6 +6,7 @@
 #include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Options.h"
+#include "Writers/Generics.h"
 
 #include <string>
 #include <unordered_map>
@@ -14,6 +15,8 @@
 #include <vector>
 
 namespace Orn_Hdl::Legal {
+
+using Writers::IsGeneric;
 
 /// A name as it is written: both are the same unless names are escaped.
 struct NewName {

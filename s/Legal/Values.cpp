@@ -89,10 +89,6 @@ std::string HideCommentEnd(string_view text) {
     return hidden;
 }
 
-bool IsGeneric(const Attribute& attribute) {
-    return attribute.GetGenericOption() != Attribute::GenericNone;
-}
-
 /// The writers remove quotes that enclose a whole value; these are a part of it.
 bool IsEnclosed(string_view text, char quote) {
     return !text.empty() && text.front() == quote && text.back() == quote;

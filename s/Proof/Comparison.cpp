@@ -3,6 +3,7 @@
 #include "Port/Ascii.h"
 #include "Proof/Meaning.h"
 
+#include <algorithm>
 #include <memory>
 #include <utility>
 
@@ -69,13 +70,32 @@ bool IsOpen(const Pin& pin) {
 
 Comparison::Comparison(const Netlist& design, const HdlOptions& options, Language language,
                        Findings& findings)
-    : design_(design), findings_(findings), assignments_(design, language, findings),
-      parameters_(design, options, findings), signals_(design.GetSignalIterator()),
-      instances_(design.GetInstanceIterator()) {}
+    : design_(design), options_(options), language_(language), findings_(findings),
+      assignments_(design, language, findings), parameters_(design, options, language, findings),
+      signals_(design.GetSignalIterator()), instances_(design.GetInstanceIterator()) {}
+
+/// The name that the reader finds for one of the design.
+string_view Comparison::NameInFile(string_view name) const noexcept {
+    return language_ == Language::Verilog ? NameInVerilog(name) : name;
+}
+
+/// A signal without a name is no signal, and "open" is none in VHDL.
+bool Comparison::IsNothing(const Signal& signal) const noexcept {
+    return signal.GetNameView().empty() ||
+           (language_ == Language::Vhdl && Port::EqualIgnoringCase(signal.GetNameView(), "open"));
+}
+
+/// Whether a signal has the name in the eyes of the language.
+bool Comparison::IsTakenBySignal(string_view name) const {
+    return language_ == Language::Vhdl
+               ? design_.GetSignal(name) != nullptr ||
+                     design_.GetParentBus(std::string(name).c_str()) != nullptr
+               : FindInDesign(name) != nullptr;
+}
 
 void Comparison::TakeModule(string_view name, const Place& place) {
     place_ = place;
-    if (name != NameInVerilog(design_.GetNameView())) {
+    if (name != NameInFile(design_.GetNameView())) {
         findings_.Add("the module is " + Quoted(name) + ", the design " +
                           Quoted(design_.GetNameView()),
                       place, {Kind::DesignName, "", ""});
@@ -87,7 +107,7 @@ const Signal* Comparison::NextDeclared() {
     for (; !signals_.IsAtEnd(); signals_.Next()) {
         const Signal* const signal = signals_.GetCurrent();
         if (signal->IsNeededToDeclared() && signal->IsPort() == isAmongPorts_ &&
-            !signal->GetNameView().empty()) {
+            !IsNothing(*signal)) {
             return signal;
         }
     }
@@ -195,8 +215,7 @@ Signal* Comparison::FindInDesign(string_view name) const {
     if (Signal* const signal = find(name)) {
         return signal;
     }
-    const std::string escaped = "\\" + std::string(name) + " ";
-    return find(escaped);
+    return language_ == Language::Verilog ? find("\\" + std::string(name) + " ") : nullptr;
 }
 
 Signal* Comparison::FindSignal(string_view name) {
@@ -225,12 +244,126 @@ void Comparison::SkipTo(const Instance& instance, const Place& place) {
     }
 }
 
+/// The first of several components whose names differ in letter case alone is the one declared.
+void Comparison::TakeComponent(const Readers::ModuleHead& head, const Place& place) {
+    place_ = place;
+    const Component* const component = design_.GetComponent(string_view(head.name));
+    if (component == nullptr || component->GetNameView() != head.name) {
+        findings_.Add("the component " + Quoted(head.name) + " is none of the design", place, {});
+        return;
+    }
+    declared_.insert(component);
+    ComparePorts(*component, head, place);
+    parameters_.BeginComponent(*component, head, place);
+}
+
+void Comparison::ComparePorts(const Component& component, const Readers::ModuleHead& head,
+                              const Place& place) {
+    const auto report = [&](const std::string& what, const Pin& pin, const Place& where) {
+        findings_.Add(
+            "the pin " + Quoted(pin.GetNameView()) + " of the component " + Quoted(head.name) +
+                " " + what,
+            where,
+            {Kind::Pin, std::string(component.GetNameView()), std::string(pin.GetNameView())});
+    };
+    std::size_t next = 0;
+    for (const Pin* pin : component.GetPinIterator()) {
+        if (next == head.ports.size()) {
+            report("is not declared", *pin, place);
+            return;
+        }
+        const Readers::PortHead& port = head.ports[next++];
+        const Run run = pin->GetPinType() == PinTypeBus ? ReadRun(pin->GetNameView()) : Run();
+        std::optional<Readers::Range> range;
+        if (!run.isScalar) {
+            range = Readers::Range{static_cast<int>(run.left), static_cast<int>(run.right)};
+        }
+        if (port.name != BaseOf(*pin)) {
+            report("is declared as " + Quoted(port.name), *pin, port.place);
+        } else if (port.range != range) {
+            report("is declared as " + Show(port.range), *pin, port.place);
+        } else if (port.direction != pin->GetPolarity().GetValue()) {
+            report("is declared as " + ShowDirection(port.direction), *pin, port.place);
+        }
+    }
+    if (next < head.ports.size()) {
+        findings_.Add("the component " + Quoted(head.name) + " has no pin " +
+                          Quoted(head.ports[next].name) + " in the design",
+                      head.ports[next].place,
+                      {Kind::Component, std::string(component.GetNameView()), ""});
+    }
+}
+
+/// What the configuration binds: the instances of each component that is no primitive.
+void Comparison::FindBound() {
+    hasBound_ = true;
+    for (const Instance* instance : design_.GetInstanceIterator()) {
+        const Component* const component = instance->GetComponent();
+        const Attribute* const level = component == nullptr ? nullptr : component->GetAttr("Level");
+        if (component != nullptr &&
+            (level == nullptr ||
+             !Port::EqualIgnoringCase(level->GetValueString().GetView(), "HALVEX"))) {
+            bound_[component].push_back(instance);
+        }
+    }
+}
+
+void Comparison::TakeBinding(const std::vector<std::string>& instances,
+                             const std::string& component, const Place& place) {
+    place_ = place;
+    if (!hasBound_) {
+        FindBound();
+    }
+    const auto bound = bound_.find(design_.GetComponent(string_view(component)));
+    const bool isSame =
+        bound != bound_.end() && bound->first->GetNameView() == component &&
+        std::equal(instances.begin(), instances.end(), bound->second.begin(), bound->second.end(),
+                   [](const std::string& label, const Instance* instance) {
+                       return instance->GetNameView() == label;
+                   });
+    if (!isSame) {
+        findings_.Add("the configuration binds other instances to " + Quoted(component) +
+                          " than the design has",
+                      place, {Kind::Component, component, ""});
+    }
+    if (bound != bound_.end()) {
+        bound_.erase(bound);
+    }
+}
+
+/// Reports components that instances have and that are not declared.
+void Comparison::EndComponents() {
+    if (language_ == Language::Verilog) {
+        return;
+    }
+    for (const Component* component : used_) {
+        if (component != nullptr && !options_.vhdl.suppressComponent &&
+            declared_.count(component) == 0) {
+            findings_.Add("the component " + Quoted(component->GetNameView()) + " is not declared",
+                          place_, {Kind::Component, std::string(component->GetNameView()), ""});
+        }
+    }
+    if (options_.vhdl.suppressComponent && !declared_.empty()) {
+        findings_.Add("components are declared, against an option", place_,
+                      {Kind::Option, "SUPPRESS COMPONENT", ""});
+    }
+    if (!hasBound_) {
+        FindBound();
+    }
+    if (!options_.vhdl.suppressConfiguration && !bound_.empty()) {
+        findings_.Add("the configuration does not bind the instances of " +
+                          Quoted(bound_.begin()->first->GetNameView()),
+                      place_, {});
+    }
+}
+
 void Comparison::BeginInstance(string_view name, const Readers::ModuleHead& head,
                                const Place& place) {
     EndInstance();
+    parameters_.EndInstance(place_);
     place_ = place;
-    const auto isNamed = [name](const Instance& instance) {
-        return NameInVerilog(instance.GetNameView()) == name;
+    const auto isNamed = [this, name](const Instance& instance) {
+        return NameInFile(instance.GetNameView()) == name;
     };
     const Instance* next = instances_.GetCurrent();
     if (next == nullptr || !isNamed(*next)) {
@@ -264,14 +397,17 @@ void Comparison::CheckInstance(const Instance& instance, const Readers::ModuleHe
     expected_ = pins_.empty() ? nullptr : pins_.front()->GetSignal();
     const Component* const component = instance.GetComponent();
     const string_view type = component == nullptr ? string_view() : component->GetNameView();
-    if (NameInVerilog(type) != head.name) {
+    if (language_ == Language::Vhdl) {
+        used_.insert(component);
+    }
+    if (NameInFile(type) != head.name) {
         findings_.Add(Quoted(instance.GetNameView()) + " is an instance of " + Quoted(head.name) +
                           ", in the design of " + Quoted(type),
                       place, CauseOf(instance));
     }
     // Another object of the name is what the name means elsewhere.
     if (design_.GetInstance(instance.GetNameView()) != &instance ||
-        FindInDesign(instance.GetNameView()) != nullptr) {
+        IsTakenBySignal(instance.GetNameView())) {
         findings_.Add("the name of the instance " + Quoted(instance.GetNameView()) +
                           " is that of another object, too",
                       place, CauseOf(instance));
@@ -297,7 +433,7 @@ void Comparison::EndInstance() {
 std::size_t Comparison::FindPin(string_view port) {
     for (std::size_t i = 0; i < pins_.size(); ++i) {
         const std::size_t index = (nextPin_ + i) % pins_.size();
-        if (NameInVerilog(BaseOf(*pins_[index])) == port) {
+        if (NameInFile(BaseOf(*pins_[index])) == port) {
             return index;
         }
     }
@@ -383,14 +519,15 @@ void Comparison::TakeParameter(const Readers::Owner& owner, const std::string& n
 }
 
 void Comparison::TakeAttribute(const Readers::Owner& owner, const std::string& name,
-                               const Readers::Value& value, const Place& place) {
+                               const Readers::Value& value, bool isDeclared, const Place& place) {
     place_ = place;
     switch (owner.kind) {
+    case Readers::Owner::Component:
     case Readers::Owner::Instance:
-        parameters_.TakeAttribute(name, value, place);
+        parameters_.TakeAttribute(owner, name, value, isDeclared, place);
         break;
     case Readers::Owner::Signal:
-        parameters_.TakeAttribute(*owner.signal, name, value, place);
+        parameters_.TakeAttribute(*owner.signal, name, value, isDeclared, place);
         break;
     default:
         findings_.Add("the module has the attribute " + Quoted(name) + ", which no design gives it",
@@ -408,6 +545,7 @@ void Comparison::End() {
     }
     assignments_.End(place_);
     parameters_.End(place_);
+    EndComponents();
     for (; !instances_.IsAtEnd(); instances_.Next()) {
         const Instance& left = *instances_.GetCurrent();
         findings_.Add("the instance " + Quoted(left.GetNameView()) + " is not in the netlist",

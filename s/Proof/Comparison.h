@@ -10,6 +10,8 @@
 
 #include <string>
 #include <string_view>
+#include <unordered_map>
+#include <unordered_set>
 #include <vector>
 
 namespace Orn_Hdl::Proving {
@@ -26,6 +28,9 @@ public:
     Signal* Declare(const std::string& name, const std::optional<Readers::Range>& range,
                     int direction, const Readers::Place& place) override;
     Signal* FindSignal(std::string_view name) override;
+    void TakeComponent(const Readers::ModuleHead& head, const Readers::Place& place) override;
+    void TakeBinding(const std::vector<std::string>& instances, const std::string& component,
+                     const Readers::Place& place) override;
     void BeginInstance(std::string_view name, const Readers::ModuleHead& head,
                        const Readers::Place& place) override;
     void Connect(const Readers::PortHead& port, const Readers::Members& members,
@@ -39,12 +44,16 @@ public:
                        const Readers::Value& value, bool isHidden,
                        const Readers::Place& place) override;
     void TakeAttribute(const Readers::Owner& owner, const std::string& name,
-                       const Readers::Value& value, const Readers::Place& place) override;
+                       const Readers::Value& value, bool isDeclared,
+                       const Readers::Place& place) override;
 
     /// Looks for what the netlist lacks.
     void End();
 
 private:
+    std::string_view NameInFile(std::string_view name) const noexcept;
+    bool IsNothing(const Signal& signal) const noexcept;
+    bool IsTakenBySignal(std::string_view name) const;
     Signal* FindInDesign(std::string_view name) const;
     const Signal* NextDeclared();
     Signal* DeclareStranger(const std::string& name, const std::optional<Readers::Range>& range);
@@ -58,11 +67,17 @@ private:
     void CheckInstance(const Instance& instance, const Readers::ModuleHead& head,
                        const Readers::Place& place);
     void EndInstance();
+    void ComparePorts(const Component& component, const Readers::ModuleHead& head,
+                      const Readers::Place& place);
+    void FindBound();
+    void EndComponents();
     std::size_t FindPin(std::string_view port);
     void ReportConnection(const Pin& pin, const std::string& found, const Readers::Place& place);
     bool AreSame(const Signal& signal, const Readers::Members& members);
 
     const Netlist& design_;
+    const HdlOptions& options_;
+    const Language language_;
     Findings& findings_;
     Assignments assignments_;
     Parameters parameters_;
@@ -84,6 +99,15 @@ private:
     std::size_t nextPin_ = 0;
     /// The signal that is read next, when all is well.
     const Signal* expected_ = nullptr;
+
+    /// \{
+    /// Of VHDL: the components that were declared, those of the instances, and what the
+    /// configuration has to bind.
+    std::unordered_set<const Component*> declared_;
+    std::unordered_set<const Component*> used_;
+    std::unordered_map<const Component*, std::vector<const Instance*>> bound_;
+    bool hasBound_ = false;
+    /// \}
 
     /// Where the reader is.
     Readers::Place place_;

@@ -118,6 +118,54 @@ std::string InOneLine(const Attribute& attribute) {
     return text;
 }
 
+/// The characters of a text that holds the escape sequences of Verilog.
+std::string WithoutVerilogEscapes(string_view text) {
+    constexpr std::size_t OctalDigits = 3;
+    std::string result;
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        if (text[i] != '\\' || i + 1 == text.size()) {
+            result += text[i];
+        } else if (Port::IsDigit(text[i + 1])) {
+            result += static_cast<char>(
+                std::strtol(std::string(text.substr(i + 1, OctalDigits)).c_str(), nullptr, 8));
+            i += OctalDigits;
+        } else {
+            result += text[++i];
+        }
+    }
+    return result;
+}
+
+/// The characters of what stands between the quotes around a VHDL string, which may end the
+/// literal, go on with the code of a character, and begin another literal.
+std::string WithoutVhdlEscapes(string_view text) {
+    constexpr string_view Begin = "\" & character'val(";
+    constexpr string_view End = ") & \"";
+    constexpr string_view Nothing = "\" & \"";
+    std::string result;
+    for (std::size_t i = 0; i < text.size();) {
+        const string_view rest = text.substr(i);
+        const std::size_t end = rest.find(End);
+        if (rest.substr(0, Begin.size()) == Begin && end != string_view::npos) {
+            result += static_cast<char>(
+                std::strtol(std::string(rest.substr(Begin.size(), end)).c_str(), nullptr, 10));
+            i += end + End.size();
+        } else if (rest.substr(0, Nothing.size()) == Nothing) {
+            i += Nothing.size();
+        } else {
+            result += text[i];
+            i += rest.substr(0, 2) == "\"\"" ? 2 : 1;
+        }
+    }
+    return result;
+}
+
+std::string WithoutEscapes(const std::string& text, Language language, bool isEscaped) {
+    return !isEscaped                   ? text
+           : language == Language::Vhdl ? WithoutVhdlEscapes(text)
+                                        : WithoutVerilogEscapes(text);
+}
+
 bool AreSameNumbers(const std::string& a, const std::string& b) {
     return AttributeFloat("", a.c_str()).GetValue() == AttributeFloat("", b.c_str()).GetValue();
 }
@@ -142,6 +190,19 @@ bool IsSameVector(const BitVectorValue& wanted, const Readers::Value& value) {
     return bits && value.type == Attribute::Integer && AreAllOf("01", *bits) &&
            std::count(bits->begin(), bits->end(), '1') <= (bits->back() == '1' ? 1 : 0) &&
            value.text == (bits->back() == '1' ? "1" : "0");
+}
+
+/// Whether a bit string of VHDL, which has no length of its own, is the bits of an attribute.
+bool IsSameVectorInVhdl(const BitVectorValue& wanted, const Readers::Value& value) {
+    const BitVectorValue read(value.text.c_str());
+    const std::size_t width = wanted.HasBaseAndLength()
+                                  ? static_cast<std::size_t>(std::max(wanted.GetLength(), 0))
+                                  : string_view(wanted.GetValue()).size();
+    if (value.type != Attribute::BitVector || static_cast<std::size_t>(read.GetLength()) != width) {
+        return value.text.empty() && width == 0;
+    }
+    const std::optional<std::string> bits = BitsOf(wanted, width);
+    return bits && bits == BitsOf(read, width);
 }
 
 } // namespace
@@ -183,41 +244,40 @@ std::string TextOf(const Attribute& attribute) {
     return text;
 }
 
-std::string WithoutEscapes(string_view text) {
-    constexpr std::size_t OctalDigits = 3;
-    std::string result;
-    for (std::size_t i = 0; i < text.size(); ++i) {
-        if (text[i] != '\\' || i + 1 == text.size()) {
-            result += text[i];
-        } else if (Port::IsDigit(text[i + 1])) {
-            result += static_cast<char>(
-                std::strtol(std::string(text.substr(i + 1, OctalDigits)).c_str(), nullptr, 8));
-            i += OctalDigits;
-        } else {
-            result += text[++i];
-        }
-    }
-    return result;
-}
-
-bool IsSameInVerilog(const Attribute& attribute, const Readers::Value& value, bool isEscaped) {
-    const bool isUser = attribute.GetValueType() == Attribute::User;
-    const std::string text = isUser ? InOneLine(attribute) : TextOf(attribute);
+bool IsSameValue(const Attribute& attribute, const Readers::Value& value, Language language,
+                 bool isEscaped) {
+    const bool isVhdl = language == Language::Vhdl;
+    const std::string text = InOneLine(attribute);
     switch (attribute.GetValueType()) {
     case Attribute::Integer:
         return value.type == Attribute::Integer && value.text == text;
     case Attribute::Float:
-        return (value.type == Attribute::Float || value.type == Attribute::Integer) &&
+        return (value.type == Attribute::Float || (!isVhdl && value.type == Attribute::Integer)) &&
                AreSameNumbers(value.text, text);
     case Attribute::Bit:
         return value.type == Attribute::Bit && value.text == text;
-    case Attribute::BitVector:
-        return IsSameVector(static_cast<const AttributeBitVector&>(attribute).GetBitVectorValue(),
-                            value);
-    default:
-        return value.type == Attribute::String &&
-               value.text == (isEscaped ? WithoutEscapes(text) : text);
+    case Attribute::Boolean:
+        return isVhdl
+                   ? value.type == Attribute::Boolean && Port::EqualIgnoringCase(value.text, text)
+                   : value.type == Attribute::String && value.text == text;
+    case Attribute::BitVector: {
+        const BitVectorValue wanted =
+            static_cast<const AttributeBitVector&>(attribute).GetBitVectorValue();
+        return isVhdl ? IsSameVectorInVhdl(wanted, value) : IsSameVector(wanted, value);
     }
+    case Attribute::User:
+        return isVhdl ? value.text == (text.empty() ? "\"\"" : text)
+                      : value.type == Attribute::String &&
+                            value.text == WithoutEscapes(text, language, isEscaped);
+    default:
+        return IsSameText(attribute, value, language, isEscaped);
+    }
+}
+
+bool IsSameText(const Attribute& attribute, const Readers::Value& value, Language language,
+                bool isEscaped) {
+    return value.type == Attribute::String &&
+           value.text == WithoutEscapes(TextOf(attribute), language, isEscaped);
 }
 
 } // namespace Orn_Hdl::Proving

@@ -4,7 +4,7 @@
 #include "Orn_Hdl/Attributes.h"
 #include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Signals.h"
-#include "Readers/Heads.h"
+#include "Readers/Value.h"
 
 #include <cstdint>
 #include <optional>
@@ -24,11 +24,13 @@ std::optional<std::string> BitsOfConstant(const Signal& signal);
 
 /// The text of an attribute in one line, without quotes around it.
 std::string TextOf(const Attribute& attribute);
-/// The characters of a text that holds the escape sequences of Verilog.
-std::string WithoutEscapes(std::string_view text);
 
-/// Whether a parameter's value in a Verilog netlist is that of an attribute.
-/// \param isEscaped whether texts hold escape sequences.
-bool IsSameInVerilog(const Attribute& attribute, const Readers::Value& value, bool isEscaped);
+/// Whether the value of a parameter or generic in a netlist is that of an attribute.
+/// \param isEscaped whether texts hold the escapes of the language.
+bool IsSameValue(const Attribute& attribute, const Readers::Value& value, Language language,
+                 bool isEscaped);
+/// Whether the text of an attribute in a netlist is that of one in the design.
+bool IsSameText(const Attribute& attribute, const Readers::Value& value, Language language,
+                bool isEscaped);
 
 } // namespace Orn_Hdl::Proving

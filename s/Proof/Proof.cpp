@@ -3,10 +3,12 @@
 #include "Exception/Failure.h"
 #include "Orn_Hdl/Exception.h"
 #include "Orn_Hdl/Options.h"
+#include "Port/Ascii.h"
 #include "Port/File.h"
 #include "Proof/Comparison.h"
 #include "Proof/Meaning.h"
 #include "Readers/Verilog/ReadVerilog.h"
+#include "Readers/Vhdl/ReadVhdl.h"
 
 #include <algorithm>
 #include <charconv>
@@ -68,7 +70,7 @@ void CompareVerilog(const char* fileName, const Netlist& netlist, const HdlOptio
                     Findings& findings) {
     Readers::VerilogSetup setup;
     setup.includes = VerilogReader::Includes::Keep;
-    setup.names = VerilogReader::Names::Literal;
+    setup.names = ReaderNames::Literal;
     Readers::Heads components;
     components.Add(netlist, Proving::NameInVerilog);
     Proving::Comparison comparison(netlist, options, Language::Verilog, findings);
@@ -76,6 +78,63 @@ void CompareVerilog(const char* fileName, const Netlist& netlist, const HdlOptio
         Readers::ReadVerilog(fileName, setup, components, comparison);
     comparison.End();
     CompareIncludes(includes, options.verilog.includePaths, findings);
+}
+
+/// Whether both say the same, letter case and blanks aside.
+bool AreSameClauses(const std::vector<std::string>& read, const std::vector<std::string>& meant) {
+    const auto key = [](string_view text) {
+        std::string small;
+        for (const char c : text) {
+            small.append(c == ' ' || c == '\t' ? 0 : 1, Port::ToLower(c));
+        }
+        return small;
+    };
+    return std::equal(
+        read.begin(), read.end(), meant.begin(), meant.end(),
+        [&key](const std::string& a, const std::string& b) { return key(a) == key(b); });
+}
+
+void CompareFrame(const Readers::VhdlFrame& frame, const Netlist& netlist,
+                  const HdlOptions::VhdlOption& options, Findings& findings) {
+    std::vector<std::string> libraries;
+    std::vector<std::string> uses;
+    for (int i = 0; i < options.libraries.GetSize(); ++i) {
+        libraries.emplace_back(options.libraries.GetView(i));
+    }
+    for (int i = 0; i < options.useClauses.GetSize(); ++i) {
+        uses.emplace_back(options.useClauses.GetView(i));
+    }
+    if (options.useDefaultLibrary) {
+        libraries.insert(libraries.end(), {"ieee", "KESTRA"});
+        uses.insert(uses.end(),
+                    {"ieee.std_logic_1164.ALL", "ieee.numeric_std.ALL", "KESTRA.Vcomponents.ALL"});
+    }
+    if (!AreSameClauses(frame.libraries, libraries)) {
+        findings.Add("the library clauses are not those of the design", {},
+                     {Check::Cause::Kind::Library, "", ""});
+    }
+    if (!AreSameClauses(frame.uses, uses)) {
+        findings.Add("the use clauses are not those of the design", {},
+                     {Check::Cause::Kind::UseClause, "", ""});
+    }
+    std::vector<std::string> configurations;
+    if (!options.suppressConfiguration) {
+        configurations.push_back("CFG_" + std::string(netlist.GetNameView()));
+    }
+    if (frame.configurations != configurations) {
+        findings.Add("the configuration is not that of the design", {},
+                     {Check::Cause::Kind::DesignName, "", ""});
+    }
+}
+
+void CompareVhdl(const char* fileName, const Netlist& netlist, const HdlOptions& options,
+                 Findings& findings) {
+    Readers::VhdlSetup setup;
+    setup.names = ReaderNames::Literal;
+    Proving::Comparison comparison(netlist, options, Language::Vhdl, findings);
+    const Readers::VhdlFrame frame = Readers::ReadVhdl(fileName, setup, netlist, comparison);
+    comparison.End();
+    CompareFrame(frame, netlist, options.vhdl, findings);
 }
 
 /// Adds the texts of the lines.
@@ -134,9 +193,6 @@ void AddRules(std::vector<Proof::Difference>& differences, Language language,
 std::vector<Proof::Difference> Proof::Compare(const Port::TextArgument& fileName, Language language,
                                               const Netlist& netlist, const HdlOptions& options) {
     const char* const name = fileName.Get() == nullptr ? "" : fileName.Get();
-    if (language != Language::Verilog) {
-        Fail(ProofUnit, __LINE__, "Only Verilog netlists can be proven, not \"%s\".\n", {name});
-    }
     Port::File file;
     if (!file.open(name, Port::File::Read, true)) {
         Fail(ProofUnit, __LINE__, "Cannot read \"%s\": %s.\n",
@@ -146,7 +202,11 @@ std::vector<Proof::Difference> Proof::Compare(const Port::TextArgument& fileName
     Findings findings;
     try {
         try {
-            CompareVerilog(name, netlist, options, findings);
+            if (language == Language::Vhdl) {
+                CompareVhdl(name, netlist, options, findings);
+            } else {
+                CompareVerilog(name, netlist, options, findings);
+            }
         } catch (const Exception& exception) {
             AddError(exception.getLocalized().GetView(), name, findings);
         }

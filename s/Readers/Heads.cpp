@@ -1,6 +1,7 @@
 #include "Readers/Heads.h"
 
 #include "Orn_Hdl/Model/Netlist.h"
+#include "Port/Ascii.h"
 
 #include <algorithm>
 #include <charconv>
@@ -37,26 +38,43 @@ PortHead MakePort(const Pin& pin, std::string_view (*toFile)(std::string_view na
 
 } // namespace
 
+bool IsExtended(std::string_view name) noexcept {
+    return name.size() > 1 && name.front() == '\\' && name.back() == '\\';
+}
+
+bool IsSameName(std::string_view a, std::string_view b, bool ignoresCase) noexcept {
+    return a == b || (ignoresCase && !IsExtended(a) && Port::EqualIgnoringCase(a, b));
+}
+
+bool Heads::NameOrder::operator()(std::string_view a, std::string_view b) const noexcept {
+    if (!ignoresCase || IsExtended(a) || IsExtended(b)) {
+        return a < b;
+    }
+    return Port::OrderIgnoringCase(a, b) < 0;
+}
+
 PortHead* ModuleHead::FindPort(std::string_view portName) noexcept {
     const std::size_t index = FindPort(portName, 0);
     return index < ports.size() ? &ports[index] : nullptr;
 }
 
 std::size_t ModuleHead::FindPort(std::string_view portName, std::size_t hint) const noexcept {
-    if (hint < ports.size() && ports[hint].name == portName) {
+    if (hint < ports.size() && IsSameName(ports[hint].name, portName, ignoresCase)) {
         return hint;
     }
-    const auto found = std::find_if(ports.begin(), ports.end(), [portName](const PortHead& port) {
-        return port.name == portName;
-    });
+    const auto found =
+        std::find_if(ports.begin(), ports.end(), [this, portName](const PortHead& port) {
+            return IsSameName(port.name, portName, ignoresCase);
+        });
     return static_cast<std::size_t>(found - ports.begin());
 }
 
 const ParameterHead* ModuleHead::FindParameter(std::string_view parameterName) const noexcept {
-    const auto found = std::find_if(parameters.begin(), parameters.end(),
-                                    [parameterName](const ParameterHead& parameter) {
-                                        return parameter.name == parameterName;
-                                    });
+    const auto found =
+        std::find_if(parameters.begin(), parameters.end(),
+                     [this, parameterName](const ParameterHead& parameter) {
+                         return IsSameName(parameter.name, parameterName, ignoresCase);
+                     });
     return found == parameters.end() ? nullptr : &*found;
 }
 
@@ -72,6 +90,7 @@ ModuleHead* Heads::Add(std::string_view name, const Place& place) {
     auto head = std::make_unique<ModuleHead>();
     head->name = name;
     head->place = place;
+    head->ignoresCase = ignoresCase_;
     heads_.push_back(std::move(head));
     ModuleHead* const added = heads_.back().get();
     byName_.emplace(added->name, added);

@@ -4,10 +4,9 @@
 #include "Orn_Hdl/Model/Pins.h"
 #include "Readers/Place.h"
 #include "Readers/Range.h"
-#include "Readers/Verilog/Literals.h"
+#include "Readers/Value.h"
 
 #include <cstdint>
-#include <functional>
 #include <map>
 #include <memory>
 #include <optional>
@@ -28,6 +27,8 @@ struct PortHead {
     int direction = Polarity::Invalid;
     /// Nothing for a port of one bit.
     std::optional<Range> range;
+    /// Whether the port has a value of its own when nothing is connected to it.
+    bool hasDefault = false;
     /// Why no model can have the port; empty when one can.
     std::string problem;
     /// The parameters on which the range depends.
@@ -41,11 +42,21 @@ struct PortHead {
 struct ParameterHead {
     std::string name;
     bool isLocal = false;
+    /// Whether it is hidden from synthesis.
+    bool isHidden = false;
+    /// The name of its type, where the language has one; empty when it is not known.
+    std::string typeName;
     /// The default value; nothing when it is no literal.
     std::optional<Value> value;
     /// The default value as a number, when it is a small integer.
     std::optional<std::int64_t> number;
 };
+
+/// Whether two names of a file are the same.
+/// \param ignoresCase whether letter case makes no difference, but in names in backslashes.
+bool IsSameName(std::string_view a, std::string_view b, bool ignoresCase) noexcept;
+/// Whether a name begins and ends with a backslash.
+bool IsExtended(std::string_view name) noexcept;
 
 struct ModuleHead {
     /// Where a module is instantiated for the first time.
@@ -56,6 +67,8 @@ struct ModuleHead {
 
     std::string name;
     Place place;
+    /// Whether names that differ in letter case alone are the same.
+    bool ignoresCase = false;
     /// The file that was opened to read it, which may include the one where it stands.
     std::uint32_t source = 0;
     /// A user-defined primitive has no named ports.
@@ -79,6 +92,8 @@ struct ModuleHead {
 /// The heads of all modules, by name.
 class Heads {
 public:
+    explicit Heads(bool ignoresCase = false) : ignoresCase_(ignoresCase), byName_({ignoresCase}) {}
+
     /// The head of that name; null if there is none.
     ModuleHead* Find(std::string_view name) const;
     /// Adds a head. \return null if there is one of that name.
@@ -101,10 +116,16 @@ public:
     const Place& GetUnfinishedPlace() const noexcept { return unfinishedPlace_; }
 
 private:
+    struct NameOrder {
+        bool ignoresCase;
+        bool operator()(std::string_view a, std::string_view b) const noexcept;
+    };
+
+    bool ignoresCase_;
     const ModuleHead* unfinished_ = nullptr;
     Place unfinishedPlace_;
     std::vector<std::unique_ptr<ModuleHead>> heads_;
-    std::map<std::string_view, ModuleHead*, std::less<>> byName_;
+    std::map<std::string_view, ModuleHead*, NameOrder> byName_;
 };
 
 } // namespace Readers

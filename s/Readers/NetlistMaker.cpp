@@ -3,6 +3,7 @@
 #include "HdlModel/Objects/MakePacked.h"
 #include "Port/Ascii.h"
 
+#include <algorithm>
 #include <charconv>
 #include <memory>
 #include <utility>
@@ -58,10 +59,19 @@ std::string MakeSimple(std::string_view name) {
     return result;
 }
 
+std::string InSmallLetters(std::string_view name) {
+    std::string result(name);
+    std::transform(result.begin(), result.end(), result.begin(), Port::ToLower);
+    return result;
+}
+
 /// Whether a bus has this base name.
-bool HasBase(std::string_view busName, std::string_view base) {
-    return busName.size() > base.size() && busName[base.size()] == '(' &&
-           busName.substr(0, base.size()) == base;
+bool HasBase(std::string_view busName, std::string_view base, bool isExact) {
+    if (busName.size() <= base.size() || busName[base.size()] != '(') {
+        return false;
+    }
+    busName = busName.substr(0, base.size());
+    return isExact ? busName == base : Port::EqualIgnoringCase(busName, base);
 }
 
 } // namespace
@@ -70,10 +80,19 @@ bool NetlistMaker::IsOpenWord(std::string_view name) noexcept {
     return Port::EqualIgnoringCase(name, "open");
 }
 
-NetlistMaker::NetlistMaker(Netlist& netlist, VerilogReader::Names names,
-                           bool (*isReserved)(std::string_view name), NetlistSink* sink)
-    : netlist_(netlist), names_(names), isReserved_(isReserved),
-      renamed_(0, RenamingHash{&renamings_}, RenamingEqual{&renamings_}), sink_(sink) {}
+std::size_t NetlistMaker::RenamingHash::operator()(std::string_view name) const noexcept {
+    if (!ignoresCase || IsExtended(name)) {
+        return std::hash<std::string_view>()(name);
+    }
+    return std::hash<std::string_view>()(InSmallLetters(name));
+}
+
+NetlistMaker::NetlistMaker(Netlist& netlist, ReaderNames names, const NameRules& rules,
+                           NetlistSink* sink)
+    : netlist_(netlist), names_(names), rules_(rules),
+      renamed_(0, RenamingHash{&renamings_, rules.ignoresCase},
+               RenamingEqual{&renamings_, rules.ignoresCase}),
+      sink_(sink) {}
 
 Owner NetlistMaker::GetOwner(const AttributeHolder& holder) const noexcept {
     if (&holder == &netlist_) {
@@ -85,13 +104,23 @@ Owner NetlistMaker::GetOwner(const AttributeHolder& holder) const noexcept {
     return {Owner::Signal, static_cast<const Signal*>(&holder), {}};
 }
 
+/// The name without the backslashes that are part of it; valid until the next call.
+const std::string& NetlistMaker::Plain(const std::string& name) const {
+    if (!rules_.ignoresCase || !IsExtended(name)) {
+        return name;
+    }
+    plain_.assign(name, 1, name.size() - 2);
+    return plain_;
+}
+
 void NetlistMaker::SetName(const std::string& name) {
     if (sink_ != nullptr) {
         sink_->TakeModule(name, place_);
         return;
     }
-    const bool isKept = names_ == VerilogReader::Names::Literal || CanKeep(name, false);
-    const std::string newName = isKept ? name : MakeSimple(name);
+    const std::string& plain = Plain(name);
+    const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false);
+    const std::string newName = isKept ? plain : MakeSimple(plain);
     if (!isKept) {
         renamings_.push_back({name, newName});
     }
@@ -100,12 +129,12 @@ void NetlistMaker::SetName(const std::string& name) {
 
 /// Whether a netlist can have an object of that name and tell it from others.
 bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
-    const bool isLiteral = names_ == VerilogReader::Names::Literal;
+    const bool isLiteral = names_ == ReaderNames::Literal;
     if (!isLiteral && IsOpenWord(name)) {
         return false;
     }
     if (IsSimple(name)) {
-        return isLiteral || !isReserved_(name);
+        return isLiteral || !rules_.isReserved(name);
     }
     if (name.empty() || isBus) {
         return false;
@@ -113,10 +142,11 @@ bool NetlistMaker::CanKeep(std::string_view name, bool isBus) const {
     if (isLiteral) {
         return name.find_first_of(Meaningful) == std::string_view::npos && name.front() != '\'';
     }
-    // A Verilog name of letters, digits, "_" and "$".
+    // A name of letters, digits, "_" and "$".
     bool hasOther = Port::IsDigit(name.front()) || name.front() == '$';
     for (const char c : name) {
-        hasOther = hasOther || !(Port::IsLetter(c) || Port::IsDigit(c) || c == '_' || c == '$');
+        hasOther = hasOther || !(Port::IsLetter(c) || Port::IsDigit(c) || c == '_' ||
+                                 (c == '$' && rules_.allowsDollar));
     }
     return !hasOther;
 }
@@ -149,16 +179,35 @@ bool NetlistMaker::IsDeclared(const std::string& name, bool isTaken) const {
            (isTaken && (FindSignal(name) != nullptr || FindInstance(name) != nullptr));
 }
 
+void NetlistMaker::AddRenaming(const std::string& name, const std::string& newName) {
+    renamings_.push_back({name, newName});
+    renamed_.insert(static_cast<std::uint32_t>(renamings_.size() - 1));
+    newNames_.insert(InSmallLetters(newName));
+}
+
+bool NetlistMaker::IsRenamedTo(std::string_view newName) const {
+    return !newNames_.empty() && newNames_.find(InSmallLetters(newName)) != newNames_.end();
+}
+
 const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, bool isTaken) {
-    if (!isTaken && CanKeep(name, isBus)) {
-        return name;
+    const std::string& plain = Plain(name);
+    const bool isBasic = &plain == &name;
+    if (!isTaken && CanKeep(plain, isBus)) {
+        if (isBasic) {
+            return name;
+        }
+        newName_ = plain;
+        if (IsSimple(plain)) {
+            // The file may have this name without backslashes too, and mean another object.
+            AddRenaming(name, newName_);
+        }
+        return newName_;
     }
-    newName_ = IsSimple(name) ? name : MakeSimple(name);
+    newName_ = IsSimple(plain) ? plain : MakeSimple(plain);
     if (!CanKeep(newName_, isBus) || IsTaken(newName_)) {
         newName_ = MakeUnique(newName_);
     }
-    renamings_.push_back({name, newName_});
-    renamed_.insert(static_cast<std::uint32_t>(renamings_.size() - 1));
+    AddRenaming(name, newName_);
     return newName_;
 }
 
@@ -166,7 +215,7 @@ Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional
     if (sink_ != nullptr) {
         return sink_->Declare(name, range, Polarity::Invalid, place_);
     }
-    const bool isTaken = IsTaken(name);
+    const bool isTaken = IsTaken(Plain(name));
     if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
@@ -204,7 +253,7 @@ Instance* NetlistMaker::AddInstance(const std::string& name, const ModuleHead& h
         sink_->BeginInstance(name, head, place_);
         return instance_.get();
     }
-    const bool isTaken = IsTaken(name);
+    const bool isTaken = IsTaken(Plain(name));
     if (IsDeclared(name, isTaken)) {
         return nullptr;
     }
@@ -214,13 +263,18 @@ Instance* NetlistMaker::AddInstance(const std::string& name, const ModuleHead& h
     return added;
 }
 
-Signal* NetlistMaker::FindByNewName(const std::string& name) const {
+Signal* NetlistMaker::FindByNewName(const std::string& name, bool isExact) const {
     Signal* const signal = netlist_.GetSignal(std::string_view(name));
-    if (signal != nullptr && signal->GetNameView() == name) {
+    if (signal != nullptr && (isExact ? signal->GetNameView() == name
+                                      : Port::EqualIgnoringCase(signal->GetNameView(), name))) {
         return signal;
     }
     Bus* const bus = netlist_.GetParentBus(name.c_str());
-    return bus != nullptr && HasBase(bus->GetNameView(), name) ? bus : nullptr;
+    return bus != nullptr && HasBase(bus->GetNameView(), name, isExact) ? bus : nullptr;
+}
+
+bool NetlistMaker::CanBeFound(std::string_view plain, bool isBasic) const {
+    return (IsSimple(plain) ? isBasic : CanKeep(plain, false)) && !IsRenamedTo(plain);
 }
 
 Signal* NetlistMaker::FindSignal(const std::string& name) const {
@@ -228,12 +282,14 @@ Signal* NetlistMaker::FindSignal(const std::string& name) const {
         return sink_->FindSignal(name);
     }
     if (const std::string* const renamed = FindRenamed(name)) {
-        return FindByNewName(*renamed);
+        return FindByNewName(*renamed, true);
     }
-    if (!IsSimple(name) && !CanKeep(name, false)) {
+    const std::string& plain = Plain(name);
+    const bool isBasic = &plain == &name;
+    if (!CanBeFound(plain, isBasic)) {
         return nullptr;
     }
-    Signal* const signal = FindByNewName(name);
+    Signal* const signal = FindByNewName(plain, !rules_.ignoresCase || !isBasic);
     return signal == nullptr || made_.empty() || made_.find(signal) == made_.end() ? signal
                                                                                    : nullptr;
 }
@@ -245,11 +301,15 @@ Instance* NetlistMaker::FindInstance(const std::string& name) const {
     if (const std::string* const renamed = FindRenamed(name)) {
         return netlist_.GetInstance(std::string_view(*renamed));
     }
-    if (!IsSimple(name) && !CanKeep(name, false)) {
+    const std::string& plain = Plain(name);
+    const bool isBasic = &plain == &name;
+    if (!CanBeFound(plain, isBasic)) {
         return nullptr;
     }
-    Instance* const instance = netlist_.GetInstance(std::string_view(name));
-    return instance != nullptr && instance->GetNameView() == name ? instance : nullptr;
+    Instance* const instance = netlist_.GetInstance(std::string_view(plain));
+    const bool isExact = !rules_.ignoresCase || !isBasic;
+    return instance != nullptr && (!isExact || instance->GetNameView() == plain) ? instance
+                                                                                 : nullptr;
 }
 
 Range NetlistMaker::GetRange(const Bus& bus) {
@@ -308,6 +368,26 @@ Signal* NetlistMaker::GetConcatenation(const std::vector<Signal*>& members) {
     return added;
 }
 
+Signal* NetlistMaker::GetSignal(const std::vector<Piece>& pieces) {
+    if (pieces.size() == 1 && pieces.front().signal != nullptr) {
+        return pieces.front().signal;
+    }
+    return GetConcatenation(GetMembers(pieces));
+}
+
+const Members& NetlistMaker::GetMembers(const std::vector<Piece>& pieces) {
+    members_.clear();
+    for (const Piece& piece : pieces) {
+        if (piece.signal != nullptr) {
+            members_.push_back(piece.signal);
+        }
+        for (const char bit : piece.bits) {
+            members_.push_back(GetConstantNet(bit == '1'));
+        }
+    }
+    return members_;
+}
+
 Signal* NetlistMaker::GetConstantNet(bool value) {
     Signal*& net = constantNets_[value ? 1 : 0];
     if (net == nullptr) {
@@ -361,12 +441,13 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
     if (sink_ != nullptr) {
         return MakeStandIn(head);
     }
-    const bool canKeep = CanKeep(head.name, false);
-    if (canKeep && netlist_.GetComponent(std::string_view(head.name)) != nullptr) {
+    const std::string plain = Plain(head.name);
+    const bool canKeep = CanKeep(plain, false);
+    if (canKeep && netlist_.GetComponent(std::string_view(plain)) != nullptr) {
         return "a model does not tell it from another component, whose name differs in letter case "
                "alone";
     }
-    std::string name = canKeep ? head.name : MakeSimple(head.name);
+    std::string name = canKeep ? plain : MakeSimple(plain);
     if (!CanKeep(name, false) || IsTaken(name)) {
         name = MakeUnique(name);
     }
@@ -399,8 +480,8 @@ std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component)
         if (!Polarity::IsValidValue(port.direction)) {
             return "its port " + Quoted(port.name) + " has no direction";
         }
-        std::string name =
-            CanKeep(port.name, port.range.has_value()) ? port.name : MakeSimple(port.name);
+        const std::string& plain = Plain(port.name);
+        std::string name = CanKeep(plain, port.range.has_value()) ? plain : MakeSimple(plain);
         const std::string base = name;
         if (port.range) {
             AppendRange(name, *port.range);

@@ -20,16 +20,33 @@
 
 namespace Orn_Hdl::Readers {
 
-/// Names are compared exactly. A name that the netlist cannot have, because of its characters or of
-/// another name that differs in letter case alone, is replaced, and found by the one of the file.
+/// How names of a language are compared, and which of them are special.
+struct NameRules {
+    /// Whether names that differ in letter case alone are the same. If so, names in backslashes,
+    /// which they begin and end with, are compared exactly.
+    bool ignoresCase = false;
+    /// Whether "$" can stand in a name without an escape.
+    bool allowsDollar = true;
+    /// Tells which names need an escape.
+    bool (*isReserved)(std::string_view name) = nullptr;
+};
+
+/// A net, a part of one, or constant bits.
+struct Piece {
+    /// Null for a constant.
+    Signal* signal = nullptr;
+    std::string bits;
+};
+
+/// A name that the netlist cannot have, because of its characters or of another name that differs
+/// in letter case alone, is replaced, and found by the one of the file.
 class NetlistMaker {
 public:
     /// \param netlist an empty one, not owned.
-    /// \param isReserved tells which names need an escape in the language of the file.
     /// \param sink not owned. When there is one, it gets what is read; the netlist only gets
     ///        components without pins, and the parts of nets that the sink does not know.
-    NetlistMaker(Netlist& netlist, VerilogReader::Names names,
-                 bool (*isReserved)(std::string_view name), NetlistSink* sink = nullptr);
+    NetlistMaker(Netlist& netlist, ReaderNames names, const NameRules& rules,
+                 NetlistSink* sink = nullptr);
     NetlistMaker(const NetlistMaker&) = delete;
     NetlistMaker& operator=(const NetlistMaker&) = delete;
 
@@ -70,31 +87,36 @@ public:
     Signal* GetSlice(Bus& bus, const Range& range);
     /// The concatenation of two or more signals.
     Signal* GetConcatenation(const std::vector<Signal*>& members);
+    /// The signal that pieces are from left to right; what of it is constant comes from nets that
+    /// carry the constants.
+    Signal* GetSignal(const std::vector<Piece>& pieces);
+    /// The members of that signal, for a sink; valid until the next call.
+    const Members& GetMembers(const std::vector<Piece>& pieces);
     /// A net of one bit that carries a constant.
     Signal* GetConstantNet(bool value);
     /// Connects a pin to a signal of its own that carries a constant.
     void ConnectConstant(const Instance& instance, Pin& pin, const std::string& constant);
 
-    std::vector<VerilogReader::Renaming>& GetRenamings() noexcept { return renamings_; }
+    std::vector<ReaderRenaming>& GetRenamings() noexcept { return renamings_; }
 
 private:
     /// The renamings by the name in the file.
     struct RenamingHash {
         using is_transparent = void; // NOLINT(readability-identifier-naming)
-        const std::vector<VerilogReader::Renaming>* renamings;
-        std::size_t operator()(std::string_view name) const noexcept {
-            return std::hash<std::string_view>()(name);
-        }
+        const std::vector<ReaderRenaming>* renamings;
+        bool ignoresCase;
+        std::size_t operator()(std::string_view name) const noexcept;
         std::size_t operator()(std::uint32_t index) const noexcept {
             return (*this)((*renamings)[index].name);
         }
     };
     struct RenamingEqual {
         using is_transparent = void; // NOLINT(readability-identifier-naming)
-        const std::vector<VerilogReader::Renaming>* renamings;
+        const std::vector<ReaderRenaming>* renamings;
+        bool ignoresCase;
         bool operator()(std::uint32_t a, std::uint32_t b) const noexcept { return a == b; }
         bool operator()(std::string_view name, std::uint32_t index) const noexcept {
-            return (*renamings)[index].name == name;
+            return IsSameName((*renamings)[index].name, name, ignoresCase);
         }
         bool operator()(std::uint32_t index, std::string_view name) const noexcept {
             return (*this)(name, index);
@@ -103,6 +125,7 @@ private:
 
     Signal* FindPart(const std::string& name) const;
     std::string MakeStandIn(ModuleHead& head);
+    const std::string& Plain(const std::string& name) const;
     bool CanKeep(std::string_view name, bool isBus) const;
     bool IsTaken(const std::string& name) const;
     bool IsDeclared(const std::string& name, bool isTaken) const;
@@ -110,14 +133,20 @@ private:
     std::string MakeUnique(const std::string& name);
     /// The name in the netlist for an object that is about to be declared.
     const std::string& MakeName(const std::string& name, bool isBus, bool isTaken);
-    Signal* FindByNewName(const std::string& name) const;
+    void AddRenaming(const std::string& name, const std::string& newName);
+    Signal* FindByNewName(const std::string& name, bool isExact) const;
+    /// Whether an object that was not renamed can have the name.
+    bool CanBeFound(std::string_view plain, bool isBasic) const;
+    bool IsRenamedTo(std::string_view newName) const;
     std::string MakePins(const ModuleHead& head, Component& component);
 
     Netlist& netlist_;
-    const VerilogReader::Names names_;
-    bool (*const isReserved_)(std::string_view name);
-    std::vector<VerilogReader::Renaming> renamings_;
+    const ReaderNames names_;
+    const NameRules rules_;
+    std::vector<ReaderRenaming> renamings_;
     std::unordered_set<std::uint32_t, RenamingHash, RenamingEqual> renamed_;
+    /// The new names of the objects that were renamed, in small letters.
+    std::unordered_set<std::string> newNames_;
     std::unordered_map<std::string, unsigned> lastSuffixes_;
     /// The signals that the file does not have.
     std::unordered_set<const Signal*> made_;
@@ -131,7 +160,9 @@ private:
     /// \}
     /// Room for names, kept so that most objects cost no allocation.
     std::string newName_;
+    mutable std::string plain_;
     std::string text_;
+    Members members_;
 };
 
 } // namespace Orn_Hdl::Readers

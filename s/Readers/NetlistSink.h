@@ -22,12 +22,12 @@ using Members = std::vector<Signal*>;
 
 /// The object to which a parameter or an attribute belongs.
 struct Owner {
-    enum Kind { Module, Instance, Signal };
+    enum Kind { Module, Component, Instance, Signal };
     Kind kind = Module;
-    /// Null for the module and for an instance.
+    /// Null for all but a signal.
     const Orn_Hdl::Signal* signal = nullptr;
-    /// The name of an instance in the file.
-    std::string_view instance;
+    /// The name of a component or an instance in the file.
+    std::string_view name;
 };
 
 /// Is told what a reader finds, in the order of the file. Nothing is kept but the signals that the
@@ -49,6 +49,12 @@ public:
     /// The signal that stands for a name, which may be that of a part in parentheses; null when
     /// there is none.
     virtual Signal* FindSignal(std::string_view name) = 0;
+    /// A component is declared.
+    virtual void TakeComponent(const ModuleHead& head, const Place& place) = 0;
+    /// A configuration binds instances of a component to the configuration of that component. Comes
+    /// before anything else.
+    virtual void TakeBinding(const std::vector<std::string>& instances,
+                             const std::string& component, const Place& place) = 0;
     /// An instance begins. What comes before the next one can belong to it.
     virtual void BeginInstance(std::string_view name, const ModuleHead& head,
                                const Place& place) = 0;
@@ -64,9 +70,10 @@ public:
     /// \param isHidden whether synthesis does not see it.
     virtual void TakeParameter(const Owner& owner, const std::string& name, const Value& value,
                                bool isHidden, const Place& place) = 0;
-    /// An object has an attribute.
+    /// An object has an attribute. In VHDL, those of an instance come before it.
+    /// \param isDeclared whether there is a declaration of the attribute, or need be none.
     virtual void TakeAttribute(const Owner& owner, const std::string& name, const Value& value,
-                               const Place& place) = 0;
+                               bool isDeclared, const Place& place) = 0;
 };
 
 } // namespace Readers

@@ -4,11 +4,11 @@
 #include "Port/Ascii.h"
 #include "Readers/Heads.h"
 #include "Readers/NetlistMaker.h"
+#include "Readers/Top.h"
 #include "Readers/Verilog/HeadReader.h"
 #include "Readers/Verilog/ModuleReader.h"
 #include "Readers/Verilog/ReadVerilog.h"
 
-#include <set>
 #include <utility>
 
 namespace Orn_Hdl {
@@ -24,7 +24,6 @@ struct VerilogReader::Implementation {
 namespace {
 
 using Readers::FailAt;
-using Readers::Quoted;
 
 /// One reading of one file.
 class Reading {
@@ -47,8 +46,6 @@ private:
     void ReadHeads();
     void ReadHeads(const std::string& fileName, bool isLibrary);
     void AddComponents(const Readers::Heads& components);
-    const Readers::ModuleHead& FindTop() const;
-    const Readers::ModuleHead& FindOnlyTop() const;
 
     std::string fileName_;
     const Readers::VerilogSetup& setup_;
@@ -82,50 +79,15 @@ void Reading::AddComponents(const Readers::Heads& components) {
     }
 }
 
-const Readers::ModuleHead& Reading::FindOnlyTop() const {
-    std::set<std::string_view> used;
-    for (const auto& head : heads_.GetAll()) {
-        for (const Readers::ModuleHead::Use& use : head->uses) {
-            used.insert(use.name);
-        }
-    }
-    const Readers::ModuleHead* top = nullptr;
-    std::string names;
-    for (const auto& head : heads_.GetAll()) {
-        if (head->canBeTop && used.find(head->name) == used.end()) {
-            names.append(names.empty() ? "" : ", ").append(Quoted(head->name));
-            top = top == nullptr ? head.get() : top;
-        }
-    }
-    const Readers::Place whole{0, 0, 0};
-    if (top == nullptr) {
-        FailAt(files_, whole, "there is no module that no other one instantiates");
-    }
-    if (names != Quoted(top->name)) {
-        FailAt(files_, whole, "no module instantiates " + names + ": say which one to read");
-    }
-    return *top;
-}
-
-const Readers::ModuleHead& Reading::FindTop() const {
-    if (setup_.top.empty()) {
-        return FindOnlyTop();
-    }
-    const Readers::ModuleHead* const top = heads_.Find(setup_.top);
-    if (top == nullptr || top->isPrimitive) {
-        FailAt(files_, {0, 0, 0}, "there is no module " + Quoted(setup_.top));
-    }
-    return *top;
-}
-
 std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist,
                                                           Readers::NetlistSink* sink) {
-    const Readers::ModuleHead& top = FindTop();
+    const Readers::ModuleHead& top = Readers::FindTop(heads_, setup_.top, "module", files_);
     const Readers::ModuleHead* const unfinished = heads_.GetUnfinished();
     if (unfinished != nullptr && unfinished != &top) {
         FailAt(files_, heads_.GetUnfinishedPlace(), "\"endmodule\" does not follow this");
     }
-    Readers::NetlistMaker maker(netlist, setup_.names, Readers::IsVerilogKeyword, sink);
+    Readers::NetlistMaker maker(netlist, setup_.names, {false, true, Readers::IsVerilogKeyword},
+                                sink);
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();

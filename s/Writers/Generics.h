@@ -9,6 +9,11 @@
 
 namespace Orn_Hdl::Writers {
 
+/// Whether an attribute becomes a parameter or generic.
+inline bool IsGeneric(const Attribute& attribute) noexcept {
+    return attribute.GetGenericOption() != Attribute::GenericNone;
+}
+
 /// The attributes whose generic option is "SYN" and those for which it is "NOSYN".
 struct GenericAttrs {
     PtrArray<Attribute*> syn;

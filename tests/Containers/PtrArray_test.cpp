@@ -620,11 +620,14 @@ TEST(Iterator, WorksInAlgorithmsAndRanges) {
     EXPECT_EQ(std::ranges::count_if(list, isOne), 2);
     EXPECT_EQ(*std::ranges::find_if(list, isOne), &values[1]);
     EXPECT_EQ(std::ranges::max(list, {}, [](const int* value) { return *value; }), &values[2]);
+#if !defined(__clang__) || __clang_major__ >= 16
+    // Earlier versions of Clang cannot compile the views of GCC's library.
     std::vector<int> ones;
     for (const int* value : Iterator<int*>(&array) | std::views::filter(isOne)) {
         ones.push_back(*value);
     }
     EXPECT_EQ(ones, (std::vector<int>{1, 1}));
+#endif
     auto cursor = list.begin();
     EXPECT_EQ(*cursor++, &values[0]);
     EXPECT_EQ(*cursor, &values[1]);

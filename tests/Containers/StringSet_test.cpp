@@ -413,9 +413,12 @@ TEST(StringSet, IsARange) {
     EXPECT_EQ(names, expected);
     EXPECT_EQ(Support::Names(set.begin(), set.end()), expected);
     EXPECT_EQ(std::ranges::count(set, "a"), 1);
+#if !defined(__clang__) || __clang_major__ >= 16
+    // Earlier versions of Clang cannot compile the views of GCC's library.
     const std::ranges::subrange copies(set.GetBeginPos(), set.GetEndPos());
     EXPECT_EQ(std::ranges::count_if(copies, [](const Port::String& name) { return name == "b"; }),
               1);
+#endif
     auto at = set.begin();
     EXPECT_EQ(*at++, expected[0]);
     EXPECT_EQ(*at, expected[1]);

@@ -24,7 +24,7 @@ from check_designs import generate
 
 RULES = Path(__file__).resolve().parents[1] / "check" / "rules"
 UNPROVEN = 4
-LANGUAGES = {"verilog": "v"}
+LANGUAGES = {"verilog": "v", "vhdl": "vhd"}
 TARGETS = {"verilog": "verilog-1995,verilog-2005,systemverilog-2017,icarus,verilator,yosys",
            "vhdl": "vhdl-93,vhdl-2008,ghdl"}
 

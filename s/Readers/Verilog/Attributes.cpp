@@ -11,42 +11,6 @@ namespace {
 
 constexpr const char* Assigned = "ASSIGN";
 
-std::string_view Trim(std::string_view text) {
-    while (!text.empty() && Characters::IsBlank(text.front())) {
-        text.remove_prefix(1);
-    }
-    while (!text.empty() && Characters::IsBlank(text.back())) {
-        text.remove_suffix(1);
-    }
-    return text;
-}
-
-/// Takes the first word off a text.
-std::string_view TakeWord(std::string_view& text) {
-    text = Trim(text);
-    std::size_t length = 0;
-    while (length < text.size() && !Characters::IsBlank(text[length])) {
-        ++length;
-    }
-    const std::string_view word = text.substr(0, length);
-    text.remove_prefix(length);
-    return word;
-}
-
-/// The first words of a text, at most seven.
-std::vector<std::string_view> FirstWords(std::string_view text) {
-    constexpr std::size_t Most = 7;
-    std::vector<std::string_view> words;
-    while (words.size() < Most) {
-        const std::string_view word = TakeWord(text);
-        if (word.empty()) {
-            break;
-        }
-        words.push_back(word);
-    }
-    return words;
-}
-
 /// Comments that may hold attributes, or hide text from synthesis.
 bool IsDialect(std::string_view text) {
     const std::string_view word = TakeWord(text);
@@ -65,81 +29,7 @@ std::string_view WithoutQuotes(std::string_view text) {
     return text;
 }
 
-/// Whether a line of a comment is a divider of a banner: nothing but slashes.
-bool IsDivider(const std::string& line) {
-    constexpr std::size_t Shortest = 40;
-    return line.size() >= Shortest && line.find_first_not_of('/') == std::string::npos;
-}
-
-/// Drops the banner that opens a netlist that this library has written: it begins with a divider
-/// and ends with the text below the line "Reference", which is indented.
-void DropBanner(std::vector<std::string>& lines) {
-    if (lines.empty() || !IsDivider(lines.front())) {
-        return;
-    }
-    auto end = std::find(lines.begin(), lines.end(), "Reference");
-    if (end == lines.end()) {
-        return;
-    }
-    ++end;
-    while (end != lines.end() && end->substr(0, 3) == "   ") {
-        ++end;
-    }
-    lines.erase(lines.begin(), end);
-}
-
-/// Puts an attribute in the place of another one of its holder, the order kept.
-void Replace(AttributeHolder& holder, Attribute* present, std::unique_ptr<Attribute> attribute) {
-    std::vector<Attribute*> all;
-    for (Attribute* each : holder.GetAttrIterator()) {
-        all.push_back(each);
-    }
-    for (Attribute* each : all) {
-        std::unique_ptr<Attribute> detached = holder.DetachAttr(each);
-        holder.AddAttr(each == present ? attribute.release() : detached.release());
-    }
-}
-
 } // namespace
-
-std::string SetAttribute(AttributeHolder& holder, const std::string& name, const Value& value,
-                         const char* generic, const char* synthesis) {
-    std::unique_ptr<Attribute> attribute = value.MakeAttribute(name.c_str());
-    Attribute* const present = holder.GetAttr(name.c_str());
-    if (present == nullptr) {
-        if (attribute->GetNameView() != name) {
-            return "a model has no attribute of this name";
-        }
-        attribute->SetGeneric(generic == nullptr ? "NONE" : generic);
-        attribute->SetSynAttr(synthesis == nullptr ? "NONE" : synthesis);
-        holder.AddAttr(attribute.release());
-        return "";
-    }
-    if (present->GetNameView() != name) {
-        return "a model does not tell it from " + Quoted(present->GetNameView());
-    }
-    const bool wasSet = generic != nullptr ? present->GetGenericOption() != Attribute::GenericNone
-                                           : present->GetSynAttrOption() != Attribute::SynAttrNone;
-    if (!wasSet && present->GetValueString() != attribute->GetValueString()) {
-        return "there is an attribute and a parameter of this name, with different values, and a "
-               "model has one of both";
-    }
-    // The form of a parameter's value says more than that of an attribute in a comment.
-    if (!wasSet && generic == nullptr) {
-        present->SetSynAttr(synthesis);
-        return "";
-    }
-    attribute->SetGeneric(generic != nullptr ? generic : present->GetGeneric().CStr());
-    attribute->SetSynAttr(synthesis != nullptr ? synthesis : present->GetSynAttr().CStr());
-    if (present->GetValueType() == attribute->GetValueType()) {
-        present->SetValue(value.text.c_str());
-        present->SetGeneric(attribute->GetGeneric().CStr());
-        present->SetSynAttr(attribute->GetSynAttr().CStr());
-        return "";
-    }
-    Replace(holder, present, std::move(attribute));
-    return "";
-}
 
 AttributeReader::AttributeReader(Parser& parser, Scanner& scanner, NetlistMaker& maker,
                                  const VerilogSetup& setup)
@@ -167,15 +57,15 @@ void AttributeReader::ReadAttributes() {
             }
             read.name = parser_.Get().text;
             parser_.Next();
-            read.value = Value{Attribute::Integer, "1"};
+            read.value = Value{Attribute::Integer, "1", {}};
             if (parser_.Accept('=')) {
                 const bool isNegative = parser_.Accept('-');
                 const Token& token = parser_.Get();
                 try {
                     if (token.kind == TokenKind::String) {
-                        read.value = Value::OfString(token.text);
+                        read.value = ValueOfString(token.text);
                     } else if (token.kind == TokenKind::Number) {
-                        read.value = Value::Of(Number::Read(token.text), isNegative);
+                        read.value = ValueOf(Number::Read(token.text), isNegative);
                     } else {
                         parser_.FailExpected("a number or a string");
                     }
@@ -227,7 +117,7 @@ void AttributeReader::GiveTo(const Target& target) {
 
 void AttributeReader::GiveNotes() {
     TakeComments(true);
-    DropBanner(lines_);
+    DropBanner(lines_, '/');
     Netlist& netlist = maker_.GetNetlist();
     GiveTo({&netlist, &netlist});
     attributes_.clear();
@@ -237,7 +127,7 @@ void AttributeReader::GiveNotes() {
 void AttributeReader::Set(const Target& target, const std::string& name, const Value& value,
                           const Place& place) {
     if (NetlistSink* const sink = maker_.GetSink()) {
-        sink->TakeAttribute(maker_.GetOwner(*target.holder), name, value, place);
+        sink->TakeAttribute(maker_.GetOwner(*target.holder), name, value, true, place);
         return;
     }
     const std::string problem = SetAttribute(*target.holder, name, value, nullptr, Assigned);
@@ -254,31 +144,10 @@ void AttributeReader::TakeComments(bool isBefore) {
     }
     for (const Comment& comment : comments) {
         if (!TakeDialect(comment) && isBefore && setup_.keepsComments) {
-            KeepLines(comment);
+            AddLines(comment, lines_);
         }
     }
     comments.clear();
-}
-
-void AttributeReader::KeepLines(const Comment& comment) {
-    std::string_view text = comment.text;
-    for (;;) {
-        const std::size_t end = std::min(text.find('\n'), text.size());
-        std::string_view line = text.substr(0, end);
-        if (comment.isBlock) {
-            line = Trim(line);
-        } else {
-            line.remove_prefix(!line.empty() && line.front() == ' ' ? 1 : 0);
-            line.remove_suffix(!line.empty() && line.back() == '\r' ? 1 : 0);
-        }
-        if (!line.empty()) {
-            lines_.emplace_back(line);
-        }
-        if (end == text.size()) {
-            return;
-        }
-        text.remove_prefix(end + 1);
-    }
 }
 
 /// \return false for a comment that is none of a dialect.
@@ -287,7 +156,14 @@ bool AttributeReader::TakeDialect(const Comment& comment) {
         return false;
     }
     const std::vector<std::string_view> words = FirstWords(comment.text);
-    if (TakeSwitch(words)) {
+    bool isHidden = false;
+    if (TakeSwitch(comment.text, isHidden)) {
+        // A sink gets what the library has written, and what the tools of the check make of it: to
+        // them these words of other dialects are a user's comment.
+        const bool isObeyed = words.front() == "synopsys" || words.front() == "synthesis";
+        if (isObeyed || maker_.GetSink() == nullptr) {
+            isHidden_ = isHidden;
+        }
         return true;
     }
     if (comment.isBlock) {
@@ -305,19 +181,6 @@ bool AttributeReader::TakeDialect(const Comment& comment) {
         return false;
     }
     return TakeNamed(comment.text, words, comment.place);
-}
-
-bool AttributeReader::TakeSwitch(const std::vector<std::string_view>& words) {
-    if (words.size() != 2 || (words[1] != "translate_off" && words[1] != "translate_on")) {
-        return false;
-    }
-    // A sink gets what the library has written, and what the tools of the check make of it: to them
-    // these words of other dialects are a user's comment.
-    const bool isObeyed = words.front() == "synopsys" || words.front() == "synthesis";
-    if (isObeyed || maker_.GetSink() == nullptr) {
-        isHidden_ = words[1] == "translate_off";
-    }
-    return true;
 }
 
 /// The forms "synthesis attribute NAME of OBJECT is "VALUE"", "exemplar attribute OBJECT NAME
@@ -343,7 +206,7 @@ bool AttributeReader::TakeNamed(std::string_view text, const std::vector<std::st
     const Target target = Find(object);
     if (target.holder != nullptr && setup_.keepsAttributes) {
         const std::string_view value = isSentence ? WithoutQuotes(Trim(text)) : Trim(text);
-        Set(target, name, Value{Attribute::String, std::string(value)}, place);
+        Set(target, name, Value{Attribute::String, std::string(value), {}}, place);
     }
     return true;
 }
@@ -365,7 +228,7 @@ void AttributeReader::SetOnTargets(std::string_view name, std::string_view value
         return;
     }
     for (const Target& target : targets_) {
-        Set(target, std::string(name), Value{Attribute::String, std::string(value)}, place);
+        Set(target, std::string(name), Value{Attribute::String, std::string(value), {}}, place);
     }
 }
 

@@ -19,12 +19,6 @@ struct Target {
     Object* object = nullptr;
 };
 
-/// Gives an object an attribute, or an attribute that it has another option.
-/// \param generic, synthesis options as `Attribute` takes them; null for one that stays.
-/// \return an empty text, or why the object cannot have it.
-std::string SetAttribute(AttributeHolder& holder, const std::string& name, const Value& value,
-                         const char* generic, const char* synthesis);
-
 class AttributeReader {
 public:
     AttributeReader(Parser& parser, Scanner& scanner, NetlistMaker& maker,
@@ -54,7 +48,6 @@ public:
 private:
     void TakeComments(bool isBefore);
     bool TakeDialect(const Comment& comment);
-    bool TakeSwitch(const std::vector<std::string_view>& words);
     bool TakeNamed(std::string_view text, const std::vector<std::string_view>& words,
                    const Place& place);
     void TakeSynplicity(std::string_view text, const Place& place);
@@ -62,7 +55,6 @@ private:
     void SetOnTargets(std::string_view name, std::string_view value, const Place& place);
     void Set(const Target& target, const std::string& name, const Value& value, const Place& place);
     Target Find(const std::string& name) const;
-    void KeepLines(const Comment& comment);
 
     struct Read {
         std::string name;

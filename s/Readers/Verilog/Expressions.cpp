@@ -378,26 +378,6 @@ void ExpressionReader::AddBits(const std::string& bits, const Place& place) {
     expression_->pieces.back().bits = bits;
 }
 
-Signal* ExpressionReader::MakeSignal(const Expression& expression) {
-    if (expression.pieces.size() == 1 && expression.pieces.front().signal != nullptr) {
-        return expression.pieces.front().signal;
-    }
-    return maker_.GetConcatenation(GetMembers(expression));
-}
-
-const Members& ExpressionReader::GetMembers(const Expression& expression) {
-    members_.clear();
-    for (const Piece& piece : expression.pieces) {
-        if (piece.signal != nullptr) {
-            members_.push_back(piece.signal);
-        }
-        for (const char bit : piece.bits) {
-            members_.push_back(maker_.GetConstantNet(bit == '1'));
-        }
-    }
-    return members_;
-}
-
 std::string ExpressionReader::GetBits(const Expression& expression, std::uint64_t width) {
     if (width > MostBits) {
         parser_.Fail(expression.place,

@@ -14,13 +14,6 @@
 
 namespace Orn_Hdl::Readers {
 
-/// A net, a part of one, or constant bits.
-struct Piece {
-    /// Null for a constant.
-    Signal* signal = nullptr;
-    std::string bits;
-};
-
 struct Expression {
     Place place;
     /// From left to right; empty when the expression is a number alone.
@@ -58,11 +51,6 @@ public:
     /// Reads "[left:right]" if it is there.
     std::optional<Range> ReadRange();
 
-    /// The signal that an expression of nets is; what of it is constant comes from nets that carry
-    /// the constants.
-    Signal* MakeSignal(const Expression& expression);
-    /// What an expression of nets consists of, for a sink; valid until the next call.
-    const Members& GetMembers(const Expression& expression);
     /// The bits of a constant expression in so many bits, leftmost first.
     std::string GetBits(const Expression& expression, std::uint64_t width);
     /// The constant of a model that a constant expression is in so many bits.
@@ -95,7 +83,6 @@ private:
     /// How much repetitions have made of all expressions.
     std::uint64_t repeated_ = 0;
     std::string name_;
-    Members members_;
 };
 
 } // namespace Orn_Hdl::Readers

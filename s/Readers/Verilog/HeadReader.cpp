@@ -1,5 +1,7 @@
 #include "Readers/Verilog/HeadReader.h"
 
+#include "Readers/Verilog/Literals.h"
+
 #include <limits>
 #include <utility>
 
@@ -300,7 +302,7 @@ void HeadReader::ReadParameter(bool isLocal) {
     if (parser_.Accept('=')) {
         const Token& token = parser_.Get();
         if (token.kind == TokenKind::String) {
-            parameter.value = Value::OfString(token.text);
+            parameter.value = ValueOfString(token.text);
             parser_.Next();
         } else if (token.kind == TokenKind::Number || parser_.IsSign('-') || parser_.IsName() ||
                    parser_.IsSign('(')) {
@@ -309,7 +311,7 @@ void HeadReader::ReadParameter(bool isLocal) {
             try {
                 if (token.kind == TokenKind::Number) {
                     number = Number::Read(token.text);
-                    parameter.value = Value::Of(*number, false);
+                    parameter.value = ValueOf(*number, false);
                 }
             } catch (const LiteralProblem&) {
                 parameter.value.reset();
@@ -325,7 +327,7 @@ void HeadReader::ReadParameter(bool isLocal) {
                 parameter.value.reset();
                 parameter.number.reset();
             } else if (parameter.number && !isLiteral) {
-                parameter.value = Value{Attribute::Integer, std::to_string(*parameter.number)};
+                parameter.value = Value{Attribute::Integer, std::to_string(*parameter.number), {}};
             }
         }
     }

@@ -146,41 +146,6 @@ Number ReadBased(std::string_view text, std::size_t apostrophe) {
     return number;
 }
 
-/// A real number without an exponent: a model keeps as many decimals as the text has.
-std::string WithoutExponent(const std::string& text) {
-    const std::size_t e = text.find_first_of("eE");
-    if (e == std::string::npos) {
-        return text;
-    }
-    const char* first = text.data() + e + 1;
-    first += *first == '+' ? 1 : 0;
-    int exponent = 0;
-    const auto result = std::from_chars(first, text.data() + text.size(), exponent);
-    constexpr int MostDigits = 300;
-    if (result.ec != std::errc() || result.ptr != text.data() + text.size() ||
-        exponent > MostDigits || exponent < -MostDigits) {
-        throw LiteralProblem{"the number " + text + " is too large or too small"};
-    }
-    std::string digits = text.substr(0, e);
-    std::size_t point = std::min(digits.find('.'), digits.size());
-    if (point < digits.size()) {
-        digits.erase(point, 1);
-    }
-    if (exponent < 0) {
-        const auto places = static_cast<std::size_t>(-exponent);
-        if (point <= places) {
-            digits.insert(0, places - point + 1, '0');
-            point += places - point + 1;
-        }
-        point -= places;
-    } else {
-        point += static_cast<std::size_t>(exponent);
-        digits.append(point > digits.size() ? point - digits.size() : 0, '0');
-    }
-    digits.insert(point, ".");
-    return digits.back() == '.' ? digits + "0" : digits;
-}
-
 } // namespace
 
 Number Number::Read(std::string_view withBlanks) {
@@ -248,10 +213,6 @@ std::optional<std::int64_t> Number::GetValue() const {
     return value;
 }
 
-std::string MakeConstant(const std::string& bits, bool isBare) {
-    return isBare ? bits : std::to_string(bits.size()) + ":B:" + bits;
-}
-
 std::string MakeConstant(const Number& number, std::uint32_t width, bool isBare) {
     const std::uint32_t perDigit = BitsOfDigit(number.base);
     // A model writes the digits in a language in which each stands for as many bits.
@@ -265,9 +226,9 @@ std::string MakeConstant(const Number& number, std::uint32_t width, bool isBare)
     return constant.append(width / perDigit - number.digits.size(), '0').append(number.digits);
 }
 
-Value Value::Of(const Number& number, bool isNegative) {
+Value ValueOf(const Number& number, bool isNegative) {
     if (number.kind == Number::Real) {
-        return {Attribute::Float, (isNegative ? "-" : "") + WithoutExponent(number.digits)};
+        return {Attribute::Float, (isNegative ? "-" : "") + WithoutExponent(number.digits), {}};
     }
     if (number.size == 0 && number.kind == Number::Integer) {
         const std::optional<std::int64_t> value = number.GetValue();
@@ -276,38 +237,19 @@ Value Value::Of(const Number& number, bool isNegative) {
             throw LiteralProblem{"the number " + number.digits +
                                  " does not fit in the 32 bits that a model's integers have"};
         }
-        return {Attribute::Integer, std::to_string(isNegative ? -*value : *value)};
+        return {Attribute::Integer, std::to_string(isNegative ? -*value : *value), {}};
     }
     if (isNegative) {
         throw LiteralProblem{"a negative number with a size is no value that a model has"};
     }
     if (number.kind == Number::Fill || (number.size == 1 && number.base == 2)) {
-        return {Attribute::Bit, number.GetBits(1)};
+        return {Attribute::Bit, number.GetBits(1), {}};
     }
-    return {Attribute::BitVector, MakeConstant(number, number.size, false)};
+    return {Attribute::BitVector, MakeConstant(number, number.size, false), {}};
 }
 
-Value Value::OfString(std::string_view text) {
-    return {Attribute::String, ReadString(text)};
-}
-
-Value Value::OfBits(const std::string& bits) {
-    return {Attribute::BitVector, MakeConstant(bits, false)};
-}
-
-std::unique_ptr<Attribute> Value::MakeAttribute(const char* name) const {
-    switch (type) {
-    case Attribute::Integer:
-        return std::make_unique<AttributeInteger>(name, text.c_str());
-    case Attribute::Float:
-        return std::make_unique<AttributeFloat>(name, text.c_str());
-    case Attribute::Bit:
-        return std::make_unique<AttributeBit>(name, text.c_str());
-    case Attribute::BitVector:
-        return std::make_unique<AttributeBitVector>(name, text.c_str());
-    default:
-        return std::make_unique<AttributeString>(name, text.c_str());
-    }
+Value ValueOfString(std::string_view text) {
+    return {Attribute::String, ReadString(text), {}};
 }
 
 std::string ReadString(std::string_view text) {

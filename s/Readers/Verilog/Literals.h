@@ -1,21 +1,15 @@
 // Numbers and strings of Verilog as values.
 #pragma once
 
-#include "Orn_Hdl/Attributes.h"
+#include "Readers/Value.h"
 
 #include <cstddef>
 #include <cstdint>
-#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 
 namespace Orn_Hdl::Readers {
-
-/// Why a literal cannot be taken; the text is a message.
-struct LiteralProblem {
-    std::string text;
-};
 
 /// A number (IEEE 1364-2005, clause 3.5).
 struct Number {
@@ -47,23 +41,12 @@ struct Number {
 /// The constant of a model that has the bits of a number in so many bits: "8:H:A5", or "1" for one
 /// bit when `isBare`.
 std::string MakeConstant(const Number& number, std::uint32_t width, bool isBare);
-/// The constant of a model with these bits.
-std::string MakeConstant(const std::string& bits, bool isBare);
 
-/// The value of a parameter or attribute.
-struct Value {
-    Attribute::ValueType type = Attribute::String;
-    /// As the attribute's `SetValue` reads it.
-    std::string text;
-
-    /// \throws LiteralProblem.
-    static Value Of(const Number& number, bool isNegative);
-    static Value OfString(std::string_view text);
-    static Value OfBits(const std::string& bits);
-
-    /// Makes an attribute of the type that has the value.
-    std::unique_ptr<Attribute> MakeAttribute(const char* name) const;
-};
+/// The value that a number is.
+/// \throws LiteralProblem.
+Value ValueOf(const Number& number, bool isNegative);
+/// The value that a string is.
+Value ValueOfString(std::string_view text);
 
 /// The characters of a string, whose escape sequences are replaced.
 std::string ReadString(std::string_view text);

@@ -404,12 +404,12 @@ void ModuleReader::ReadAssignments() {
 void ModuleReader::Assign(const Expression& target, const Expression& value) {
     NetlistSink* const sink = maker_.GetSink();
     if (value.IsConstant() && sink != nullptr) {
-        sink->Tie(expressions_.GetMembers(target), expressions_.GetBits(value, target.width),
+        sink->Tie(maker_.GetMembers(target.pieces), expressions_.GetBits(value, target.width),
                   target.place);
         return;
     }
     if (value.IsConstant()) {
-        Tie(*expressions_.MakeSignal(target), value);
+        Tie(*maker_.GetSignal(target.pieces), value);
         return;
     }
     if (target.width != value.width) {
@@ -417,12 +417,12 @@ void ModuleReader::Assign(const Expression& target, const Expression& value) {
                                       std::to_string(target.width));
     }
     if (sink != nullptr) {
-        const Members members = expressions_.GetMembers(target);
-        sink->Assign(members, expressions_.GetMembers(value), target.place);
+        const Members members = maker_.GetMembers(target.pieces);
+        sink->Assign(members, maker_.GetMembers(value.pieces), target.place);
         return;
     }
-    Signal& signal = *expressions_.MakeSignal(target);
-    Signal& source = *expressions_.MakeSignal(value);
+    Signal& signal = *maker_.GetSignal(target.pieces);
+    Signal& source = *maker_.GetSignal(value.pieces);
     if (&signal == &source) {
         parser_.Fail(value.place, Quoted(signal.GetNameView()) + " is assigned to itself");
     }
@@ -489,12 +489,12 @@ Value ModuleReader::ReadValue(std::string_view parameter) {
     Value value;
     try {
         if (parser_.Get().kind == TokenKind::Number) {
-            value = Value::Of(Number::Read(parser_.Get().text), isNegative);
+            value = ValueOf(Number::Read(parser_.Get().text), isNegative);
             parser_.Next();
         } else if (isNegative) {
             parser_.FailExpected("a number");
         } else if (parser_.Get().kind == TokenKind::String) {
-            value = Value::OfString(parser_.Get().text);
+            value = ValueOfString(parser_.Get().text);
             parser_.Next();
         } else if (parser_.IsSign('{')) {
             value = ReadBitsValue();
@@ -783,10 +783,10 @@ void ModuleReader::Connect(const ModuleHead& head, const Instance& instance, std
                                        std::to_string(value_.width) + " are connected to it");
     }
     if (sink != nullptr) {
-        sink->Connect(head.ports[port], expressions_.GetMembers(value_), value_.place);
+        sink->Connect(head.ports[port], maker_.GetMembers(value_.pieces), value_.place);
         return;
     }
-    Signal* const signal = expressions_.MakeSignal(value_);
+    Signal* const signal = maker_.GetSignal(value_.pieces);
     if (NetlistMaker::IsOpenWord(signal->GetNameView())) {
         parser_.Fail(value_.place, "a net of this name, which stands for an open pin in a model");
     }

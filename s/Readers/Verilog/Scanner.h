@@ -1,6 +1,7 @@
 // The words and signs of Verilog source text, as IEEE 1364-2005 clauses 3 and 19 define them.
 #pragma once
 
+#include "Readers/Comments.h"
 #include "Readers/InputText.h"
 #include "Readers/Place.h"
 #include "Readers/Verilog/Setup.h"
@@ -45,13 +46,6 @@ struct Token {
     char sign = '\0';
     /// Valid until the next token is read.
     std::string_view text;
-    Place place;
-};
-
-/// A comment without its delimiters.
-struct Comment {
-    std::string text;
-    bool isBlock = false;
     Place place;
 };
 

@@ -15,7 +15,7 @@ struct VerilogSetup {
     std::vector<std::string> includeFolders;
     std::vector<std::pair<std::string, std::string>> macros;
     VerilogReader::Includes includes = VerilogReader::Includes::Follow;
-    VerilogReader::Names names = VerilogReader::Names::Simple;
+    ReaderNames names = ReaderNames::Simple;
     bool keepsComments = false;
     bool keepsAttributes = true;
 };

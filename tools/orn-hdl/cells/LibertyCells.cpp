@@ -40,7 +40,7 @@ private:
     std::size_t line_ = 1;
 };
 
-bool IsBlank(char c) noexcept {
+bool IsGap(char c) noexcept {
     // A backslash continues a line.
     return c == ' ' || (c >= '\t' && c <= '\r') || c == '\\' || c == '\0';
 }
@@ -63,7 +63,7 @@ void LibertyLexer::SkipBlanks() {
             position_ = end + 1;
         } else if (rest == "//") {
             position_ = std::min(text_.find('\n', position_), text_.size()) - 1;
-        } else if (IsBlank(text_[position_])) {
+        } else if (IsGap(text_[position_])) {
             line_ += text_[position_] == '\n' ? 1 : 0;
         } else {
             return;
@@ -84,7 +84,7 @@ LibertyToken LibertyLexer::Next() {
         ++position_;
         return LibertyToken{LibertyToken::Mark, text_.substr(start, 1), line_};
     }
-    while (!IsAtEnd() && !IsBlank(text_[position_]) && !IsMark(text_[position_]) &&
+    while (!IsAtEnd() && !IsGap(text_[position_]) && !IsMark(text_[position_]) &&
            text_[position_] != '"') {
         ++position_;
     }

@@ -4,6 +4,7 @@
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
+#include "diagnostics/Words.h"
 
 #include <utility>
 
@@ -14,10 +15,6 @@ using Orn_Hdl::HdlOptions;
 using Orn_Hdl::StringArray;
 
 namespace {
-
-bool IsWord(const StringArray& words, int index, std::string_view word) {
-    return Port::EqualIgnoringCase(words.GetView(index), word);
-}
 
 bool ChangesNames(const HdlOptions& options) {
     const HdlOptions::VerilogOption& verilog = options.verilog;

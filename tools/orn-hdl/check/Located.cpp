@@ -4,6 +4,7 @@
 #include "Port/Ascii.h"
 #include "Port/File.h"
 #include "diagnostics/NameKey.h"
+#include "diagnostics/Words.h"
 
 #include <algorithm>
 #include <string_view>
@@ -119,10 +120,6 @@ void Search::Found(const std::string& key, Kind kind, std::uint64_t line) {
         }
         *place.line = line;
     }
-}
-
-bool IsWord(const StringArray& words, int index, string_view word) {
-    return index < words.GetSize() && Port::EqualIgnoringCase(words.GetView(index), word);
 }
 
 /// Of "owner.pin", both; only the owner without a ".".

@@ -55,7 +55,7 @@ void WriteText(JsonWriter& json, string_view key, string_view text) {
     json.Key(key).BeginObject().Key("text").Text(text).EndObject();
 }
 
-void WriteRules(JsonWriter& json, const std::vector<RuleTexts>& rules) {
+void WriteRuleList(JsonWriter& json, const std::vector<RuleTexts>& rules) {
     json.Key("rules").BeginArray();
     for (const RuleTexts& rule : rules) {
         json.BeginObject().Key("id").Text(rule.name);
@@ -172,7 +172,7 @@ std::string FormatSarif(const std::vector<Diagnostic>& diagnostics,
     json.Key("tool").BeginObject().Key("driver").BeginObject();
     json.Key("name").Text("orn-hdl");
     json.Key("version").Text(Port::Version::getValue("version").GetView());
-    WriteRules(json, rules);
+    WriteRuleList(json, rules);
     json.EndObject().EndObject().Key("results").BeginArray();
     for (const Diagnostic& diagnostic : diagnostics) {
         WriteResult(json, diagnostic);

@@ -27,7 +27,7 @@ constexpr std::string_view Break = "\\\n";
 
 /// A text for a Graphviz string, or, with `record`, for a field of a box. Bytes that no picture can
 /// show become "?".
-std::string Quote(std::string_view text, bool record = false) {
+std::string Escape(std::string_view text, bool record = false) {
     constexpr std::size_t AtOnce = 4096;
     const std::string_view special = record ? "\"\\{}|<> " : "\"\\";
     std::string result;
@@ -83,20 +83,20 @@ void DotWriter::WriteLine(std::string_view from, std::string_view to, const Sign
         text_ += "penwidth=3, ";
     }
     if (&GetWholeSignal(part) != &part) {
-        text_.append("label=\"").append(Quote(part.GetNameView())).append("\", ");
+        text_.append("label=\"").append(Escape(part.GetNameView())).append("\", ");
     }
     text_.append(more).append("];\n");
 }
 
 std::string DotWriter::GetPinText(const Box& box, const Pin& pin, std::size_t number) const {
-    std::string text = Quote(pin.GetNameView(), true);
+    std::string text = Escape(pin.GetNameView(), true);
     const char* separator = "\\ =\\ ";
     auto wire = std::lower_bound(
         box.wires.begin(), box.wires.end(), number,
         [](const DesignGraph::Wire& w, std::size_t wanted) { return w.pin < wanted; });
     for (; wire != box.wires.end() && wire->pin == number; ++wire) {
         if (DesignGraph::HasManyEnds(graph_.GetNets()[wire->net])) {
-            text.append(separator).append(Quote(wire->part->GetNameView(), true));
+            text.append(separator).append(Escape(wire->part->GetNameView(), true));
             separator = ",\\ ";
         }
     }
@@ -120,8 +120,8 @@ void DotWriter::WriteBox(std::size_t index) {
     if (!left.empty()) {
         text_.append("{").append(left).append("}|");
     }
-    text_.append(Quote(instance.GetNameView(), true)).append("\\n");
-    text_.append(Quote(instance.GetComponentName().GetView(), true));
+    text_.append(Escape(instance.GetNameView(), true)).append("\\n");
+    text_.append(Escape(instance.GetComponentName().GetView(), true));
     if (!right.empty()) {
         text_.append("|{").append(right).append("}");
     }
@@ -134,13 +134,13 @@ void DotWriter::WritePort(const Net& net) {
     text_.append("  ").append(GetNode(PortNode, net));
     text_.append(both ? " [shape=hexagon" : " [shape=cds");
     text_.append(thick ? ", penwidth=3" : "").append(", label=\"");
-    text_.append(Quote(net.signal->GetNameView())).append("\"];\n");
+    text_.append(Escape(net.signal->GetNameView())).append("\"];\n");
 }
 
 void DotWriter::WriteStub(const Net& net) {
     text_.append("  ").append(GetNode(StubNode, net));
     text_.append(" [shape=plaintext, fontcolor=gray40, label=\"");
-    text_.append(Quote(net.signal->GetNameView())).append(" ...\"];\n");
+    text_.append(Escape(net.signal->GetNameView())).append(" ...\"];\n");
 }
 
 void DotWriter::WriteSources(const Net& net, const std::string& to) {
@@ -169,7 +169,7 @@ void DotWriter::WriteNetByName(const Net& net) {
 void DotWriter::WritePoint(const Net& net, const SortedEnds& ends) {
     const std::string point = GetNode(PointNode, net);
     text_.append("  ").append(point).append(" [shape=point, width=0.06, height=0.06, xlabel=\"");
-    text_.append(Quote(net.signal->GetNameView())).append("\"];\n");
+    text_.append(Escape(net.signal->GetNameView())).append("\"];\n");
     for (const End* driver : ends.drivers) {
         WriteLine(GetEndNode(net, *driver), point, *driver->part, "");
     }
@@ -185,7 +185,7 @@ void DotWriter::WriteNet(const Net& net) {
     }
     for (std::size_t i = 0; i < net.constants.size(); ++i) {
         text_.append("  ").append(GetConstantNode(net, i)).append(" [shape=plaintext, label=\"");
-        text_.append(Quote(net.constants[i].value)).append("\"];\n");
+        text_.append(Escape(net.constants[i].value)).append("\"];\n");
     }
     if (DesignGraph::HasManyEnds(net)) {
         WriteNetByName(net);

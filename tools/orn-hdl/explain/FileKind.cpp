@@ -71,15 +71,16 @@ void SkipBlanks(string_view& text) {
     }
 }
 
-bool Begins(string_view text, string_view start) {
+bool BeginsWith(string_view text, string_view start) {
     return Port::EqualIgnoringCase(text.substr(0, start.size()), start);
 }
 
 /// Skips blanks and the comments of Verilog and VHDL.
 void SkipComments(string_view& text) {
-    for (SkipBlanks(text); Begins(text, "//") || Begins(text, "--") || Begins(text, "/*");
+    for (SkipBlanks(text);
+         BeginsWith(text, "//") || BeginsWith(text, "--") || BeginsWith(text, "/*");
          SkipBlanks(text)) {
-        const bool isLong = Begins(text, "/*");
+        const bool isLong = BeginsWith(text, "/*");
         const std::size_t end = isLong ? text.find("*/", 2) : text.find('\n');
         text.remove_prefix(std::min(text.size(), end == string_view::npos ? end
                                                  : isLong                 ? end + 2
@@ -112,19 +113,20 @@ string_view DescribeWords(string_view text) {
     const string_view word = GetFirstWord(text);
     if (IsNameOf(word, "library")) {
         const bool isLiberty =
-            word.find('(') != string_view::npos || Begins(GetSecondWord(text), "(");
+            word.find('(') != string_view::npos || BeginsWith(GetSecondWord(text), "(");
         return isLiberty ? string_view("this looks like a Liberty file") : IsVhdl;
     }
     for (const Signature& first : FirstWords) {
         const bool isLetter = Port::IsLetter(first.start.back());
-        if (isLetter ? Port::EqualIgnoringCase(word, first.start) : Begins(word, first.start)) {
+        if (isLetter ? Port::EqualIgnoringCase(word, first.start) : BeginsWith(word, first.start)) {
             return first.what;
         }
     }
     // Braces open JSON and nothing else; "[" is also a name's first character.
     const string_view second = GetSecondWord(text);
-    const bool isJson = Begins(word, "{") || Begins(word, "[{") || Begins(word, "[\"") ||
-                        (word == "[" && (Begins(second, "{") || Begins(second, "\"")));
+    const bool isJson = BeginsWith(word, "{") || BeginsWith(word, "[{") ||
+                        BeginsWith(word, "[\"") ||
+                        (word == "[" && (BeginsWith(second, "{") || BeginsWith(second, "\"")));
     return isJson ? IsJson : string_view();
 }
 

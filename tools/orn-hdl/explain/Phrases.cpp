@@ -5,6 +5,7 @@
 #include "Port/Ascii.h"
 #include "Port/File.h"
 #include "diagnostics/Nearest.h"
+#include "diagnostics/Words.h"
 
 #include <algorithm>
 #include <array>

@@ -1,6 +1,7 @@
 #include "explain/Syntax.h"
 
 #include "Port/Ascii.h"
+#include "diagnostics/Words.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -80,10 +81,6 @@ const Phrase* FindPhrase(const StringArray& words) {
         }
     }
     return longest;
-}
-
-bool IsWord(const StringArray& words, int index, string_view word) noexcept {
-    return index < words.GetSize() && Port::EqualIgnoringCase(words.GetView(index), word);
 }
 
 std::string JoinChoices(const std::vector<std::string>& choices, string_view last) {

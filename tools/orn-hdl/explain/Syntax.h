@@ -28,8 +28,6 @@ const std::vector<Phrase>& GetPhrases();
 /// The longest phrase that a line begins with; null if there is none.
 const Phrase* FindPhrase(const Orn_Hdl::StringArray& words);
 
-/// Whether the word of a line is this one, letter case ignored.
-bool IsWord(const Orn_Hdl::StringArray& words, int index, std::string_view word) noexcept;
 /// "a, b or c".
 std::string JoinChoices(const std::vector<std::string>& choices, std::string_view last);
 

@@ -22,11 +22,6 @@ bool IsGreater(const NamedCount& a, const NamedCount& b) {
     return a.count != b.count ? a.count > b.count : a.name < b.name;
 }
 
-bool IsDeclared(const Signal& signal) {
-    return signal.GetSignalType() == Orn_Hdl::SignalTypeScalar ||
-           signal.GetSignalType() == Orn_Hdl::SignalTypeBus;
-}
-
 /// The most loaded nets that were seen so far. The name of a net is made when it is one of them.
 class GreatestFanOuts {
 public:

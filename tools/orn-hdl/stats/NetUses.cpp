@@ -12,11 +12,6 @@ namespace {
 using Orn_Hdl::Polarity;
 using Orn_Hdl::Signal;
 
-bool IsDeclared(const Signal& signal) {
-    return signal.GetSignalType() == Orn_Hdl::SignalTypeScalar ||
-           signal.GetSignalType() == Orn_Hdl::SignalTypeBus;
-}
-
 /// The range at the end of a name. \return false if the name is no bus name.
 bool GetRange(std::string_view name, int& left, int& right) {
     Port::String base;
@@ -37,6 +32,11 @@ bool Drives(Polarity polarity) {
 }
 
 } // namespace
+
+bool IsDeclared(const Signal& signal) {
+    return signal.GetSignalType() == Orn_Hdl::SignalTypeScalar ||
+           signal.GetSignalType() == Orn_Hdl::SignalTypeBus;
+}
 
 NetUses::NetUses(const Orn_Hdl::Netlist& netlist) {
     for (const Signal* signal : netlist.GetSignalIterator()) {

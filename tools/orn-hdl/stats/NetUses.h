@@ -14,6 +14,9 @@ class Signal;
 
 namespace Tool::Stats {
 
+/// Whether a signal is declared by itself: no part of a bus and no compound.
+bool IsDeclared(const Orn_Hdl::Signal& signal);
+
 /// How often one bit is driven and read.
 struct NetUse {
     std::int32_t drivers = 0;

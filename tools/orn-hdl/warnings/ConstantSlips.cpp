@@ -2,6 +2,7 @@
 
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/Ascii.h"
+#include "diagnostics/Words.h"
 
 #include <algorithm>
 
@@ -80,10 +81,6 @@ bool IsVerilogNumber(string_view digits) {
     digits.remove_prefix(1);
     return base != nullptr && std::all_of(digits.begin(), digits.end(),
                                           [base](char c) { return IsDigitOf(*base, c); });
-}
-
-std::string Quoted(string_view text) {
-    return std::string("\"").append(text).append("\"");
 }
 
 } // namespace

@@ -3,6 +3,7 @@
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
+#include "diagnostics/Words.h"
 
 #include <algorithm>
 #include <array>
@@ -25,10 +26,6 @@ constexpr std::array<string_view, 5> Flags = {"FLATTEN BUS", "SUPPRESS CONFIGURA
 constexpr std::array<string_view, 5> Ineffective = {
     "FLATTEN BUS", "SET SOURCE FILE", "SET PORT ONEPERLINE", "ADD COMPONENT PIN COMMENT",
     "ADD INSTANCE PIN COMMENT"};
-
-bool IsWord(const StringArray& words, int index, string_view word) {
-    return Port::EqualIgnoringCase(words.GetView(index), word);
-}
 
 /// The place of the word ATTRIBUTE: behind the kind of its owner.
 int GetAttributeWord(const StringArray& words) {

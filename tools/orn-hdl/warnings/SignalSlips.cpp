@@ -3,6 +3,7 @@
 
 #include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
+#include "diagnostics/Words.h"
 
 #include <algorithm>
 #include <utility>
@@ -13,10 +14,6 @@ namespace {
 
 using Orn_Hdl::StringArray;
 using std::string_view;
-
-std::string Quoted(string_view text) {
-    return std::string("\"").append(text).append("\"");
-}
 
 /// A name as the netlist keeps it.
 std::string Normal(string_view name) {

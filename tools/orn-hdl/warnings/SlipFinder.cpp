@@ -5,6 +5,7 @@
 
 #include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
+#include "diagnostics/Words.h"
 
 #include <cstdint>
 #include <cstring>
@@ -16,10 +17,6 @@ namespace {
 
 using Orn_Hdl::StringArray;
 using std::string_view;
-
-std::string Quoted(string_view text) {
-    return std::string("\"").append(text).append("\"");
-}
 
 /// Whether one of eight characters is a parenthesis or a comma.
 bool HasBracketInEight(std::uint64_t characters) noexcept {

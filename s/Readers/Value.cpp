@@ -1,0 +1,133 @@
+#include "Readers/Value.h"
+
+#include "Readers/Place.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cstddef>
+#include <system_error>
+#include <utility>
+#include <vector>
+
+namespace Orn_Hdl::Readers {
+
+namespace {
+
+/// Puts an attribute in the place of another one of its holder, the order kept.
+void Replace(AttributeHolder& holder, Attribute* present, std::unique_ptr<Attribute> attribute) {
+    std::vector<Attribute*> all;
+    for (Attribute* each : holder.GetAttrIterator()) {
+        all.push_back(each);
+    }
+    for (Attribute* each : all) {
+        std::unique_ptr<Attribute> detached = holder.DetachAttr(each);
+        holder.AddAttr(each == present ? attribute.release() : detached.release());
+    }
+}
+
+} // namespace
+
+std::string WithoutExponent(const std::string& text) {
+    const std::size_t e = text.find_first_of("eE");
+    if (e == std::string::npos) {
+        return text;
+    }
+    const char* first = text.data() + e + 1;
+    first += *first == '+' ? 1 : 0;
+    int exponent = 0;
+    const auto result = std::from_chars(first, text.data() + text.size(), exponent);
+    constexpr int MostDigits = 300;
+    if (result.ec != std::errc() || result.ptr != text.data() + text.size() ||
+        exponent > MostDigits || exponent < -MostDigits) {
+        throw LiteralProblem{"the number " + text + " is too large or too small"};
+    }
+    std::string digits = text.substr(0, e);
+    std::size_t point = std::min(digits.find('.'), digits.size());
+    if (point < digits.size()) {
+        digits.erase(point, 1);
+    }
+    if (exponent < 0) {
+        const auto places = static_cast<std::size_t>(-exponent);
+        if (point <= places) {
+            digits.insert(0, places - point + 1, '0');
+            point += places - point + 1;
+        }
+        point -= places;
+    } else {
+        point += static_cast<std::size_t>(exponent);
+        digits.append(point > digits.size() ? point - digits.size() : 0, '0');
+    }
+    digits.insert(point, ".");
+    return digits.back() == '.' ? digits + "0" : digits;
+}
+
+std::string MakeConstant(const std::string& bits, bool isBare) {
+    return isBare ? bits : std::to_string(bits.size()) + ":B:" + bits;
+}
+
+Value Value::OfBits(const std::string& bits) {
+    return {Attribute::BitVector, MakeConstant(bits, false), {}};
+}
+
+std::unique_ptr<Attribute> Value::MakeAttribute(const char* name) const {
+    switch (type) {
+    case Attribute::Integer:
+        return std::make_unique<AttributeInteger>(name, text.c_str());
+    case Attribute::Float:
+        return std::make_unique<AttributeFloat>(name, text.c_str());
+    case Attribute::Boolean:
+        return std::make_unique<AttributeBoolean>(name, text.c_str());
+    case Attribute::Bit:
+        return std::make_unique<AttributeBit>(name, text.c_str());
+    case Attribute::BitVector:
+        return std::make_unique<AttributeBitVector>(name, text.c_str());
+    case Attribute::User: {
+        auto attribute = std::make_unique<AttributeUser>(name, text.c_str());
+        attribute->SetUserType(userType.c_str());
+        return attribute;
+    }
+    default:
+        return std::make_unique<AttributeString>(name, text.c_str());
+    }
+}
+
+std::string SetAttribute(AttributeHolder& holder, const std::string& name, const Value& value,
+                         const char* generic, const char* synthesis) {
+    std::unique_ptr<Attribute> attribute = value.MakeAttribute(name.c_str());
+    Attribute* const present = holder.GetAttr(name.c_str());
+    if (present == nullptr) {
+        if (attribute->GetNameView() != name) {
+            return "a model has no attribute of this name";
+        }
+        attribute->SetGeneric(generic == nullptr ? "NONE" : generic);
+        attribute->SetSynAttr(synthesis == nullptr ? "NONE" : synthesis);
+        holder.AddAttr(attribute.release());
+        return "";
+    }
+    if (present->GetNameView() != name) {
+        return "a model does not tell it from " + Quoted(present->GetNameView());
+    }
+    const bool wasSet = generic != nullptr ? present->GetGenericOption() != Attribute::GenericNone
+                                           : present->GetSynAttrOption() != Attribute::SynAttrNone;
+    if (!wasSet && present->GetValueString() != attribute->GetValueString()) {
+        return "there is an attribute and a parameter of this name, with different values, and a "
+               "model has one of both";
+    }
+    // The form of a parameter's value says more than that of an attribute in a comment.
+    if (!wasSet && generic == nullptr) {
+        present->SetSynAttr(synthesis);
+        return "";
+    }
+    attribute->SetGeneric(generic != nullptr ? generic : present->GetGeneric().CStr());
+    attribute->SetSynAttr(synthesis != nullptr ? synthesis : present->GetSynAttr().CStr());
+    if (present->GetValueType() == attribute->GetValueType()) {
+        present->SetValue(value.text.c_str());
+        present->SetGeneric(attribute->GetGeneric().CStr());
+        present->SetSynAttr(attribute->GetSynAttr().CStr());
+        return "";
+    }
+    Replace(holder, present, std::move(attribute));
+    return "";
+}
+
+} // namespace Orn_Hdl::Readers
