@@ -278,7 +278,9 @@ void Comparison::ComparePorts(const Component& component, const Readers::ModuleH
         if (!run.isScalar) {
             range = Readers::Range{static_cast<int>(run.left), static_cast<int>(run.right)};
         }
-        if (port.name != BaseOf(*pin)) {
+        if (!port.problem.empty()) {
+            report("cannot be declared like this: " + port.problem, *pin, port.place);
+        } else if (port.name != BaseOf(*pin)) {
             report("is declared as " + Quoted(port.name), *pin, port.place);
         } else if (port.range != range) {
             report("is declared as " + Show(port.range), *pin, port.place);

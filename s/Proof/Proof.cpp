@@ -80,19 +80,22 @@ void CompareVerilog(const char* fileName, const Netlist& netlist, const HdlOptio
     CompareIncludes(includes, options.verilog.includePaths, findings);
 }
 
-/// Whether both say the same, letter case and blanks aside.
+/// Whether both say the same, letter case and blanks aside. One clause may name several things.
 bool AreSameClauses(const std::vector<std::string>& read, const std::vector<std::string>& meant) {
-    const auto key = [](string_view text) {
-        std::string small;
-        for (const char c : text) {
-            small.append(c == ' ' || c == '\t' ? 0 : 1, Port::ToLower(c));
+    const auto join = [](const std::vector<std::string>& clauses) {
+        std::string all;
+        for (const std::string& clause : clauses) {
+            for (const char c : clause + ",") {
+                all.append(c == ' ' || c == '\t' ? 0 : 1, Port::ToLower(c));
+            }
         }
-        return small;
+        return all;
     };
-    return std::equal(
-        read.begin(), read.end(), meant.begin(), meant.end(),
-        [&key](const std::string& a, const std::string& b) { return key(a) == key(b); });
+    return join(read) == join(meant);
 }
+
+/// The name that every architecture has.
+constexpr string_view ArchitectureName = "BEHAVIORAL";
 
 void CompareFrame(const Readers::VhdlFrame& frame, const Netlist& netlist,
                   const HdlOptions::VhdlOption& options, Findings& findings) {
@@ -121,7 +124,14 @@ void CompareFrame(const Readers::VhdlFrame& frame, const Netlist& netlist,
     if (!options.suppressConfiguration) {
         configurations.push_back("CFG_" + std::string(netlist.GetNameView()));
     }
-    if (frame.configurations != configurations) {
+    if (frame.architecture != ArchitectureName) {
+        findings.Add("the architecture is \"" + frame.architecture + "\"", {},
+                     {Check::Cause::Kind::DesignName, "", ""});
+    }
+    if (frame.configurations != configurations ||
+        (!configurations.empty() &&
+         (frame.configured != ArchitectureName || frame.configuredEntity != netlist.GetNameView() ||
+          !frame.isConfigurationHidden))) {
         findings.Add("the configuration is not that of the design", {},
                      {Check::Cause::Kind::DesignName, "", ""});
     }

@@ -137,12 +137,17 @@ std::vector<ReaderRenaming> Reading::FillNetlist(Netlist& netlist,
 void Reading::SetClauses(const ModuleHead& entity, const Vhdl::Architecture& architecture) {
     const Vhdl::Clauses& ofEntity = design_.clausesOfEntities.at(&entity);
     const Vhdl::Clauses& ofArchitecture = architecture.clauses;
-    frame_ = {ofEntity.libraries, ofEntity.uses, {}};
+    frame_.libraries = ofEntity.libraries;
+    frame_.uses = ofEntity.uses;
+    frame_.architecture = architecture.name;
     frame_.libraries.insert(frame_.libraries.end(), ofArchitecture.libraries.begin(),
                             ofArchitecture.libraries.end());
     frame_.uses.insert(frame_.uses.end(), ofArchitecture.uses.begin(), ofArchitecture.uses.end());
     for (const Vhdl::Configuration& configuration : design_.configurations) {
         frame_.configurations.push_back(configuration.name);
+        frame_.configured = configuration.architecture;
+        frame_.configuredEntity = configuration.entity;
+        frame_.isConfigurationHidden = configuration.isHidden;
     }
 }
 

@@ -155,17 +155,11 @@ bool AttributeReader::TakeDialect(const Comment& comment) {
     if (!IsDialect(comment.text)) {
         return false;
     }
-    const std::vector<std::string_view> words = FirstWords(comment.text);
-    bool isHidden = false;
-    if (TakeSwitch(comment.text, isHidden)) {
-        // A sink gets what the library has written, and what the tools of the check make of it: to
-        // them these words of other dialects are a user's comment.
-        const bool isObeyed = words.front() == "synopsys" || words.front() == "synthesis";
-        if (isObeyed || maker_.GetSink() == nullptr) {
-            isHidden_ = isHidden;
-        }
+    // A sink gets what the library has written: the words of other dialects are a user's comment.
+    if (TakeSwitch(comment.text, isHidden_, maker_.GetSink() == nullptr)) {
         return true;
     }
+    const std::vector<std::string_view> words = FirstWords(comment.text);
     if (comment.isBlock) {
         std::string_view rest = comment.text;
         TakeWord(rest);

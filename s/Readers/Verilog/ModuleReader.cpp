@@ -171,7 +171,13 @@ void ModuleReader::ReadBody() {
         attributes_.BeginStatement();
         attributes_.ReadAttributes();
         attributes_.TakeCommentsBefore();
-        if (parser_.GetKeyword() == Keyword::Endmodule) {
+        const Keyword keyword = parser_.GetKeyword();
+        // A sink is not told of this, which is so in no written netlist.
+        if (maker_.GetSink() != nullptr && attributes_.IsHidden() &&
+            keyword != Keyword::Parameter && keyword != Keyword::Defparam) {
+            parser_.Fail("this is hidden from synthesis");
+        }
+        if (keyword == Keyword::Endmodule) {
             return;
         }
         maker_.SetPlace(parser_.Get().place);

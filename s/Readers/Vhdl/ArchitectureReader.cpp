@@ -22,7 +22,8 @@ ArchitectureReader::ArchitectureReader(Scanner& scanner, const Design& design,
                                        const ModuleHead& entity, const Architecture& architecture,
                                        NetlistMaker& maker, const VhdlSetup& setup)
     : parser_(scanner), scanner_(scanner), design_(design), entity_(entity),
-      architecture_(architecture), maker_(maker), notes_(scanner, setup.keepsComments),
+      architecture_(architecture), maker_(maker),
+      notes_(scanner, setup.keepsComments, maker.GetSink() == nullptr),
       expressions_(parser_, maker, entity),
       attributes_(parser_, maker, design, architecture, setup.keepsAttributes),
       instances_(parser_, maker, notes_, expressions_, attributes_, design, architecture, entity) {}
@@ -41,17 +42,29 @@ void ArchitectureReader::Read() {
     }
     while (parser_.GetKeyword() != Keyword::Begin) {
         notes_.TakeBefore();
+        RefuseHidden();
         ReadDeclaration();
         notes_.EndStatement();
     }
     parser_.Next();
     while (parser_.GetKeyword() != Keyword::End) {
         notes_.TakeBefore();
+        RefuseHidden();
         ReadStatement();
         parser_.Expect(';');
         notes_.EndStatement();
     }
+    notes_.TakeBefore();
+    RefuseHidden();
+    CheckEnd(architecture_.name);
     attributes_.RefuseUnused();
+}
+
+/// A sink is not told that synthesis does not see a statement, which is so in no written netlist.
+void ArchitectureReader::RefuseHidden() {
+    if (maker_.GetSink() != nullptr && notes_.IsHidden()) {
+        parser_.Fail("this is hidden from synthesis");
+    }
 }
 
 /// Skips to the first word of a unit, and gives the comments in front of it to the netlist.
@@ -141,8 +154,16 @@ void ArchitectureReader::ReadEntity() {
         }
     }
     notes_.TakeInside();
-    while (!parser_.IsSign(';')) {
-        parser_.Next();
+    CheckEnd(entity_.name);
+}
+
+/// Reads on from "end" to the semicolon. A name between them is that of the unit.
+void ArchitectureReader::CheckEnd(const std::string& unit) {
+    for (; !parser_.IsSign(';') && !parser_.IsEnd(); parser_.Next()) {
+        if (parser_.IsName() && parser_.GetKeyword() == Keyword::None &&
+            !IsSameName(parser_.Get().text, unit, true)) {
+            parser_.Fail("the end of " + Quoted(unit) + " has another name");
+        }
     }
 }
 

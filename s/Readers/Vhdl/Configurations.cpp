@@ -76,8 +76,11 @@ void ReadItem(Parser& parser, Configuration& configuration, bool isOwn, std::siz
     const Place begin = parser.Get().place;
     const bool isInstance =
         ReadSpecification(parser, component, sink == nullptr ? nullptr : &labels);
-    if (isInstance && sink != nullptr) {
+    if (isInstance && sink != nullptr && parser.GetKeyword() == Keyword::Use) {
         sink->TakeBinding(labels, component, begin);
+    }
+    if (depth == 0 && !isInstance) {
+        configuration.architecture = component;
     }
     if (isInstance && parser.GetKeyword() == Keyword::Use) {
         const Place place = parser.Get().place;
@@ -141,7 +144,7 @@ Configuration ReadConfiguration(Parser& parser, NetlistSink* sink) {
             parser.FailExpected("\"for\" or \"end\"");
         }
     }
-    parser.SkipEnd();
+    parser.SkipEnd(configuration.name);
     return configuration;
 }
 

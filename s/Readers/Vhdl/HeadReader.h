@@ -32,6 +32,7 @@ private:
     void ReadPackage();
     void ReadComponent(Heads& heads);
     ModuleHead& AddHead(Heads& heads, const std::string& name, const Place& place);
+    void TakeComments();
     void ReadGenerics(ModuleHead& head);
     void ReadGeneric(ModuleHead& head);
     void ReadPorts(ModuleHead& head);

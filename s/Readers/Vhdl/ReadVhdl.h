@@ -19,6 +19,12 @@ struct VhdlFrame {
     std::vector<std::string> uses;
     /// The names of the configurations.
     std::vector<std::string> configurations;
+    /// The names of the architecture, and of that in the last configuration; empty for none.
+    std::string architecture;
+    std::string configured;
+    /// The entity of the last configuration, and whether synthesis does not see it.
+    std::string configuredEntity;
+    bool isConfigurationHidden = false;
 };
 
 /// Reads one entity of a file, with its architecture, into a sink.
