@@ -204,6 +204,53 @@ constexpr Change Changes[] = {
 INSTANTIATE_TEST_SUITE_P(Each, ProofChange, ::testing::ValuesIn(Changes),
                          [](const auto& change) { return std::string(change.param.name); });
 
+/// The same design in VHDL.
+class ProofOfVhdl : public ProofTest, public ::testing::WithParamInterface<Change> {};
+
+TEST_P(ProofOfVhdl, IsFound) {
+    const std::string file = folder_ / "top.vhd";
+    // A component declares its generics.
+    Do({"ADD COMPONENT ATTRIBUTE REG -TYPE=BitVector INIT 16:H:0000",
+        "SET COMPONENT ATTRIBUTE OPTION REG INIT -GENERIC=SYN",
+        "ADD COMPONENT ATTRIBUTE REG -TYPE=Float DELAY 0.5",
+        "SET COMPONENT ATTRIBUTE OPTION REG DELAY -GENERIC=NOSYN"});
+    model_.ExecuteLine("WRITE VHDL -NOHEADER " + file);
+    const auto compare = [&] {
+        return Proof::Compare(file, Language::Vhdl, *model_.GetNetlist(), *model_.GetOptions());
+    };
+    for (const Proof::Difference& difference : compare()) {
+        FAIL() << difference.line << ": " << difference.message;
+    }
+    std::string text = ReadWholeFile(file);
+    const std::string from = GetParam().from;
+    const std::size_t at = text.find(from);
+    ASSERT_NE(at, std::string::npos) << from << "\n" << text;
+    WriteWholeFile(file, text.replace(at, from.size(), GetParam().to));
+    const std::vector<Proof::Difference> found = compare();
+    ASSERT_FALSE(found.empty());
+    EXPECT_NE(found.front().message.find(GetParam().message), std::string::npos)
+        << found.front().message;
+}
+
+constexpr Change VhdlChanges[] = {
+    {"Clause", "use ieee.numeric_std.ALL;", "", "the use clauses are not those of the design"},
+    {"Architecture", "BEHAVIORAL", "STRUCTURAL", "the end of \"STRUCTURAL\" has another name"},
+    {"Generic", ":=  8", ":=  9", "the parameter WIDTH of the module has the value \"9\""},
+    {"ComponentPin", "in    std_logic_vector (3 downto 0)", "out   std_logic_vector (3 downto 0)",
+     "is declared as an output"},
+    {"Connection", "I=>A", "I=>B", "is connected to \"B\", in the design to \"A\""},
+    {"ConnectionBit", "D(6 downto 4)", "D(5 downto 3)", "is connected to \"A, D[5:3]\""},
+    {"Constant", "b\"1010\"", "b\"1011\"", "the netlist has K[3:0] = 1011"},
+    {"Alias", "T <= n1", "T <= A", "the netlist has T = A, the design T = n1"},
+    {"InstanceGeneric", "x\"8000\"", "x\"8001\"", "the parameter INIT of U3 has the value"},
+    {"Attribute", "is \"P1\"", "is \"P2\"", "the attribute LOC of U1 is \"P2\""},
+    {"AttributeDeclaration", "attribute KEEP  : string ;", "", "is not declared"},
+    {"Binding", "for U1, U2 : INV", "for U1 : INV", "the configuration binds other instances"},
+};
+
+INSTANTIATE_TEST_SUITE_P(Each, ProofOfVhdl, ::testing::ValuesIn(VhdlChanges),
+                         [](const auto& change) { return std::string(change.param.name); });
+
 TEST_F(ProofTest, AChangeWithoutMeaningIsNone) {
     EXPECT_EQ(FindFirst("{A, D[6:4]}", "{A, D[6], D[5:4]}"), "");
     EXPECT_EQ(FindFirst("4'b1010", "4'hA"), "");
