@@ -60,8 +60,9 @@ void CompareIncludes(const std::vector<std::string>& read, const StringArray& me
             wanted = wanted.substr(1, wanted.size() - 2);
         }
         if (wanted != found) {
-            findings.Add("the netlist includes \"" + found + "\", the design \"" + wanted + "\"",
-                         {}, {Check::Cause::Kind::Include, wanted, ""});
+            std::string message("the netlist includes \"");
+            message.append(found).append("\", the design \"").append(wanted).append("\"");
+            findings.Add(std::move(message), {}, {Check::Cause::Kind::Include, wanted, ""});
         }
     }
 }
@@ -101,6 +102,8 @@ void CompareFrame(const Readers::VhdlFrame& frame, const Netlist& netlist,
                   const HdlOptions::VhdlOption& options, Findings& findings) {
     std::vector<std::string> libraries;
     std::vector<std::string> uses;
+    libraries.reserve(static_cast<std::size_t>(options.libraries.GetSize()));
+    uses.reserve(static_cast<std::size_t>(options.useClauses.GetSize()));
     for (int i = 0; i < options.libraries.GetSize(); ++i) {
         libraries.emplace_back(options.libraries.GetView(i));
     }
