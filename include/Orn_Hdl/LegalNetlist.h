@@ -55,6 +55,11 @@ public:
     /// netlisters do: it is sorted, and dummy signals are made.
     /// \throws Exception, nothing written, with the text of every error when there are any.
     void Write(Language language, OutStream& out);
+    /// The design that was written last, as the write left it: the copy, or the design itself. The
+    /// options' `verify` keeps the copy; it is valid until this object changes.
+    const Netlist& GetWrittenNetlist() const noexcept;
+    /// The options that were in force for it.
+    const HdlOptions& GetWrittenOptions() const noexcept;
 
 private:
     struct Implementation;

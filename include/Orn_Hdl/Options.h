@@ -93,6 +93,9 @@ struct ORN_HDL_API HdlOptions {
     bool legal = false;
     /// Whether a legal netlist escapes names where that is enough, instead of changing them.
     bool escapeNames = false;
+    /// Whether the write commands read each netlist back and compare it with the design (`Proof`)
+    /// before it replaces its file. A netlist that differs is an error, and the file stays.
+    bool verify = false;
 };
 
 /// Helpers that both writers share.

@@ -12,6 +12,7 @@
 #include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Orn_Hdl/Options.h"
+#include "Orn_Hdl/Proof.h"
 #include "Orn_Hdl/Readers.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"

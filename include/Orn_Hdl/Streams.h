@@ -206,6 +206,14 @@ public:
     /// they could not be removed; 0 if the file has its former length.
     std::uint64_t GetLeftoverSize() const noexcept;
 
+    /// Writes the buffered text, and gives the name under which a file that is written to replace
+    /// another can be read before `Close` does so.
+    /// \return an empty text when the file is written directly, or not at all.
+    Port::StringBase<char> FlushToRead();
+    /// Writes the bytes of a file as they are: without indentation, and without breaking lines.
+    /// \return 0, or the system's error number if the file cannot be read.
+    int WriteFile(const char* fileName);
+
 private:
     TextFileDst& file_;
 };

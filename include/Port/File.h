@@ -65,6 +65,10 @@ public:
     /// Whether a file is open.
     bool IsOpen() const noexcept { return descriptor_ >= 0; }
 
+    /// The name under which the temporary file that is to replace another can be opened; empty if
+    /// there is none.
+    std::string GetTemporaryName() const;
+
     /// Reads up to `size` bytes into a buffer that has room for them.
     /// \return their number; 0 at the end of the file, on a failure and when no file is open.
     std::size_t read(char* buffer, std::size_t size);

@@ -16,6 +16,7 @@ inline constexpr SourceUnit EngineUnit{"../s/HdlEngine", "$Revision: 1.5 $"};
 inline constexpr SourceUnit CommandUnit{"../s/HdlCmd", "$Revision: 1.19 $"};
 inline constexpr SourceUnit LegalUnit{"../s/Legal", "$Revision: 1.0 $"};
 inline constexpr SourceUnit ModelUnit{"../s/HdlModel", "$Revision: 1.8 $"};
+inline constexpr SourceUnit ProofUnit{"../s/Proof", "$Revision: 1.0 $"};
 inline constexpr SourceUnit ReaderUnit{"../s/Readers", "$Revision: 1.1 $"};
 
 /// Throws an Orn_Hdl::Exception. The texts are inserted as they stand, "%" included.

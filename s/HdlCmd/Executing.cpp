@@ -3,6 +3,7 @@
 #include "Exception/Failure.h"
 #include "HdlModel/ModelUse.h"
 #include "Orn_Hdl/LegalNetlist.h"
+#include "Orn_Hdl/Proof.h"
 #include "Orn_Hdl/Streams.h"
 #include "Orn_Hdl/Writers.h"
 #include "Port/Ascii.h"
@@ -89,10 +90,20 @@ void WriteFile(Model& model, const Arguments& arguments, Language language, Writ
                                  arguments.Has(WriteFlag::Append) ? TextFileOutStream::Append
                                                                   : TextFileOutStream::Replace);
     model.GetOptions()->writeHeader = !arguments.Has(WriteFlag::WithoutHeader);
-    if (legal) {
-        legal->Write(language, out);
+    const auto writeNetlist = [&](OutStream& stream) {
+        if (legal) {
+            legal->Write(language, stream);
+        } else {
+            write(stream, *model.GetNetlist(), *model.GetOptions());
+        }
+    };
+    if (model.GetOptions()->verify) {
+        Proof::Write(out, fileName, language, writeNetlist, [&]() -> Proof::Written {
+            return legal ? Proof::Written{legal->GetWrittenNetlist(), legal->GetWrittenOptions()}
+                         : Proof::Written{*model.GetNetlist(), *model.GetOptions()};
+        });
     } else {
-        write(out, *model.GetNetlist(), *model.GetOptions());
+        writeNetlist(out);
     }
     out.Close();
     model.RecordWrite(fileName, out.GetError(), out.GetLeftoverSize());

@@ -127,7 +127,18 @@ void LegalNetlist::Write(Language language, OutStream& out) {
     }
     own.copyOptions.writeHeader = own.options.writeHeader;
     own.WriteLiterally(*own.copy, own.copyOptions, language, out);
-    own.copy = nullptr;
+    if (!own.options.verify) {
+        own.copy = nullptr;
+    }
+}
+
+const Netlist& LegalNetlist::GetWrittenNetlist() const noexcept {
+    return implementation_->copy != nullptr ? *implementation_->copy : implementation_->netlist;
+}
+
+const HdlOptions& LegalNetlist::GetWrittenOptions() const noexcept {
+    return implementation_->copy != nullptr ? implementation_->copyOptions
+                                            : implementation_->options;
 }
 
 } // namespace Orn_Hdl

@@ -296,6 +296,14 @@ int File::OpenTemporary(unsigned mode) {
     return 0;
 }
 
+std::string File::GetTemporaryName() const {
+    if (temporary_.empty() || !folder_.IsOpen()) {
+        return temporary_;
+    }
+    // A name below the folder says nothing when the folder was moved.
+    return "/dev/fd/" + std::to_string(descriptor_);
+}
+
 bool File::OpenTarget() {
     return OpenDescriptor(target_.c_str(), O_WRONLY | O_TRUNC, 0) || Fail(errno);
 }

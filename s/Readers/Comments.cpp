@@ -53,12 +53,14 @@ std::vector<std::string_view> FirstWords(std::string_view text) {
     return words;
 }
 
-bool TakeSwitch(std::string_view text, bool& isHidden) {
+bool TakeSwitch(std::string_view text, bool& isHidden, bool obeysAll) {
     const std::vector<std::string_view> words = FirstWords(text);
     if (words.size() != 2 || (words[1] != "translate_off" && words[1] != "translate_on")) {
         return false;
     }
-    isHidden = words[1] == "translate_off";
+    if (obeysAll || words.front() == "synopsys" || words.front() == "synthesis") {
+        isHidden = words[1] == "translate_off";
+    }
     return true;
 }
 

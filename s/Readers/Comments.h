@@ -25,7 +25,8 @@ std::vector<std::string_view> FirstWords(std::string_view text);
 
 /// Whether a comment hides what follows it from synthesis ("synopsys translate_off") or ends that.
 /// \param isHidden becomes true or false for such a comment.
-bool TakeSwitch(std::string_view text, bool& isHidden);
+/// \param obeysAll whether the words of all dialects count, or those that the check's tools obey.
+bool TakeSwitch(std::string_view text, bool& isHidden, bool obeysAll = true);
 
 /// Adds the lines of a comment to a list; empty ones are left out.
 void AddLines(const Comment& comment, std::vector<std::string>& lines);

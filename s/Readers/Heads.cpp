@@ -20,12 +20,12 @@ int TakeInteger(std::string_view& text) {
     return value;
 }
 
-PortHead MakePort(const Pin& pin) {
+PortHead MakePort(const Pin& pin, std::string_view (*toFile)(std::string_view name)) {
     PortHead port;
     std::string_view name = pin.GetNameView();
     port.direction = pin.GetPolarity().GetValue();
     const std::size_t parenthesis = name.find('(');
-    port.name = name.substr(0, parenthesis);
+    port.name = toFile(name.substr(0, parenthesis));
     if (pin.GetPinType() == PinTypeBus) {
         name.remove_prefix(parenthesis + 1);
         const int left = TakeInteger(name);
@@ -97,16 +97,16 @@ ModuleHead* Heads::Add(std::string_view name, const Place& place) {
     return added;
 }
 
-void Heads::Add(const Netlist& netlist) {
+void Heads::Add(const Netlist& netlist, std::string_view (*toFile)(std::string_view name)) {
     for (const Component* component : netlist.GetComponentIterator()) {
         ModuleHead* const head =
-            component == nullptr ? nullptr : Add(component->GetNameView(), Place());
+            component == nullptr ? nullptr : Add(toFile(component->GetNameView()), Place());
         if (head == nullptr) {
             continue;
         }
         head->hasParameters = false;
         for (const Pin* pin : component->GetPinIterator()) {
-            head->ports.push_back(MakePort(*pin));
+            head->ports.push_back(MakePort(*pin, toFile));
         }
     }
 }

@@ -35,6 +35,8 @@ struct PortHead {
     std::string problem;
     /// The parameters on which the range depends.
     std::vector<std::string> parameters;
+    /// Where it is declared.
+    Place place;
 
     std::uint64_t GetWidth() const noexcept { return range ? range->GetWidth() : 1; }
 };
@@ -101,7 +103,12 @@ public:
     /// Adds a head. \return null if there is one of that name.
     ModuleHead* Add(std::string_view name, const Place& place);
     /// Adds the components of a netlist whose names are new.
-    void Add(const Netlist& netlist);
+    void Add(const Netlist& netlist) {
+        Add(netlist, [](std::string_view name) { return name; });
+    }
+    /// Adds the components of a netlist.
+    /// \param toFile gives the name in the file of one that a component or a pin has.
+    void Add(const Netlist& netlist, std::string_view (*toFile)(std::string_view name));
     const std::vector<std::unique_ptr<ModuleHead>>& GetAll() const noexcept { return heads_; }
 
     /// Remembers the module in which a file ends, and where the module begins.

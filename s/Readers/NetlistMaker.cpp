@@ -88,10 +88,22 @@ std::size_t NetlistMaker::RenamingHash::operator()(std::string_view name) const 
     return std::hash<std::string_view>()(InSmallLetters(name));
 }
 
-NetlistMaker::NetlistMaker(Netlist& netlist, ReaderNames names, const NameRules& rules)
+NetlistMaker::NetlistMaker(Netlist& netlist, ReaderNames names, const NameRules& rules,
+                           NetlistSink* sink)
     : netlist_(netlist), names_(names), rules_(rules),
       renamed_(0, RenamingHash{&renamings_, rules.ignoresCase},
-               RenamingEqual{&renamings_, rules.ignoresCase}) {}
+               RenamingEqual{&renamings_, rules.ignoresCase}),
+      sink_(sink) {}
+
+Owner NetlistMaker::GetOwner(const AttributeHolder& holder) const noexcept {
+    if (&holder == &netlist_) {
+        return {};
+    }
+    if (&holder == instance_.get()) {
+        return {Owner::Instance, nullptr, instanceName_};
+    }
+    return {Owner::Signal, static_cast<const Signal*>(&holder), {}};
+}
 
 /// The name without the backslashes that are part of it; valid until the next call.
 const std::string& NetlistMaker::Plain(const std::string& name) const {
@@ -108,6 +120,10 @@ bool NetlistMaker::MayBeEscaped(std::string_view name) const noexcept {
 }
 
 void NetlistMaker::SetName(const std::string& name) {
+    if (sink_ != nullptr) {
+        sink_->TakeModule(name, place_);
+        return;
+    }
     const std::string& plain = Plain(name);
     const bool isEscaped = MayBeEscaped(name);
     const bool isKept = names_ == ReaderNames::Literal || CanKeep(plain, false, isEscaped);
@@ -219,6 +235,9 @@ const std::string& NetlistMaker::MakeName(const std::string& name, bool isBus, b
 }
 
 Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional<Range>& range) {
+    if (sink_ != nullptr) {
+        return sink_->Declare(name, range, Polarity::Invalid, place_);
+    }
     const bool isTaken = IsTaken(Plain(name));
     if (IsDeclared(name, isTaken)) {
         return nullptr;
@@ -237,7 +256,27 @@ Signal* NetlistMaker::DeclareSignal(const std::string& name, const std::optional
     return signal;
 }
 
-Instance* NetlistMaker::AddInstance(const std::string& name, const Component& component) {
+Signal* NetlistMaker::DeclarePort(const PortHead& port) {
+    if (sink_ != nullptr) {
+        return sink_->Declare(port.name, port.range, port.direction, port.place);
+    }
+    Signal* const signal = DeclareSignal(port.name, port.range);
+    if (signal != nullptr) {
+        signal->SetPortPolarity(Polarity(port.direction));
+    }
+    return signal;
+}
+
+Instance* NetlistMaker::AddInstance(const std::string& name, const ModuleHead& head) {
+    const Component& component = *head.component;
+    if (sink_ != nullptr) {
+        if (instance_ == nullptr || instance_->GetComponent() != &component) {
+            instance_ = MakePacked<Instance>("", &component);
+        }
+        instanceName_ = name;
+        sink_->BeginInstance(name, head, place_);
+        return instance_.get();
+    }
     const bool isTaken = IsTaken(Plain(name));
     if (IsDeclared(name, isTaken)) {
         return nullptr;
@@ -264,6 +303,9 @@ bool NetlistMaker::CanBeFound(std::string_view plain, bool isBasic) const {
 }
 
 Signal* NetlistMaker::FindSignal(const std::string& name) const {
+    if (sink_ != nullptr) {
+        return sink_->FindSignal(name);
+    }
     if (const std::string* const renamed = FindRenamed(name)) {
         return FindByNewName(*renamed, true);
     }
@@ -278,6 +320,9 @@ Signal* NetlistMaker::FindSignal(const std::string& name) const {
 }
 
 Instance* NetlistMaker::FindInstance(const std::string& name) const {
+    if (sink_ != nullptr) {
+        return instance_ != nullptr && instanceName_ == name ? instance_.get() : nullptr;
+    }
     if (const std::string* const renamed = FindRenamed(name)) {
         return netlist_.GetInstance(std::string_view(*renamed));
     }
@@ -298,14 +343,19 @@ Range NetlistMaker::GetRange(const Bus& bus) {
     return range;
 }
 
+Signal* NetlistMaker::FindPart(const std::string& name) const {
+    Signal* const present = sink_ == nullptr ? nullptr : sink_->FindSignal(name);
+    return present != nullptr ? present : netlist_.GetSignal(std::string_view(name));
+}
+
 Signal* NetlistMaker::GetBit(Bus& bus, int index) {
     const std::string_view name = bus.GetNameView();
     text_ = name.substr(0, name.find('(') + 1);
     AppendNumber(text_, index);
     text_ += ')';
-    Signal* bit = netlist_.GetSignal(std::string_view(text_));
+    Signal* bit = FindPart(text_);
     if (bit == nullptr) {
-        bit = new BusIndex(text_.c_str(), &bus);
+        bit = new BusIndex(text_.c_str(), sink_ == nullptr ? &bus : nullptr);
         netlist_.Add(bit);
     }
     return bit;
@@ -318,9 +368,9 @@ Signal* NetlistMaker::GetSlice(Bus& bus, const Range& range) {
     const std::string_view name = bus.GetNameView();
     text_ = name.substr(0, name.find('('));
     AppendRange(text_, range);
-    Signal* slice = netlist_.GetSignal(std::string_view(text_));
+    Signal* slice = FindPart(text_);
     if (slice == nullptr) {
-        slice = new BusSlice(text_.c_str(), &bus);
+        slice = new BusSlice(text_.c_str(), sink_ == nullptr ? &bus : nullptr);
         netlist_.Add(slice);
     }
     return slice;
@@ -347,6 +397,10 @@ Signal* NetlistMaker::GetSignal(const std::vector<Piece>& pieces) {
     if (pieces.size() == 1 && pieces.front().signal != nullptr) {
         return pieces.front().signal;
     }
+    return GetConcatenation(GetMembers(pieces));
+}
+
+const Members& NetlistMaker::GetMembers(const std::vector<Piece>& pieces) {
     members_.clear();
     for (const Piece& piece : pieces) {
         if (piece.signal != nullptr) {
@@ -356,7 +410,7 @@ Signal* NetlistMaker::GetSignal(const std::vector<Piece>& pieces) {
             members_.push_back(GetConstantNet(bit == '1'));
         }
     }
-    return GetConcatenation(members_);
+    return members_;
 }
 
 Signal* NetlistMaker::GetConstantNet(bool value) {
@@ -409,6 +463,9 @@ std::string NetlistMaker::MakeComponent(ModuleHead& head) {
     if (head.isPrimitive) {
         return "it is a primitive, whose ports have no names";
     }
+    if (sink_ != nullptr) {
+        return MakeStandIn(head);
+    }
     const std::string plain = Plain(head.name);
     const bool canKeep = CanKeep(plain, false, MayBeEscaped(head.name));
     if (canKeep && netlist_.GetComponent(std::string_view(plain)) != nullptr) {
@@ -453,6 +510,14 @@ std::string NetlistMaker::MakePinName(const PortHead& port, const ModuleHead& he
         name = similar + "_" + std::to_string(suffix);
     }
     return similar;
+}
+
+/// Makes a component that stands for a module, when there is a sink.
+std::string NetlistMaker::MakeStandIn(ModuleHead& head) {
+    auto component = std::make_unique<Component>(head.name.c_str());
+    head.component = component.get();
+    netlist_.Add(component.release());
+    return "";
 }
 
 std::string NetlistMaker::MakePins(const ModuleHead& head, Component& component) {

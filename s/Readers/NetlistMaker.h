@@ -4,11 +4,13 @@
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Readers.h"
 #include "Readers/Heads.h"
+#include "Readers/NetlistSink.h"
 #include "Readers/Range.h"
 
 #include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -43,7 +45,10 @@ struct Piece {
 class NetlistMaker {
 public:
     /// \param netlist an empty one, not owned.
-    NetlistMaker(Netlist& netlist, ReaderNames names, const NameRules& rules);
+    /// \param sink not owned. When there is one, it gets what is read; the netlist only gets
+    ///        components without pins, and the parts of nets that the sink does not know.
+    NetlistMaker(Netlist& netlist, ReaderNames names, const NameRules& rules,
+                 NetlistSink* sink = nullptr);
     NetlistMaker(const NetlistMaker&) = delete;
     NetlistMaker& operator=(const NetlistMaker&) = delete;
 
@@ -51,14 +56,24 @@ public:
     static bool IsOpenWord(std::string_view name) noexcept;
 
     Netlist& GetNetlist() noexcept { return netlist_; }
+    /// Who gets what is read; null when the netlist does.
+    NetlistSink* GetSink() const noexcept { return sink_; }
+    /// Sets the place of what is made next, for the sink.
+    void SetPlace(const Place& place) noexcept { place_ = place; }
+    const Place& GetPlace() const noexcept { return place_; }
+    /// The owner that a holder is, for the sink.
+    Owner GetOwner(const AttributeHolder& holder) const noexcept;
     void SetName(const std::string& name);
     /// Makes a component with the ports of a module, unless there is one.
     /// \return an empty text, or why no component can be made.
     std::string MakeComponent(ModuleHead& head);
     /// Declares a signal or a bus. \return null when the name is declared already.
     Signal* DeclareSignal(const std::string& name, const std::optional<Range>& range);
-    /// Adds an instance. \return null when the name is declared already.
-    Instance* AddInstance(const std::string& name, const Component& component);
+    /// Declares a port. \return null when the name is declared already.
+    Signal* DeclarePort(const PortHead& port);
+    /// Adds an instance of a module that is a component. With a sink, it lives until the next one
+    /// is added. \return null when the name is declared already.
+    Instance* AddInstance(const std::string& name, const ModuleHead& head);
 
     /// The signal or bus of that name in the file; null when there is none.
     Signal* FindSignal(const std::string& name) const;
@@ -77,6 +92,8 @@ public:
     /// The signal that pieces are from left to right; what of it is constant comes from nets that
     /// carry the constants.
     Signal* GetSignal(const std::vector<Piece>& pieces);
+    /// The members of that signal, for a sink; valid until the next call.
+    const Members& GetMembers(const std::vector<Piece>& pieces);
     /// A net of one bit that carries a constant.
     Signal* GetConstantNet(bool value);
     /// Connects a pin to a signal of its own that carries a constant.
@@ -108,6 +125,8 @@ private:
         }
     };
 
+    Signal* FindPart(const std::string& name) const;
+    std::string MakeStandIn(ModuleHead& head);
     const std::string& Plain(const std::string& name) const;
     bool MayBeEscaped(std::string_view name) const noexcept;
     bool CanKeep(std::string_view name, bool isBus, bool isEscaped = true) const;
@@ -139,11 +158,18 @@ private:
     /// The signals that the file does not have.
     std::unordered_set<const Signal*> made_;
     Signal* constantNets_[2] = {nullptr, nullptr};
+    NetlistSink* const sink_;
+    Place place_;
+    /// \{
+    /// The present instance, when there is a sink, and its name in the file.
+    std::unique_ptr<Instance> instance_;
+    std::string instanceName_;
+    /// \}
     /// Room for names, kept so that most objects cost no allocation.
     std::string newName_;
     mutable std::string plain_;
     std::string text_;
-    std::vector<Signal*> members_;
+    Members members_;
 };
 
 } // namespace Orn_Hdl::Readers

@@ -8,6 +8,7 @@
 #include "Readers/Undeclared.h"
 #include "Readers/Verilog/HeadReader.h"
 #include "Readers/Verilog/ModuleReader.h"
+#include "Readers/Verilog/ReadVerilog.h"
 #include "Readers/Verilog/UndeclaredReader.h"
 
 #include <algorithm>
@@ -39,7 +40,8 @@ public:
     }
 
     /// \return the names that were replaced.
-    std::vector<VerilogReader::Renaming> FillNetlist(Netlist& netlist);
+    std::vector<VerilogReader::Renaming> FillNetlist(Netlist& netlist,
+                                                     Readers::NetlistSink* sink = nullptr);
     const std::vector<std::string>& GetKeptIncludes() const noexcept { return keptIncludes_; }
     const std::string& GetFileName() const noexcept { return fileName_; }
 
@@ -94,7 +96,8 @@ void Reading::AddUndeclared(const Readers::ModuleHead& top) {
     }
 }
 
-std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
+std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist,
+                                                          Readers::NetlistSink* sink) {
     const Readers::ModuleHead& top = Readers::FindTop(heads_, setup_.top, "module", files_);
     const Readers::ModuleHead* const unfinished = heads_.GetUnfinished();
     if (unfinished != nullptr && unfinished != &top) {
@@ -104,7 +107,7 @@ std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
         AddUndeclared(top);
     }
     Readers::NetlistMaker maker(netlist, setup_.names,
-                                {false, true, Readers::IsVerilogKeyword, setup_.keepsName});
+                                {false, true, Readers::IsVerilogKeyword, setup_.keepsName}, sink);
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
@@ -113,6 +116,14 @@ std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist) {
 }
 
 } // namespace
+
+std::vector<std::string> Readers::ReadVerilog(const char* fileName, const VerilogSetup& setup,
+                                              const Heads& components, NetlistSink& sink) {
+    Reading reading(fileName, setup, components);
+    Netlist parts;
+    reading.FillNetlist(parts, &sink);
+    return reading.GetKeptIncludes();
+}
 
 VerilogReader::VerilogReader() : implementation_(std::make_unique<Implementation>()) {}
 

@@ -6,6 +6,7 @@
 #include "Readers/Top.h"
 #include "Readers/Vhdl/ArchitectureReader.h"
 #include "Readers/Vhdl/HeadReader.h"
+#include "Readers/Vhdl/ReadVhdl.h"
 #include "Readers/Vhdl/Types.h"
 #include "Readers/Vhdl/WriterOptions.h"
 
@@ -33,8 +34,10 @@ using Readers::Quoted;
 /// One reading of one file.
 class Reading {
 public:
-    Reading(const char* fileName, const Readers::VhdlSetup& setup, const Readers::Heads& components)
-        : fileName_(ViewOf(fileName)), setup_(setup) {
+    /// \param sink gets what is read; null when a netlist does.
+    Reading(const char* fileName, const Readers::VhdlSetup& setup, const Readers::Heads& components,
+            Readers::NetlistSink* sink = nullptr)
+        : fileName_(ViewOf(fileName)), setup_(setup), sink_(sink) {
         files_.Add(fileName_);
         ReadHeads(fileName_, false);
         for (const std::string& library : setup_.libraries) {
@@ -46,12 +49,15 @@ public:
     /// \return the names that were replaced.
     std::vector<ReaderRenaming> FillNetlist(Netlist& netlist, HdlOptions::VhdlOption& options);
     const std::string& GetFileName() const noexcept { return fileName_; }
+    /// What a sink is not told.
+    Readers::VhdlFrame& GetFrame() noexcept { return frame_; }
 
 private:
     void ReadHeads(const std::string& fileName, bool isLibrary);
     void AddComponents(const Readers::Heads& components);
     const Vhdl::Architecture& FindArchitecture(const ModuleHead& entity,
                                                const std::string& name) const;
+    void SetClauses(const ModuleHead& entity, const Vhdl::Architecture& architecture);
     const Vhdl::Configuration* FindOwnConfiguration(const ModuleHead& entity) const;
     void MarkPrimitives(const ModuleHead& entity, const Netlist& netlist) const;
     void SetOptions(const ModuleHead& entity, const Vhdl::Architecture& architecture,
@@ -59,14 +65,16 @@ private:
 
     std::string fileName_;
     const Readers::VhdlSetup& setup_;
+    Readers::NetlistSink* const sink_;
     Readers::Files files_;
     Vhdl::Design design_;
+    Readers::VhdlFrame frame_;
 };
 
 void Reading::ReadHeads(const std::string& fileName, bool isLibrary) {
     Vhdl::Scanner scanner(files_);
     scanner.Open(fileName);
-    Vhdl::HeadReader(scanner, design_, isLibrary).Read();
+    Vhdl::HeadReader(scanner, design_, isLibrary, isLibrary ? nullptr : sink_).Read();
 }
 
 void Reading::AddComponents(const Readers::Heads& components) {
@@ -111,14 +119,35 @@ std::vector<ReaderRenaming> Reading::FillNetlist(Netlist& netlist,
     const ModuleHead& entity = Readers::FindTop(design_.entities, top, "entity", files_);
     const Vhdl::Architecture& architecture = FindArchitecture(entity, architectureName);
     Readers::NetlistMaker maker(netlist, setup_.names,
-                                {true, false, Vhdl::IsReserved, setup_.keepsName});
+                                {true, false, Vhdl::IsReserved, setup_.keepsName}, sink_);
     Vhdl::Scanner scanner(files_);
     scanner.Open(fileName_);
     Vhdl::ArchitectureReader reader(scanner, design_, entity, architecture, maker, setup_);
     reader.Read();
+    if (sink_ != nullptr) {
+        SetClauses(entity, architecture);
+        return {};
+    }
     MarkPrimitives(entity, netlist);
     SetOptions(entity, architecture, reader, options);
     return std::move(maker.GetRenamings());
+}
+
+void Reading::SetClauses(const ModuleHead& entity, const Vhdl::Architecture& architecture) {
+    const Vhdl::Clauses& ofEntity = design_.clausesOfEntities.at(&entity);
+    const Vhdl::Clauses& ofArchitecture = architecture.clauses;
+    frame_.libraries = ofEntity.libraries;
+    frame_.uses = ofEntity.uses;
+    frame_.architecture = architecture.name;
+    frame_.libraries.insert(frame_.libraries.end(), ofArchitecture.libraries.begin(),
+                            ofArchitecture.libraries.end());
+    frame_.uses.insert(frame_.uses.end(), ofArchitecture.uses.begin(), ofArchitecture.uses.end());
+    for (const Vhdl::Configuration& configuration : design_.configurations) {
+        frame_.configurations.push_back(configuration.name);
+        frame_.configured = configuration.architecture;
+        frame_.configuredEntity = configuration.entity;
+        frame_.isConfigurationHidden = configuration.isHidden;
+    }
 }
 
 /// The configuration that a model has; null if the file has none.
@@ -199,6 +228,18 @@ void AddGenerics(const Netlist& netlist, Readers::Heads& heads) {
 }
 
 } // namespace
+
+Readers::VhdlFrame Readers::ReadVhdl(const char* fileName, const VhdlSetup& setup,
+                                     const Netlist& library, NetlistSink& sink) {
+    Heads components{true};
+    components.Add(library);
+    AddGenerics(library, components);
+    Reading reading(fileName, setup, components, &sink);
+    Netlist parts;
+    HdlOptions::VhdlOption options;
+    reading.FillNetlist(parts, options);
+    return std::move(reading.GetFrame());
+}
 
 VhdlReader::VhdlReader() : implementation_(std::make_unique<Implementation>()) {}
 

@@ -145,6 +145,16 @@ std::uint64_t TextFileOutStream::GetLeftoverSize() const noexcept {
     return file_.GetLeftoverSize();
 }
 
+Port::StringBase<char> TextFileOutStream::FlushToRead() {
+    file_.Flush();
+    return file_.GetTemporaryName();
+}
+
+int TextFileOutStream::WriteFile(const char* fileName) {
+    file_.Flush();
+    return file_.CopyFile(fileName);
+}
+
 TextMemOutStream::TextMemOutStream(const char* initial) : TextMemOutStream(Port::ViewOf(initial)) {}
 
 TextMemOutStream::TextMemOutStream(std::string_view initial)

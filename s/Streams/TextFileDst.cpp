@@ -101,6 +101,18 @@ void TextFileDst::Send(std::string_view text) {
     isGood_ = isGood_ && (text.empty() || file_.write(text.data(), text.size()));
 }
 
+int TextFileDst::CopyFile(const char* fileName) {
+    Port::File from;
+    if (!from.open(fileName, Port::File::Read, true)) {
+        return from.GetError();
+    }
+    const std::unique_ptr<char[]> piece(new char[LargeBuffer]);
+    while (const std::size_t count = from.read(piece.get(), LargeBuffer)) {
+        Send(std::string_view(piece.get(), count));
+    }
+    return from.GetError();
+}
+
 /// Writes the complete lines and moves the current line to the front of the buffer.
 void TextFileDst::SendLines() {
     Send(std::string_view(buffer_.get(), lineStart_));

@@ -8,6 +8,7 @@
 #include <cstdint>
 #include <cstring>
 #include <memory>
+#include <string>
 #include <string_view>
 
 namespace Orn_Hdl {
@@ -31,6 +32,10 @@ public:
     const Port::StringBase<char>& GetFileName() const noexcept { return fileName_; }
     int GetError() const noexcept { return file_.GetError(); }
     std::uint64_t GetLeftoverSize() const noexcept { return file_.GetLeftoverSize(); }
+    /// The name under which the file can be read that is to replace another; empty if none is.
+    std::string GetTemporaryName() const { return file_.GetTemporaryName(); }
+    /// Writes the bytes of a file. \return 0, or the error number if it cannot be read.
+    int CopyFile(const char* fileName);
 
     void Flush() override;
     void Write(const char* text) override;

@@ -85,6 +85,9 @@ The command line is wrong.
 .TP
 .B 3
 A file could not be read or written.
+.TP
+.B 4
+A netlist does not mean what its design does; \\-\\-verify found that, and the file was not written.
 .SH ENVIRONMENT
 .TP
 .B SOURCE_DATE_EPOCH

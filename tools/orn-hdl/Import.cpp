@@ -2,10 +2,13 @@
 
 #include "JsonImport.h"
 #include "NetlistImport.h"
+#include "Progress.h"
 #include "explain/FileKind.h"
 #include "explain/Syntax.h"
+#include "proof/Differences.h"
 
 #include "Orn_Hdl/LegalNetlist.h"
+#include "Orn_Hdl/Model.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
@@ -100,6 +103,17 @@ bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file
         reporter.Report(std::move(diagnostic));
     }
     return !legal.GetErrors().empty();
+}
+
+Status WriteNetlists(Orn_Hdl::Model& model, const ImportOptions& options,
+                     Orn_Hdl::LegalNetlist* legal, Reporter& reporter) {
+    Progress progress(false, options.file);
+    model.GetOptions()->verify = options.verify;
+    return WriteOutputs(model, options.outputs, progress, legal,
+                        [&reporter](const std::vector<Orn_Hdl::Proof::Difference>& differences,
+                                    const std::string& file) {
+                            return ReportDifferences(differences, file, reporter);
+                        });
 }
 
 Status ImportDesign(const ImportOptions& options) {

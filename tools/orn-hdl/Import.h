@@ -13,7 +13,8 @@
 
 namespace Orn_Hdl {
 class LegalNetlist;
-}
+class Model;
+} // namespace Orn_Hdl
 
 namespace Tool {
 
@@ -51,6 +52,8 @@ struct ImportOptions {
     std::string nameMap;
     /// Write legal netlists, or nothing.
     bool legal = false;
+    /// Read each netlist back and compare it with the design before it replaces its file.
+    bool verify = false;
     ReportOptions report;
 };
 
@@ -63,6 +66,10 @@ Import::NameLanguages GetNameLanguages(const ImportOptions& options);
 /// Reports what keeps a netlist from being legal. \return whether anything does.
 bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file,
                      Reporter& reporter);
+/// Writes the netlists of a model, each compared with the design first if the options ask for it.
+/// \param legal writes the netlists legally; null for none.
+Status WriteNetlists(Orn_Hdl::Model& model, const ImportOptions& options,
+                     Orn_Hdl::LegalNetlist* legal, Reporter& reporter);
 /// What a file that is no JSON is, by its beginning; empty if that is not known, or if it may be
 /// JSON.
 std::string DescribeOtherFile(const std::string& beginning);

@@ -1,7 +1,7 @@
 #include "JsonImport.h"
 
 #include "CellFiles.h"
-#include "Progress.h"
+#include "explain/FileKind.h"
 #include "import/CellLibrary.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
@@ -33,7 +33,7 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
-Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& options,
+Status WriteImported(const ImportedNetlist& netlist, const ImportOptions& options,
                      Reporter& reporter) {
     if (options.outputs.IsEmpty()) {
         return Status::Success;
@@ -43,14 +43,13 @@ Status WriteNetlists(const ImportedNetlist& netlist, const ImportOptions& option
     Orn_Hdl::Model& model = *engine.GetModel(netlist.name.c_str());
     ModelSink sink(model);
     EmitNetlist(netlist, sink);
-    Progress progress(false, options.file);
     if (!options.legal) {
-        return WriteOutputs(model, options.outputs, progress);
+        return WriteNetlists(model, options, nullptr, reporter);
     }
     Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
     return TellWhyNotLegal(legal, options.file, reporter)
                ? Status::Failed
-               : WriteOutputs(model, options.outputs, progress, &legal);
+               : WriteNetlists(model, options, &legal, reporter);
 }
 
 /// Writes all files. The command file and the name map are replaced last, and only if every file
@@ -67,7 +66,7 @@ Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options, Re
     }
     Status status = Worse(commands.Flush(), nameMap.Flush());
     if (status == Status::Success) {
-        status = WriteNetlists(netlist, options, reporter);
+        status = WriteImported(netlist, options, reporter);
     }
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }

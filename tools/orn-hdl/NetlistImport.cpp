@@ -4,8 +4,8 @@
 #include "CommandsOutput.h"
 #include "NetlistNames.h"
 #include "Output.h"
-#include "Progress.h"
 #include "diagnostics/SourceLines.h"
+#include "explain/FileKind.h"
 #include "import/CellComponents.h"
 
 #include "Orn_Hdl/LegalNetlist.h"
@@ -285,8 +285,7 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
     }
     Status status = Worse(commands.Write(*model_), nameMap.Flush());
     if (status == Status::Success) {
-        Progress progress(false, options_.file);
-        status = WriteOutputs(*model_, options_.outputs, progress, legal ? &*legal : nullptr);
+        status = WriteNetlists(*model_, options_, legal ? &*legal : nullptr, reporter_);
     }
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }

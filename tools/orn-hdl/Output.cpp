@@ -30,6 +30,12 @@ void WriteNetlist(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::
     }
 }
 
+Orn_Hdl::Proof::Written GetWritten(Orn_Hdl::Model& model, const Orn_Hdl::LegalNetlist* legal) {
+    return legal != nullptr
+               ? Orn_Hdl::Proof::Written{legal->GetWrittenNetlist(), legal->GetWrittenOptions()}
+               : Orn_Hdl::Proof::Written{*model.GetNetlist(), *model.GetOptions()};
+}
+
 /// Copies a file from its start to standard output.
 Status PrintFile(std::FILE* file) {
     std::rewind(file);
@@ -59,6 +65,11 @@ Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl:
         WriteNetlist(model, legal, language, out);
         out.Close();
     }
+    if (model.GetOptions()->verify && out.GetError() == 0) {
+        const Orn_Hdl::Proof::Written written = GetWritten(model, legal);
+        Orn_Hdl::Proof::Require(name.c_str(), "standard output", language, written.netlist,
+                                written.options);
+    }
     progress.Erase();
     return out.GetError() == 0 ? PrintFile(file.get())
                                : ComplainUnwritable("a temporary file", out.GetError());
@@ -71,7 +82,14 @@ Status WriteLegally(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist& legal, Orn_Hdl
     model.GetOptions()->writeHeader = !noHeader;
     legal.Prepare(language);
     Orn_Hdl::TextFileOutStream out(file.c_str(), Orn_Hdl::TextFileOutStream::Replace);
-    legal.Write(language, out);
+    if (model.GetOptions()->verify) {
+        Orn_Hdl::Proof::Write(
+            out, file.c_str(), language,
+            [&](Orn_Hdl::OutStream& stream) { legal.Write(language, stream); },
+            [&] { return GetWritten(model, &legal); });
+    } else {
+        legal.Write(language, out);
+    }
     out.Close();
     progress.Erase();
     return out.GetError() == 0 ? Status::Success : ComplainUnwritable(file, out.GetError());
@@ -132,11 +150,17 @@ Status OutputFile::Commit() {
 }
 
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,
-                    Orn_Hdl::LegalNetlist* legal) {
+                    Orn_Hdl::LegalNetlist* legal, const TellDifferences& tell) {
     Status status = Status::Success;
     for (const auto& [language, file] : outputs.files) {
-        status =
-            Worse(status, WriteOutput(model, legal, language, file, outputs.noHeader, progress));
+        try {
+            status = Worse(status,
+                           WriteOutput(model, legal, language, file, outputs.noHeader, progress));
+        } catch (const Orn_Hdl::ProofException& exception) {
+            progress.Erase();
+            status = Worse(
+                status, tell(exception.GetDifferences(), file == "-" ? "standard output" : file));
+        }
     }
     return status;
 }

@@ -2,12 +2,15 @@
 #pragma once
 
 #include "Orn_Hdl/Language.h"
+#include "Orn_Hdl/Proof.h"
 #include "Port/File.h"
 #include "Tool.h"
 
+#include <functional>
 #include <map>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace Orn_Hdl {
 class LegalNetlist;
@@ -51,11 +54,16 @@ private:
     Status status_ = Status::Success;
 };
 
+/// Reports that a netlist does not mean what its design does. \return the exit status.
+using TellDifferences = std::function<Status(
+    const std::vector<Orn_Hdl::Proof::Difference>& differences, const std::string& netlist)>;
+
 /// Writes the netlists in the order of their languages, and prints a message for each that could
 /// not be written.
 /// \param legal the legal netlist of the model, without errors; null to write the design as it
 ///        stands.
+/// \param tell reports what the proof finds that the model's options ask for.
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,
-                    Orn_Hdl::LegalNetlist* legal = nullptr);
+                    Orn_Hdl::LegalNetlist* legal, const TellDifferences& tell);
 
 } // namespace Tool

@@ -3,13 +3,17 @@
 #include "CommandsOutput.h"
 #include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
+#include "Port/Ascii.h"
 #include "Port/File.h"
 #include "Progress.h"
 #include "check/Checker.h"
 #include "check/WriteGate.h"
 #include "explain/FailureExplainer.h"
+#include "proof/Certificate.h"
+#include "proof/Differences.h"
 #include "warnings/SlipFinder.h"
 
+#include <algorithm>
 #include <cstdint>
 #include <string_view>
 #include <system_error>
@@ -29,9 +33,9 @@ constexpr const char* NamelessModel = "HDL_NETLIST";
 class Replayer {
 public:
     Replayer(Orn_Hdl::Model& model, CommandFile& file, Checking::WriteGate* gate,
-             const WarningOptions* warnings)
-        : model_(model), file_(file), gate_(gate), explainer_(model, file.lines),
-          asErrors_(warnings != nullptr && warnings->areErrors) {
+             const WarningOptions* warnings, Certificate* certificate)
+        : model_(model), file_(file), gate_(gate), certificate_(certificate),
+          explainer_(model, file.lines), asErrors_(warnings != nullptr && warnings->areErrors) {
         if (warnings != nullptr && !warnings->dropped.all()) {
             slips_.emplace(model, *warnings, [this](const FoundSlip& found) { Report(found); });
         }
@@ -51,6 +55,11 @@ public:
         }
         try {
             model_.Execute(words);
+        } catch (const Orn_Hdl::ProofException& exception) {
+            const std::string netlist(words.GetView(words.GetSize() - 1));
+            status_ = Worse(status_, ReportDifferences(exception.GetDifferences(), netlist, lines_,
+                                                       file_.lines, file_.reporter));
+            return false;
         } catch (const Orn_Hdl::Exception& exception) {
             if (!TellWhyNotLegal(words)) {
                 Report(words, exception.getLocalized().GetView());
@@ -65,7 +74,10 @@ public:
             words_ = &words;
             slips_->Look(words);
         }
-        return model_.GetWriteError() == 0 || ReportWriteError(words);
+        if (model_.GetWriteError() != 0) {
+            return ReportWriteError(words);
+        }
+        return certificate_ == nullptr || !Checking::Checker::IsWrite(words) || Certify(words);
     }
 
     Status GetStatus() const noexcept { return status_; }
@@ -82,6 +94,15 @@ private:
         const Orn_Hdl::LegalNetlist legal(*model_.GetNetlist(), *model_.GetOptions());
         return Checking::WriteGate(model_, file_.lines, file_.reporter)
             .Tell(legal.GetErrors(), lines_);
+    }
+
+    bool Certify(const Orn_Hdl::StringArray& words) {
+        const bool isVerilog = Port::EqualIgnoringCase(words.GetView(1), "VERILOG");
+        const Status status = certificate_->AddNetlist(
+            std::string(model_.GetWrittenFileName().GetView()),
+            isVerilog ? Orn_Hdl::Language::Verilog : Orn_Hdl::Language::Vhdl, *model_.GetNetlist());
+        status_ = Worse(status_, status);
+        return status == Status::Success;
     }
 
     void Report(const Orn_Hdl::StringArray& words, std::string_view text) {
@@ -120,6 +141,7 @@ private:
     Orn_Hdl::Model& model_;
     CommandFile& file_;
     Checking::WriteGate* const gate_;
+    Certificate* const certificate_;
     FailureExplainer explainer_;
     const bool asErrors_;
     /// Without a value if no slips are reported.
@@ -149,7 +171,8 @@ CommandFile::CommandFile(const std::string& fileName, const ReportOptions& repor
       reporter(report, [&shownProgress] { shownProgress.Erase(); }) {}
 
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const WriteRules& rules,
-                Checking::WriteGate* gate, const WarningOptions* warnings) {
+                Checking::WriteGate* gate, const WarningOptions* warnings,
+                Certificate* certificate) {
     Orn_Hdl::CommandReader input(model);
     if (!input.Open(SystemFileName(file.name.c_str()))) {
         return {ComplainUnreadable(file.name, input.GetError()), false, 0};
@@ -160,7 +183,7 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
     } catch (const std::system_error& error) {
         return {ComplainUnwritable(rules.folder.value_or(""), error.code().value()), false, 0};
     }
-    Replayer replayer(model, file, gate, warnings);
+    Replayer replayer(model, file, gate, warnings, certificate);
     while (const Orn_Hdl::StringArray* words = input.Next()) {
         if (!replayer.Execute(*words, input.GetPosition()) &&
             (!keepGoing || file.reporter.IsAtLimit())) {
@@ -175,6 +198,14 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
 }
 
 namespace {
+
+/// Reports differences at the lines of a command file, or at its last one.
+TellDifferences TellOf(CommandFile& file, std::uint64_t lines) {
+    return [&file, lines](const std::vector<Orn_Hdl::Proof::Difference>& differences,
+                          const std::string& netlist) {
+        return ReportDifferences(differences, netlist, lines, file.lines, file.reporter);
+    };
+}
 
 /// Writes the outputs and the table of names, or tells why there is no legal netlist.
 Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOptions& options,
@@ -192,7 +223,7 @@ Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOpti
     }
     Status status = nameMap.Flush();
     if (status == Status::Success) {
-        status = WriteOutputs(model, outputs, file.progress, &legal);
+        status = WriteOutputs(model, outputs, file.progress, &legal, TellOf(file, lines));
     }
     return status == Status::Success ? nameMap.Commit() : status;
 }
@@ -208,11 +239,25 @@ Status WriteCommands(Orn_Hdl::Model& model, const std::string& file, CommandsOut
     return status;
 }
 
+/// Writes the certificate of the netlists of lines and of the command line.
+Status Certify(Orn_Hdl::Model& model, const Outputs& outputs, CommandFile& file,
+               Certificate& certificate) {
+    Status status = certificate.AddCommands(file.name, file.lines.GetSystemName());
+    for (const auto& [language, name] : outputs.files) {
+        if (!name.empty()) {
+            status = Worse(status, certificate.AddNetlist(name, language, *model.GetNetlist()));
+        }
+    }
+    return status == Status::Success ? certificate.Write() : status;
+}
+
 /// Replays the file of the options and writes its netlists.
 Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions& options) {
     Checking::WriteGate gate(model, file.lines, file.reporter);
-    const Replayed replayed = Replay(model, file, options.keepGoing, options.writeRules,
-                                     options.check ? &gate : nullptr, &options.warnings);
+    Certificate certificate(options.certificate);
+    const Replayed replayed =
+        Replay(model, file, options.keepGoing, options.writeRules, options.check ? &gate : nullptr,
+               &options.warnings, options.certificate.empty() ? nullptr : &certificate);
     if (!replayed.complete) {
         return replayed.status;
     }
@@ -233,16 +278,29 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
             status = Worse(status, Status::Failed);
         }
     }
-    const Status written = options.legal
-                               ? WriteLegally(model, outputs, options, replayed.lines, file)
-                               : WriteOutputs(model, outputs, file.progress);
+    const Status written =
+        options.legal
+            ? WriteLegally(model, outputs, options, replayed.lines, file)
+            : WriteOutputs(model, outputs, file.progress, nullptr, TellOf(file, replayed.lines));
     status = Worse(status, written);
-    return written == Status::Success ? Worse(status, commands.Commit()) : status;
+    if (written == Status::Success) {
+        status = Worse(status, commands.Commit());
+    }
+    return status == Status::Success && !options.certificate.empty()
+               ? Certify(model, outputs, file, certificate)
+               : status;
 }
 
 } // namespace
 
 Status Run(const RunOptions& options) {
+    const auto isOut = [](const auto& output) { return output.second == "-"; };
+    if (!options.certificate.empty() &&
+        (options.file == "-" ||
+         std::any_of(options.outputs.files.begin(), options.outputs.files.end(), isOut))) {
+        Complain("a certificate is of files: name the command file and the netlists");
+        return Status::Usage;
+    }
     Progress progress(options.quiet, options.file);
     CommandFile file(options.file, options.report, progress);
     // The design is not destroyed before the process ends: freeing it object by object would take a
@@ -255,6 +313,7 @@ Status Run(const RunOptions& options) {
     Orn_Hdl::Model& model = *engine->GetModel(name.c_str());
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";
+    model.GetOptions()->verify = options.verify;
     const Status status = ReplayAndWrite(model, file, options);
     file.reporter.Finish(GetWarningRules());
     return status;

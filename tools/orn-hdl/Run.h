@@ -18,6 +18,7 @@ class Model;
 
 namespace Tool {
 
+class Certificate;
 class Progress;
 
 namespace Checking {
@@ -41,6 +42,10 @@ struct RunOptions {
     /// The file for the commands of the design in which the replay ends; "-" is standard output,
     /// and an empty name is none.
     std::string commandFile;
+    /// Read each netlist back and compare it with the design before it replaces its file.
+    bool verify = false;
+    /// The file for the certificate of the netlists; empty for none.
+    std::string certificate;
     /// How a legal netlist changes names: "rename" or "escape".
     std::string names = "rename";
     /// The file for the table of old and new names; empty for none.
@@ -81,8 +86,9 @@ struct CommandFile {
 /// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.
 /// \param gate decides which lines may write; null when all may.
 /// \param warnings the slips that are reported; null for none.
+/// \param certificate gets the netlists that lines have written; null for none.
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing,
                 const WriteRules& rules = {}, Checking::WriteGate* gate = nullptr,
-                const WarningOptions* warnings = nullptr);
+                const WarningOptions* warnings = nullptr, Certificate* certificate = nullptr);
 
 } // namespace Tool

@@ -12,7 +12,9 @@ enum class Status {
     Failed = 1,
     Usage = 2,
     /// A file could not be read or written.
-    File = 3
+    File = 3,
+    /// A netlist does not mean what its design does.
+    Unproven = 4
 };
 
 inline Status Worse(Status a, Status b) noexcept {

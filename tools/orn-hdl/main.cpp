@@ -9,6 +9,7 @@
 #include "diagnostics/Nearest.h"
 #include "diff/Diff.h"
 #include "explain/Syntax.h"
+#include "proof/Verify.h"
 #include "stats/Stats.h"
 #include "warnings/WarningsPage.h"
 
@@ -201,6 +202,7 @@ public:
         AddImport();
         AddCheck();
         AddDiff();
+        AddVerify();
         AddDraw();
         AddStats();
         AddCommands();
@@ -335,6 +337,11 @@ private:
         CLI::Option* legal =
             command.add_flag("--legal", run_.legal, "Write netlists that every tool takes")
                 ->excludes(check);
+        CLI::Option* verify = command.add_flag(
+            "--verify", run_.verify, "Read each netlist back and compare it with the design");
+        AddFile(command, "--certificate", run_.certificate,
+                "Write what was proven, with the SHA-256 of the files, as JSON")
+            ->needs(verify);
         command.add_option("--names", run_.names, "How --legal mends names")
             ->check(CLI::IsMember({"rename", "escape"}))
             ->type_name("rename|escape")
@@ -383,6 +390,8 @@ private:
                          "Import the attributes of cells and nets");
         command.add_flag("--comments", import_.comments, "Import the comments of objects");
         command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
+        command.add_flag("--verify", import_.verify,
+                         "Read each netlist back and compare it with the design");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
@@ -452,6 +461,35 @@ private:
                        "trouble.");
     }
 
+    void AddVerify() {
+        CLI::App& command =
+            AddCommand("verify", "Compare a netlist with the design of a command file",
+                       [this] { return Tool::Verify(verify_); });
+        command.add_option("NETLIST", verify_.netlist, "The netlist")
+            ->type_name("")
+            ->check(CheckFileName)
+            ->required();
+        AddFile(command, "--commands", verify_.commands, "The command file; - is standard input")
+            ->required();
+        command.add_option("--model", verify_.model, "The name of the design")->type_name("NAME");
+        command
+            .add_option("--language", verify_.language,
+                        "The language of the netlist, if its extension does not tell")
+            ->check(CLI::IsMember({"verilog", "vhdl"}))
+            ->type_name("verilog|vhdl");
+        CLI::Option* legal = command.add_flag("--legal", verify_.legal,
+                                              "Compare with the design as run --legal writes it");
+        command.add_option("--names", verify_.names, "How --legal mends names")
+            ->check(CLI::IsMember({"rename", "escape"}))
+            ->type_name("rename|escape")
+            ->needs(legal);
+        AddFile(command, "--certificate", verify_.certificate,
+                "Write what was proven, with the SHA-256 of the files, as JSON");
+        AddReport(command, verify_.report);
+        command.add_flag("--quiet", verify_.quiet, "Do not show progress");
+        command.footer("WRITE commands in the file do nothing.");
+    }
+
     void AddDraw() {
         CLI::App& command = AddCommand("draw", "Draw the design of a command file",
                                        [this] { return Tool::Draw(draw_); });
@@ -513,6 +551,7 @@ private:
     Tool::CheckOptions check_;
     Tool::DiffOptions diff_;
     Tool::StatsOptions stats_;
+    Tool::VerifyOptions verify_;
     std::vector<std::string> words_;
     bool markdown_ = false;
 };

@@ -126,6 +126,10 @@ void AttributeReader::GiveNotes() {
 
 void AttributeReader::Set(const Target& target, const std::string& name, const Value& value,
                           const Place& place) {
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        sink->TakeAttribute(maker_.GetOwner(*target.holder), name, value, true, place);
+        return;
+    }
     const std::string problem = SetAttribute(*target.holder, name, value, nullptr, Assigned);
     if (!problem.empty()) {
         parser_.Fail(place, "the attribute " + Quoted(name) + ": " + problem);
@@ -151,7 +155,8 @@ bool AttributeReader::TakeDialect(const Comment& comment) {
     if (!IsDialect(comment.text)) {
         return false;
     }
-    if (TakeSwitch(comment.text, isHidden_)) {
+    // A sink gets what the library has written: the words of other dialects are a user's comment.
+    if (TakeSwitch(comment.text, isHidden_, maker_.GetSink() == nullptr)) {
         return true;
     }
     const std::vector<std::string_view> words = FirstWords(comment.text);

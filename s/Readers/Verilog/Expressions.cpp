@@ -96,6 +96,7 @@ void ExpressionReader::ReadNet() {
             parser_.IsSign('[')) {
             parser_.Fail(place, "the net " + Quoted(name_) + " is not declared");
         }
+        maker_.SetPlace(place);
         signal = maker_.DeclareSignal(name_, std::nullopt);
     }
     if (!parser_.IsSign('[')) {
@@ -372,6 +373,29 @@ void ExpressionReader::AddBits(const std::string& bits, const Place& place) {
     }
     expression_->pieces.emplace_back();
     expression_->pieces.back().bits = bits;
+}
+
+std::string ExpressionReader::GetBits(const Expression& expression, std::uint64_t width) {
+    if (width > MostBits) {
+        parser_.Fail(expression.place,
+                     "a constant of more than " + std::to_string(MostBits) + " bits");
+    }
+    const auto count = static_cast<std::uint32_t>(width);
+    if (expression.number) {
+        try {
+            return expression.number->GetBits(count);
+        } catch (const LiteralProblem& problem) {
+            parser_.Fail(expression.place, problem.text);
+        }
+    }
+    std::string bits;
+    for (const Piece& piece : expression.pieces) {
+        bits += piece.bits;
+    }
+    if (bits.size() > count) {
+        return bits.substr(bits.size() - count);
+    }
+    return bits.insert(0, count - bits.size(), '0');
 }
 
 std::string ExpressionReader::MakeConstant(const Expression& expression, std::uint64_t width,

@@ -51,6 +51,8 @@ public:
     /// Reads "[left:right]" if it is there.
     std::optional<Range> ReadRange();
 
+    /// The bits of a constant expression in so many bits, leftmost first.
+    std::string GetBits(const Expression& expression, std::uint64_t width);
     /// The constant of a model that a constant expression is in so many bits.
     std::string MakeConstant(const Expression& expression, std::uint64_t width, bool isBare);
 

@@ -134,6 +134,7 @@ void HeadReader::ReadPortName() {
     }
     PortHead port;
     port.name = name_;
+    port.place = place;
     if (!head_->ports.empty() && Polarity::IsValidValue(head_->ports.back().direction)) {
         // One more name of a declaration.
         const PortHead& last = head_->ports.back();
@@ -214,6 +215,7 @@ void HeadReader::ReadPortDeclaration(bool isInHead) {
         if (port != nullptr) {
             const std::string problem = port->problem;
             port->direction = model.direction;
+            port->place = place;
             port->range = model.range;
             port->parameters = model.parameters;
             port->problem = problem.empty() ? model.problem : problem;

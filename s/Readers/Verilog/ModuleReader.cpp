@@ -27,6 +27,7 @@ void ModuleReader::Read() {
     SkipToModule();
     attributes_.GiveNotes();
     scanner_.SetInModule(true);
+    maker_.SetPlace(head_.place);
     maker_.SetName(head_.name);
     MakeComponents();
     DeclarePorts();
@@ -92,11 +93,9 @@ void ModuleReader::DeclarePorts() {
                                               ", which a model cannot say: make it a localparam");
             }
         }
-        Signal* const signal = maker_.DeclareSignal(port.name, port.range);
-        if (signal == nullptr) {
+        if (maker_.DeclarePort(port) == nullptr) {
             parser_.Fail(head_.place, what + " is declared already");
         }
-        signal->SetPortPolarity(Polarity(port.direction));
     }
 }
 
@@ -171,9 +170,16 @@ void ModuleReader::ReadBody() {
         attributes_.BeginStatement();
         attributes_.ReadAttributes();
         attributes_.TakeCommentsBefore();
-        if (parser_.GetKeyword() == Keyword::Endmodule) {
+        const Keyword keyword = parser_.GetKeyword();
+        // A sink is not told of this, which is so in no written netlist.
+        if (maker_.GetSink() != nullptr && attributes_.IsHidden() &&
+            keyword != Keyword::Parameter && keyword != Keyword::Defparam) {
+            parser_.Fail("this is hidden from synthesis");
+        }
+        if (keyword == Keyword::Endmodule) {
             return;
         }
+        maker_.SetPlace(parser_.Get().place);
         ReadStatement();
     }
 }
@@ -310,17 +316,17 @@ void ModuleReader::ReadOneNet(NetKind kind, const std::optional<Range>& range) {
     }
     Signal* const signal = DeclareNet(range, place);
     attributes_.GiveTo({signal, signal});
+    target_.Clear(place);
+    Piece piece;
+    piece.signal = signal;
+    target_.pieces.push_back(piece);
+    target_.width = static_cast<std::uint64_t>(signal->GetWidth());
     if (kind != NetKind::Wire) {
         value_.Clear(place);
         value_.number = Number::Read(kind == NetKind::Supply1 ? "'1" : "'0");
-        Tie(*signal, value_);
+        Assign(target_, value_);
     }
     if (parser_.Accept('=')) {
-        target_.Clear(place);
-        Piece piece;
-        piece.signal = signal;
-        target_.pieces.push_back(piece);
-        target_.width = static_cast<std::uint64_t>(signal->GetWidth());
         expressions_.Read(value_, ExpressionReader::Undeclared::Refuse);
         Assign(target_, value_);
     }
@@ -328,6 +334,7 @@ void ModuleReader::ReadOneNet(NetKind kind, const std::optional<Range>& range) {
 
 /// Declares the net `name_`. A port may be declared as a net once more.
 Signal* ModuleReader::DeclareNet(const std::optional<Range>& range, const Place& place) {
+    maker_.SetPlace(place);
     if (Signal* const signal = maker_.DeclareSignal(name_, range)) {
         return signal;
     }
@@ -369,6 +376,10 @@ void ModuleReader::GiveParameter(const Place& place) {
     if (!parameter->value) {
         parser_.Fail(place, "the value of the parameter " + Quoted(name_) + " is no literal");
     }
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        sink->TakeParameter({}, name_, *parameter->value, attributes_.IsHidden(), place);
+        return;
+    }
     const std::string problem = SetAttribute(maker_.GetNetlist(), name_, *parameter->value,
                                              attributes_.IsHidden() ? Hidden : Seen, nullptr);
     if (!problem.empty()) {
@@ -396,15 +407,26 @@ void ModuleReader::ReadAssignments() {
 }
 
 void ModuleReader::Assign(const Expression& target, const Expression& value) {
-    Signal& signal = *maker_.GetSignal(target.pieces);
+    NetlistSink* const sink = maker_.GetSink();
+    if (value.IsConstant() && sink != nullptr) {
+        sink->Tie(maker_.GetMembers(target.pieces), expressions_.GetBits(value, target.width),
+                  target.place);
+        return;
+    }
     if (value.IsConstant()) {
-        Tie(signal, value);
+        Tie(*maker_.GetSignal(target.pieces), value);
         return;
     }
     if (target.width != value.width) {
         parser_.Fail(value.place, std::to_string(value.width) + " bits are assigned to " +
                                       std::to_string(target.width));
     }
+    if (sink != nullptr) {
+        const Members members = maker_.GetMembers(target.pieces);
+        sink->Assign(members, maker_.GetMembers(value.pieces), target.place);
+        return;
+    }
+    Signal& signal = *maker_.GetSignal(target.pieces);
     Signal& source = *maker_.GetSignal(value.pieces);
     if (&signal == &source) {
         parser_.Fail(value.place, Quoted(signal.GetNameView()) + " is assigned to itself");
@@ -548,6 +570,11 @@ void ModuleReader::SetParameter(Instance& instance, const ModuleHead& head,
             }
         }
     }
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        sink->TakeParameter(maker_.GetOwner(instance), override.name, override.value, isHidden,
+                            override.place);
+        return;
+    }
     const std::string problem =
         SetAttribute(instance, override.name, override.value, isHidden ? Hidden : Seen, nullptr);
     if (!problem.empty()) {
@@ -671,7 +698,8 @@ void ModuleReader::ReadOneInstance(ModuleHead& head) {
         parser_.Fail(place,
                      "the array of instances " + Quoted(name_) + ": a model has single instances");
     }
-    Instance* const instance = maker_.AddInstance(name_, *head.component);
+    maker_.SetPlace(place);
+    Instance* const instance = maker_.AddInstance(name_, head);
     if (instance == nullptr) {
         parser_.Fail(place, Quoted(name_) + " is declared already");
     }
@@ -689,7 +717,7 @@ void ModuleReader::ReadConnections(const ModuleHead& head, Instance& instance) {
     for (Pin* pin : instance.GetPinIterator()) {
         pins_.push_back(pin);
     }
-    isConnected_.assign(pins_.size(), false);
+    isConnected_.assign(head.ports.size(), false);
     if (parser_.Accept(')')) {
         return;
     }
@@ -706,9 +734,9 @@ void ModuleReader::ReadConnections(const ModuleHead& head, Instance& instance) {
         if (hasNames) {
             ReadNamedConnection(head, instance, port);
         } else {
-            if (port >= pins_.size()) {
+            if (port >= head.ports.size()) {
                 parser_.Fail("the module " + Quoted(head.name) + " has " +
-                             std::to_string(pins_.size()) + " ports and no further one");
+                             std::to_string(head.ports.size()) + " ports and no further one");
             }
             if (!parser_.IsSign(',') && !parser_.IsSign(')')) {
                 expressions_.Read(value_, ExpressionReader::Undeclared::Declare);
@@ -754,7 +782,7 @@ void ModuleReader::ReadNamedConnection(const ModuleHead& head, const Instance& i
         parser_.FailExpected("the name of a port");
     }
     port = FindPort(head, parser_.Get().text, port);
-    if (port >= pins_.size()) {
+    if (port >= head.ports.size()) {
         parser_.Fail("the module " + Quoted(head.name) + " has no port " + parser_.Show());
     }
     if (isConnected_[port]) {
@@ -793,9 +821,14 @@ void ModuleReader::ReadImplicitConnection(const ModuleHead& head, const Instance
 
 /// Connects what was read to a pin.
 void ModuleReader::Connect(const ModuleHead& head, const Instance& instance, std::size_t port) {
-    Pin& pin = *pins_[port];
+    NetlistSink* const sink = maker_.GetSink();
     const std::uint64_t width = head.ports[port].GetWidth();
+    if (value_.IsConstant() && sink != nullptr) {
+        sink->ConnectConstant(head.ports[port], value_.place);
+        return;
+    }
     if (value_.IsConstant()) {
+        Pin& pin = *pins_[port];
         const bool isBare = pin.GetPinType() != PinTypeBus;
         maker_.ConnectConstant(instance, pin, expressions_.MakeConstant(value_, width, isBare));
         return;
@@ -807,11 +840,15 @@ void ModuleReader::Connect(const ModuleHead& head, const Instance& instance, std
                          (head.isDeclared ? "" : " in an earlier connection") + ", and " +
                          std::to_string(value_.width) + " are connected to it");
     }
+    if (sink != nullptr) {
+        sink->Connect(head.ports[port], maker_.GetMembers(value_.pieces), value_.place);
+        return;
+    }
     Signal* const signal = maker_.GetSignal(value_.pieces);
     if (NetlistMaker::IsOpenWord(signal->GetNameView())) {
         parser_.Fail(value_.place, "a net of this name, which stands for an open pin in a model");
     }
-    signal->Connect(&pin);
+    signal->Connect(pins_[port]);
 }
 
 } // namespace Orn_Hdl::Readers

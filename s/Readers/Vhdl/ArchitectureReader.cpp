@@ -21,12 +21,14 @@ ArchitectureReader::ArchitectureReader(Scanner& scanner, const Design& design,
                                        const ModuleHead& entity, const Architecture& architecture,
                                        NetlistMaker& maker, const VhdlSetup& setup)
     : parser_(scanner), scanner_(scanner), design_(design), entity_(entity),
-      architecture_(architecture), maker_(maker), notes_(scanner, setup.keepsComments),
+      architecture_(architecture), maker_(maker),
+      notes_(scanner, setup.keepsComments, maker.GetSink() == nullptr),
       expressions_(parser_, maker, entity),
       attributes_(parser_, maker, design, architecture, setup.keepsAttributes),
       instances_(parser_, maker, notes_, expressions_, attributes_, design, architecture, entity) {}
 
 void ArchitectureReader::Read() {
+    maker_.SetPlace(entity_.place);
     maker_.SetName(entity_.name);
     instances_.MakeComponents();
     DeclareGenerics();
@@ -39,17 +41,29 @@ void ArchitectureReader::Read() {
     }
     while (parser_.GetKeyword() != Keyword::Begin) {
         notes_.TakeBefore();
+        RefuseHidden();
         ReadDeclaration();
         notes_.EndStatement();
     }
     parser_.Next();
     while (parser_.GetKeyword() != Keyword::End) {
         notes_.TakeBefore();
+        RefuseHidden();
         ReadStatement();
         parser_.Expect(';');
         notes_.EndStatement();
     }
+    notes_.TakeBefore();
+    RefuseHidden();
+    CheckEnd(architecture_.name);
     attributes_.RefuseUnused();
+}
+
+/// A sink is not told that synthesis does not see a statement, which is so in no written netlist.
+void ArchitectureReader::RefuseHidden() {
+    if (maker_.GetSink() != nullptr && notes_.IsHidden()) {
+        parser_.Fail("this is hidden from synthesis");
+    }
 }
 
 /// Skips to the first word of a unit, and gives the comments in front of it to the netlist.
@@ -78,6 +92,11 @@ void ArchitectureReader::DeclareGenerics() {
             parser_.Fail(entity_.place, what + " of the entity has no value that is a literal, and "
                                                "a model has one");
         }
+        if (NetlistSink* const sink = maker_.GetSink()) {
+            sink->TakeParameter({}, parameter.name, *parameter.value, parameter.isHidden,
+                                entity_.place);
+            continue;
+        }
         const std::string problem =
             GiveAttribute(maker_.GetNetlist(), parameter.name, *parameter.value,
                           parameter.isHidden ? "NOSYN" : "SYN", nullptr);
@@ -101,11 +120,9 @@ void ArchitectureReader::DeclarePorts() {
                                             Quoted(port.parameters.front()) +
                                             ", which a model cannot say: write a number");
         }
-        Signal* const signal = maker_.DeclareSignal(port.name, port.range);
-        if (signal == nullptr) {
+        if (maker_.DeclarePort(port) == nullptr) {
             parser_.Fail(entity_.place, what + " is declared already");
         }
-        signal->SetPortPolarity(Polarity(port.direction));
     }
 }
 
@@ -136,8 +153,16 @@ void ArchitectureReader::ReadEntity() {
         }
     }
     notes_.TakeInside();
-    while (!parser_.IsSign(';')) {
-        parser_.Next();
+    CheckEnd(entity_.name);
+}
+
+/// Reads on from "end" to the semicolon. A name between them is that of the unit.
+void ArchitectureReader::CheckEnd(const std::string& unit) {
+    for (; !parser_.IsSign(';') && !parser_.IsEnd(); parser_.Next()) {
+        if (parser_.IsName() && parser_.GetKeyword() == Keyword::None &&
+            !IsSameName(parser_.Get().text, unit, true)) {
+            parser_.Fail("the end of " + Quoted(unit) + " has another name");
+        }
     }
 }
 
@@ -237,6 +262,7 @@ void ArchitectureReader::ReadSignals() {
         parser_.Fail(typePlace, type.problem);
     }
     for (const auto& [name, place] : names) {
+        maker_.SetPlace(place);
         Signal* const signal =
             expressions_.IsDeclared(name) ? nullptr : maker_.DeclareSignal(name, type.range);
         if (signal == nullptr) {
@@ -265,9 +291,13 @@ void ArchitectureReader::ReadSubtype() {
 
 /// The component is known; comments in front of it belong to it.
 void ArchitectureReader::ReadComponent() {
+    const Place place = parser_.Get().place;
     parser_.Next();
     parser_.TakeName(name_, "name of a component");
     const ModuleHead* const head = architecture_.components.Find(name_);
+    if (head != nullptr && maker_.GetSink() != nullptr) {
+        maker_.GetSink()->TakeComponent(*head, place);
+    }
     if (head != nullptr && head->component != nullptr) {
         notes_.GiveTo(*head->component);
     }
@@ -401,6 +431,19 @@ void ArchitectureReader::FinishAssignment() {
 }
 
 void ArchitectureReader::Assign() {
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        const Members target = maker_.GetMembers(target_.pieces);
+        if (!value_.IsConstant()) {
+            sink->Assign(target, maker_.GetMembers(value_.pieces), target_.place);
+            return;
+        }
+        std::string bits;
+        for (const Piece& piece : value_.pieces) {
+            bits += piece.bits;
+        }
+        sink->Tie(target, bits, target_.place);
+        return;
+    }
     Signal& signal = *maker_.GetSignal(target_.pieces);
     if (value_.IsConstant()) {
         if (!std::string_view(signal.GetConstantValue().GetValue()).empty()) {

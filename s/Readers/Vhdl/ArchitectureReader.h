@@ -31,6 +31,8 @@ private:
     void DeclareGenerics();
     void DeclarePorts();
     void ReadEntity();
+    void RefuseHidden();
+    void CheckEnd(const std::string& unit);
     void ReadPortNames();
     void SkipParentheses();
     void ReadDeclaration();

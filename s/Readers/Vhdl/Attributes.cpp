@@ -86,6 +86,13 @@ void AttributeReader::ReadSpecification(const std::string& name, const Parser::R
     }
     hasTypes_ = hasTypes_ || attribute.value.type != Attribute::String;
     for (const auto& [object, place] : objects) {
+        const bool isLabel = entityClass == Keyword::Label;
+        if (maker_.GetSink() != nullptr && (isLabel || entityClass == Keyword::Component)) {
+            const Owner owner{isLabel ? Owner::Instance : Owner::Component, nullptr, object};
+            maker_.GetSink()->TakeAttribute(owner, name, attribute.value, attribute.isDeclared,
+                                            place);
+            continue;
+        }
         if (entityClass == Keyword::Label) {
             pending_[KeyOf(object)].push_back(attribute);
         } else if (AttributeHolder* const holder = FindHolder(entityClass, object, place)) {
@@ -121,6 +128,11 @@ AttributeHolder* AttributeReader::FindHolder(Keyword entityClass, const std::str
 }
 
 void AttributeReader::Set(AttributeHolder& holder, const Pending& attribute) const {
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        sink->TakeAttribute(maker_.GetOwner(holder), attribute.name, attribute.value,
+                            attribute.isDeclared, attribute.place);
+        return;
+    }
     const std::string problem = GiveAttribute(holder, attribute.name, attribute.value, nullptr,
                                               attribute.isDeclared ? Assigned : AssignedOnly);
     if (!problem.empty()) {

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace Orn_Hdl::Readers::Vhdl {
 
@@ -43,11 +44,16 @@ std::string ReadBindingIndication(Parser& parser, const std::string& component) 
 }
 
 /// Reads "U1, U2 : COMPONENT" or the name of a block. \return whether it is a list of instances.
-bool ReadSpecification(Parser& parser, std::string& component) {
+/// \param labels gets the instances; null when nobody wants them.
+bool ReadSpecification(Parser& parser, std::string& component,
+                       std::vector<std::string>* labels = nullptr) {
     parser.Expect(Keyword::For, "for");
     do {
         if (!parser.Accept(Keyword::All) && !parser.Accept(Keyword::Others)) {
             parser.TakeName(component, "label of an instance");
+            if (labels != nullptr) {
+                labels->push_back(component);
+            }
         }
     } while (parser.Accept(','));
     if (!parser.Accept(':')) {
@@ -59,13 +65,23 @@ bool ReadSpecification(Parser& parser, std::string& component) {
 
 /// Reads "for ... end for;".
 /// \param isOwn whether it configures the architecture itself, not one of a component.
-void ReadItem(Parser& parser, Configuration& configuration, bool isOwn, std::size_t depth) {
+void ReadItem(Parser& parser, Configuration& configuration, bool isOwn, std::size_t depth,
+              NetlistSink* sink) {
     constexpr std::size_t Deepest = 100;
     if (depth > Deepest) {
         parser.Fail("a configuration that is nested too deeply");
     }
     std::string component;
-    const bool isInstance = ReadSpecification(parser, component);
+    std::vector<std::string> labels;
+    const Place begin = parser.Get().place;
+    const bool isInstance =
+        ReadSpecification(parser, component, sink == nullptr ? nullptr : &labels);
+    if (isInstance && sink != nullptr && parser.GetKeyword() == Keyword::Use) {
+        sink->TakeBinding(labels, component, begin);
+    }
+    if (depth == 0 && !isInstance) {
+        configuration.architecture = component;
+    }
     if (isInstance && parser.GetKeyword() == Keyword::Use) {
         const Place place = parser.Get().place;
         const std::string problem = ReadBindingIndication(parser, component);
@@ -82,7 +98,7 @@ void ReadItem(Parser& parser, Configuration& configuration, bool isOwn, std::siz
         if (parser.GetKeyword() == Keyword::Use) {
             parser.SkipStatement();
         } else if (parser.GetKeyword() == Keyword::For) {
-            ReadItem(parser, configuration, isOwn && !isInstance, depth + 1);
+            ReadItem(parser, configuration, isOwn && !isInstance, depth + 1, sink);
         } else {
             parser.FailExpected("\"for\" or \"end\"");
         }
@@ -111,7 +127,7 @@ std::string ReadBinding(Parser& parser, Place& place) {
     return problem;
 }
 
-Configuration ReadConfiguration(Parser& parser) {
+Configuration ReadConfiguration(Parser& parser, NetlistSink* sink) {
     Configuration configuration;
     parser.Next();
     parser.TakeName(configuration.name, "name of a configuration");
@@ -123,12 +139,12 @@ Configuration ReadConfiguration(Parser& parser) {
         if (keyword == Keyword::Use || keyword == Keyword::Attribute || keyword == Keyword::Group) {
             parser.SkipStatement();
         } else if (keyword == Keyword::For) {
-            ReadItem(parser, configuration, true, 0);
+            ReadItem(parser, configuration, true, 0, sink);
         } else {
             parser.FailExpected("\"for\" or \"end\"");
         }
     }
-    parser.SkipEnd();
+    parser.SkipEnd(configuration.name);
     return configuration;
 }
 

@@ -45,6 +45,10 @@ std::string KeyOf(const std::string& name);
 struct Configuration {
     std::string name;
     std::string entity;
+    /// The architecture that it configures.
+    std::string architecture;
+    /// Whether it is hidden from synthesis.
+    bool isHidden = false;
     /// Why no model can have it, and where; empty when one can, or when it changes nothing.
     std::string problem;
     Place problemPlace;

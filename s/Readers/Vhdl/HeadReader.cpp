@@ -65,8 +65,8 @@ void ReadClause(Parser& parser, Clauses& clauses) {
     parser.Expect(';');
 }
 
-HeadReader::HeadReader(Scanner& scanner, Design& design, bool isLibrary)
-    : parser_(scanner), scanner_(scanner), design_(design), isLibrary_(isLibrary) {
+HeadReader::HeadReader(Scanner& scanner, Design& design, bool isLibrary, NetlistSink* sink)
+    : parser_(scanner), scanner_(scanner), design_(design), isLibrary_(isLibrary), sink_(sink) {
     scanner_.SetCommentFilter(MayBeSwitch);
 }
 
@@ -93,7 +93,9 @@ void HeadReader::ReadUnit() {
         ReadPackage();
         break;
     case Keyword::Configuration:
-        design_.configurations.push_back(ReadConfiguration(parser_));
+        TakeComments();
+        design_.configurations.push_back(ReadConfiguration(parser_, sink_));
+        design_.configurations.back().isHidden = isHidden_;
         break;
     default:
         if (!parser_.IsWord("context")) {
@@ -214,8 +216,9 @@ void HeadReader::ReadPackage() {
 void HeadReader::ReadComponent(Heads& heads) {
     parser_.Next();
     const Place place = parser_.Get().place;
-    parser_.TakeName(name_, "name of a component");
-    ModuleHead& head = AddHead(heads, name_, place);
+    std::string name;
+    parser_.TakeName(name, "name of a component");
+    ModuleHead& head = AddHead(heads, name, place);
     parser_.Accept(Keyword::Is);
     if (parser_.GetKeyword() == Keyword::Generic) {
         ReadGenerics(head);
@@ -225,7 +228,15 @@ void HeadReader::ReadComponent(Heads& heads) {
     }
     parser_.Expect(Keyword::End, "end");
     parser_.Expect(Keyword::Component, "component");
-    parser_.SkipEnd();
+    parser_.SkipEnd(name);
+}
+
+/// Takes what hides text from synthesis off the comments.
+void HeadReader::TakeComments() {
+    for (const Comment& comment : scanner_.GetComments()) {
+        TakeSwitch(comment.text, isHidden_, sink_ == nullptr);
+    }
+    scanner_.GetComments().clear();
 }
 
 void HeadReader::ReadGenerics(ModuleHead& head) {
@@ -240,10 +251,7 @@ void HeadReader::ReadGenerics(ModuleHead& head) {
 
 /// "A, B : integer := 1"
 void HeadReader::ReadGeneric(ModuleHead& head) {
-    for (const Comment& comment : scanner_.GetComments()) {
-        TakeSwitch(comment.text, isHidden_);
-    }
-    scanner_.GetComments().clear();
+    TakeComments();
     const Keyword keyword = parser_.GetKeyword();
     if (keyword == Keyword::Type || keyword == Keyword::Function || keyword == Keyword::Procedure ||
         keyword == Keyword::Package) {
@@ -323,6 +331,7 @@ void HeadReader::ReadPort(ModuleHead& head) {
         if (head.FindPort(port.name) != nullptr) {
             parser_.Fail(place, "the port " + Quoted(port.name) + " is declared already");
         }
+        port.place = place;
         head.ports.push_back(std::move(port));
     } while (parser_.Accept(','));
     parser_.Expect(':');

@@ -5,6 +5,8 @@
 #include "Readers/Vhdl/Design.h"
 #include "Readers/Vhdl/Parser.h"
 
+#include "Readers/NetlistSink.h"
+
 #include <cstddef>
 #include <set>
 #include <string>
@@ -16,7 +18,8 @@ class HeadReader {
 public:
     /// \param isLibrary whether the file's entities are components alone. Of a head that is known
     ///        already, the first one counts.
-    HeadReader(Scanner& scanner, Design& design, bool isLibrary);
+    /// \param sink gets the bindings of configurations; null when nobody wants them.
+    HeadReader(Scanner& scanner, Design& design, bool isLibrary, NetlistSink* sink = nullptr);
 
     /// Reads the file that the scanner has opened.
     void Read();
@@ -29,6 +32,7 @@ private:
     void ReadPackage();
     void ReadComponent(Heads& heads);
     ModuleHead& AddHead(Heads& heads, const std::string& name, const Place& place);
+    void TakeComments();
     void ReadGenerics(ModuleHead& head);
     void ReadGeneric(ModuleHead& head);
     void ReadPorts(ModuleHead& head);
@@ -47,6 +51,7 @@ private:
     Scanner& scanner_;
     Design& design_;
     const bool isLibrary_;
+    NetlistSink* const sink_;
     /// The clauses in front of the next design unit.
     Clauses clauses_;
     /// Takes what is read of a head that is known already.

@@ -81,6 +81,9 @@ void InstanceReader::MakeComponent(ModuleHead& head, const Place& place) {
         parser_.Fail(place, Quoted(head.name) + " cannot be a component: " + problem);
     }
     made = &head;
+    if (maker_.GetSink() != nullptr) {
+        return;
+    }
     for (const ParameterHead& parameter : head.parameters) {
         if (!parameter.value) {
             continue;
@@ -170,7 +173,8 @@ void InstanceReader::ReadConfiguration(const std::string& label, const Place& pl
 }
 
 void InstanceReader::ReadInstance(const std::string& label, const Place& place, ModuleHead& head) {
-    Instance* const instance = maker_.AddInstance(label, *head.component);
+    maker_.SetPlace(place);
+    Instance* const instance = maker_.AddInstance(label, head);
     if (instance == nullptr || expressions_.IsDeclared(label)) {
         parser_.Fail(place, Quoted(label) + " is declared already");
     }
@@ -289,6 +293,11 @@ void InstanceReader::SetGeneric(const ModuleHead& head, Instance& instance,
                                  "fixed ranges");
             }
         }
+    }
+    if (NetlistSink* const sink = maker_.GetSink()) {
+        sink->TakeParameter(maker_.GetOwner(instance), generic.name, generic.value,
+                            generic.isHidden, generic.place);
+        return;
     }
     Component& component = *head.component;
     const Attribute* present = component.GetAttr(generic.name.c_str());

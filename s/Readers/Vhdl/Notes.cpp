@@ -27,7 +27,7 @@ void Notes::TakeBefore() {
         return;
     }
     for (const Comment& comment : comments) {
-        if (!TakeSwitch(comment.text, isHidden_) && keepsComments_) {
+        if (!TakeSwitch(comment.text, isHidden_, obeysAll_) && keepsComments_) {
             AddLines(comment, lines_);
         }
     }
@@ -40,7 +40,7 @@ void Notes::TakeInside() {
         return;
     }
     for (const Comment& comment : comments) {
-        TakeSwitch(comment.text, isHidden_);
+        TakeSwitch(comment.text, isHidden_, obeysAll_);
     }
     comments.clear();
 }
@@ -68,7 +68,7 @@ void Notes::EndStatement() {
         if (place.line > end.line || (place.line == end.line && place.column > end.column)) {
             break;
         }
-        TakeSwitch(comments[count].text, isHidden_);
+        TakeSwitch(comments[count].text, isHidden_, obeysAll_);
     }
     comments.erase(comments.begin(), comments.begin() + static_cast<std::ptrdiff_t>(count));
 }

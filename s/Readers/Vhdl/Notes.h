@@ -12,8 +12,9 @@ namespace Orn_Hdl::Readers::Vhdl {
 class Notes {
 public:
     /// \param keepsComments whether comments become comments of objects.
-    Notes(Scanner& scanner, bool keepsComments)
-        : scanner_(scanner), keepsComments_(keepsComments) {}
+    /// \param obeysAll as `TakeSwitch` takes it.
+    Notes(Scanner& scanner, bool keepsComments, bool obeysAll)
+        : scanner_(scanner), keepsComments_(keepsComments), obeysAll_(obeysAll) {}
 
     /// Begins or stops to collect comments with the next token.
     void Collect(bool isOn);
@@ -37,6 +38,7 @@ public:
 private:
     Scanner& scanner_;
     const bool keepsComments_;
+    const bool obeysAll_;
     std::vector<std::string> lines_;
     bool isHidden_ = false;
 };

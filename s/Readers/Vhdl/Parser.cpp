@@ -1,6 +1,7 @@
 #include "Readers/Vhdl/Parser.h"
 
 #include "Port/Ascii.h"
+#include "Readers/Heads.h"
 #include "Readers/Limits.h"
 #include "Readers/Vhdl/Literals.h"
 
@@ -152,10 +153,13 @@ void Parser::SkipStatement() {
     Expect(';');
 }
 
-void Parser::SkipEnd() {
+void Parser::SkipEnd(const std::string& name) {
     while (!IsSign(';')) {
         if (!IsName()) {
             FailExpected("\";\"");
+        }
+        if (GetKeyword() == Keyword::None && !IsSameName(Get().text, name, true)) {
+            Fail("the end of " + Quoted(name) + " has another name");
         }
         Next();
     }

@@ -68,8 +68,8 @@ public:
     std::string TakeSource(char sign, char other);
     /// Skips a semicolon and everything in front of it.
     void SkipStatement();
-    /// Reads what may stand between "end" and the semicolon.
-    void SkipEnd();
+    /// Reads what may stand between "end" and the semicolon: keywords, and the name of what ends.
+    void SkipEnd(const std::string& name);
 
     /// What a name stands for in a constant expression.
     using Resolve = std::function<std::optional<std::int64_t>(std::string_view name)>;

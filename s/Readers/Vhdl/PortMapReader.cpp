@@ -26,7 +26,7 @@ void PortMapReader::Read(const ModuleHead& head, Instance& instance) {
     for (Pin* pin : instance.GetPinIterator()) {
         pins_.push_back(pin);
     }
-    isConnected_.assign(pins_.size(), false);
+    isConnected_.assign(head.ports.size(), false);
     next_ = 0;
     hasNames_ = false;
     parts_.clear();
@@ -37,7 +37,7 @@ void PortMapReader::Read(const ModuleHead& head, Instance& instance) {
         ReadAssociation();
     } while (parser_.Accept(','));
     EndPort();
-    for (std::size_t port = 0; port < pins_.size(); ++port) {
+    for (std::size_t port = 0; port < head.ports.size(); ++port) {
         if (head.ports[port].hasDefault && !isConnected_[port] &&
             head.ports[port].direction == Polarity::Input) {
             parser_.Fail("the port " + Quoted(head.ports[port].name) +
@@ -73,7 +73,7 @@ void PortMapReader::ReadAssociation() {
 void PortMapReader::ReadByName(const std::optional<Selection>& selection, const Place& place) {
     hasNames_ = true;
     const std::size_t port = head_->FindPort(name_, next_);
-    if (port >= pins_.size()) {
+    if (port >= head_->ports.size()) {
         parser_.Fail(place,
                      "the component " + Quoted(head_->name) + " has no port " + Quoted(name_));
     }
@@ -124,9 +124,9 @@ void PortMapReader::ReadByPosition(bool hasName, const std::optional<Selection>&
     if (hasNames_) {
         parser_.Fail(place, "a connection by position behind one by name");
     }
-    if (next_ >= pins_.size()) {
+    if (next_ >= head_->ports.size()) {
         parser_.Fail(place, "the component " + Quoted(head_->name) + " has " +
-                                std::to_string(pins_.size()) + " ports and no further one");
+                                std::to_string(head_->ports.size()) + " ports and no further one");
     }
     BeginPort(next_, place);
     if (!hasName && parser_.Accept(Keyword::Open)) {
@@ -201,14 +201,22 @@ void PortMapReader::CheckWidth(std::uint64_t width, bool isVector) const {
 
 /// Connects what was read to the pin of the present port.
 void PortMapReader::Connect() {
-    Pin& pin = *pins_[port_];
+    NetlistSink* const sink = maker_.GetSink();
     if (value_.IsConstant()) {
         if (head_->ports[port_].direction != Polarity::Input) {
             parser_.Fail(value_.place, "a constant at the port " +
                                            Quoted(head_->ports[port_].name) +
                                            ", which is no input");
         }
-        maker_.ConnectConstant(*instance_, pin, value_.GetConstant());
+        if (sink != nullptr) {
+            sink->ConnectConstant(head_->ports[port_], value_.place);
+        } else {
+            maker_.ConnectConstant(*instance_, *pins_[port_], value_.GetConstant());
+        }
+        return;
+    }
+    if (sink != nullptr) {
+        sink->Connect(head_->ports[port_], maker_.GetMembers(value_.pieces), value_.place);
         return;
     }
     Signal* const signal = maker_.GetSignal(value_.pieces);
@@ -216,7 +224,7 @@ void PortMapReader::Connect() {
         parser_.Fail(value_.place,
                      "a signal of this name, which stands for an open pin in a model");
     }
-    signal->Connect(&pin);
+    signal->Connect(pins_[port_]);
 }
 
 } // namespace Orn_Hdl::Readers::Vhdl

@@ -84,19 +84,36 @@ Attribute::ValueType GuessType(std::string_view text) {
     throw LiteralProblem{"the value " + Quoted(text) + " is no literal of its type"};
 }
 
+/// Takes a string literal, or the character of a code, off the front of a text.
+std::string TakeCharacters(std::string_view& text) {
+    constexpr std::string_view CharacterOf = "character'val(";
+    if (Port::EqualIgnoringCase(text.substr(0, CharacterOf.size()), CharacterOf)) {
+        const std::size_t end = std::min(text.find(')'), text.size());
+        const std::optional<std::int64_t> code =
+            GetInteger(text.substr(CharacterOf.size(), end - CharacterOf.size()));
+        if (!code || *code > 255 || end == text.size()) {
+            RefuseValue(text);
+        }
+        text.remove_prefix(end + 1);
+        return std::string(1, static_cast<char>(*code));
+    }
+    std::size_t end = 1;
+    while (end < text.size() && (text[end] != '"' || text.substr(end, 2) == "\"\"")) {
+        end += text[end] == '"' ? 2 : 1;
+    }
+    if (text.empty() || text.front() != '"' || end >= text.size()) {
+        RefuseValue(text);
+    }
+    std::string characters = ReadString(text.substr(1, end - 1));
+    text.remove_prefix(end + 1);
+    return characters;
+}
+
 /// The characters of a string literal, or of several that are concatenated.
 std::string StringOf(std::string_view text) {
     std::string result;
     for (;;) {
-        std::size_t end = 1;
-        while (end < text.size() && (text[end] != '"' || text.substr(end, 2) == "\"\"")) {
-            end += text[end] == '"' ? 2 : 1;
-        }
-        if (text.empty() || text.front() != '"' || end >= text.size()) {
-            RefuseValue(text);
-        }
-        result += ReadString(text.substr(1, end - 1));
-        text.remove_prefix(end + 1);
+        result += TakeCharacters(text);
         text.remove_prefix(std::min(text.find_first_not_of(' '), text.size()));
         if (text.empty()) {
             return result;
