@@ -72,7 +72,9 @@ public:
 
     /// A design as a write left it, and the options of the write. Both must outlive this object.
     struct Written {
+        /// The design.
         const Netlist& netlist;
+        /// The options of the write.
         const HdlOptions& options;
     };
     /// Writes a netlist that is proven before anything of it reaches a file that exists. A stream

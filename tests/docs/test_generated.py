@@ -156,7 +156,7 @@ class Bash(unittest.TestCase):
 
     def test_commands_and_options(self) -> None:
         self.assertEqual(self.complete("co"), ["commands"])
-        self.assertEqual(self.complete("run", "--v"), ["--verilog", "--vhdl"])
+        self.assertEqual(self.complete("run", "--v"), ["--verify", "--verilog", "--vhdl"])
         self.assertEqual(self.complete("run", "--model", ""), [])
         self.assertEqual(self.complete("import", "--x-as", ""), ["0", "1"])
         self.assertEqual(self.complete("unknown", ""), [])
