@@ -199,6 +199,8 @@ Signal* Comparison::DeclareStranger(const std::string& name,
     Signal* const added = signal.get();
     strangers_.Add(signal.release());
     hasStrangers_ = true;
+    // The netlist owns it now.
+    // cppcheck-suppress returnDanglingLifetime
     return added;
 }
 

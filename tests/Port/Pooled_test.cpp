@@ -1,5 +1,7 @@
 #include "Port/Pooled.h"
 
+#include "Support/Sanitized.h"
+
 #include <gtest/gtest.h>
 
 #include <cstdint>
@@ -61,7 +63,7 @@ TEST(Pooled, BuildsInAGivenPlace) {
 constexpr std::size_t TooMuch = SIZE_MAX / 4;
 
 TEST(Pooled, ReportsThatAllocationFailed) {
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+#if defined(ORN_HDL_SANITIZED)
     GTEST_SKIP() << "a sanitizer ends the program at a request of this size";
 #endif
     EXPECT_THROW(Small::operator new(TooMuch), std::bad_alloc);

@@ -2,6 +2,7 @@
 // std::bad_alloc or a message, nothing leaks, and the engine can be used on and ends.
 #include "Robustness/MidSizedDesign.h"
 #include "Support/EngineScript.h"
+#include "Support/Sanitized.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
@@ -15,10 +16,6 @@
 #include <sys/mman.h>
 #include <sys/syscall.h>
 #include <unistd.h>
-
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-#define ORN_HDL_SANITIZED 1
-#endif
 
 namespace {
 

@@ -3,17 +3,15 @@
 /// allocation functions: one source file of a program may include it.
 #pragma once
 
+#include "Support/Sanitized.h"
+
 #include <cstddef>
 #include <cstdlib>
 #include <new>
 
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-#define ORN_HDL_SANITIZED 1
-#else
 #include <sys/mman.h>
 #include <sys/syscall.h>
 #include <unistd.h>
-#endif
 
 // GCC sees malloc through the operator below, and then free in the place of delete.
 #pragma GCC diagnostic ignored "-Wmismatched-new-delete"

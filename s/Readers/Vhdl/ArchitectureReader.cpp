@@ -87,10 +87,10 @@ void ArchitectureReader::SkipToUnit(const Clauses& clauses, Keyword keyword) {
 /// Makes the generics of the entity attributes of the netlist.
 void ArchitectureReader::DeclareGenerics() {
     for (const ParameterHead& parameter : entity_.parameters) {
-        const std::string what = "the generic " + Quoted(parameter.name);
+        const auto what = [&parameter] { return "the generic " + Quoted(parameter.name); };
         if (!parameter.value) {
-            parser_.Fail(entity_.place, what + " of the entity has no value that is a literal, and "
-                                               "a model has one");
+            parser_.Fail(entity_.place, what() + " of the entity has no value that is a literal, "
+                                                 "and a model has one");
         }
         if (NetlistSink* const sink = maker_.GetSink()) {
             sink->TakeParameter({}, parameter.name, *parameter.value, parameter.isHidden,
@@ -101,7 +101,7 @@ void ArchitectureReader::DeclareGenerics() {
             GiveAttribute(maker_.GetNetlist(), parameter.name, *parameter.value,
                           parameter.isHidden ? "NOSYN" : "SYN", nullptr);
         if (!problem.empty()) {
-            parser_.Fail(entity_.place, what + ": " + problem);
+            parser_.Fail(entity_.place, what().append(": ").append(problem));
         }
     }
 }
@@ -333,7 +333,8 @@ void ArchitectureReader::ReadStatement() {
     }
     parser_.TakeName(name_, "label or name of a signal");
     if (parser_.Accept(':')) {
-        ReadLabelled(std::move(name_), place);
+        const std::string label = std::move(name_);
+        ReadLabelled(label, place);
     } else {
         ReadNamedAssignment(name_, place);
     }
