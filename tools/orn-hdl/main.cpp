@@ -198,15 +198,35 @@ public:
         app_.set_version_flag(
             "--version", "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
             "Print the version and exit");
-        AddRun();
-        AddImport();
-        AddCheck();
-        AddDiff();
-        AddVerify();
-        AddDraw();
-        AddStats();
-        AddCommands();
-        AddWarningsPage();
+        AddCommand(
+            "run", "Replay a command file and write netlists", [this] { return Tool::Run(run_); },
+            &CommandLine::AddRun);
+        AddCommand(
+            "import", "Import a netlist in Verilog, VHDL or JSON",
+            [this] { return Tool::ImportDesign(import_); }, &CommandLine::AddImport);
+        AddCommand(
+            "check", "Tell what tools make of the netlists of a command file",
+            [this] { return Tool::CheckFiles(check_); }, &CommandLine::AddCheck);
+        AddCommand(
+            "diff", "Tell in what two designs differ", [this] { return Tool::PrintDiff(diff_); },
+            &CommandLine::AddDiff);
+        AddCommand(
+            "verify", "Compare a netlist with the design of a command file",
+            [this] { return Tool::Verify(verify_); }, &CommandLine::AddVerify);
+        AddCommand(
+            "draw", "Draw the design of a command file", [this] { return Tool::Draw(draw_); },
+            &CommandLine::AddDraw);
+        AddCommand(
+            "stats", "Count what the design of a command file is made of",
+            [this] { return Tool::PrintStats(stats_); }, &CommandLine::AddStats);
+        AddCommand(
+            "commands", "Print the command language",
+            [this] { return markdown_ ? Tool::PrintCommandsPage() : Tool::PrintCommands(words_); },
+            &CommandLine::AddCommands);
+        AddCommand(
+            "warnings", "Print the warnings of run",
+            [this] { return markdown_ ? Tool::PrintWarningsPage() : Tool::PrintWarnings(); },
+            &CommandLine::AddWarningsPage);
         app_.footer("\"orn-hdl help COMMAND\" prints the help of a command.");
     }
 
@@ -215,11 +235,14 @@ public:
     }
 
 private:
-    CLI::App& AddCommand(const std::string& name, const std::string& help,
-                         std::function<Status()> action) {
+    /// Adds a command. Its options are added when it is the one that runs: making all of them would
+    /// take longer than a small file.
+    void AddCommand(const std::string& name, const std::string& help,
+                    std::function<Status()> action, void (CommandLine::*addOptions)(CLI::App&)) {
         CLI::App& command = *app_.add_subcommand(name, help);
+        command.preparse_callback(
+            [this, &command, addOptions](std::size_t) { (this->*addOptions)(command); });
         command.callback([this, action = std::move(action)] { action_ = action; });
-        return command;
     }
 
     /// \param words the command line without the name of the program.
@@ -313,9 +336,7 @@ private:
         return "";
     }
 
-    void AddRun() {
-        CLI::App& command = AddCommand("run", "Replay a command file and write netlists",
-                                       [this] { return Tool::Run(run_); });
+    void AddRun(CLI::App& command) {
         AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
@@ -351,9 +372,7 @@ private:
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
 
-    void AddImport() {
-        CLI::App& command = AddCommand("import", "Import a netlist in Verilog, VHDL or JSON",
-                                       [this] { return Tool::ImportDesign(import_); });
+    void AddImport(CLI::App& command) {
         AddFile(command, "FILE", import_.file, "The netlist; - is standard input")->required();
         AddChoice<std::optional<Tool::ImportFormat>>(
             command, "--from", import_.format,
@@ -397,10 +416,7 @@ private:
         command.footer("If no output is given, the file is only checked.");
     }
 
-    void AddCheck() {
-        CLI::App& command =
-            AddCommand("check", "Tell what tools make of the netlists of a command file",
-                       [this] { return Tool::CheckFiles(check_); });
+    void AddCheck(CLI::App& command) {
         command.add_option("FILE", check_.files, "The command files; - is standard input")
             ->type_name("")
             ->check(CheckFileName);
@@ -418,9 +434,7 @@ private:
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
     }
 
-    void AddDiff() {
-        CLI::App& command = AddCommand("diff", "Tell in what two designs differ",
-                                       [this] { return Tool::PrintDiff(diff_); });
+    void AddDiff(CLI::App& command) {
         AddFile(command, "A", diff_.a.name, "The first file; - is standard input")
             ->type_name("")
             ->required();
@@ -461,10 +475,7 @@ private:
                        "trouble.");
     }
 
-    void AddVerify() {
-        CLI::App& command =
-            AddCommand("verify", "Compare a netlist with the design of a command file",
-                       [this] { return Tool::Verify(verify_); });
+    void AddVerify(CLI::App& command) {
         command.add_option("NETLIST", verify_.netlist, "The netlist")
             ->type_name("")
             ->check(CheckFileName)
@@ -490,9 +501,7 @@ private:
         command.footer("WRITE commands in the file do nothing.");
     }
 
-    void AddDraw() {
-        CLI::App& command = AddCommand("draw", "Draw the design of a command file",
-                                       [this] { return Tool::Draw(draw_); });
+    void AddDraw(CLI::App& command) {
         AddFile(command, "FILE", draw_.file, "The command file; - is standard input")->required();
         AddFile(command, "-o", draw_.output, "The SVG file to write")->required();
         CLI::Option* around = command
@@ -508,10 +517,7 @@ private:
         AddReport(command, draw_.report);
     }
 
-    void AddStats() {
-        CLI::App& command =
-            AddCommand("stats", "Count what the design of a command file is made of",
-                       [this] { return Tool::PrintStats(stats_); });
+    void AddStats(CLI::App& command) {
         AddFile(command, "FILE", stats_.file, "The command file; - is standard input")->required();
         command.add_option("--model", stats_.model, "The name of the design")->type_name("NAME");
         AddChoice<Tool::StatsFormat>(
@@ -523,20 +529,14 @@ private:
         command.footer("WRITE commands in the file do nothing.");
     }
 
-    void AddCommands() {
-        CLI::App& command = AddCommand("commands", "Print the command language", [this] {
-            return markdown_ ? Tool::PrintCommandsPage() : Tool::PrintCommands(words_);
-        });
+    void AddCommands(CLI::App& command) {
         CLI::Option* words =
             command.add_option("WORDS", words_, "Print only commands that begin with these words");
         command.add_flag("--markdown", markdown_, "Print the page for the documentation")
             ->excludes(words);
     }
 
-    void AddWarningsPage() {
-        CLI::App& command = AddCommand("warnings", "Print the warnings of run", [this] {
-            return markdown_ ? Tool::PrintWarningsPage() : Tool::PrintWarnings();
-        });
+    void AddWarningsPage(CLI::App& command) {
         command.add_flag("--markdown", markdown_, "Print the table of the documentation");
     }
 
