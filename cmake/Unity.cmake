@@ -12,4 +12,8 @@ function(orn_hdl_unite_folders target)
     endif()
   endforeach()
   set_target_properties(${target} PROPERTIES UNITY_BUILD_MODE GROUP)
+  if(CMAKE_UNITY_BUILD AND CMAKE_CXX_COMPILER_ID STREQUAL "GNU")
+    # GCC takes a source that another one includes for a header.
+    target_compile_options(${target} PRIVATE -Wno-subobject-linkage)
+  endif()
 endfunction()
