@@ -81,7 +81,7 @@ public:
             }
         }
         if (checks_ == Checks::All) {
-            Fuzz::CheckCommands(model_);
+            Fuzz::CheckCommands(model_, Fuzz::Again::Any);
         }
         Write();
         // Loose signals are destroyed before the design or after it.
