@@ -6,14 +6,13 @@
 #include "Consistency.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
-#include "Writes.h"
+#include "Reading.h"
 
 #include <string>
 #include <string_view>
 
 namespace {
 
-using Fuzz::Check;
 using namespace Orn_Hdl;
 
 constexpr std::string_view Cells =
@@ -22,14 +21,6 @@ constexpr std::string_view Cells =
     "module REG #(parameter W = 4, parameter [7:0] INIT = 8'h00, NAME = \"none\") (\n"
     "  input C, input [3:0] D, output [3:0] Q); endmodule\n"
     "module UP(input [0:3] A, inout P); endmodule\n";
-
-/// FILE:LINE:COLUMN: error: TEXT, or FILE: error: TEXT.
-void CheckMessage(std::string_view message) {
-    const std::size_t error = message.find(": error: ");
-    Check(error != std::string_view::npos && error > 0, "the message names a file and an error");
-    Check(message.back() == '\n', "the message ends in a line end");
-    Check(message.find('\0') == std::string_view::npos, "the message holds no NUL");
-}
 
 std::string WriteVerilog(Model& model) {
     model.GetOptions()->writeHeader = false;
@@ -73,20 +64,8 @@ void Run(Fuzz::Bytes bytes) {
     files.Put("top.v", bytes.Rest());
     CommandFactory factory;
     Model model(&factory);
-    model.AddSignal("former");
-    try {
-        reader.Read("top.v", model);
-    } catch (const Exception& exception) {
-        CheckMessage(exception.what());
-        Check(!files.HasOpenFiles(), "every file is closed");
-        Check(model.GetSignal("former") != nullptr, "the model is as it was");
-        return;
-    }
-    Check(!files.HasOpenFiles(), "every file is closed");
-    Fuzz::CheckNetlist(*model.GetNetlist());
-    Fuzz::CheckNames(*model.GetNetlist());
-    Fuzz::WriteWithChecks(*model.GetNetlist(), *model.GetOptions());
-    if (!isLiteral && IsPlain(bytes.Rest())) {
+    const bool isRead = Fuzz::ReadWithChecks(reader, "top.v", files, model);
+    if (isRead && !isLiteral && IsPlain(bytes.Rest())) {
         CheckReadBack(model);
     }
 }

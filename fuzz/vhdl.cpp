@@ -7,7 +7,7 @@
 #include "Consistency.h"
 #include "MemoryFiles.h"
 #include "Orn_Hdl/Orn_Hdl.h"
-#include "Writes.h"
+#include "Reading.h"
 
 #include <string>
 #include <string_view>
@@ -25,14 +25,6 @@ constexpr std::string_view Cells =
     "  Q : out bit_vector(3 downto 0)); end component;\n"
     "end cells;\n"
     "entity UP is port (A : in bit_vector(0 to 3); P : inout bit); end UP;\n";
-
-/// FILE:LINE:COLUMN: error: TEXT, or FILE: error: TEXT.
-void CheckMessage(std::string_view message) {
-    const std::size_t error = message.find(": error: ");
-    Check(error != std::string_view::npos && error > 0, "the message names a file and an error");
-    Check(message.back() == '\n', "the message ends in a line end");
-    Check(message.find('\0') == std::string_view::npos, "the message holds no NUL");
-}
 
 std::string WriteVhdl(Model& model) {
     model.GetOptions()->writeHeader = false;
@@ -99,20 +91,8 @@ void Run(Fuzz::Bytes bytes) {
     files.Put("top.vhd", bytes.Rest());
     CommandFactory factory;
     Model model(&factory);
-    model.AddSignal("former");
-    try {
-        reader.Read("top.vhd", model);
-    } catch (const Exception& exception) {
-        CheckMessage(exception.what());
-        Check(!files.HasOpenFiles(), "every file is closed");
-        Check(model.GetSignal("former") != nullptr, "the model is as it was");
-        return;
-    }
-    Check(!files.HasOpenFiles(), "every file is closed");
-    Fuzz::CheckNetlist(*model.GetNetlist());
-    Fuzz::CheckNames(*model.GetNetlist());
-    Fuzz::WriteWithChecks(*model.GetNetlist(), *model.GetOptions());
-    if (!isLiteral && IsPlain(bytes.Rest())) {
+    const bool isRead = Fuzz::ReadWithChecks(reader, "top.vhd", files, model);
+    if (isRead && !isLiteral && IsPlain(bytes.Rest())) {
         CheckReadBack(model);
     }
 }
