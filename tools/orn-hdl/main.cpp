@@ -380,9 +380,21 @@ private:
              {"vhdl", Tool::ImportFormat::Vhdl},
              {"json", Tool::ImportFormat::Json}},
             "What the netlist is written in; the default is what its extension says");
-        command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
-        AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
+        CLI::Option* top =
+            command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
+        AddRepeated(command, "--module", import_.modules,
+                    "Of a JSON netlist, import this module alone; may be repeated")
+            ->type_name("NAME")
+            ->excludes(top);
+        AddFile(command, "-o", import_.commandFile,
+                "Write the design as a command file; DIR/ gets one file a module");
         AddOutputs(command, import_.outputs);
+        command
+            .add_option(
+                "--output-dir", import_.outputs.folder,
+                "Write one file a module into DIR, and a list of them in place of each file")
+            ->type_name("DIR")
+            ->check(CheckFileName);
         AddRepeated(command, "-l,--library,--cells", import_.libraries,
                     "Read cell types: Verilog, VHDL, Liberty or JSON; may be repeated")
             ->type_name("FILE")

@@ -1,6 +1,7 @@
 #include "import/ImportedNetlist.h"
 
 #include "import/BitUses.h"
+#include "import/DesignUnits.h"
 #include "import/NetlistConnections.h"
 #include "import/NetlistNames.h"
 #include "import/UniqueNames.h"
@@ -78,8 +79,7 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     const UnknownValues& unknown = rules.unknown;
     UniqueNames names(rules.names);
     const std::vector<std::string> portNames = ClaimPortNames(top, names);
-    ImportedComponents components =
-        FindComponents(design, top, rules.library, unknown, names, warnings);
+    ImportedComponents components = FindComponents(design, top, rules, names, warnings);
     OpenConstantOutputs(top, components, warnings);
     const BitUses uses = BitUses::Count(top, components, unknown, portNames);
     BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
@@ -87,11 +87,14 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
     netlist.hasVhdl = rules.names.HasVhdl();
-    NameDesign(netlist, names, warnings);
+    NameDesign(netlist, rules.units, names, warnings);
     NameCellsAndSignals(netlist, names);
     ReportRenamedPorts(netlist, rules.names, rules.keepPorts, warnings);
     DecideConnections(netlist, uses, names);
     NameAttributes(netlist, names, warnings);
+    if (rules.units != nullptr) {
+        rules.units->SetPorts(top, netlist.owners);
+    }
     return netlist;
 }
 
