@@ -368,6 +368,52 @@ class Files(HierarchyTest):
         self.judge_both()
 
 
+class Clauses(HierarchyTest):
+    def setUp(self) -> None:
+        super().setUp()
+        self.write("d.json", json.dumps(design(
+            {"a": port("input", 2), "y": port("output", 4)},
+            {"u": cell("sub", "io", I=[2], O=[3]), "v": cell("INV", "io", I=[3], O=[4])},
+            sub=inverter())))
+
+    def test_configurations(self) -> None:
+        _, vhdl = self.import_both(None, "--configuration", "work", "--verify")
+        self.assertEqual(re.findall(r"configuration (CFG_\w+) of", vhdl), ["CFG_sub", "CFG_top"])
+        self.assertEqual(re.findall(r"use configuration (\S+);", vhdl), ["WORK.CFG_sub"])
+        self.judge_both()
+        self.judge(["ghdl", "-e", "--std=93c", "--workdir=ghdl93c", "-Pghdl93c", "CFG_top"])
+        self.expect(self.run_tool("import", "d.json", "-o", "cmd/", "--configuration", "work"),
+                    SUCCESS)
+        self.expect(self.run_tool("run", "cmd/top.cmd", "--vhdl", "r.vhd", "--no-header"), SUCCESS)
+        self.assertTrue(vhdl.endswith(self.read("r.vhd")))
+        self.assertNotIn("CFG_", self.import_both(None, "--configuration", "none")[1])
+
+    def test_configurations_that_cannot_be(self) -> None:
+        self.refuse(design({"a": port("input", 2)}, {"u": cell("CFG_top", "io", I=[2], O=[3])},
+                           CFG_top=inverter()),
+                    "modules.top: another module has the name of its configuration, \"CFG_top\"",
+                    "--configuration", "work")
+        self.refuse(design({"a": port("input", 2)},
+                           {"u": cell("BOX", "i", parameters={"Level": "1"}, I=[2])}),
+                    "modules.top.cells.u.parameters: a configuration needs the name LEVEL, which "
+                    "is that of a parameter", "--configuration", "work")
+
+    def test_ieee_alone(self) -> None:
+        _, vhdl = self.import_both(None, "--no-kestra", "--verify")
+        self.assertNotIn("KESTRA", vhdl)
+        self.assertEqual(vhdl.count("use ieee.std_logic_1164.ALL;"), 2)
+        self.judge_both()
+        self.expect(self.run_tool("import", "d.json", "-o", "cmd/", "--no-kestra"), SUCCESS)
+        self.expect(self.run_tool("run", "cmd/top.cmd", "--vhdl", "r.vhd", "--no-header"), SUCCESS)
+        self.assertTrue(vhdl.endswith(self.read("r.vhd")))
+
+    def test_netlists_in_the_languages(self) -> None:
+        self.write("d.v", "module m(input a); endmodule")
+        for option in (("--configuration", "work"), ("--no-kestra",)):
+            self.expect(self.run_tool("import", "d.v", *option), USAGE,
+                        f"orn-hdl: {option[0]} applies to JSON netlists alone; see --help\n")
+
+
 @unittest.skipIf(shutil.which("yosys") is None, "yosys is not installed")
 class Designs(HierarchyTest):
     """Designs that Yosys has read, before and after synthesis; it proves the netlists equal."""

@@ -46,10 +46,23 @@ ImportFormat GetFormat(const ImportOptions& options) {
     return options.format.value_or(told);
 }
 
+/// The first option that applies to JSON netlists alone; empty for none.
+std::string_view FindJsonOption(const ImportOptions& options) {
+    if (!options.unknownAs.empty()) {
+        return "--x-as";
+    }
+    if (!options.modules.empty()) {
+        return "--module";
+    }
+    return options.vhdl.configuration ? "--configuration"
+           : options.vhdl.ieeeAlone   ? "--no-kestra"
+                                      : "";
+}
+
 /// The first option that does not apply to the format; empty if all do.
 std::string_view FindForeignOption(const ImportOptions& options, ImportFormat format) {
     if (format != ImportFormat::Json) {
-        return !options.unknownAs.empty() ? "--x-as" : !options.modules.empty() ? "--module" : "";
+        return FindJsonOption(options);
     }
     if (options.comments) {
         return "--comments";

@@ -4,6 +4,7 @@
 #include "Output.h"
 #include "Tool.h"
 #include "diagnostics/Reporter.h"
+#include "import/ImportRules.h"
 #include "import/NameRules.h"
 
 #include <optional>
@@ -46,6 +47,8 @@ struct ImportOptions {
     std::optional<Import::NameLanguages> names;
     /// Reject a design whose ports cannot keep their names.
     bool keepPorts = false;
+    /// The clauses that VHDL gets, for JSON.
+    Import::VhdlClauses vhdl;
     /// Import the attributes of cells and nets.
     bool attributes = false;
     /// Import the comments of objects.

@@ -17,6 +17,7 @@
 #include "Orn_Hdl/Engine.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
+#include "Port/NameScope.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -143,6 +144,21 @@ std::vector<Module*> FindWanted(ImportedDesign& design, const Hierarchy& hierarc
     return wanted;
 }
 
+/// The configuration of a module stands beside the entities.
+void CheckConfigurationNames(const Netlists& netlists) {
+    Port::NameScope names;
+    for (const ImportedNetlist& netlist : netlists) {
+        names.Claim(netlist.name);
+    }
+    for (const ImportedNetlist& netlist : netlists) {
+        const std::string name = "CFG_" + netlist.name;
+        if (names.IsTaken(name)) {
+            Fail(JsonPath("modules").AddKey(netlist.top.name),
+                 "another module has the name of its configuration, " + Quote(name));
+        }
+    }
+}
+
 /// Makes the netlists of the modules to import and of all modules that these use; of modules that
 /// were asked for by their names, these alone.
 Netlists MakeNetlists(ImportedDesign& design, const ImportOptions& options, ImportRules rules,
@@ -162,6 +178,9 @@ Netlists MakeNetlists(ImportedDesign& design, const ImportOptions& options, Impo
             std::find(wanted.begin(), wanted.end(), module) != wanted.end()) {
             netlists.push_back(std::move(netlist));
         }
+    }
+    if (options.vhdl.configuration) {
+        CheckConfigurationNames(netlists);
     }
     if (netlists.size() > 1 && !options.commandFile.empty() && GetCommandFolder(options).empty()) {
         throw Error("the design has " + std::to_string(netlists.size()) +
@@ -190,7 +209,8 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
             ReadDesign(std::move(text), options.attributes);
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
-        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts, library};
+        const ImportRules rules{
+            GetUnknownValues(options), names, options.keepPorts, library, nullptr, options.vhdl};
         const Netlists netlists = MakeNetlists(*design, options, rules, warnings);
         const Status written = WriteAll(netlists, options, reporter);
         for (std::string& warning : warnings.GetLines()) {

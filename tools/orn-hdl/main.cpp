@@ -413,6 +413,11 @@ private:
                                               "Make names legal in these languages")
             ->type_name("verilog|vhdl|both")
             ->check(CheckNameLanguages);
+        AddChoice<bool>(command, "--configuration", import_.vhdl.configuration,
+                        {{"none", false}, {"work", true}},
+                        "Configurations in VHDL: none, or one a module, for those in WORK");
+        command.add_flag("--no-kestra", import_.vhdl.ieeeAlone,
+                         "Leave the library KESTRA out of VHDL");
         command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
         command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")

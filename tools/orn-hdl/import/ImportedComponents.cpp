@@ -157,6 +157,7 @@ void ComponentFinder::Add(std::uint32_t index, const Variant& variant, const Cel
     ImportedComponent& component = components_.emplace_back();
     component.oldName = design_.types[index].name;
     component.type = index;
+    component.isUnit = type.unit != nullptr;
     component.firstCell = &cell;
     component.splitByPins = type.splitsByPins;
     component.splitByParameters = type.splitsByParameters;

@@ -49,6 +49,8 @@ struct ImportedComponent {
     /// The first cell that needs it.
     const Cell* firstCell = nullptr;
     std::string name;
+    /// Whether it is a module that is imported with the one that has the cells.
+    bool isUnit = false;
     /// Whether it only has the pins of the cells that need it.
     bool splitByPins = false;
     /// Whether it only has the parameters of the cells that need it.

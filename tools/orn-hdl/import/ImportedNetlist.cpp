@@ -7,6 +7,8 @@
 #include "import/UniqueNames.h"
 #include "import/Values.h"
 
+#include "Port/Ascii.h"
+
 #include <cstddef>
 #include <utility>
 
@@ -72,6 +74,19 @@ void CheckParameters(const Module& top, const UnknownValues& unknown, Warnings& 
     }
 }
 
+/// In a configuration, the attribute LEVEL tells that a component has none of its own.
+void CheckConfiguration(const ImportedNetlist& netlist) {
+    for (const ImportedComponent& component : netlist.components.GetAll()) {
+        for (const ImportedGeneric& generic : component.generics) {
+            if (netlist.vhdl.configuration &&
+                Port::EqualIgnoringCase(generic.value.name, "LEVEL")) {
+                Fail(netlist.top.GetPath("cells", component.firstCell->name).AddKey("parameters"),
+                     "a configuration needs the name LEVEL, which is that of a parameter");
+            }
+        }
+    }
+}
+
 } // namespace
 
 ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRules& rules,
@@ -87,6 +102,8 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
     netlist.hasVhdl = rules.names.HasVhdl();
+    netlist.vhdl = rules.vhdl;
+    CheckConfiguration(netlist);
     NameDesign(netlist, rules.units, names, warnings);
     NameCellsAndSignals(netlist, names);
     ReportRenamedPorts(netlist, rules.names, rules.keepPorts, warnings);

@@ -36,6 +36,7 @@ struct ImportedNetlist {
     bool hasOpenInputs = false;
     /// Whether the netlist may be written in VHDL.
     bool hasVhdl = true;
+    VhdlClauses vhdl = {};
 };
 
 /// Determines all names and connections, so that all errors are found before anything is written.
