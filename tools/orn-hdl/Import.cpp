@@ -1,5 +1,6 @@
 #include "Import.h"
 
+#include "Gzip.h"
 #include "JsonImport.h"
 #include "NetlistImport.h"
 #include "Progress.h"
@@ -40,7 +41,7 @@ constexpr Extension Extensions[] = {
 ImportFormat GetFormat(const ImportOptions& options) {
     const auto* const found =
         std::find_if(std::begin(Extensions), std::end(Extensions), [&](const Extension& extension) {
-            return HasExtension(options.file, extension.text);
+            return HasExtension(WithoutGzip(options.file), extension.text);
         });
     const ImportFormat told = found == std::end(Extensions) ? ImportFormat::Json : found->format;
     return options.format.value_or(told);
