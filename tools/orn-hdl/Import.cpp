@@ -45,7 +45,9 @@ ImportFormat GetFormat(const ImportOptions& options) {
 /// The first option that does not apply to the format; empty if all do.
 std::string_view FindForeignOption(const ImportOptions& options, ImportFormat format) {
     if (format != ImportFormat::Json) {
-        return options.unknownAs.empty() ? "" : "--x-as";
+        return !options.unknownAs.empty()    ? "--x-as"
+               : !options.cellModels.empty() ? "--write-cells"
+                                             : "";
     }
     if (options.comments) {
         return "--comments";
@@ -123,6 +125,10 @@ Status ImportDesign(const ImportOptions& options) {
         Complain(std::string(foreign) + (format == ImportFormat::Json
                                              ? " does not apply to a JSON netlist; see --help"
                                              : " applies to JSON netlists alone; see --help"));
+        return Status::Usage;
+    }
+    if (!options.cellModels.empty() && GetNameLanguages(options) == NameLanguages::Verilog) {
+        Complain("--write-cells needs names that are legal in VHDL, too; see --names");
         return Status::Usage;
     }
     Reporter reporter(options.report);

@@ -3,6 +3,7 @@
 #include "CellFiles.h"
 #include "explain/FileKind.h"
 #include "import/CellLibrary.h"
+#include "import/CellModels.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
 #include "import/EmitNetlist.h"
@@ -94,7 +95,15 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
         const ImportRules rules{GetUnknownValues(options), names, options.keepPorts, library};
         const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
-        const Status written = WriteAll(netlist, options, reporter);
+        OutputFile models(options.cellModels);
+        if (Port::Stream* out = models.GetStream()) {
+            WriteCellModels({&netlist}, *out, warnings);
+        }
+        Status written = models.Flush();
+        if (written == Status::Success) {
+            written = WriteAll(netlist, options, reporter);
+        }
+        written = written == Status::Success ? models.Commit() : written;
         for (std::string& warning : warnings.GetLines()) {
             reporter.Report(
                 MakeFileDiagnostic(options.file, Severity::Warning, std::move(warning)));
