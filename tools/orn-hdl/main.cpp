@@ -380,9 +380,21 @@ private:
              {"vhdl", Tool::ImportFormat::Vhdl},
              {"json", Tool::ImportFormat::Json}},
             "What the netlist is written in; the default is what its extension says");
-        command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
-        AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
+        CLI::Option* top =
+            command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
+        AddRepeated(command, "--module", import_.modules,
+                    "Of a JSON netlist, import this module alone; may be repeated")
+            ->type_name("NAME")
+            ->excludes(top);
+        AddFile(command, "-o", import_.commandFile,
+                "Write the design as a command file; DIR/ gets one file a module");
         AddOutputs(command, import_.outputs);
+        command
+            .add_option(
+                "--output-dir", import_.outputs.folder,
+                "Write one file a module into DIR, and a list of them in place of each file")
+            ->type_name("DIR")
+            ->check(CheckFileName);
         AddRepeated(command, "-l,--library,--cells", import_.libraries,
                     "Read cell types: Verilog, VHDL, Liberty or JSON; may be repeated")
             ->type_name("FILE")
@@ -401,6 +413,11 @@ private:
                                               "Make names legal in these languages")
             ->type_name("verilog|vhdl|both")
             ->check(CheckNameLanguages);
+        AddChoice<bool>(command, "--configuration", import_.vhdl.configuration,
+                        {{"none", false}, {"work", true}},
+                        "Configurations in VHDL: none, or one a module, for those in WORK");
+        command.add_flag("--no-kestra", import_.vhdl.ieeeAlone,
+                         "Leave the library KESTRA out of VHDL");
         command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
         command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")

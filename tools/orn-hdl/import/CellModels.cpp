@@ -264,12 +264,12 @@ void ModelWriter::WriteOnce(std::string_view key) {
 
 } // namespace
 
-void WriteCellModels(const std::vector<const ImportedNetlist*>& netlists, Port::Stream& out,
+void WriteCellModels(const std::vector<ImportedNetlist>& netlists, Port::Stream& out,
                      Warnings& warnings) {
     out << "-- Simulation models of cells, by Orn_Hdl.\n";
     ModelWriter writer(out, warnings);
-    for (const ImportedNetlist* netlist : netlists) {
-        writer.Write(*netlist);
+    for (const ImportedNetlist& netlist : netlists) {
+        writer.Write(netlist);
     }
 }
 

@@ -15,7 +15,7 @@ namespace Tool::Import {
 /// \param netlists the modules of a design, whose names are legal in VHDL.
 /// \param warnings gets the types of Yosys that have no model.
 /// \throws Error if a module or component has a name that the models need.
-void WriteCellModels(const std::vector<const ImportedNetlist*>& netlists, Port::Stream& out,
+void WriteCellModels(const std::vector<ImportedNetlist>& netlists, Port::Stream& out,
                      Warnings& warnings);
 
 } // namespace Tool::Import
