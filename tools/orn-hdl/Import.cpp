@@ -55,6 +55,9 @@ std::string_view FindJsonOption(const ImportOptions& options) {
     if (!options.modules.empty()) {
         return "--module";
     }
+    if (!options.cellModels.empty()) {
+        return "--write-cells";
+    }
     return options.vhdl.configuration ? "--configuration"
            : options.vhdl.ieeeAlone   ? "--no-kestra"
                                       : "";
@@ -192,6 +195,10 @@ Status ImportDesign(const ImportOptions& options) {
         Complain(std::string(foreign) + (format == ImportFormat::Json
                                              ? " does not apply to a JSON netlist; see --help"
                                              : " applies to JSON netlists alone; see --help"));
+        return Status::Usage;
+    }
+    if (!options.cellModels.empty() && GetNameLanguages(options) == NameLanguages::Verilog) {
+        Complain("--write-cells needs names that are legal in VHDL, too; see --names");
         return Status::Usage;
     }
     Reporter reporter(options.report);

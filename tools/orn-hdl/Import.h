@@ -55,6 +55,8 @@ struct ImportOptions {
     bool comments = false;
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
+    /// The file for the simulation models of cells; empty for none.
+    std::string cellModels;
     /// Write legal netlists, or nothing.
     bool legal = false;
     /// Read each netlist back and compare it with the design before it replaces its file.

@@ -4,6 +4,7 @@
 #include "design/DesignOutput.h"
 #include "explain/FileKind.h"
 #include "import/CellLibrary.h"
+#include "import/CellModels.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
 #include "import/DesignUnits.h"
@@ -212,7 +213,15 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
         const ImportRules rules{
             GetUnknownValues(options), names, options.keepPorts, library, nullptr, options.vhdl};
         const Netlists netlists = MakeNetlists(*design, options, rules, warnings);
-        const Status written = WriteAll(netlists, options, reporter);
+        OutputFile models(options.cellModels);
+        if (Port::Stream* out = models.GetStream()) {
+            WriteCellModels(netlists, *out, warnings);
+        }
+        Status written = models.Flush();
+        if (written == Status::Success) {
+            written = WriteAll(netlists, options, reporter);
+        }
+        written = written == Status::Success ? models.Commit() : written;
         for (std::string& warning : warnings.GetLines()) {
             reporter.Report(
                 MakeFileDiagnostic(options.file, Severity::Warning, std::move(warning)));

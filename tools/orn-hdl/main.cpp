@@ -443,6 +443,8 @@ private:
         command.add_flag("--verify", import_.verify,
                          "Read each netlist back and compare it with the design");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
+        AddFile(command, "--write-cells", import_.cellModels,
+                "Write simulation models in VHDL of the cells of Yosys");
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
     }
