@@ -339,6 +339,15 @@ class Files(HierarchyTest):
         self.expect(self.run_tool("import", "d.json", "-o", "there"), SUCCESS)
         self.assertEqual(self.read("there/commands.txt"), "there/sub.cmd\nthere/top.cmd\n")
 
+    def test_folders_of_netlists_in_the_languages(self) -> None:
+        self.write("m.v", "module m(input a, output y); INV u(.I(a), .O(y)); endmodule\n")
+        self.expect(self.run_tool("import", "m.v", "--output-dir", "out", "--vhdl", "-", "-o",
+                                  "c.list"), SUCCESS, "", "out/m.vhd\n")
+        self.assertEqual(self.read("c.list"), "out/m.cmd\n")
+        self.expect(self.run_tool("import", "m.v", "-o", "cmd/"), SUCCESS)
+        self.assertEqual(self.read("cmd/commands.txt"), "cmd/m.cmd\n")
+        self.assertIn("SET NETLIST NAME m\n", self.read("cmd/m.cmd"))
+
     def test_one_command_file_holds_one_module(self) -> None:
         self.refuse(self.contents, "the design has 2 modules, and a command file holds one: -o DIR/ "
                                    "writes one file a module")

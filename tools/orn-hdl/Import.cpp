@@ -92,18 +92,28 @@ bool IsFolder(const std::string& file) {
 
 } // namespace
 
-std::string GetCommandFolder(const ImportOptions& options) {
-    if (options.commandFile.empty() || IsFolder(options.commandFile)) {
-        return options.commandFile;
-    }
-    return options.outputs.folder;
+bool HasCommandFolder(const ImportOptions& options) {
+    return IsFolder(options.commandFile) ||
+           (!options.commandFile.empty() && !options.outputs.folder.empty());
 }
 
-std::string GetCommandList(const ImportOptions& options) {
-    if (IsFolder(options.commandFile)) {
-        return (std::filesystem::path(options.commandFile) / "commands.txt").string();
+std::vector<std::string> MakeCommandFiles(const ImportOptions& options,
+                                          const std::vector<std::string>& modules) {
+    if (!HasCommandFolder(options)) {
+        return {options.commandFile};
     }
-    return options.outputs.folder.empty() ? std::string() : options.commandFile;
+    const std::string& folder =
+        IsFolder(options.commandFile) ? options.commandFile : options.outputs.folder;
+    return MakeFolder(folder) == Status::Success ? MakeFileNames(modules, folder, ".cmd")
+                                                 : std::vector<std::string>();
+}
+
+Status WriteCommandList(const ImportOptions& options, const std::vector<std::string>& files) {
+    if (!HasCommandFolder(options)) {
+        return Status::Success;
+    }
+    const std::filesystem::path list = options.commandFile;
+    return WriteFileList(IsFolder(list) ? (list / "commands.txt").string() : list.string(), files);
 }
 
 std::string DescribeOtherFile(const std::string& beginning) {

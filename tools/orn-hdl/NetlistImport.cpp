@@ -304,7 +304,12 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
     // The name of the netlist that was read is in no output.
     model_->SetSourceFileName("");
     // A write changes the design, so the commands come first.
-    CommandsOutput commands(options_.commandFile);
+    const std::vector<std::string> files =
+        MakeCommandFiles(options_, {std::string(model_->GetNetlist()->GetNameView())});
+    if (files.empty()) {
+        return Status::File;
+    }
+    CommandsOutput commands(files.front());
     OutputFile nameMap(options_.nameMap);
     if (Port::Stream* out = nameMap.GetStream()) {
         WriteNetlistNames(*model_->GetNetlist(), renamings, legal ? &*legal : nullptr, *out);
@@ -313,7 +318,10 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
     if (status == Status::Success) {
         status = WriteNetlists(*model_, options_, legal ? &*legal : nullptr, reporter_);
     }
-    return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
+    if (status == Status::Success) {
+        status = Worse(commands.Commit(), nameMap.Commit());
+    }
+    return status == Status::Success ? WriteCommandList(options_, files) : status;
 }
 
 template <class Reader> Status Importer::Read(Reader& reader) {
