@@ -18,7 +18,7 @@ namespace Tool {
 
 namespace {
 
-constexpr std::string_view Extension = ".gz";
+constexpr std::string_view Suffix = ".gz";
 constexpr std::size_t PieceSize = 65536;
 
 [[noreturn]] void Fail(const std::string& file, const std::string& reason) {
@@ -87,12 +87,12 @@ private:
 } // namespace
 
 bool IsGzip(std::string_view file) noexcept {
-    return file.size() > Extension.size() &&
-           Port::EqualIgnoringCase(file.substr(file.size() - Extension.size()), Extension);
+    return file.size() > Suffix.size() &&
+           Port::EqualIgnoringCase(file.substr(file.size() - Suffix.size()), Suffix);
 }
 
 std::string_view WithoutGzip(std::string_view file) noexcept {
-    return IsGzip(file) ? file.substr(0, file.size() - Extension.size()) : file;
+    return IsGzip(file) ? file.substr(0, file.size() - Suffix.size()) : file;
 }
 
 void ReadGzip(const std::string& file, std::string& text) {
