@@ -85,7 +85,7 @@ class Verilog(ToolTest):
 
     def test_files_that_are_no_netlists(self) -> None:
         for text, what in (("ADD PORT A input\n", "a command file; use orn-hdl run"),
-                           ("\x1f\x8b", "a gzip file; unpack it first")):
+                           ("\x1f\x8b", "a gzip file; unpack it, or let its name end in .gz")):
             self.write("d.v", text)
             done = self.run_tool("import", "d.v")
             self.assertEqual(done.status, FAILED)

@@ -17,7 +17,7 @@ struct Signature {
 };
 
 constexpr Signature Signatures[] = {
-    {"\x1f\x8b", "this looks like a gzip file; unpack it first"},
+    {"\x1f\x8b", "this looks like a gzip file; unpack it, or let its name end in .gz"},
     {"BZh", "this looks like a bzip2 file; unpack it first"},
     {string_view("\xfd"
                  "7zXZ\0",
