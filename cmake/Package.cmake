@@ -61,6 +61,8 @@ them with Graphviz.")
 set(CPACK_DEBIAN_PYTHON_PACKAGE_NAME python3-orn-hdl)
 set(CPACK_DEBIAN_PYTHON_PACKAGE_SECTION python)
 set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS "python3 (>= 3.9)")
+set(CPACK_DEBIAN_PYTHON_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/packaging/python3/postinst
+    ${PROJECT_SOURCE_DIR}/packaging/python3/prerm)
 # It imports JSON and draws with the tool.
 set(CPACK_DEBIAN_PYTHON_PACKAGE_RECOMMENDS orn-hdl)
 set(CPACK_DEBIAN_PYTHON_PACKAGE_SUGGESTS "python3-networkx, python3-numpy, python3-pandas")
