@@ -130,16 +130,13 @@ def main() -> None:
         design.add_instances(made.names, (KINDS, made.kinds))
         return design
 
-    def only_replayed_instances(path: Path) -> orn_hdl.Design:
-        return replay(path)
-
     rows = []
     with tempfile.TemporaryDirectory() as folder:
         path, first = Path(folder) / "bench.cmd", Path(folder) / "instances.cmd"
         lines = made.write_commands(path)
         with path.open() as whole, first.open("w") as part:
             part.writelines(line for line in whole if not line.startswith("CONNECT"))
-        rows.append(("replay, instances alone", made.count, seconds(lambda: only_replayed_instances(first), repeat)))
+        rows.append(("replay, instances alone", made.count, seconds(lambda: replay(first), repeat)))
         rows.append(("add_instances", made.count, seconds(only_instances, repeat)))
         rows.append(("replay, the whole design", lines, seconds(lambda: replay(path), repeat)))
     rows.append(("calls with lists of names", lines, seconds(lambda: from_lists(made), repeat)))
