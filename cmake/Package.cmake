@@ -5,6 +5,9 @@ set(CPACK_PACKAGE_NAME orn-hdl)
 set(CPACK_PACKAGE_VENDOR "the Orn_Hdl authors")
 set(CPACK_PACKAGE_CONTACT "The Orn_Hdl authors <orn-hdl@example.org>")
 set(CPACK_COMPONENTS_ALL Library Development Tool)
+if(TARGET orn_hdl_python)
+  list(APPEND CPACK_COMPONENTS_ALL Python)
+endif()
 set(CPACK_STRIP_FILES ON)
 # Each package has a description of its own.
 set(CPACK_PACKAGE_DESCRIPTION_SUMMARY "")
@@ -21,6 +24,7 @@ set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${PROJECT_BINARY_DIR})
 set(CPACK_DEBIAN_ENABLE_COMPONENT_DEPENDS ON)
 set(CPACK_COMPONENT_DEVELOPMENT_DEPENDS Library)
 set(CPACK_COMPONENT_TOOL_DEPENDS Library)
+set(CPACK_COMPONENT_PYTHON_DEPENDS Library)
 
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_NAME liborn-hdl${PROJECT_VERSION_MAJOR})
 set(CPACK_DEBIAN_LIBRARY_PACKAGE_SECTION libs)
@@ -53,5 +57,18 @@ set(CPACK_COMPONENT_TOOL_DESCRIPTION
 Replays files of commands that describe a flat hardware design and writes
 it as structural Verilog and VHDL. Imports netlists from Yosys and draws
 them with Graphviz.")
+
+set(CPACK_DEBIAN_PYTHON_PACKAGE_NAME python3-orn-hdl)
+set(CPACK_DEBIAN_PYTHON_PACKAGE_SECTION python)
+set(CPACK_DEBIAN_PYTHON_PACKAGE_DEPENDS "python3 (>= 3.9)")
+set(CPACK_DEBIAN_PYTHON_PACKAGE_CONTROL_EXTRA ${PROJECT_SOURCE_DIR}/packaging/python3/postinst
+    ${PROJECT_SOURCE_DIR}/packaging/python3/prerm)
+# It imports JSON and draws with the tool.
+set(CPACK_DEBIAN_PYTHON_PACKAGE_RECOMMENDS orn-hdl)
+set(CPACK_DEBIAN_PYTHON_PACKAGE_SUGGESTS "python3-networkx, python3-numpy, python3-pandas")
+set(CPACK_COMPONENT_PYTHON_DESCRIPTION
+"writes structural netlists (Python 3 package)
+Builds flat hardware designs from Python, reads structural Verilog and
+VHDL, and writes both.")
 
 include(CPack)
