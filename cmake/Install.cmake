@@ -43,8 +43,11 @@ file(RELATIVE_PATH ORN_HDL_PC_LIBDIR ${CMAKE_INSTALL_PREFIX} ${CMAKE_INSTALL_FUL
 file(RELATIVE_PATH ORN_HDL_PC_INCLUDEDIR ${CMAKE_INSTALL_PREFIX} ${CMAKE_INSTALL_FULL_INCLUDEDIR})
 if(BUILD_SHARED_LIBS)
   set(ORN_HDL_PC_STATIC "")
+  set(ORN_HDL_PC_PRIVATE "")
 else()
   set(ORN_HDL_PC_STATIC " -DORN_HDL_STATIC")
+  # For programs in C, which are not linked with the C++ library by themselves.
+  set(ORN_HDL_PC_PRIVATE "\nLibs.private: -lstdc++ -lm -pthread")
 endif()
 configure_file(${CMAKE_CURRENT_LIST_DIR}/orn_hdl.pc.in ${PROJECT_BINARY_DIR}/orn_hdl.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/orn_hdl.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig
@@ -52,7 +55,8 @@ install(FILES ${PROJECT_BINARY_DIR}/orn_hdl.pc DESTINATION ${CMAKE_INSTALL_LIBDI
 
 install(DIRECTORY ${PROJECT_SOURCE_DIR}/examples DESTINATION ${CMAKE_INSTALL_DOCDIR}
   COMPONENT Development PATTERN "__pycache__" EXCLUDE)
-install(FILES ${PROJECT_SOURCE_DIR}/docs/interface.md DESTINATION ${CMAKE_INSTALL_DOCDIR}
+install(FILES ${PROJECT_SOURCE_DIR}/docs/interface.md ${PROJECT_SOURCE_DIR}/docs/c.md
+  DESTINATION ${CMAKE_INSTALL_DOCDIR}
   COMPONENT Development)
 
 # The tool, its manual pages, its pages for users, and support for shells and editors.

@@ -18,7 +18,7 @@ import sys
 from pathlib import Path
 
 LIST = Path(__file__).with_name("symbols.txt")
-VERSION_NODE = re.compile(r"@@?ORN_HDL_\d+$")
+VERSION_NODE = re.compile(r"@@?ORN_HDL_(C_)?\d+$")
 
 
 def exported_symbols(library: Path) -> list[str]:

@@ -112,7 +112,7 @@ Verdicts Find(const Table& table, std::string_view word) noexcept {
 
 } // namespace
 
-Verdicts FindReserved(std::string_view verilogName, std::string_view vhdlName) noexcept {
+Verdicts FindReserved(std::string_view verilogName, std::string_view vhdlName) {
     static const Table verilog = MakeTable(VerilogWords);
     static const Table vhdl = MakeTable(VhdlWords);
     Verdicts verdicts;

@@ -11,6 +11,6 @@ namespace Orn_Hdl::Checking {
 /// letter case, VHDL's have none.
 /// \param verilogName the name as the Verilog writer spells it.
 /// \param vhdlName the name as the VHDL writer spells it.
-Check::Verdicts FindReserved(std::string_view verilogName, std::string_view vhdlName) noexcept;
+Check::Verdicts FindReserved(std::string_view verilogName, std::string_view vhdlName);
 
 } // namespace Orn_Hdl::Checking

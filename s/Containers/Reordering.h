@@ -25,6 +25,18 @@ struct Reordering {
     template <class T> static Iterator<T> WalkFrom(const PtrArray<T>& array, int first) noexcept {
         return Iterator<T>(&array, first);
     }
+
+    /// The same walk, its present element being the first at or behind an index.
+    template <class T> static Iterator<T> Continue(Iterator<T> walk, int index) noexcept {
+        walk.index_ = index > walk.index_ ? index : walk.index_;
+        return walk;
+    }
+
+    /// The index of the present element of a walk that is not at its end.
+    template <class T> static int IndexOf(const Iterator<T>& walk) noexcept {
+        return walk.passesNulls_ ? Iterator<T>::PassNulls(walk.GetArray(), walk.index_)
+                                 : walk.index_;
+    }
 };
 
 } // namespace Orn_Hdl

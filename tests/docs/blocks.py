@@ -5,6 +5,7 @@ What follows the three back-quotes decides:
 
     cpp               a program: compiled and run, and a text block behind it is what it prints;
                       without main, statements that see `engine` and `model`: compiled
+    c                 a program in C99, or statements in C, in the same way
     cpp sources       a piece of the library's own sources: compiled
     orn               commands: replayed
     orn more          commands: replayed behind those of the blocks before
@@ -33,6 +34,19 @@ FENCE = re.compile(r"^```", re.M)
 LINK = re.compile(r"\]\(([^)#:]+)(?:#[^)]*)?\)")
 COMPILE = ["g++", "-std=c++17", "-O0", "-Wall", "-Wextra", "-Wpedantic", "-Wconversion", "-Wshadow",
            "-Werror"]
+C_COMPILE = ["gcc", "-std=c99", "-O0", "-Wall", "-Wextra", "-pedantic", "-Wstrict-prototypes",
+             "-Werror"]
+C_STATEMENTS = """\
+#include <Orn_Hdl/orn_hdl.h>
+#include <stdio.h>
+void Statements(orn_hdl_engine_t engine, orn_hdl_model_t model);
+void Statements(orn_hdl_engine_t engine, orn_hdl_model_t model) {{
+    (void)engine, (void)model;
+    {{
+{code}
+    }}
+}}
+"""
 STATEMENTS = """\
 #include <Orn_Hdl/Orn_Hdl.h>
 #include <iostream>
@@ -121,6 +135,8 @@ class Page:
             (self.folder / block.word).write_text(block.code)
         elif block.language == "cpp":
             self.check_cpp(block.code)
+        elif block.language == "c":
+            self.check_c(block.code)
         elif block.language == "orn":
             self.replay(block.code)
         elif block.language in ("verilog", "vhdl"):
@@ -147,6 +163,19 @@ class Page:
         else:
             self.compile(STATEMENTS.format(code=textwrap.indent(code, "    ")), include,
                          "-fsyntax-only")
+
+    def check_c(self, code: str) -> None:
+        is_program = "int main(" in code
+        source = self.folder / "block.c"
+        source.write_text(code if is_program else C_STATEMENTS.format(code=code))
+        include = f"-I{self.installed.prefix / 'include'}"
+        if is_program:
+            program = self.folder / "block"
+            self.run(*C_COMPILE, source, include, f"-L{self.installed.libraries}", "-lOrn_Hdl", "-o",
+                     program)
+            self.printed = self.run(program)
+        else:
+            self.run(*C_COMPILE, source, include, "-fsyntax-only")
 
     @staticmethod
     def check_printed(block: Block, printed: str | None) -> None:

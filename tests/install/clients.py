@@ -3,7 +3,7 @@
 
 The build under test is installed (shared), the library is built anew as a part of a client (static)
 and installed from there; both prefixes are then moved, and found with CMake and with pkg-config, by
-g++ and clang++, as C++17 and C++20.
+g++ and clang++, as C++17 and C++20. A program in C finds both prefixes with pkg-config.
 """
 
 from __future__ import annotations
@@ -22,6 +22,9 @@ SOURCE = FOLDER.parents[1]
 WARNINGS = ["-Wall", "-Wextra", "-Wpedantic", "-Wconversion", "-Wshadow", "-Werror"]
 COMPILERS = ("g++", "clang++")
 EDITIONS = ("17", "20")
+EXAMPLE = SOURCE / "examples" / "embed"
+C_FLAGS = ["-std=c99", "-Wall", "-Wextra", "-pedantic", "-Wstrict-prototypes", "-Werror"]
+C_COMPILERS = ("gcc", "clang")
 
 
 def run(*command: str | Path, **environment: str) -> str:
@@ -104,6 +107,19 @@ def find_with_pkg_config(prefix: Prefix, compiler: str, work: Path) -> int:
     return len(EDITIONS)
 
 
+def build_c_program(prefix: Prefix, compiler: str, work: Path) -> int:
+    """A program in C that finds the library with pkg-config."""
+    kind = ["--static"] if prefix.linkage == "static" else []
+    flags = shlex.split(run("pkg-config", *kind, "--cflags", "--libs", "orn_hdl",
+                            PKG_CONFIG_PATH=str(prefix.libraries / "pkgconfig")))
+    program = work / f"c-{prefix.linkage}-{compiler}"
+    run(compiler, *C_FLAGS, EXAMPLE / "netlist.c", "-o", program, *flags)
+    printed = run(program, EXAMPLE / "report.cmd", LD_LIBRARY_PATH=str(prefix.libraries))
+    if printed != (EXAMPLE / "netlist.expected").read_text():
+        raise SystemExit(f"clients: {program.name} printed {printed!r}")
+    return 1
+
+
 def main() -> int:
     parser = argparse.ArgumentParser(description=__doc__.splitlines()[0])
     parser.add_argument("build", type=Path, help="the shared build to install")
@@ -117,6 +133,8 @@ def main() -> int:
             for compiler in COMPILERS:
                 clients += find_with_cmake(prefix, compiler, work)
                 clients += find_with_pkg_config(prefix, compiler, work)
+            for compiler in C_COMPILERS:
+                clients += build_c_program(prefix, compiler, work)
     print(f"clients: {clients} built and run, {len(COMPILERS)} compilers, shared and static")
     return 0
 

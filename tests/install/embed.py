@@ -9,7 +9,8 @@ import sys
 from pathlib import Path
 
 FOLDER = Path(__file__).resolve().parents[2] / "examples" / "embed"
-RUNS = {"adder": ["2"], "report": ["report.cmd"], "chain": ["chain.cmd"]}
+RUNS = {"adder": ["2"], "report": ["report.cmd"], "chain": ["chain.cmd"],
+        "netlist": ["report.cmd"]}
 
 
 def main(programs: Path) -> int:

@@ -1,5 +1,5 @@
 """The installed headers: docs/interface.md lists each of them, and each compiles by itself as C++17,
-without a warning."""
+without a warning; that of the C interface as C99, too."""
 
 from __future__ import annotations
 
@@ -17,6 +17,8 @@ HEADERS = sorted(path.relative_to(INCLUDE).as_posix() for path in INCLUDE.rglob(
 PAGE = (PROJECT / "docs" / "interface.md").read_text()
 COMPILERS = [name for name in ("g++", "clang++") if shutil.which(name)]
 FLAGS = ["-std=c++17", "-fsyntax-only", "-Wall", "-Wextra", "-Wpedantic", "-Werror"]
+C_FLAGS = ["-std=c99", "-fsyntax-only", "-Wall", "-Wextra", "-pedantic", "-Wstrict-prototypes",
+           "-Werror"]
 
 
 def problems(compiler: str, header: str) -> str:
@@ -34,6 +36,16 @@ class Headers(unittest.TestCase):
             for (compiler, header), said in zip(runs, pool.map(lambda run: problems(*run), runs)):
                 with self.subTest(compiler=compiler, header=header):
                     self.assertEqual(said, "")
+
+    def test_the_c_header_compiles_by_itself(self) -> None:
+        program = "#include <Orn_Hdl/orn_hdl.h>\n" * 2 + "int main(void) { return 0; }\n"
+        compilers = [name for name in ("gcc", "clang") if shutil.which(name)]
+        self.assertTrue(compilers)
+        for compiler in compilers:
+            with self.subTest(compiler=compiler):
+                done = subprocess.run([compiler, *C_FLAGS, "-x", "c", "-I", str(INCLUDE), "-"],
+                                      input=program, capture_output=True, text=True, check=False)
+                self.assertEqual(done.stderr, "")
 
     def test_the_page_lists_each_with_its_purpose(self) -> None:
         listed = re.findall(r"^\| `([\w/]+\.h)` \| (\S.*) \|$", PAGE, re.M)

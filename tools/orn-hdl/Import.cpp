@@ -1,10 +1,10 @@
 #include "Import.h"
 
-#include "DesignOutput.h"
 #include "JsonImport.h"
-#include "LegalDesign.h"
 #include "NetlistImport.h"
 #include "Progress.h"
+#include "design/DesignOutput.h"
+#include "design/LegalDesign.h"
 #include "explain/FileKind.h"
 #include "explain/Syntax.h"
 #include "proof/Differences.h"

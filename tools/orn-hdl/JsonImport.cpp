@@ -1,7 +1,7 @@
 #include "JsonImport.h"
 
 #include "CellFiles.h"
-#include "DesignOutput.h"
+#include "design/DesignOutput.h"
 #include "explain/FileKind.h"
 #include "import/CellLibrary.h"
 #include "import/CellModels.h"

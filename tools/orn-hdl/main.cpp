@@ -199,7 +199,7 @@ public:
             "--version", "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
             "Print the version and exit");
         AddCommand(
-            "run", "Replay a command file and write netlists", [this] { return Tool::Run(run_); },
+            "run", "Replay a command file and write netlists", [this] { return Run(); },
             &CommandLine::AddRun);
         AddCommand(
             "import", "Import a netlist in Verilog, VHDL or JSON",
@@ -336,8 +336,21 @@ private:
         return "";
     }
 
+    Status Run() {
+        if (run_.files.size() == 1) {
+            run_.file = run_.files.front();
+            run_.files.clear();
+        }
+        return Tool::Run(run_);
+    }
+
     void AddRun(CLI::App& command) {
-        AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
+        command
+            .add_option("FILE", run_.files,
+                        "The command file; - is standard input. Of several, each is a design")
+            ->type_name("")
+            ->check(CheckFileName)
+            ->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
         AddFile(command, "--output-commands", run_.commandFile,

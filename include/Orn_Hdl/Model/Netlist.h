@@ -165,6 +165,7 @@ private:
     friend class ModelRegistry;
     friend class ReadAhead;
     friend class RememberedDummies;
+    friend class Removals;
     struct Implementation;
 
     /// Exchanges everything with another netlist but who is told of a new name.

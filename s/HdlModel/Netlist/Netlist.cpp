@@ -12,6 +12,7 @@
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Netlist/ReadAhead.h"
 #include "HdlModel/Netlist/RememberedDummies.h"
+#include "HdlModel/Netlist/Removals.h"
 #include "HdlModel/Objects/NameListener.h"
 #include "HdlModel/Objects/ObjectKey.h"
 #include "HdlModel/Objects/OwnerLink.h"
@@ -74,6 +75,7 @@ struct Netlist::Implementation {
     DummySignals dummies;
     std::string sourceFileName;
     NameListener* nameListener = nullptr;
+    std::uint64_t removals = 0;
 
     ~Implementation() {
         dummies.Clear();
@@ -137,6 +139,7 @@ struct Netlist::Implementation {
 
     /// Removes the object at a position. Classes derived from `T` may already be destroyed.
     template <class T> void LetGo(T& object, ObjectList<T>& objects, int place) noexcept {
+        ++removals;
         Forget(&object);
         byName.Remove(&object, GroupOf(&object));
         objects.TakeOut(place);
@@ -215,6 +218,11 @@ void Netlist::Swap(Netlist& other) noexcept {
     SwapAttrs(other);
     std::swap(implementation_, other.implementation_);
     std::swap(implementation_->nameListener, other.implementation_->nameListener);
+    // Neither netlist holds what it held before, and the numbers must not come again.
+    const std::uint64_t removals =
+        std::max(implementation_->removals, other.implementation_->removals) + 1;
+    implementation_->removals = removals;
+    other.implementation_->removals = removals;
     implementation_->TellName();
     other.implementation_->TellName();
 }
@@ -334,6 +342,10 @@ void ReadAhead::Note(Netlist& netlist, const StringArray& words) noexcept {
 
 const DummySignals& RememberedDummies::Of(const Netlist& netlist) noexcept {
     return netlist.implementation_->dummies;
+}
+
+std::uint64_t Removals::Count(const Netlist& netlist) noexcept {
+    return netlist.implementation_->removals;
 }
 
 Bus* Netlist::GetParentBus(const char* name) const {

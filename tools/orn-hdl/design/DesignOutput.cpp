@@ -1,4 +1,4 @@
-#include "DesignOutput.h"
+#include "design/DesignOutput.h"
 
 #include "NetlistText.h"
 #include "Orn_Hdl/Orn_Hdl.h"

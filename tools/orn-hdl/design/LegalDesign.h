@@ -37,12 +37,16 @@ private:
     void Plan(Orn_Hdl::Model& model);
     void RenameComponents(Orn_Hdl::Model& model);
     void RenamePins(Orn_Hdl::Model& model, Orn_Hdl::Component& component, std::size_t used) const;
+    const std::size_t* FindPlanned(const Orn_Hdl::Component& component) const;
     void FindProblem();
 
     const std::vector<Orn_Hdl::Model*> models_;
     std::vector<std::unique_ptr<Orn_Hdl::LegalNetlist>> netlists_;
-    /// The index of each model that is planned, by the name that it had.
+    /// The index of each model that is planned, by the name that it had without the marks of an
+    /// escaped name.
     std::unordered_map<std::string, std::size_t> planned_;
+    /// By the name as models compare it.
+    std::unordered_map<std::string, std::size_t> plannedKeys_;
     Port::NameScope names_;
     std::string problem_;
 };

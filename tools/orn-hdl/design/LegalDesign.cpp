@@ -1,12 +1,14 @@
-#include "LegalDesign.h"
+#include "design/LegalDesign.h"
 
 #include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Orn_Hdl/Model/Netlist.h"
+#include "diagnostics/NameKey.h"
 #include "import/NameRules.h"
 
 #include <algorithm>
 #include <string_view>
+#include <utility>
 
 namespace Tool {
 
@@ -42,23 +44,41 @@ void LegalDesign::Plan(Orn_Hdl::Model& model) {
         model.SetName(given);
         legal = plan();
     }
-    planned_.emplace(name, netlists_.size());
+    planned_.emplace(Import::NameRules::WithoutEscape(name), netlists_.size());
+    plannedKeys_.emplace(GetNameKey(name), netlists_.size());
     netlists_.push_back(std::move(legal));
+}
+
+/// The index of the model that a component is; null if it is none.
+const std::size_t* LegalDesign::FindPlanned(const Orn_Hdl::Component& component) const {
+    const std::string_view name = component.GetNameView();
+    auto found = planned_.find(std::string(Import::NameRules::WithoutEscape(name)));
+    if (found != planned_.end()) {
+        return &found->second;
+    }
+    found = plannedKeys_.find(GetNameKey(name));
+    return found == plannedKeys_.end() ? nullptr : &found->second;
 }
 
 /// Gives the components that are models of the design their names and the names of their ports.
 void LegalDesign::RenameComponents(Orn_Hdl::Model& model) {
+    std::vector<std::pair<Orn_Hdl::Component*, std::string>> renamed;
     for (Orn_Hdl::Component* component : model.GetNetlist()->GetComponentIterator()) {
-        const auto used = planned_.find(std::string(component->GetNameView()));
-        if (used == planned_.end()) {
+        const std::size_t* const used = FindPlanned(*component);
+        if (used == nullptr) {
             continue;
         }
-        RenamePins(model, *component, used->second);
-        const Orn_Hdl::Netlist& netlist = *models_[used->second]->GetNetlist();
-        const std::string name = netlists_[used->second]->GetName(netlist);
+        RenamePins(model, *component, *used);
+        const std::string name = netlists_[*used]->GetName(*models_[*used]->GetNetlist());
         if (name != component->GetNameView()) {
-            component->SetName(name);
+            renamed.emplace_back(component, name);
         }
+    }
+    for (const auto& [component, name] : renamed) {
+        // The netlist finds a component by the name under which it was added.
+        std::unique_ptr<Orn_Hdl::Component> taken = model.GetNetlist()->DetachComponent(component);
+        taken->SetName(name);
+        model.GetNetlist()->Add(taken.release());
     }
 }
 
@@ -70,13 +90,13 @@ void LegalDesign::RenamePins(Orn_Hdl::Model& model, Orn_Hdl::Component& componen
         if (port->IsPort()) {
             std::string name = netlists_[used]->GetName(*port).append(GetRange(old));
             if (name != old) {
-                names.emplace(old, std::move(name));
+                names.emplace(GetNameKey(old), std::move(name));
             }
         }
     }
     const auto rename = [&names](const Orn_Hdl::Iterator<Orn_Hdl::Pin*>& pins) {
         for (Orn_Hdl::Pin* pin : pins) {
-            const auto changed = names.find(std::string(pin->GetNameView()));
+            const auto changed = names.find(GetNameKey(pin->GetNameView()));
             if (changed != names.end()) {
                 pin->SetName(changed->second);
             }
