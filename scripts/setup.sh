@@ -7,7 +7,7 @@ build_packages=(g++ cmake make ninja-build libcli11-dev libsimdjson-dev nettle-d
     pkg-config)
 test_packages=(ccache clang clang-tidy clang-format cppcheck doxygen gcovr ghdl git graphviz iverilog
     libbenchmark-dev libclang-rt-14-dev libgtest-dev librapidcheck-dev llvm lintian locales man-db
-    python3 valgrind verilator vim-tiny yosys zsh)
+    python3 tcl-dev valgrind verilator vim-tiny yosys zsh)
 
 case "${1:-build}" in
 build) packages=("${build_packages[@]}") ;;

@@ -10,6 +10,7 @@ What follows the three back-quotes decides:
     orn               commands: replayed
     orn more          commands: replayed behind those of the blocks before
     verilog, vhdl     a passage of the netlist that the last commands give
+    tcl               run by tclsh with the installed package; a text block behind it is what it prints
     sh                run by bash; a text block behind it is what it prints
     LANGUAGE FILE     written to that file, for the blocks behind it
 
@@ -95,6 +96,7 @@ class Installed:
                 "PATH": f"{self.prefix / 'bin'}:{os.environ['PATH']}",
                 "CMAKE_PREFIX_PATH": str(self.prefix),
                 "PKG_CONFIG_PATH": str(self.libraries / "pkgconfig"),
+                "TCLLIBPATH": str(self.libraries / "tcltk"),
                 "LD_LIBRARY_PATH": str(self.libraries)}
 
 
@@ -143,6 +145,9 @@ class Page:
             netlist = (self.folder / f"block.{block.language}").read_text()
             if _without_ends(block.code) not in _without_ends(netlist):
                 raise Failed(f"is no passage of\n{netlist}")
+        elif block.language == "tcl":
+            (self.folder / "block.tcl").write_text(block.code)
+            self.printed = self.run("tclsh", "block.tcl")
         elif block.language == "sh":
             self.printed = self.run("bash", "-euo", "pipefail", "-c", block.code)
         else:
