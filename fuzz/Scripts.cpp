@@ -217,7 +217,7 @@ public:
             CheckAll();
         }
         if (when_ == When::EveryFewLines) {
-            CheckCommands(*model_, Again::Same);
+            CheckCommands(*model_);
         }
         return result_;
     }

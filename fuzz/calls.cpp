@@ -81,7 +81,7 @@ public:
             }
         }
         if (checks_ == Checks::All) {
-            Fuzz::CheckCommands(model_, Fuzz::Again::Any);
+            Fuzz::CheckCommands(model_);
         }
         Write();
         // Loose signals are destroyed before the design or after it.

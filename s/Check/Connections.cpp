@@ -2,7 +2,7 @@
 
 #include "Check/Bits.h"
 #include "Check/Context.h"
-#include "Port/Prefetch.h"
+#include "HdlModel/Netlist/SignalsAhead.h"
 #include "Writers/Text.h"
 
 #include <unordered_set>
@@ -13,28 +13,6 @@ namespace {
 
 /// How many instances ahead their signals are asked for.
 constexpr int SignalLead = 6;
-
-/// The pins of an instance some way ahead of the one in hand.
-class Ahead {
-public:
-    Ahead(const Netlist& netlist, int lead) noexcept : instances_(netlist.GetInstanceIterator()) {
-        for (int i = 0; i < lead; ++i) {
-            instances_.Next();
-        }
-    }
-    /// Calls `visit` with each signal, and goes one instance on.
-    template <class Visit> void Step(const Visit& visit) {
-        if (const Instance* const instance = instances_.GetCurrent()) {
-            for (const Pin* pin : instance->GetPinIterator()) {
-                visit(pin->GetSignal());
-            }
-            instances_.Next();
-        }
-    }
-
-private:
-    Iterator<Instance*> instances_;
-};
 
 bool IsInput(int direction) {
     return direction == Polarity::Input;
@@ -96,10 +74,9 @@ Finding* Walk::Add(RuleId rule, const Verdicts& verdicts, const Instance& instan
 }
 
 void Walk::CheckAll() {
-    // The signals of the pins are spread over the memory of a large design.
-    Ahead ahead(context_.netlist, SignalLead);
+    SignalsAhead ahead(context_.netlist, SignalLead);
     for (const Instance* instance : context_.netlist.GetInstanceIterator()) {
-        ahead.Step([](const Signal* signal) { Port::Prefetch(signal); });
+        ahead.Step();
         CheckInstance(*instance);
     }
 }

@@ -1,5 +1,6 @@
 #include "Proof/Comparison.h"
 
+#include "HdlModel/Objects/ObjectKey.h"
 #include "Port/Ascii.h"
 #include "Proof/Meaning.h"
 
@@ -14,6 +15,9 @@ using Readers::Quoted;
 using std::string_view;
 
 namespace {
+
+/// How many instances ahead of the present one their signals are prefetched.
+constexpr int Lead = 4;
 
 std::string BaseOf(const Signal& signal) {
     return std::string(ReadRun(signal.GetNameView()).base);
@@ -71,8 +75,9 @@ bool IsOpen(const Pin& pin) {
 Comparison::Comparison(const Netlist& design, const HdlOptions& options, Language language,
                        Findings& findings)
     : design_(design), options_(options), language_(language), findings_(findings),
-      assignments_(design, language, findings), parameters_(design, options, language, findings),
-      signals_(design.GetSignalIterator()), instances_(design.GetInstanceIterator()) {}
+      shared_(design, language), assignments_(design, language, findings),
+      parameters_(design, options, language, findings), signals_(design.GetSignalIterator()),
+      instances_(design.GetInstanceIterator()), ahead_(design, Lead) {}
 
 /// The name that the reader finds for one of the design.
 string_view Comparison::NameInFile(string_view name) const noexcept {
@@ -85,12 +90,11 @@ bool Comparison::IsNothing(const Signal& signal) const noexcept {
            (language_ == Language::Vhdl && Port::EqualIgnoringCase(signal.GetNameView(), "open"));
 }
 
-/// Whether a signal has the name in the eyes of the language.
-bool Comparison::IsTakenBySignal(string_view name) const {
-    return language_ == Language::Vhdl
-               ? design_.GetSignal(name) != nullptr ||
-                     design_.GetParentBus(std::string(name).c_str()) != nullptr
-               : FindInDesign(name) != nullptr;
+/// Whether the declaration of a signal bears the name.
+bool Comparison::IsDeclaredAs(const Signal& signal, string_view name) const noexcept {
+    const string_view full = signal.GetNameView();
+    return NameInFile(full) == name ||
+           (signal.GetSignalType() == SignalTypeBus && ReadRun(full).base == name);
 }
 
 void Comparison::TakeModule(string_view name, const Place& place) {
@@ -145,7 +149,9 @@ Signal* Comparison::Declare(const std::string& name, const std::optional<Readers
         signals_ = design_.GetSignalIterator();
     }
     const Signal* const next = NextDeclared();
-    Signal* const own = FindInDesign(name);
+    const bool isNext = next != nullptr && IsDeclaredAs(*next, name) && !shared_.Contains(name);
+    // The signals are the netlist's, which nobody changes here.
+    Signal* const own = isNext ? const_cast<Signal*>(next) : FindInDesign(name);
     if (own == nullptr || !own->IsNeededToDeclared() || own->IsPort() != isAmongPorts_) {
         findings_.Add(Quoted(name) + " is declared as " + ShowDirection(direction) +
                           ", the design has no such signal",
@@ -165,6 +171,9 @@ Signal* Comparison::Declare(const std::string& name, const std::optional<Readers
         SkipTo(*own, place);
     }
     signals_.Next();
+    if (ObjectKey::Get(*own) != own->GetNameView()) {
+        renamed_.emplace(name, own);
+    }
     parameters_.AddSignal(*own);
     return CheckDeclared(*own, range, direction, place) ? own : DeclareStranger(name, range);
 }
@@ -206,6 +215,12 @@ Signal* Comparison::DeclareStranger(const std::string& name,
 
 /// The signal of the design that has the name in the netlist: exactly, letter case counts.
 Signal* Comparison::FindInDesign(string_view name) const {
+    if (!renamed_.empty()) {
+        const auto found = renamed_.find(std::string(name));
+        if (found != renamed_.end()) {
+            return found->second;
+        }
+    }
     const auto find = [this](string_view spelled) -> Signal* {
         Signal* const signal = design_.GetSignal(spelled);
         if (signal != nullptr && signal->GetNameView() == spelled) {
@@ -366,6 +381,7 @@ void Comparison::BeginInstance(string_view name, const Readers::ModuleHead& head
     EndInstance();
     parameters_.EndInstance(place_);
     place_ = place;
+    ahead_.Step();
     const auto isNamed = [this, name](const Instance& instance) {
         return NameInFile(instance.GetNameView()) == name;
     };
@@ -410,8 +426,7 @@ void Comparison::CheckInstance(const Instance& instance, const Readers::ModuleHe
                       place, CauseOf(instance));
     }
     // Another object of the name is what the name means elsewhere.
-    if (design_.GetInstance(instance.GetNameView()) != &instance ||
-        IsTakenBySignal(instance.GetNameView())) {
+    if (shared_.Contains(NameInFile(instance.GetNameView()))) {
         findings_.Add("the name of the instance " + Quoted(instance.GetNameView()) +
                           " is that of another object, too",
                       place, CauseOf(instance));

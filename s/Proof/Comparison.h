@@ -1,11 +1,13 @@
 // A netlist that is read, compared with the design that it was written from.
 #pragma once
 
+#include "HdlModel/Netlist/SignalsAhead.h"
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Options.h"
 #include "Proof/Assignments.h"
 #include "Proof/Findings.h"
 #include "Proof/Parameters.h"
+#include "Proof/SharedNames.h"
 #include "Readers/NetlistSink.h"
 
 #include <string>
@@ -53,7 +55,7 @@ public:
 private:
     std::string_view NameInFile(std::string_view name) const noexcept;
     bool IsNothing(const Signal& signal) const noexcept;
-    bool IsTakenBySignal(std::string_view name) const;
+    bool IsDeclaredAs(const Signal& signal, std::string_view name) const noexcept;
     Signal* FindInDesign(std::string_view name) const;
     const Signal* NextDeclared();
     Signal* DeclareStranger(const std::string& name, const std::optional<Readers::Range>& range);
@@ -79,6 +81,7 @@ private:
     const HdlOptions& options_;
     const Language language_;
     Findings& findings_;
+    const SharedNames shared_;
     Assignments assignments_;
     Parameters parameters_;
 
@@ -87,11 +90,14 @@ private:
     Iterator<Signal*> signals_;
     bool isAmongPorts_ = true;
     /// \}
+    /// Signals that the design finds by their former names, as far as they have been declared.
+    std::unordered_map<std::string, Signal*> renamed_;
     /// What the netlist declares and the design does not have, or in another form.
     Netlist strangers_;
     bool hasStrangers_ = false;
 
     Iterator<Instance*> instances_;
+    SignalsAhead ahead_;
     /// The instance in the design; null when it has none of the name.
     const Instance* instance_ = nullptr;
     std::vector<const Pin*> pins_;

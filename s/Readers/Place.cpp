@@ -117,7 +117,10 @@ std::string TextOf(const Files& files, const Place& place) {
 void FailAt(const Files& files, const Place& place, std::string_view text) {
     const std::string line =
         place.line == 0 ? std::string() : ShowLine(files.GetName(place.file), place);
-    Fail(ReaderUnit, __LINE__, "%s: error: %s\n%s", {TextOf(files, place), text, line});
+    // A text may quote a character of the file, and a message with a NUL would end there.
+    std::string printable(text);
+    ReplaceControls(printable);
+    Fail(ReaderUnit, __LINE__, "%s: error: %s\n%s", {TextOf(files, place), printable, line});
 }
 
 std::string Quoted(std::string_view name) {

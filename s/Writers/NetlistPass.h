@@ -1,11 +1,11 @@
 // The common part of the writers of all languages.
 #pragma once
 
+#include "HdlModel/Netlist/SignalsAhead.h"
 #include "Orn_Hdl/Language.h"
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Options.h"
 #include "Orn_Hdl/Streams.h"
-#include "Port/Prefetch.h"
 #include "Writers/Generics.h"
 #include "Writers/SignalLists.h"
 #include "Writers/Text.h"
@@ -69,21 +69,11 @@ void NetlistPass::WriteAssignments(const SignalLists& signals, const WriteConsta
     }
 }
 
-/// The signals of the pins are spread over the memory of a large design. They are prefetched a few
-/// instances ahead, because waiting for them takes a seventh of the time of a Verilog write.
 template <class Write> void NetlistPass::ForEachInstance(const Write& write) const {
     constexpr int Lead = 4;
-    Iterator<Instance*> ahead = netlist_.GetInstanceIterator();
-    for (int i = 0; i < Lead; ++i) {
-        ahead.Next();
-    }
+    SignalsAhead ahead(netlist_, Lead);
     for (const Instance* instance : netlist_.GetInstanceIterator()) {
-        if (const Instance* const coming = ahead.GetCurrent()) {
-            for (const Pin* pin : coming->GetPinIterator()) {
-                Port::Prefetch(pin->GetSignal());
-            }
-            ahead.Next();
-        }
+        ahead.Step();
         write(*instance);
     }
 }

@@ -1,4 +1,5 @@
-"""Writes everything that is made from the command table, or checks that it is current.
+"""Writes everything that is made from the command table, and the models of cells, or checks that it is
+current.
 
 python3 share/generator [--check] TOOL
 """
@@ -11,6 +12,7 @@ from datetime import datetime
 from email.utils import parsedate_to_datetime
 from pathlib import Path
 
+import cells
 import completions
 import editors
 import manuals
@@ -46,6 +48,7 @@ def generate(tool: Path) -> dict[str, str]:
         "share/vim/vimfiles/syntax/orn-hdl.vim": editors.vim_syntax(language),
         "share/vim/vimfiles/ftdetect/orn-hdl.vim": editors.vim_detect(language),
         "share/orn-hdl/orn-hdl.tmLanguage.json": editors.textmate(language),
+        **cells.files(),
     }
 
 

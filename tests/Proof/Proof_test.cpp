@@ -282,6 +282,42 @@ TEST_F(ProofTest, NoMoreDifferencesAreLookedForThanAreTold) {
     EXPECT_EQ(Compare().size(), Proof::MostDifferences);
 }
 
+TEST_F(ProofTest, RenamedObjectsAreKnownByTheirNewNames) {
+    model_.GetInstance("U1")->SetName("first");
+    model_.GetSignal("n1")->SetName("middle");
+    Write();
+    EXPECT_TRUE(Compare().empty()) << Compare().front().message;
+}
+
+TEST_F(ProofTest, NamesThatDifferInLetterCaseAreOneInVhdlAlone) {
+    model_.GetInstance("U1")->SetName("u2");
+    Write();
+    EXPECT_TRUE(Compare().empty()) << Compare().front().message;
+    model_.ExecuteLine("WRITE VHDL -NOHEADER " + (folder_ / "top.vhd"));
+    EXPECT_FALSE(Proof::Compare((folder_ / "top.vhd").c_str(), Language::Vhdl, *model_.GetNetlist(),
+                                *model_.GetOptions())
+                     .empty());
+}
+
+TEST_F(ProofTest, ANameOfTwoObjectsIsFound) {
+    model_.GetInstance("U1")->SetName("U2");
+    Write();
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message,
+              "the name of the instance \"U2\" is that of another object, too");
+    model_.GetInstance("U1")->SetName("n1");
+    Write();
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message,
+              "the name of the instance \"n1\" is that of another object, too");
+}
+
+TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {
+    model_.GetSignal("T")->SetName("n1");
+    Write();
+    EXPECT_FALSE(Compare().empty());
+}
+
 TEST_F(ProofTest, AFileThatIsNotThereIsAnException) {
     EXPECT_NE(FailureOf([this] { Compare(); }).find("Cannot read "), std::string::npos);
 }

@@ -871,6 +871,17 @@ TEST(VhdlErrors, ShowTheLineAndTheColumn) {
         "top.vhd:4:3: error: the signal \"a\" is not declared\n  a <= 'X';\n  ^\n");
 }
 
+TEST(VhdlErrors, AreWholeWhereTheyQuoteANul) {
+    VhdlTextReader text;
+    const std::string failure =
+        text.GetFailure(std::string("entity m is end;\n"
+                                    "architecture a of m is signal v : bit_vector(1 downto 0);\n"
+                                    "begin\n  v <= \"1") +
+                        '\0' + "\";\nend;\n");
+    EXPECT_EQ(failure, "top.vhd:4:8: error: the value ' ': a model has the values 0 and 1 alone\n"
+                       "  v <= \"1 \";\n       ^\n");
+}
+
 TEST(VhdlErrors, OfTheFileAsAWhole) {
     VhdlTextReader text;
     EXPECT_EQ(text.GetFailure(""),

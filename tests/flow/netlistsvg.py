@@ -29,9 +29,8 @@ IMPORTED = ["analog/and", "analog/common_emitter_full", "analog/mcu", "analog/re
 WITH_A_COMMA = "analog/vcc_and_gnd"
 REFUSED = {
     "digital/hyperedges": "modules.hyperedges.ports.i1.bits[0]: two input ports share this bit",
-    "digital/mux4": 'modules.MUX4.cells.mux0.type: "MUX2" is a module with contents; flatten the '
-                    "design first",
 }
+WITH_HIERARCHY = "digital/mux4"
 # Schematics have open nets, and nets that several parts drive.
 OPEN_INPUT = "dangling input port"
 OPEN_NET = "has no driver|conflicting drivers|^    port "
@@ -41,7 +40,7 @@ samples: dict[str, Path] = {}
 
 class Samples(ImportTest):
     def test_every_sample_has_its_outcome(self) -> None:
-        self.assertEqual(sorted(samples), sorted([*IMPORTED, *REFUSED, WITH_A_COMMA]))
+        self.assertEqual(sorted(samples), sorted([*IMPORTED, *REFUSED, WITH_A_COMMA, WITH_HIERARCHY]))
 
     def test_imported(self) -> None:
         for name in IMPORTED:
@@ -76,8 +75,15 @@ class Samples(ImportTest):
         text = samples[WITH_A_COMMA].read_text("utf-8")
         self.judge_sample(json.loads(re.sub(r",(\s*})", r"\1", text)))
 
-    def test_refused_for_the_hierarchy_only(self) -> None:
-        contents = json.loads(samples["digital/mux4"].read_text("utf-8"))
+    def test_hierarchy(self) -> None:
+        self.write("d.json", samples[WITH_HIERARCHY].read_text("utf-8"))
+        outcome = self.run_tool("import", "d.json", "--top", "MUX4", "--verilog", "-", "--no-header")
+        self.assertEqual(outcome.status, 0, outcome.err)
+        self.assertEqual(re.findall(r"^module (\w+)", outcome.out, re.MULTILINE),
+                         ["MUX2", "MUX4"])
+
+    def test_black_box_in_place_of_a_module(self) -> None:
+        contents = json.loads(samples[WITH_HIERARCHY].read_text("utf-8"))
         contents["modules"]["MUX2"]["attributes"] = {"blackbox": "1"}
         (self.folder / "d.json").write_text(json.dumps(contents), encoding="utf-8")
         self.import_file("d.json", "--top", "MUX4")

@@ -155,14 +155,6 @@ class Verilog(CellsTest):
                                   "--cells", "a.v", "--cells", "b.v", allowed="dangling|floating")
         self.assertEqual(done.lines("ADD PIN"), ["X A Input", "Y Q Output"])
 
-    def test_module_with_contents_stays_one(self) -> None:
-        self.write("c.v", "module sub(input I); endmodule")
-        self.refuse(design({}, {"u": cell("sub", "i", I=["0"])},
-                           sub={"ports": {"I": port("input", 2)},
-                                "cells": {"v": cell("LEAF", "i", I=[2])}}),
-                    'modules.top.cells.u.type: "sub" is a module with contents; flatten the design '
-                    "first", "--cells", "c.v")
-
     def test_errors(self) -> None:
         for text, line, message in (
                 ("\nmodule", 2, "the name of a module is expected"),

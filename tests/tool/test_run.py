@@ -545,7 +545,7 @@ class Usage(ToolTest):
     def test_usage_errors(self) -> None:
         self.expect_usage("A subcommand is required")
         self.expect_usage("FILE is required", "run")
-        self.expect_usage("The following argument was not expected: b", "run", "a", "b")
+        self.expect_usage("The following argument was not expected: b", "stats", "a", "b")
         self.expect_usage("unknown option --nothing", "run", "a", "--nothing")
         self.expect_usage("unknown option --nothing", "run", "a", "--nothing=1")
         self.expect_usage("The following argument was not expected: --verlog", "run", "a", "--",

@@ -3,6 +3,8 @@
 #include "JsonImport.h"
 #include "NetlistImport.h"
 #include "Progress.h"
+#include "design/DesignOutput.h"
+#include "design/LegalDesign.h"
 #include "explain/FileKind.h"
 #include "explain/Syntax.h"
 #include "proof/Differences.h"
@@ -12,8 +14,10 @@
 #include "Port/Ascii.h"
 
 #include <algorithm>
+#include <filesystem>
 #include <iterator>
 #include <string_view>
+#include <system_error>
 #include <utility>
 
 namespace Tool {
@@ -42,10 +46,26 @@ ImportFormat GetFormat(const ImportOptions& options) {
     return options.format.value_or(told);
 }
 
+/// The first option that applies to JSON netlists alone; empty for none.
+std::string_view FindJsonOption(const ImportOptions& options) {
+    if (!options.unknownAs.empty()) {
+        return "--x-as";
+    }
+    if (!options.modules.empty()) {
+        return "--module";
+    }
+    if (!options.cellModels.empty()) {
+        return "--write-cells";
+    }
+    return options.vhdl.configuration ? "--configuration"
+           : options.vhdl.ieeeAlone   ? "--no-kestra"
+                                      : "";
+}
+
 /// The first option that does not apply to the format; empty if all do.
 std::string_view FindForeignOption(const ImportOptions& options, ImportFormat format) {
     if (format != ImportFormat::Json) {
-        return options.unknownAs.empty() ? "" : "--x-as";
+        return FindJsonOption(options);
     }
     if (options.comments) {
         return "--comments";
@@ -53,7 +73,37 @@ std::string_view FindForeignOption(const ImportOptions& options, ImportFormat fo
     return !options.includeFolders.empty() ? "-I" : !options.macros.empty() ? "-D" : "";
 }
 
+DesignModel MakeDesignModel(Orn_Hdl::Model& model, const ImportOptions& options,
+                            Orn_Hdl::LegalNetlist* legal, Reporter& reporter) {
+    model.GetOptions()->verify = options.verify;
+    return {&model, legal,
+            [&reporter](const std::vector<Orn_Hdl::Proof::Difference>& differences,
+                        const std::string& file) {
+                return ReportDifferences(differences, file, reporter);
+            }};
+}
+
+/// Whether the command file is a folder, for one file a module.
+bool IsFolder(const std::string& file) {
+    std::error_code unknown;
+    return !file.empty() && (file.back() == '/' || std::filesystem::is_directory(file, unknown));
+}
+
 } // namespace
+
+std::string GetCommandFolder(const ImportOptions& options) {
+    if (options.commandFile.empty() || IsFolder(options.commandFile)) {
+        return options.commandFile;
+    }
+    return options.outputs.folder;
+}
+
+std::string GetCommandList(const ImportOptions& options) {
+    if (IsFolder(options.commandFile)) {
+        return (std::filesystem::path(options.commandFile) / "commands.txt").string();
+    }
+    return options.outputs.folder.empty() ? std::string() : options.commandFile;
+}
 
 std::string DescribeOtherFile(const std::string& beginning) {
     const std::size_t first = beginning.find_first_not_of(" \t\r\n");
@@ -108,12 +158,33 @@ bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file
 Status WriteNetlists(Orn_Hdl::Model& model, const ImportOptions& options,
                      Orn_Hdl::LegalNetlist* legal, Reporter& reporter) {
     Progress progress(false, options.file);
-    model.GetOptions()->verify = options.verify;
-    return WriteOutputs(model, options.outputs, progress, legal,
-                        [&reporter](const std::vector<Orn_Hdl::Proof::Difference>& differences,
-                                    const std::string& file) {
-                            return ReportDifferences(differences, file, reporter);
-                        });
+    return WriteDesign({MakeDesignModel(model, options, legal, reporter)}, options.outputs,
+                       progress);
+}
+
+Status WriteNetlists(const std::vector<Orn_Hdl::Model*>& models, const ImportOptions& options,
+                     Reporter& reporter) {
+    std::optional<LegalDesign> legal;
+    if (options.legal) {
+        legal.emplace(models);
+        bool isLegal = true;
+        for (std::size_t i = 0; i < models.size(); ++i) {
+            isLegal &= !TellWhyNotLegal(legal->Get(i), options.file, reporter);
+        }
+        if (!legal->GetProblem().empty()) {
+            reporter.Report(MakeFileDiagnostic(options.file, Severity::Error, legal->GetProblem()));
+        }
+        if (!isLegal || !legal->GetProblem().empty()) {
+            return Status::Failed;
+        }
+    }
+    std::vector<DesignModel> design;
+    for (std::size_t i = 0; i < models.size(); ++i) {
+        design.push_back(
+            MakeDesignModel(*models[i], options, legal ? &legal->Get(i) : nullptr, reporter));
+    }
+    Progress progress(false, options.file);
+    return WriteDesign(design, options.outputs, progress);
 }
 
 Status ImportDesign(const ImportOptions& options) {
@@ -123,6 +194,10 @@ Status ImportDesign(const ImportOptions& options) {
         Complain(std::string(foreign) + (format == ImportFormat::Json
                                              ? " does not apply to a JSON netlist; see --help"
                                              : " applies to JSON netlists alone; see --help"));
+        return Status::Usage;
+    }
+    if (!options.cellModels.empty() && GetNameLanguages(options) == NameLanguages::Verilog) {
+        Complain("--write-cells needs names that are legal in VHDL, too; see --names");
         return Status::Usage;
     }
     Reporter reporter(options.report);

@@ -4,6 +4,7 @@
 #include "Output.h"
 #include "Tool.h"
 #include "diagnostics/Reporter.h"
+#include "import/ImportRules.h"
 #include "import/NameRules.h"
 
 #include <optional>
@@ -29,7 +30,9 @@ struct ImportOptions {
     /// The module to import; empty for the one marked as top in JSON, and for the only one that no
     /// other instantiates in the languages.
     std::string top;
-    /// The command file to write; empty for none.
+    /// The modules to import, in place of the top module and those that it uses.
+    std::vector<std::string> modules;
+    /// The command file to write; empty for none. A folder gets one file a module.
     std::string commandFile;
     Outputs outputs;
     /// The replacement of x and z, "0" or "1"; empty to reject them.
@@ -44,12 +47,16 @@ struct ImportOptions {
     std::optional<Import::NameLanguages> names;
     /// Reject a design whose ports cannot keep their names.
     bool keepPorts = false;
+    /// The clauses that VHDL gets, for JSON.
+    Import::VhdlClauses vhdl;
     /// Import the attributes of cells and nets.
     bool attributes = false;
     /// Import the comments of objects.
     bool comments = false;
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
+    /// The file for the simulation models of cells; empty for none.
+    std::string cellModels;
     /// Write legal netlists, or nothing.
     bool legal = false;
     /// Read each netlist back and compare it with the design before it replaces its file.
@@ -63,6 +70,10 @@ Status ImportDesign(const ImportOptions& options);
 /// The languages in which the names of an import must be legal: those asked for, or else those of
 /// the netlists. A command file can be written in both.
 Import::NameLanguages GetNameLanguages(const ImportOptions& options);
+/// The folder for one command file a module; empty for one command file.
+std::string GetCommandFolder(const ImportOptions& options);
+/// The file for the list of these command files; empty for none.
+std::string GetCommandList(const ImportOptions& options);
 /// Reports what keeps a netlist from being legal. \return whether anything does.
 bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file,
                      Reporter& reporter);
@@ -70,6 +81,10 @@ bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file
 /// \param legal writes the netlists legally; null for none.
 Status WriteNetlists(Orn_Hdl::Model& model, const ImportOptions& options,
                      Orn_Hdl::LegalNetlist* legal, Reporter& reporter);
+/// Writes the netlists of several models, legally if the options ask for it.
+/// \param models in the order of compilation.
+Status WriteNetlists(const std::vector<Orn_Hdl::Model*>& models, const ImportOptions& options,
+                     Reporter& reporter);
 /// What a file that is no JSON is, by its beginning; empty if that is not known, or if it may be
 /// JSON.
 std::string DescribeOtherFile(const std::string& beginning);

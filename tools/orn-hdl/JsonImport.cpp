@@ -1,24 +1,31 @@
 #include "JsonImport.h"
 
 #include "CellFiles.h"
+#include "design/DesignOutput.h"
 #include "explain/FileKind.h"
 #include "import/CellLibrary.h"
+#include "import/CellModels.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
+#include "import/DesignUnits.h"
 #include "import/EmitNetlist.h"
+#include "import/Hierarchy.h"
 #include "import/ImportedNetlist.h"
 #include "import/ModelSink.h"
 #include "import/NameMap.h"
 #include "import/TopModule.h"
 
 #include "Orn_Hdl/Engine.h"
-#include "Orn_Hdl/LegalNetlist.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
+#include "Port/NameScope.h"
 
+#include <algorithm>
 #include <cstddef>
+#include <memory>
 #include <optional>
 #include <utility>
+#include <vector>
 
 namespace Tool {
 
@@ -33,42 +40,154 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     return UnknownValues(options.unknownAs == "1" ? One : Zero);
 }
 
-Status WriteImported(const ImportedNetlist& netlist, const ImportOptions& options,
-                     Reporter& reporter) {
+/// The modules that are written, in the order of compilation.
+using Netlists = std::vector<ImportedNetlist>;
+
+/// The command files of an import.
+class CommandFiles {
+public:
+    /// \param netlists must outlive this object, as must the options.
+    CommandFiles(const Netlists& netlists, const ImportOptions& options);
+
+    /// Writes the text of all files. The files on disk do not change before `Commit`.
+    Status Write();
+    Status Commit();
+
+private:
+    const Netlists& netlists_;
+    /// The list of the files; empty for none.
+    const std::string list_;
+    const std::string folder_;
+    std::vector<std::string> names_;
+    std::vector<std::unique_ptr<OutputFile>> files_;
+};
+
+CommandFiles::CommandFiles(const Netlists& netlists, const ImportOptions& options)
+    : netlists_(netlists), list_(GetCommandList(options)), folder_(GetCommandFolder(options)) {
+    if (folder_.empty()) {
+        names_.push_back(options.commandFile);
+        return;
+    }
+    for (const ImportedNetlist& netlist : netlists) {
+        names_.push_back(netlist.name);
+    }
+    names_ = MakeFileNames(names_, folder_, ".cmd");
+}
+
+Status CommandFiles::Write() {
+    Status status = folder_.empty() ? Status::Success : MakeFolder(folder_);
+    for (std::size_t i = 0; i < names_.size() && status == Status::Success; ++i) {
+        files_.push_back(std::make_unique<OutputFile>(names_[i]));
+        if (Port::Stream* const out = files_.back()->GetStream()) {
+            CommandSink sink(*out);
+            EmitNetlist(netlists_[i], sink);
+        }
+        status = files_.back()->Flush();
+    }
+    return status;
+}
+
+Status CommandFiles::Commit() {
+    Status status = Status::Success;
+    for (const std::unique_ptr<OutputFile>& file : files_) {
+        status = Worse(status, file->Commit());
+    }
+    return status == Status::Success && !list_.empty() ? WriteFileList(list_, names_) : status;
+}
+
+Status WriteImported(const Netlists& netlists, const ImportOptions& options, Reporter& reporter) {
     if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
     Orn_Hdl::Engine engine;
-    engine.CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
-    Orn_Hdl::Model& model = *engine.GetModel(netlist.name.c_str());
-    ModelSink sink(model);
-    EmitNetlist(netlist, sink);
-    if (!options.legal) {
-        return WriteNetlists(model, options, nullptr, reporter);
-    }
-    Orn_Hdl::LegalNetlist legal(*model.GetNetlist(), *model.GetOptions());
-    return TellWhyNotLegal(legal, options.file, reporter)
-               ? Status::Failed
-               : WriteNetlists(model, options, &legal, reporter);
-}
-
-/// Writes all files. The command file and the name map are replaced last, and only if every file
-/// was written.
-Status WriteAll(const ImportedNetlist& netlist, const ImportOptions& options, Reporter& reporter) {
-    OutputFile commands(options.commandFile);
-    if (Port::Stream* out = commands.GetStream()) {
-        CommandSink sink(*out);
+    std::vector<Orn_Hdl::Model*> models;
+    for (const ImportedNetlist& netlist : netlists) {
+        engine.CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
+        models.push_back(engine.GetModel(netlist.name.c_str()));
+        ModelSink sink(*models.back());
         EmitNetlist(netlist, sink);
     }
+    return WriteNetlists(models, options, reporter);
+}
+
+/// Writes all files. The command files and the name map are replaced last, and only if every file
+/// was written.
+Status WriteAll(const Netlists& netlists, const ImportOptions& options, Reporter& reporter) {
+    CommandFiles commands(netlists, options);
     OutputFile nameMap(options.nameMap);
     if (Port::Stream* out = nameMap.GetStream()) {
-        WriteNameMap(netlist, *out);
+        for (const ImportedNetlist& netlist : netlists) {
+            WriteNameMap(netlist, *out);
+        }
     }
-    Status status = Worse(commands.Flush(), nameMap.Flush());
+    Status status = Worse(commands.Write(), nameMap.Flush());
     if (status == Status::Success) {
-        status = WriteImported(netlist, options, reporter);
+        status = WriteImported(netlists, options, reporter);
     }
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
+}
+
+/// The modules to import: those asked for, or the top module.
+std::vector<Module*> FindWanted(ImportedDesign& design, const Hierarchy& hierarchy,
+                                const ImportOptions& options) {
+    if (options.modules.empty()) {
+        return {&FindTop(design, options.top)};
+    }
+    std::vector<Module*> wanted;
+    for (const std::string& name : options.modules) {
+        Module& module = FindTop(design, name);
+        if (std::find(hierarchy.GetModules().begin(), hierarchy.GetModules().end(), &module) ==
+            hierarchy.GetModules().end()) {
+            Fail(JsonPath("modules").AddKey(name), "the module has no contents");
+        }
+        wanted.push_back(&module);
+    }
+    return wanted;
+}
+
+/// The configuration of a module stands beside the entities.
+void CheckConfigurationNames(const Netlists& netlists) {
+    Port::NameScope names;
+    for (const ImportedNetlist& netlist : netlists) {
+        names.Claim(netlist.name);
+    }
+    for (const ImportedNetlist& netlist : netlists) {
+        const std::string name = "CFG_" + netlist.name;
+        if (names.IsTaken(name)) {
+            Fail(JsonPath("modules").AddKey(netlist.top.name),
+                 "another module has the name of its configuration, " + Quote(name));
+        }
+    }
+}
+
+/// Makes the netlists of the modules to import and of all modules that these use; of modules that
+/// were asked for by their names, these alone.
+Netlists MakeNetlists(ImportedDesign& design, const ImportOptions& options, ImportRules rules,
+                      Warnings& warnings) {
+    const Hierarchy hierarchy(design);
+    const std::vector<Module*> wanted = FindWanted(design, hierarchy, options);
+    std::optional<DesignUnits> units;
+    const std::vector<Module*> modules = hierarchy.Order(wanted);
+    if (modules.size() > 1 || !options.modules.empty()) {
+        units.emplace(design, hierarchy, rules.names, warnings);
+        rules.units = &*units;
+    }
+    Netlists netlists;
+    for (Module* module : modules) {
+        ImportedNetlist netlist = MakeNetlist(design, *module, rules, warnings);
+        if (options.modules.empty() ||
+            std::find(wanted.begin(), wanted.end(), module) != wanted.end()) {
+            netlists.push_back(std::move(netlist));
+        }
+    }
+    if (options.vhdl.configuration) {
+        CheckConfigurationNames(netlists);
+    }
+    if (netlists.size() > 1 && !options.commandFile.empty() && GetCommandFolder(options).empty()) {
+        throw Error("the design has " + std::to_string(netlists.size()) +
+                    " modules, and a command file holds one: -o DIR/ writes one file a module");
+    }
+    return netlists;
 }
 
 /// \param beginning the beginning of the file.
@@ -89,12 +208,20 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
     try {
         const std::unique_ptr<ImportedDesign> design =
             ReadDesign(std::move(text), options.attributes);
-        Module& top = FindTop(*design, options.top);
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
-        const ImportRules rules{GetUnknownValues(options), names, options.keepPorts, library};
-        const ImportedNetlist netlist = MakeNetlist(*design, top, rules, warnings);
-        const Status written = WriteAll(netlist, options, reporter);
+        const ImportRules rules{
+            GetUnknownValues(options), names, options.keepPorts, library, nullptr, options.vhdl};
+        const Netlists netlists = MakeNetlists(*design, options, rules, warnings);
+        OutputFile models(options.cellModels);
+        if (Port::Stream* out = models.GetStream()) {
+            WriteCellModels(netlists, *out, warnings);
+        }
+        Status written = models.Flush();
+        if (written == Status::Success) {
+            written = WriteAll(netlists, options, reporter);
+        }
+        written = written == Status::Success ? models.Commit() : written;
         for (std::string& warning : warnings.GetLines()) {
             reporter.Report(
                 MakeFileDiagnostic(options.file, Severity::Warning, std::move(warning)));

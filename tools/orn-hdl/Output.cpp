@@ -1,77 +1,38 @@
 #include "Output.h"
 
+#include "NetlistText.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Progress.h"
 
 #include <algorithm>
-#include <array>
 #include <cerrno>
-#include <cstdio>
-#include <memory>
-#include <string_view>
 
 namespace Tool {
 
 namespace {
 
-void WriteNetlist(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::Language language,
-                  Orn_Hdl::OutStream& out) {
-    if (legal != nullptr) {
-        legal->Write(language, out);
-        return;
-    }
-    switch (language) {
-    case Orn_Hdl::Language::Verilog:
-        Orn_Hdl::VerilogNetlister(out).WriteNetlist(model.GetNetlist(), *model.GetOptions());
-        break;
-    case Orn_Hdl::Language::Vhdl:
-        Orn_Hdl::VhdlNetlister(out).WriteNetlist(model.GetNetlist(), model.GetOptions());
-        break;
-    }
-}
-
-Orn_Hdl::Proof::Written GetWritten(Orn_Hdl::Model& model, const Orn_Hdl::LegalNetlist* legal) {
-    return legal != nullptr
-               ? Orn_Hdl::Proof::Written{legal->GetWrittenNetlist(), legal->GetWrittenOptions()}
-               : Orn_Hdl::Proof::Written{*model.GetNetlist(), *model.GetOptions()};
-}
-
-/// Copies a file from its start to standard output.
-Status PrintFile(std::FILE* file) {
-    std::rewind(file);
-    std::array<char, 65536> piece;
-    while (const std::size_t count = std::fread(piece.data(), 1, piece.size(), file)) {
-        if (const Status status = Print(std::string_view(piece.data(), count));
-            status != Status::Success) {
-            return status;
-        }
-    }
-    return std::ferror(file) == 0 ? Status::Success : ComplainUnreadable("a temporary file", errno);
-}
-
 /// Writes a netlist to standard output, by way of a temporary file: only a file that is opened by
 /// its name gets indentation, and standard output may be a socket, which cannot be opened.
 Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::Language language,
                    bool noHeader, Progress& progress) {
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::tmpfile(), &std::fclose);
-    if (file == nullptr) {
-        return ComplainUnwritable("a temporary file", errno);
+    const TemporaryFile file;
+    if (!file.IsOpen()) {
+        return Status::File;
     }
     progress.Writing("standard output");
     model.GetOptions()->writeHeader = !noHeader;
     Orn_Hdl::TextFileOutStream out;
-    const std::string name = "/dev/fd/" + std::to_string(fileno(file.get()));
-    if (out.Open(name.c_str(), Orn_Hdl::TextFileOutStream::Overwrite)) {
+    if (out.Open(file.GetName().c_str(), Orn_Hdl::TextFileOutStream::Overwrite)) {
         WriteNetlist(model, legal, language, out);
         out.Close();
     }
     if (model.GetOptions()->verify && out.GetError() == 0) {
         const Orn_Hdl::Proof::Written written = GetWritten(model, legal);
-        Orn_Hdl::Proof::Require(name.c_str(), "standard output", language, written.netlist,
-                                written.options);
+        Orn_Hdl::Proof::Require(file.GetName().c_str(), "standard output", language,
+                                written.netlist, written.options);
     }
     progress.Erase();
-    return out.GetError() == 0 ? PrintFile(file.get())
+    return out.GetError() == 0 ? file.Print()
                                : ComplainUnwritable("a temporary file", out.GetError());
 }
 

@@ -26,6 +26,9 @@ struct Outputs {
     /// The file of each language; "-" is standard output, and an empty name writes none.
     std::map<Orn_Hdl::Language, std::string> files;
     bool noHeader = false;
+    /// The folder for one file a model; empty for one file for all. With a folder, the files of the
+    /// languages are lists of these files.
+    std::string folder;
 
     /// Whether there is nothing to write.
     bool IsEmpty() const;

@@ -8,6 +8,7 @@
 #include "Progress.h"
 #include "check/Checker.h"
 #include "check/WriteGate.h"
+#include "design/RunDesign.h"
 #include "explain/FailureExplainer.h"
 #include "proof/Certificate.h"
 #include "proof/Differences.h"
@@ -168,7 +169,11 @@ std::string GetModelName(const std::string& file, const std::optional<std::strin
 CommandFile::CommandFile(const std::string& fileName, const ReportOptions& report,
                          Progress& shownProgress)
     : name(fileName), progress(shownProgress), lines(fileName, SystemFileName(fileName.c_str())),
-      reporter(report, [&shownProgress] { shownProgress.Erase(); }) {}
+      own_(std::in_place, report, [&shownProgress] { shownProgress.Erase(); }), reporter(*own_) {}
+
+CommandFile::CommandFile(const std::string& fileName, Reporter& shared, Progress& shownProgress)
+    : name(fileName), progress(shownProgress), lines(fileName, SystemFileName(fileName.c_str())),
+      reporter(shared) {}
 
 Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const WriteRules& rules,
                 Checking::WriteGate* gate, const WarningOptions* warnings,
@@ -197,15 +202,14 @@ Replayed Replay(Orn_Hdl::Model& model, CommandFile& file, bool keepGoing, const 
     return {replayer.GetStatus(), true, replayer.GetLineCount(), replayer.GetSlipCount()};
 }
 
-namespace {
-
-/// Reports differences at the lines of a command file, or at its last one.
 TellDifferences TellOf(CommandFile& file, std::uint64_t lines) {
     return [&file, lines](const std::vector<Orn_Hdl::Proof::Difference>& differences,
                           const std::string& netlist) {
         return ReportDifferences(differences, netlist, lines, file.lines, file.reporter);
     };
 }
+
+namespace {
 
 /// Writes the outputs and the table of names, or tells why there is no legal netlist.
 Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOptions& options,
@@ -294,6 +298,9 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
 } // namespace
 
 Status Run(const RunOptions& options) {
+    if (!options.files.empty()) {
+        return RunDesign(options);
+    }
     const auto isOut = [](const auto& output) { return output.second == "-"; };
     if (!options.certificate.empty() &&
         (options.file == "-" ||

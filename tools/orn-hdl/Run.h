@@ -11,6 +11,7 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <vector>
 
 namespace Orn_Hdl {
 class Model;
@@ -28,6 +29,8 @@ class WriteGate;
 struct RunOptions {
     /// The command file; "-" is standard input.
     std::string file;
+    /// The command files, if there are several; each becomes a model of its own.
+    std::vector<std::string> files;
     /// The name of the model; the default is the file's name without folder and extension.
     std::optional<std::string> model;
     Outputs outputs;
@@ -75,12 +78,22 @@ struct Replayed {
 struct CommandFile {
     /// \param fileName the file; "-" is standard input.
     CommandFile(const std::string& fileName, const ReportOptions& report, Progress& shownProgress);
+    /// One of several files, whose messages go to one reporter.
+    CommandFile(const std::string& fileName, Reporter& shared, Progress& shownProgress);
 
     const std::string name;
     Progress& progress;
     CommandLines lines;
-    Reporter reporter;
+
+private:
+    std::optional<Reporter> own_;
+
+public:
+    Reporter& reporter;
 };
+
+/// Reports differences at the lines of a command file, or at its last one.
+TellDifferences TellOf(CommandFile& file, std::uint64_t lines);
 
 /// Replays a command file into a model. Every line that fails, and every netlist that a line could
 /// not write, is reported with file and line; the replay ends there unless `keepGoing` is true.

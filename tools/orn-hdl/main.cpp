@@ -199,7 +199,7 @@ public:
             "--version", "orn-hdl " + std::string(Port::Version::getValue("version").GetView()),
             "Print the version and exit");
         AddCommand(
-            "run", "Replay a command file and write netlists", [this] { return Tool::Run(run_); },
+            "run", "Replay a command file and write netlists", [this] { return Run(); },
             &CommandLine::AddRun);
         AddCommand(
             "import", "Import a netlist in Verilog, VHDL or JSON",
@@ -336,8 +336,21 @@ private:
         return "";
     }
 
+    Status Run() {
+        if (run_.files.size() == 1) {
+            run_.file = run_.files.front();
+            run_.files.clear();
+        }
+        return Tool::Run(run_);
+    }
+
     void AddRun(CLI::App& command) {
-        AddFile(command, "FILE", run_.file, "The command file; - is standard input")->required();
+        command
+            .add_option("FILE", run_.files,
+                        "The command file; - is standard input. Of several, each is a design")
+            ->type_name("")
+            ->check(CheckFileName)
+            ->required();
         command.add_option("--model", run_.model, "The name of the design")->type_name("NAME");
         AddOutputs(command, run_.outputs);
         AddFile(command, "--output-commands", run_.commandFile,
@@ -380,9 +393,21 @@ private:
              {"vhdl", Tool::ImportFormat::Vhdl},
              {"json", Tool::ImportFormat::Json}},
             "What the netlist is written in; the default is what its extension says");
-        command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
-        AddFile(command, "-o", import_.commandFile, "Write the design as a command file");
+        CLI::Option* top =
+            command.add_option("--top", import_.top, "The module to import")->type_name("NAME");
+        AddRepeated(command, "--module", import_.modules,
+                    "Of a JSON netlist, import this module alone; may be repeated")
+            ->type_name("NAME")
+            ->excludes(top);
+        AddFile(command, "-o", import_.commandFile,
+                "Write the design as a command file; DIR/ gets one file a module");
         AddOutputs(command, import_.outputs);
+        command
+            .add_option(
+                "--output-dir", import_.outputs.folder,
+                "Write one file a module into DIR, and a list of them in place of each file")
+            ->type_name("DIR")
+            ->check(CheckFileName);
         AddRepeated(command, "-l,--library,--cells", import_.libraries,
                     "Read cell types: Verilog, VHDL, Liberty or JSON; may be repeated")
             ->type_name("FILE")
@@ -401,6 +426,11 @@ private:
                                               "Make names legal in these languages")
             ->type_name("verilog|vhdl|both")
             ->check(CheckNameLanguages);
+        AddChoice<bool>(command, "--configuration", import_.vhdl.configuration,
+                        {{"none", false}, {"work", true}},
+                        "Configurations in VHDL: none, or one a module, for those in WORK");
+        command.add_flag("--no-kestra", import_.vhdl.ieeeAlone,
+                         "Leave the library KESTRA out of VHDL");
         command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
         command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
             ->type_name("0|1")
@@ -412,6 +442,8 @@ private:
         command.add_flag("--verify", import_.verify,
                          "Read each netlist back and compare it with the design");
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
+        AddFile(command, "--write-cells", import_.cellModels,
+                "Write simulation models in VHDL of the cells of Yosys");
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
     }

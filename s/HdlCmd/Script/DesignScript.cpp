@@ -42,7 +42,7 @@ void RequireNoPoint(std::string_view kind, std::string_view name) {
 
 DesignScript::DesignScript(const Netlist& netlist, Lines& lines)
     : netlist_(netlist), lines_(lines), phrases_(Phrases::Get()), settled_(netlist),
-      stages_(netlist), expressible_(netlist) {}
+      stages_(netlist, settled_), expressible_(netlist) {}
 
 void DesignScript::Write() {
     WriteHolder({phrases_.module, netlist_, netlist_, false, {}}, lines_);

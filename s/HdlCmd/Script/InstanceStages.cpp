@@ -1,5 +1,7 @@
 #include "HdlCmd/Script/InstanceStages.h"
 
+#include "HdlCmd/Script/Values.h"
+
 #include <algorithm>
 #include <iterator>
 
@@ -9,7 +11,8 @@ int CountPins(const Iterator<Pin*>& pins) {
     return static_cast<int>(std::distance(pins.begin(), pins.end()));
 }
 
-InstanceStages::InstanceStages(const Netlist& netlist) : netlist_(netlist) {
+InstanceStages::InstanceStages(const Netlist& netlist, const SettledSignals& settled)
+    : netlist_(netlist), settled_(settled) {
     for (const Component* component : netlist.GetComponentIterator()) {
         pinCounts_[component] = CountPins(component->GetPinIterator());
     }
@@ -32,14 +35,20 @@ InstanceStages::GetEarly(const Component& component) const {
     return found == early_.end() ? none : found->second;
 }
 
+bool InstanceStages::HasNameOfSignal(const Instance& instance) const {
+    const std::string_view name = instance.GetNameView();
+    const Signal* const signal = netlist_.GetSignal(name);
+    // A signal that was renamed is found by its former name, and in the script it may get another.
+    return signal != nullptr && Folded(settled_.GetName({signal})) == Folded(name);
+}
+
 int InstanceStages::GetPinCountIfEarly(const Instance& instance) const {
     const auto found = pinCounts_.find(instance.GetComponent());
     if (found == pinCounts_.end()) {
         return NotEarly;
     }
     const int count = CountPins(instance.GetPinIterator());
-    const bool isEarly =
-        count < found->second || netlist_.GetSignal(instance.GetNameView()) != nullptr;
+    const bool isEarly = count < found->second || HasNameOfSignal(instance);
     return isEarly ? count : NotEarly;
 }
 

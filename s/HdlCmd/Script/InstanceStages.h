@@ -1,6 +1,7 @@
 // Instances that a script adds right behind their components.
 #pragma once
 
+#include "HdlCmd/Script/SettledSignals.h"
 #include "Orn_Hdl/Model/Netlist.h"
 
 #include <unordered_map>
@@ -13,7 +14,8 @@ namespace Orn_Hdl::Script {
 /// slice, a bit or a compound, but only if it was there first.
 class InstanceStages {
 public:
-    explicit InstanceStages(const Netlist& netlist);
+    /// \param netlist, settled have to outlive this object.
+    InstanceStages(const Netlist& netlist, const SettledSignals& settled);
 
     struct Early {
         const Instance* instance;
@@ -29,10 +31,12 @@ public:
 private:
     static constexpr int NotEarly = -1;
 
+    bool HasNameOfSignal(const Instance& instance) const;
     /// The number of pins of an instance that is added with its component.
     int GetPinCountIfEarly(const Instance& instance) const;
 
     const Netlist& netlist_;
+    const SettledSignals& settled_;
     std::unordered_map<const Component*, int> pinCounts_;
     std::unordered_map<const Component*, std::vector<Early>> early_;
 };

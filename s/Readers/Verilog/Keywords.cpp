@@ -1,6 +1,8 @@
 #include "Readers/Verilog/Keywords.h"
 
-#include <algorithm>
+#include "Readers/WordTable.h"
+
+#include <cstddef>
 #include <iterator>
 
 namespace Orn_Hdl::Readers {
@@ -12,7 +14,7 @@ struct Entry {
     Keyword keyword;
 };
 
-/// In alphabetical order (IEEE 1364-2005, annex B; "int", "logic", "var" and the procedures of IEEE
+/// IEEE 1364-2005, annex B ("int", "logic", "var" and the procedures of IEEE
 /// 1800 among them).
 constexpr Entry Entries[] = {
     {"always", Keyword::Behaviour},
@@ -148,30 +150,15 @@ constexpr Entry Entries[] = {
     {"xor", Keyword::Gate},
 };
 
-constexpr bool IsSorted() {
-    for (std::size_t i = 1; i < std::size(Entries); ++i) {
-        if (!(Entries[i - 1].word < Entries[i].word)) {
-            return false;
-        }
-    }
-    return true;
-}
-static_assert(IsSorted());
-
-constexpr std::size_t Shortest = 2;
-constexpr std::size_t Longest = 19;
+constexpr std::size_t Count = std::size(Entries);
+constexpr WordTable<Count> Table(Entries);
 
 } // namespace
 
 Keyword FindKeyword(std::string_view word) noexcept {
-    if (word.size() < Shortest || word.size() > Longest || word.front() < 'a' ||
-        word.front() > 'x') {
-        return Keyword::None;
-    }
-    const auto* const found = std::lower_bound(
-        std::begin(Entries), std::end(Entries), word,
-        [](const Entry& entry, std::string_view text) { return entry.word < text; });
-    return found != std::end(Entries) && found->word == word ? found->keyword : Keyword::None;
+    const std::size_t found =
+        Table.Find(word, [word](std::size_t index) { return Entries[index].word == word; });
+    return found == Count ? Keyword::None : Entries[found].keyword;
 }
 
 bool IsDirection(Keyword keyword) noexcept {

@@ -92,8 +92,10 @@ void Scanner::SkipToSemicolon() {
 /// Skips blanks, comments and directives, and ends sources. \return false at the end of the file.
 bool Scanner::SkipBlanks() {
     for (;;) {
+        while (*input_->current == ' ') {
+            ++input_->current;
+        }
         switch (*input_->current) {
-        case ' ':
         case '\t':
         case '\r':
         case '\f':

@@ -1,9 +1,9 @@
 #include "Readers/Vhdl/Keywords.h"
 
 #include "Port/Ascii.h"
+#include "Readers/WordTable.h"
 
 #include <algorithm>
-#include <array>
 #include <cstddef>
 #include <iterator>
 
@@ -139,48 +139,16 @@ constexpr std::string_view LaterWords[] = {
     "vunit",
 };
 
-constexpr bool IsSorted() {
-    for (std::size_t i = 1; i < std::size(Entries); ++i) {
-        if (!(Entries[i - 1].word < Entries[i].word)) {
-            return false;
-        }
-    }
-    return true;
-}
-static_assert(IsSorted());
-
-constexpr std::size_t Shortest = 2;
-constexpr std::size_t Longest = 13;
-constexpr std::size_t Letters = 26;
-
-/// The index of the first entry that begins with each letter, and the number of entries.
-constexpr std::array<std::uint8_t, Letters + 1> MakeStarts() {
-    std::array<std::uint8_t, Letters + 1> starts{};
-    for (std::size_t letter = 0; letter <= Letters; ++letter) {
-        std::uint8_t start = 0;
-        while (start < std::size(Entries) &&
-               static_cast<std::size_t>(Entries[start].word.front() - 'a') < letter) {
-            ++start;
-        }
-        starts[letter] = start;
-    }
-    return starts;
-}
+constexpr std::size_t Count = std::size(Entries);
+constexpr WordTable<Count> Table(Entries);
 
 } // namespace
 
 Keyword FindKeyword(std::string_view word) noexcept {
-    static constexpr std::array<std::uint8_t, Letters + 1> Starts = MakeStarts();
-    if (word.size() < Shortest || word.size() > Longest || !Port::IsLetter(word.front())) {
-        return Keyword::None;
-    }
-    const auto letter = static_cast<std::size_t>(Port::ToLower(word.front()) - 'a');
-    for (std::size_t i = Starts[letter]; i < Starts[letter + 1]; ++i) {
-        if (Port::EqualIgnoringCase(Entries[i].word, word)) {
-            return Entries[i].keyword;
-        }
-    }
-    return Keyword::None;
+    const std::size_t found = Table.Find(word, [word](std::size_t index) {
+        return Port::EqualIgnoringCase(Entries[index].word, word);
+    });
+    return found == Count ? Keyword::None : Entries[found].keyword;
 }
 
 bool IsReserved(std::string_view name) {

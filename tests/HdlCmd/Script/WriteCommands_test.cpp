@@ -347,6 +347,22 @@ TEST(WriteCommands, RenamedObjectsAreSaidByTheirNewNames) {
     }
 }
 
+TEST(WriteCommands, AnInstanceMayHaveTheNameThatACompoundWasGiven) {
+    const auto rename = [](Model& model) {
+        for (const char* line : {"ADD COMPONENT C", "ADD COMPONENT E", "ADD INSTANCE C B(7:0)",
+                                 "ADD SIGNAL N", "ADD SIGNAL M"}) {
+            model.ExecuteLine(line);
+        }
+        auto compound = std::make_unique<CompoundBus>("B(7:0)");
+        compound->AddBusMember(model.GetSignal("N"));
+        compound->AddBusMember(model.GetSignal("M"));
+        model.GetNetlist()->Add(compound.release());
+    };
+    const std::string commands = RoundTrip(rename).Check();
+    EXPECT_LT(commands.find("ADD COMPONENT E\n"), commands.find("ADD INSTANCE C B(7:0)\n"))
+        << commands;
+}
+
 TEST(WriteCommands, WhatOnlyCallsCanMakeIsRefused) {
     EXPECT_EQ(
         FailureOfCommands([](Model& model) { model.AddSignal("a\nb"); }),

@@ -62,6 +62,16 @@ void CommandSink::SuppressConfiguration() {
     WriteLine("SUPPRESS CONFIGURATION", "TRUE");
 }
 
+void CommandSink::NameIeeeAlone() {
+    WriteLine("USE DEFAULT LIBRARY", "FALSE");
+    WriteLine("ADD LIBRARY", IeeeLibrary);
+    WriteLine("ADD USE LIBRARY", IeeePackage);
+}
+
+void CommandSink::LeaveUnconfigured(const std::string& component) {
+    WriteTypedValue("ADD COMPONENT ATTRIBUTE", component, {LevelName, "String", LevelValue});
+}
+
 void CommandSink::WireOpenPins() {
     WriteLine("SET OPEN PIN", "FALSE");
 }

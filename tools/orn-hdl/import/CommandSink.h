@@ -21,10 +21,12 @@ public:
     void BeginGroup() override;
     void SetName(const std::string& name) override;
     void SuppressConfiguration() override;
+    void NameIeeeAlone() override;
     void WireOpenPins() override;
     void AddComponent(const std::string& name) override;
     void AddPin(const std::string& component, const std::string& pin,
                 const char* direction) override;
+    void LeaveUnconfigured(const std::string& component) override;
     void AddComponentGeneric(const std::string& component, const TypedValue& generic) override;
     void AddPort(const std::string& name, const char* direction) override;
     void AddSignal(const std::string& name) override;

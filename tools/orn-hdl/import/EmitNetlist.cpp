@@ -43,8 +43,13 @@ private:
 
 void NetlistEmitter::Emit() {
     sink_.SetName(netlist_.name);
-    // The leaf cells need not have configurations.
-    sink_.SuppressConfiguration();
+    if (!netlist_.vhdl.configuration) {
+        // The leaf cells need not have configurations.
+        sink_.SuppressConfiguration();
+    }
+    if (netlist_.vhdl.ieeeAlone) {
+        sink_.NameIeeeAlone();
+    }
     if (netlist_.hasOpenInputs) {
         sink_.WireOpenPins();
     }
@@ -61,6 +66,9 @@ void NetlistEmitter::EmitComponents() {
     for (const ImportedComponent& component : netlist_.components.GetAll()) {
         sink_.BeginGroup();
         sink_.AddComponent(component.name);
+        if (netlist_.vhdl.configuration && !component.isUnit) {
+            sink_.LeaveUnconfigured(component.name);
+        }
         for (const ImportedPin& pin : component.pins) {
             sink_.AddPin(component.name, pin.name, GetDirectionName(pin.direction));
         }

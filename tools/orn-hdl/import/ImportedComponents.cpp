@@ -1,5 +1,6 @@
 #include "import/ImportedComponents.h"
 
+#include "import/DesignUnits.h"
 #include "import/NameRules.h"
 #include "import/Spelling.h"
 #include "import/Values.h"
@@ -82,6 +83,7 @@ private:
     void SetFirstValue(ImportedGeneric& generic, const ImportedComponent& component,
                        const TypeUse::Parameter& parameter);
     void NameParts(ImportedComponent& component, const TypeUse& type);
+    static void NamePins(ImportedComponent& component, const TypeUse& type);
     void ClaimSimilar(UniqueNames& scope, const ImportedComponent& component, std::string_view part,
                       std::string_view oldName, std::string& name);
 
@@ -154,6 +156,8 @@ void ComponentFinder::Add(std::uint32_t index, const Variant& variant, const Cel
     const TypeUse& type = types_[index];
     ImportedComponent& component = components_.emplace_back();
     component.oldName = design_.types[index].name;
+    component.type = index;
+    component.isUnit = type.unit != nullptr;
     component.firstCell = &cell;
     component.splitByPins = type.splitsByPins;
     component.splitByParameters = type.splitsByParameters;
@@ -274,7 +278,23 @@ void ClaimUnchanged(UniqueNames& scope, std::string_view oldName, bool mayEscape
     }
 }
 
+/// Gives the pins of a module that is imported the names of its ports.
+void ComponentFinder::NamePins(ImportedComponent& component, const TypeUse& type) {
+    for (ImportedPin& pin : component.pins) {
+        const ModulePort* const port = type.pins[pin.typePin].port;
+        const ImportedPin& same =
+            type.unit->pins[static_cast<std::size_t>(port - type.leaf->ports.data())];
+        pin.baseName = same.baseName;
+        pin.name = same.name;
+        pin.scalar = same.scalar;
+    }
+}
+
 void ComponentFinder::NameParts(ImportedComponent& component, const TypeUse& type) {
+    if (type.unit != nullptr) {
+        NamePins(component, type);
+        return;
+    }
     // In VHDL, pins and generics share the scope of the component.
     UniqueNames scope(rules_);
     UniqueNames verilogGenerics(rules_);
@@ -347,6 +367,25 @@ void NameComponents(std::vector<ImportedComponent>& components, const Module& to
     }
 }
 
+/// Names the components of a module as the other modules do.
+void NameSharedComponents(std::vector<ImportedComponent>& components, const Module& top,
+                          DesignUnits& units, UniqueNames& names, Warnings& warnings) {
+    units.StartModule();
+    for (ImportedComponent& component : components) {
+        const DesignUnit* const unit = units.Find(component.type);
+        const std::string name = unit != nullptr ? unit->name : units.NameComponent(component);
+        const std::string_view identifier = NameRules::WithoutEscape(name);
+        component.name = names.ClaimModule(identifier);
+        const JsonPath path = top.GetPath("cells", component.firstCell->name).AddKey("type");
+        if (component.name.empty()) {
+            Fail(path, "other objects of the module have the name " + Quote(identifier));
+        }
+        if (unit == nullptr && identifier != component.oldName) {
+            warnings.Add(path, MakeWarning(component, names.GetRules()));
+        }
+    }
+}
+
 } // namespace
 
 const ImportedPin& ImportedComponent::GetPin(std::uint32_t typePin) const {
@@ -369,17 +408,21 @@ const ImportedGeneric* ImportedComponent::FindGeneric(const NamedValue& paramete
 }
 
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
-                                  const CellLibrary& library, const UnknownValues& unknown,
-                                  UniqueNames& names, Warnings& warnings) {
-    const std::vector<TypeUse> types = CountTypeUses(design, top, library, unknown, warnings);
-    ComponentFinder finder(design, top, types, unknown, names.GetRules(), warnings);
+                                  const ImportRules& rules, UniqueNames& names,
+                                  Warnings& warnings) {
+    const std::vector<TypeUse> types = CountTypeUses(design, top, rules, warnings);
+    ComponentFinder finder(design, top, types, rules.unknown, names.GetRules(), warnings);
     std::vector<std::uint32_t> componentOf;
     componentOf.reserve(top.cells.size());
     for (const Cell& cell : top.cells) {
         componentOf.push_back(finder.GetOrAdd(cell));
     }
     finder.Finish();
-    NameComponents(finder.GetComponents(), top, names, warnings);
+    if (rules.units != nullptr) {
+        NameSharedComponents(finder.GetComponents(), top, *rules.units, names, warnings);
+    } else {
+        NameComponents(finder.GetComponents(), top, names, warnings);
+    }
     return ImportedComponents(std::move(finder.GetComponents()), std::move(componentOf));
 }
 

@@ -1,6 +1,7 @@
 // The components of an imported design, whose instances are its cells.
 #pragma once
 
+#include "import/ImportRules.h"
 #include "import/ImportedDesign.h"
 #include "import/Sink.h"
 #include "import/TypeUses.h"
@@ -43,9 +44,13 @@ struct ImportedGeneric {
 
 struct ImportedComponent {
     std::string_view oldName;
+    /// The index of the type.
+    std::uint32_t type = 0;
     /// The first cell that needs it.
     const Cell* firstCell = nullptr;
     std::string name;
+    /// Whether it is a module that is imported with the one that has the cells.
+    bool isUnit = false;
     /// Whether it only has the pins of the cells that need it.
     bool splitByPins = false;
     /// Whether it only has the parameters of the cells that need it.
@@ -83,12 +88,11 @@ private:
     std::vector<std::uint32_t> componentOf_;
 };
 
-/// Checks the cells of the top module against the leaf modules of the library and the design, and
-/// makes and names their components.
+/// Checks the cells of a module against the leaf modules of the library and the design, and against
+/// the modules that are imported with it, and makes and names their components.
 /// \param names the scope that components share with instances and signals.
-/// \throws Error if a cell has contents, or does not match its leaf module.
+/// \throws Error if a cell has contents that are not imported, or does not match its module.
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
-                                  const CellLibrary& library, const UnknownValues& unknown,
-                                  UniqueNames& names, Warnings& warnings);
+                                  const ImportRules& rules, UniqueNames& names, Warnings& warnings);
 
 } // namespace Tool::Import

@@ -1,10 +1,13 @@
 #include "import/ImportedNetlist.h"
 
 #include "import/BitUses.h"
+#include "import/DesignUnits.h"
 #include "import/NetlistConnections.h"
 #include "import/NetlistNames.h"
 #include "import/UniqueNames.h"
 #include "import/Values.h"
+
+#include "Port/Ascii.h"
 
 #include <cstddef>
 #include <utility>
@@ -71,6 +74,19 @@ void CheckParameters(const Module& top, const UnknownValues& unknown, Warnings& 
     }
 }
 
+/// In a configuration, the attribute LEVEL tells that a component has none of its own.
+void CheckConfiguration(const ImportedNetlist& netlist) {
+    for (const ImportedComponent& component : netlist.components.GetAll()) {
+        for (const ImportedGeneric& generic : component.generics) {
+            if (netlist.vhdl.configuration &&
+                Port::EqualIgnoringCase(generic.value.name, "LEVEL")) {
+                Fail(netlist.top.GetPath("cells", component.firstCell->name).AddKey("parameters"),
+                     "a configuration needs the name LEVEL, which is that of a parameter");
+            }
+        }
+    }
+}
+
 } // namespace
 
 ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRules& rules,
@@ -78,8 +94,7 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     const UnknownValues& unknown = rules.unknown;
     UniqueNames names(rules.names);
     const std::vector<std::string> portNames = ClaimPortNames(top, names);
-    ImportedComponents components =
-        FindComponents(design, top, rules.library, unknown, names, warnings);
+    ImportedComponents components = FindComponents(design, top, rules, names, warnings);
     OpenConstantOutputs(top, components, warnings);
     const BitUses uses = BitUses::Count(top, components, unknown, portNames);
     BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
@@ -87,11 +102,16 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
     netlist.hasVhdl = rules.names.HasVhdl();
-    NameDesign(netlist, names, warnings);
+    netlist.vhdl = rules.vhdl;
+    CheckConfiguration(netlist);
+    NameDesign(netlist, rules.units, names, warnings);
     NameCellsAndSignals(netlist, names);
     ReportRenamedPorts(netlist, rules.names, rules.keepPorts, warnings);
     DecideConnections(netlist, uses, names);
     NameAttributes(netlist, names, warnings);
+    if (rules.units != nullptr) {
+        rules.units->SetPorts(top, netlist.owners);
+    }
     return netlist;
 }
 

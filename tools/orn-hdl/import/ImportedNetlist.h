@@ -2,10 +2,9 @@
 #pragma once
 
 #include "import/BitOwners.h"
-#include "import/CellLibrary.h"
+#include "import/ImportRules.h"
 #include "import/ImportedComponents.h"
 #include "import/ImportedDesign.h"
-#include "import/NameRules.h"
 #include "import/UnknownValues.h"
 #include "import/Warnings.h"
 
@@ -19,15 +18,6 @@ namespace Tool::Import {
 
 /// How a pin is connected: not at all, to a constant of its own, or to a signal.
 enum class ConnectionKind : std::uint8_t { Open, Constant, Signal };
-
-/// What the user asks of an import.
-struct ImportRules {
-    UnknownValues unknown;
-    NameRules names;
-    /// Whether renaming a port is an error.
-    bool keepPorts = false;
-    const CellLibrary& library;
-};
 
 /// The design must outlive it.
 struct ImportedNetlist {
@@ -46,10 +36,12 @@ struct ImportedNetlist {
     bool hasOpenInputs = false;
     /// Whether the netlist may be written in VHDL.
     bool hasVhdl = true;
+    VhdlClauses vhdl = {};
 };
 
 /// Determines all names and connections, so that all errors are found before anything is written.
-/// In the design, constants at output pins are replaced by net bits. \param top a module of the
+/// In the design, constants at output pins are replaced by net bits. The units of the rules learn
+/// the names of the module's ports; the modules that it uses come first. \param top a module of the
 /// design. \throws Error if the design cannot be imported.
 ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRules& rules,
                             Warnings& warnings);

@@ -19,6 +19,17 @@ void ModelSink::SuppressConfiguration() {
     model_.GetOptions()->vhdl.suppressConfiguration = true;
 }
 
+void ModelSink::NameIeeeAlone() {
+    Orn_Hdl::HdlOptions::VhdlOption& vhdl = model_.GetOptions()->vhdl;
+    vhdl.useDefaultLibrary = false;
+    vhdl.libraries.Add(IeeeLibrary);
+    vhdl.useClauses.Add(IeeePackage);
+}
+
+void ModelSink::LeaveUnconfigured(const std::string& component) {
+    model_.AddComponentAttr(component.c_str(), LevelName, LevelValue, "String");
+}
+
 void ModelSink::WireOpenPins() {
     model_.GetOptions()->vhdl.openPin = false;
 }

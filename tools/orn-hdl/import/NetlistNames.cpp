@@ -1,5 +1,6 @@
 #include "import/NetlistNames.h"
 
+#include "import/DesignUnits.h"
 #include "import/NameRules.h"
 #include "import/Values.h"
 
@@ -75,22 +76,34 @@ std::vector<std::string> ClaimPortNames(const Module& top, UniqueNames& names) {
     return result;
 }
 
-void NameDesign(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings) {
+namespace {
+
+std::string ChooseDesignName(const ImportedNetlist& netlist, const NameRules& rules,
+                             Warnings& warnings) {
     const Module& top = netlist.top;
     // Modules and entities share their names with the components only.
-    const NameRules& rules = names.GetRules();
     UniqueNames units(rules);
     for (const ImportedComponent& component : netlist.components.GetAll()) {
         units.Claim(component.name);
     }
-    netlist.name = units.ClaimSame(top.name);
-    if (netlist.name.empty()) {
-        netlist.name = units.ClaimSimilar(top.name, 'm');
+    std::string name = units.ClaimSame(top.name);
+    if (name.empty()) {
+        name = units.ClaimSimilar(top.name, 'm');
         warnings.Add(JsonPath("modules").AddKey(top.name),
                      (rules.IsLegal(top.name) ? "a component has the name " + Quote(top.name)
                                               : Quote(top.name) + rules.GetComplaint()) +
-                         "; the netlist is renamed to " + netlist.name);
+                         "; the netlist is renamed to " + name);
     }
+    return name;
+}
+
+} // namespace
+
+void NameDesign(ImportedNetlist& netlist, const DesignUnits* units, UniqueNames& names,
+                Warnings& warnings) {
+    const Module& top = netlist.top;
+    netlist.name = units != nullptr ? units->Get(top).name
+                                    : ChooseDesignName(netlist, names.GetRules(), warnings);
     // A signal may hide its entity, but tools warn about it; a port keeps its name nevertheless.
     if (std::none_of(top.ports.begin(), top.ports.end(), [&](const ModulePort& port) {
             return Port::EqualIgnoringCase(port.name, netlist.name);

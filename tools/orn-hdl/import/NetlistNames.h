@@ -14,8 +14,10 @@ namespace Tool::Import {
 /// a port that is named later. If names may be escaped, as many ports as possible keep their names.
 std::vector<std::string> ClaimPortNames(const Module& top, UniqueNames& names);
 /// Sets the name of the netlist.
+/// \param units the modules of the design, which have names; null for a single module.
 /// \param names the scope of signals, instances and components.
-void NameDesign(ImportedNetlist& netlist, UniqueNames& names, Warnings& warnings);
+void NameDesign(ImportedNetlist& netlist, const DesignUnits* units, UniqueNames& names,
+                Warnings& warnings);
 /// Sets the names of cells and signals. Legal names are claimed before similar names are generated
 /// for others.
 void NameCellsAndSignals(ImportedNetlist& netlist, UniqueNames& names);

@@ -13,6 +13,13 @@ struct TypedValue {
     std::string value;
 };
 
+/// The library and use clauses for IEEE alone.
+inline constexpr const char* IeeeLibrary = "ieee";
+inline constexpr const char* IeeePackage = "ieee.std_logic_1164.ALL";
+/// The attribute of a component without a configuration.
+inline constexpr const char* LevelName = "LEVEL";
+inline constexpr const char* LevelValue = "HALVEX";
+
 class Sink {
 public:
     Sink() = default;
@@ -24,12 +31,16 @@ public:
     virtual void BeginGroup() = 0;
     virtual void SetName(const std::string& name) = 0;
     virtual void SuppressConfiguration() = 0;
+    /// VHDL names the library IEEE alone.
+    virtual void NameIeeeAlone() = 0;
     /// VHDL gets a signal for every open input pin.
     virtual void WireOpenPins() = 0;
 
     virtual void AddComponent(const std::string& name) = 0;
     virtual void AddPin(const std::string& component, const std::string& pin,
                         const char* direction) = 0;
+    /// The component has no configuration of its own.
+    virtual void LeaveUnconfigured(const std::string& component) = 0;
     virtual void AddComponentGeneric(const std::string& component, const TypedValue& generic) = 0;
 
     virtual void AddPort(const std::string& name, const char* direction) = 0;

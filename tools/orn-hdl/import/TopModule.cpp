@@ -1,5 +1,7 @@
 #include "import/TopModule.h"
 
+#include "import/Hierarchy.h"
+
 #include <algorithm>
 #include <string>
 #include <vector>
@@ -31,6 +33,11 @@ Module& FindTop(ImportedDesign& design, std::string_view name) {
         }
         if (!module.blackBox) {
             full.push_back(&module);
+        }
+    }
+    if (marked.empty() && full.size() > 1) {
+        if (const std::vector<Module*> roots = Hierarchy(design).FindRoots(); roots.size() == 1) {
+            return *roots.front();
         }
     }
     const std::vector<Module*>& candidates = marked.empty() ? full : marked;

@@ -7,8 +7,8 @@
 
 namespace Tool::Import {
 
-/// The module to import: the named one, or, if `name` is empty, the one marked as top, or the only
-/// one that is not a black box.
+/// The module to import: the named one, or, if `name` is empty, the one marked as top, the only one
+/// that is not a black box, or the only one with contents that no other one uses.
 /// \throws Error if there is none, or more than one.
 Module& FindTop(ImportedDesign& design, std::string_view name);
 

@@ -1,5 +1,6 @@
 #include "import/TypeUses.h"
 
+#include "import/DesignUnits.h"
 #include "import/TopModule.h"
 #include "import/Values.h"
 
@@ -36,10 +37,8 @@ void AppendName(std::string& list, std::string_view name) {
 
 class TypeUseCounter {
 public:
-    TypeUseCounter(ImportedDesign& design, const Module& top, const CellLibrary& library,
-                   const UnknownValues& unknown)
-        : design_(design), top_(top), library_(library), unknown_(unknown),
-          uses_(design.types.size()) {
+    TypeUseCounter(ImportedDesign& design, const Module& top, const ImportRules& rules)
+        : design_(design), top_(top), rules_(rules), uses_(design.types.size()) {
         for (const Module& module : design.modules) {
             modules_.emplace(module.name, &module);
         }
@@ -56,8 +55,7 @@ private:
 
     ImportedDesign& design_;
     const Module& top_;
-    const CellLibrary& library_;
-    const UnknownValues& unknown_;
+    const ImportRules& rules_;
     std::vector<TypeUse> uses_;
     std::unordered_map<std::string_view, const Module*> modules_;
 };
@@ -77,12 +75,19 @@ void TypeUseCounter::FindLeaf(std::uint32_t index, const Cell& firstCell) {
     CellType& cellType = design_.types[index];
     type.firstCell = &firstCell;
     const auto module = modules_.find(cellType.name);
+    if (rules_.units != nullptr) {
+        type.unit = rules_.units->Find(index);
+    }
+    if (type.unit != nullptr) {
+        AddLeaf(type, cellType, *module->second);
+        return;
+    }
     if (module != modules_.end() && !IsLeaf(*module->second)) {
         Fail(top_.GetPath("cells", firstCell.name).AddKey("type"),
              "\"" + std::string(cellType.name) +
                  "\" is a module with contents; flatten the design first");
     }
-    if (const Module* cell = library_.Find(cellType.name)) {
+    if (const Module* cell = rules_.library.Find(cellType.name)) {
         AddLeaf(type, cellType, *cell);
     } else if (module != modules_.end()) {
         AddLeaf(type, cellType, *module->second);
@@ -104,7 +109,9 @@ void TypeUseCounter::AddLeaf(TypeUse& type, CellType& cellType, const Module& le
         type.pins[pin].port = &port;
         type.pins[pin].width = port.bits.count;
     }
-    for (const NamedValue& value : leaf.defaults) {
+    // The parameters of a module that is imported have their values.
+    const std::vector<NamedValue> none;
+    for (const NamedValue& value : type.unit != nullptr ? none : leaf.defaults) {
         TypeUse::Parameter& parameter = type.parameters.emplace_back();
         parameter.name = value.name;
         parameter.hasDefault = true;
@@ -127,6 +134,12 @@ void TypeUseCounter::CountPins(TypeUse& type, const Cell& cell) {
             Fail(top_.GetPinPath(cell, cellType.pins[connection.pin].name),
                  "the module \"" + std::string(cellType.name) + "\" has no such port");
         }
+        if (type.unit != nullptr && width != 0 && width != pin.width) {
+            Fail(top_.GetPinPath(cell, pin.port->name),
+                 std::to_string(width) + " bits are connected to a port of " +
+                     std::to_string(pin.width) + " bits of the module " +
+                     Quote(design_.types[cell.type].name));
+        }
         if (pin.width == 0) {
             pin.width = width;
         }
@@ -134,6 +147,11 @@ void TypeUseCounter::CountPins(TypeUse& type, const Cell& cell) {
 }
 
 void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
+    if (type.unit != nullptr && cell.parameters.count > 0) {
+        Fail(top_.GetPath("cells", cell.name).AddKey("parameters"),
+             "the parameters of the module " + Quote(design_.types[cell.type].name) +
+                 " have their values already; let Yosys copy the module for these (hierarchy)");
+    }
     for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
         const NamedValue& value = top_.values[cell.parameters.start + i];
         const auto [place, isNew] = type.parameterIndex.try_emplace(
@@ -142,7 +160,7 @@ void TypeUseCounter::CountParameters(TypeUse& type, const Cell& cell) {
             type.parameters.emplace_back().name = value.name;
         }
         TypeUse::Parameter& parameter = type.parameters[place->second];
-        if (parameter.hasDefault && MeansAny(value.value, unknown_)) {
+        if (parameter.hasDefault && MeansAny(value.value, rules_.unknown)) {
             continue;
         }
         ++parameter.cells;
@@ -235,9 +253,8 @@ void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& war
 } // namespace
 
 std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
-                                   const CellLibrary& library, const UnknownValues& unknown,
-                                   Warnings& warnings) {
-    TypeUseCounter counter(design, top, library, unknown);
+                                   const ImportRules& rules, Warnings& warnings) {
+    TypeUseCounter counter(design, top, rules);
     for (const Cell& cell : top.cells) {
         counter.CountCell(cell);
     }

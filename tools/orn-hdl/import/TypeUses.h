@@ -1,9 +1,8 @@
 // The uses of cell types in the top module: widths of pins, and parameters.
 #pragma once
 
-#include "import/CellLibrary.h"
+#include "import/ImportRules.h"
 #include "import/ImportedDesign.h"
-#include "import/UnknownValues.h"
 #include "import/Warnings.h"
 
 #include <cstdint>
@@ -13,6 +12,8 @@
 #include <vector>
 
 namespace Tool::Import {
+
+struct DesignUnit;
 
 /// The use of one cell type.
 struct TypeUse {
@@ -39,6 +40,8 @@ struct TypeUse {
 
     /// The module that describes the type; null if there is none.
     const Module* leaf = nullptr;
+    /// The module, if it is imported with the one that has the cells.
+    const DesignUnit* unit = nullptr;
     const Cell* firstCell = nullptr;
     std::uint32_t cells = 0;
     /// By the pin index of the type.
@@ -66,10 +69,9 @@ struct TypeUse {
 
 /// The uses of the types of a design, by the index of the type. Adds the ports of leaf modules to
 /// the pins of their types. Warns of values whose type the file does not contain.
-/// \param library its cells take the place of black boxes of the design.
-/// \throws Error if a cell has contents, or does not match its leaf module.
+/// \param rules the cells of its library take the place of black boxes of the design.
+/// \throws Error if a cell has contents that are not imported, or does not match its module.
 std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
-                                   const CellLibrary& library, const UnknownValues& unknown,
-                                   Warnings& warnings);
+                                   const ImportRules& rules, Warnings& warnings);
 
 } // namespace Tool::Import
