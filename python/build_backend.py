@@ -57,7 +57,7 @@ def build(stage: Path, settings: Mapping[str, str]) -> None:
     folder = Path(settings.get("build", SOURCE / "build" / "wheel")).resolve()
     tool = settings.get("tool", "on").lower() not in ("off", "no", "0", "false")
     if not (folder / "CMakeCache.txt").exists():
-        options = {"CMAKE_BUILD_TYPE": "Release", "CMAKE_UNITY_BUILD": "ON", "ORN_HDL_PYTHON": "ON",
+        options = {"CMAKE_BUILD_TYPE": "Release", "CMAKE_UNITY_BUILD": "ON", "ORN_HDL_BUILD_PYTHON": "ON",
                    "ORN_HDL_PYTHON_EXECUTABLE": sys.executable, "ORN_HDL_BUILD_TESTS": "OFF",
                    "ORN_HDL_BUILD_TOOL": "ON" if tool else "OFF"}
         subprocess.run(["cmake", "-S", str(SOURCE), "-B", str(folder),

@@ -11,6 +11,7 @@ What follows the three back-quotes decides:
     orn more          commands: replayed behind those of the blocks before
     verilog, vhdl     a passage of the netlist that the last commands give
     python            run by Python behind the blocks before; a text block behind it is what it prints
+    tcl               run by tclsh with the installed package; a text block behind it is what it prints
     sh                run by bash; a text block behind it is what it prints
     LANGUAGE FILE     written to that file, for the blocks behind it
 
@@ -97,6 +98,7 @@ class Installed:
                 "CMAKE_PREFIX_PATH": str(self.prefix),
                 "PKG_CONFIG_PATH": str(self.libraries / "pkgconfig"),
                 "PYTHONPATH": str(self.prefix / "lib" / "python3" / "dist-packages"),
+                "TCLLIBPATH": str(self.libraries / "tcltk"),
                 "LD_LIBRARY_PATH": str(self.libraries)}
 
 
@@ -148,6 +150,9 @@ class Page:
                 raise Failed(f"is no passage of\n{netlist}")
         elif block.language == "python":
             self.check_python(block.code)
+        elif block.language == "tcl":
+            (self.folder / "block.tcl").write_text(block.code)
+            self.printed = self.run("tclsh", "block.tcl")
         elif block.language == "sh":
             self.printed = self.run("bash", "-euo", "pipefail", "-c", block.code)
         else:
