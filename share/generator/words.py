@@ -196,7 +196,7 @@ def _other_functions() -> list[Cell]:
               "   second := " + _extended("B", "Y'length", "both_signed") +
               " xor copies(BI, Y'length);",
               "   X <= first xor second;",
-              "   if is_x(A) or is_x(B) or is_x(CI) or is_x(BI) then",
+              "   if is_x(A & B & CI & BI) then",
               "      Y <= copies('X', Y'length);",
               "      CO <= copies('X', Y'length);",
               "   else",

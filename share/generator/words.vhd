@@ -211,7 +211,7 @@ package body orn_hdl_cells is
       constant second : unsigned(b'length - 1 downto 0) := unsigned(b);
       variable low : unsigned(a'length - 1 downto 0) := (others => '0');
    begin
-      if is_x(a) or is_x(b) or is_x(carry) then
+      if is_x(a & b & carry) then
          return copies('X', a'length);
       end if;
       low(0) := to_x01(carry);
@@ -414,7 +414,7 @@ package body orn_hdl_cells is
       variable is_found : boolean := false;
    begin
       for i in 0 to selects'left loop
-         if is_x(selects(i)) or (is_found and selects(i) = '1') then
+         if is_x(selects(i downto i)) or (is_found and selects(i) = '1') then
             return copies('X', a'length);
          elsif selects(i) = '1' then
             result := parts((i + 1) * a'length - 1 downto i * a'length);
@@ -469,7 +469,7 @@ package body orn_hdl_cells is
       variable result : std_logic_vector(p'length - 1 downto 0);
       variable present : std_logic := carry;
    begin
-      if is_x(p) or is_x(g) or is_x(carry) then
+      if is_x(p & g & carry) then
          return copies('X', p'length);
       end if;
       for i in 0 to result'left loop

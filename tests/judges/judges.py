@@ -92,7 +92,8 @@ def simulate_verilog(sources: Sequence[Path], top: str, work: Path) -> str:
     A `$fatal` of the test bench is a rejection.
     """
     program = work / f"{top}.vvp"
-    run_tool(["iverilog", "-g2005", "-s", top, "-o", program, *sources])
+    edition = "2012" if any(source.suffix == ".sv" for source in sources) else "2005"
+    run_tool(["iverilog", f"-g{edition}", "-s", top, "-o", program, *sources])
     return run_tool(["vvp", "-n", program], work).stdout
 
 
@@ -104,15 +105,16 @@ class Ghdl:
     Everything is analysed into a folder of the caller's; one netlist per `Ghdl`.
     """
 
-    def __init__(self, standard: str, work: Path) -> None:
+    def __init__(self, standard: str, work: Path, has_leaf_cells: bool = True) -> None:
         self.work = work
         # Leaf cells index with signals, which are 'U' until time 0 is over.
         self.run_flags = ["--ieee-asserts=disable-at-0"]
         # VHDL-93 proper does not bind a component to the entity of its name in the same library;
         # every real tool does, and so do the later editions.
         self.flags = [f"--std={standard}", "--syn-binding", f"--workdir={work}", f"-P{work}"]
-        self.analyse(KESTRA_PACKAGE, "KESTRA")
-        self.analyse(CELL_ENTITIES)
+        if has_leaf_cells:
+            self.analyse(KESTRA_PACKAGE, "KESTRA")
+            self.analyse(CELL_ENTITIES)
 
     def analyse(self, source: Path, library: str = "work") -> None:
         run_tool(["ghdl", "-a", *self.flags, "--warn-error", f"--work={library}", source],

@@ -214,7 +214,7 @@ package body orn_hdl_cells is
       constant second : unsigned(b'length - 1 downto 0) := unsigned(b);
       variable low : unsigned(a'length - 1 downto 0) := (others => '0');
    begin
-      if is_x(a) or is_x(b) or is_x(carry) then
+      if is_x(a & b & carry) then
          return copies('X', a'length);
       end if;
       low(0) := to_x01(carry);
@@ -417,7 +417,7 @@ package body orn_hdl_cells is
       variable is_found : boolean := false;
    begin
       for i in 0 to selects'left loop
-         if is_x(selects(i)) or (is_found and selects(i) = '1') then
+         if is_x(selects(i downto i)) or (is_found and selects(i) = '1') then
             return copies('X', a'length);
          elsif selects(i) = '1' then
             result := parts((i + 1) * a'length - 1 downto i * a'length);
@@ -472,7 +472,7 @@ package body orn_hdl_cells is
       variable result : std_logic_vector(p'length - 1 downto 0);
       variable present : std_logic := carry;
    begin
-      if is_x(p) or is_x(g) or is_x(carry) then
+      if is_x(p & g & carry) then
          return copies('X', p'length);
       end if;
       for i in 0 to result'left loop
@@ -1725,7 +1725,7 @@ begin
       first := extend(A, number(A_WIDTH), both_signed, Y'length);
       second := extend(B, number(B_WIDTH), both_signed, Y'length) xor copies(BI, Y'length);
       X <= first xor second;
-      if is_x(A) or is_x(B) or is_x(CI) or is_x(BI) then
+      if is_x(A & B & CI & BI) then
          Y <= copies('X', Y'length);
          CO <= copies('X', Y'length);
       else
