@@ -3,9 +3,9 @@
 
 Yosys writes each design of rtl/hierarchy as JSON twice: as word-level cells, and as gates after synth.
 orn-hdl imports it with its modules. The Verilog has the same modules, cells and wires, and Yosys proves
-each module equal; GHDL analyses the VHDL with the models that the import writes, and simulates it, Icarus the
-Verilog with Yosys' own models: both show the same in every cycle, and what the RTL shows, where
-that is known. What GHDL can synthesise of the VHDL is proven equal, too.
+each module equal; GHDL analyses the VHDL with the models that the import writes, and simulates it,
+Icarus the Verilog with Yosys' own models: both show the same in every cycle, and what the RTL shows,
+where that is known. What GHDL can synthesise of the VHDL is proven equal, too.
 """
 
 from __future__ import annotations
@@ -137,8 +137,8 @@ class Whole:
         for role, design in roles.items():
             file = self.work / f"{role}.json"
             file.write_text(json.dumps(design))
-            script += (f"read_json {quoted(file)}; hierarchy -check -top top; flatten; memory_map; proc; "
-                       f"async2sync; opt_clean; rename top {role}; design -stash {role}; ")
+            script += (f"read_json {quoted(file)}; hierarchy -check -top top; flatten; memory_map; "
+                       f"proc; async2sync; opt_clean; rename top {role}; design -stash {role}; ")
         try:
             run_yosys(script + "design -copy-from gold -as gold gold; "
                       "design -copy-from gate -as gate gate; equiv_make gold gate equiv; "
