@@ -77,6 +77,30 @@ if(TARGET orn-hdl)
   install(FILES ${orn_hdl_pages} DESTINATION ${ORN_HDL_TOOL_DOCDIR} COMPONENT Tool)
 endif()
 
+# The Python package, beside the library and once more as a folder that needs nothing beside it, for a wheel.
+if(TARGET orn_hdl_python)
+  set(ORN_HDL_PYTHON_DIR lib/python3/dist-packages CACHE STRING "Where the Python package is installed")
+  mark_as_advanced(ORN_HDL_PYTHON_DIR)
+  cmake_path(ABSOLUTE_PATH ORN_HDL_PYTHON_DIR BASE_DIRECTORY ${CMAKE_INSTALL_PREFIX} OUTPUT_VARIABLE orn_hdl_python_dir)
+  file(RELATIVE_PATH orn_hdl_libraries ${orn_hdl_python_dir}/orn_hdl ${CMAKE_INSTALL_FULL_LIBDIR})
+  set_target_properties(orn_hdl_python PROPERTIES
+    INSTALL_RPATH "$ORIGIN/${CMAKE_INSTALL_LIBDIR};$ORIGIN/${orn_hdl_libraries}")
+  set(orn_hdl_python_source ${PROJECT_SOURCE_DIR}/python/orn_hdl/)
+  install(TARGETS orn_hdl_python LIBRARY DESTINATION ${ORN_HDL_PYTHON_DIR}/orn_hdl COMPONENT Python)
+  install(DIRECTORY ${orn_hdl_python_source} DESTINATION ${ORN_HDL_PYTHON_DIR}/orn_hdl COMPONENT Python
+    FILES_MATCHING PATTERN "*.py" PATTERN "*.pyi" PATTERN "py.typed" PATTERN "__pycache__" EXCLUDE)
+  install(TARGETS orn_hdl_python LIBRARY DESTINATION orn_hdl COMPONENT Wheel EXCLUDE_FROM_ALL)
+  install(DIRECTORY ${orn_hdl_python_source} DESTINATION orn_hdl COMPONENT Wheel EXCLUDE_FROM_ALL
+    FILES_MATCHING PATTERN "*.py" PATTERN "*.pyi" PATTERN "py.typed" PATTERN "__pycache__" EXCLUDE)
+  if(BUILD_SHARED_LIBS)
+    install(TARGETS Orn_Hdl LIBRARY DESTINATION orn_hdl/${CMAKE_INSTALL_LIBDIR} COMPONENT Wheel EXCLUDE_FROM_ALL
+      NAMELINK_SKIP)
+  endif()
+  if(TARGET orn-hdl)
+    install(TARGETS orn-hdl RUNTIME DESTINATION orn_hdl/bin COMPONENT Wheel EXCLUDE_FROM_ALL)
+  endif()
+endif()
+
 if(PROJECT_IS_TOP_LEVEL)
   include(${CMAKE_CURRENT_LIST_DIR}/Package.cmake)
 endif()

@@ -7,7 +7,9 @@ endif()
 
 set(packages Library=${CPACK_DEBIAN_LIBRARY_PACKAGE_NAME}
              Development=${CPACK_DEBIAN_DEVELOPMENT_PACKAGE_NAME}
-             Tool=${CPACK_DEBIAN_TOOL_PACKAGE_NAME})
+             Tool=${CPACK_DEBIAN_TOOL_PACKAGE_NAME}
+             Python=${CPACK_DEBIAN_PYTHON_PACKAGE_NAME}
+             Tcl=${CPACK_DEBIAN_TCL_PACKAGE_NAME})
 foreach(pair ${packages})
   string(REGEX MATCH "^([^=]*)=(.*)$" pair ${pair})
   set(root ${CPACK_TEMPORARY_INSTALL_DIRECTORY}/${CMAKE_MATCH_1}/usr/share)

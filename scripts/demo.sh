@@ -4,7 +4,8 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 
 scripts/setup.sh build
-cmake --preset release -DORN_HDL_BUILD_TESTS=OFF -DORN_HDL_BUILD_BENCH=OFF -B build/demo >/dev/null
+cmake --preset release -DORN_HDL_BUILD_TESTS=OFF -DORN_HDL_BUILD_BENCH=OFF \
+    -DORN_HDL_BUILD_PYTHON=OFF -DORN_HDL_BUILD_TCL=OFF -B build/demo >/dev/null
 cmake --build build/demo --target orn-hdl >/dev/null
 
 tool=build/demo/tools/orn-hdl/orn-hdl

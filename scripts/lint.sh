@@ -29,8 +29,8 @@ else
     build=build/tidy
     cmake --preset tidy >/dev/null
     checks=()
-    mapfile -t sources < <(git ls-files 's/*.cpp' 'tools/*.cpp')
-    inputs=(-I include -I s s tools/orn-hdl)
+    mapfile -t sources < <(git ls-files 's/*.cpp' 'tools/*.cpp' 'python/*.cpp')
+    inputs=(-I include -I s s tools/orn-hdl python/extension)
 fi
 
 echo "== cppcheck"

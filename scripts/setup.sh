@@ -3,12 +3,12 @@
 # missing. Usage: setup.sh build | test
 set -euo pipefail
 
-build_packages=(g++ cmake make ninja-build libcli11-dev libsimdjson-dev nettle-dev
+build_packages=(g++ cmake make ninja-build libcli11-dev libsimdjson-dev nettle-dev zlib1g-dev
     pkg-config)
 test_packages=(ccache clang clang-tidy clang-format cppcheck doxygen gcovr ghdl git graphviz iverilog
     libbenchmark-dev libclang-rt-14-dev libgtest-dev librapidcheck-dev llvm lintian locales man-db mypy
     python3 python3-dev python3-networkx python3-numpy python3-pandas python3-pip python3-pytest
-    python3-setuptools python3-venv python3-wheel valgrind verilator vim-tiny yosys zsh)
+    python3-setuptools python3-venv python3-wheel tcl-dev valgrind verilator vim-tiny yosys zsh)
 
 case "${1:-build}" in
 build) packages=("${build_packages[@]}") ;;

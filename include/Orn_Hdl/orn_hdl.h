@@ -225,6 +225,8 @@ ORN_HDL_C_API orn_hdl_status_t orn_hdl_engine_use_model(orn_hdl_engine_t engine,
 /** Destroys a model. \return `ORN_HDL_NOT_FOUND` if there is none of that name. */
 ORN_HDL_C_API orn_hdl_status_t orn_hdl_engine_remove_model(orn_hdl_engine_t engine,
                                                            const char* name);
+/** Destroys a model, whatever its name is by now. */
+ORN_HDL_C_API orn_hdl_status_t orn_hdl_model_destroy(orn_hdl_model_t model);
 /** Runs a command line on the current model. It fails with "Missing Model." if there is none. */
 ORN_HDL_C_API orn_hdl_status_t orn_hdl_engine_execute(orn_hdl_engine_t engine, const char* line);
 /** Replays a command file on a model, as `orn_hdl_model_replay` does. The model is made if there is

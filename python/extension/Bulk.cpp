@@ -179,21 +179,55 @@ Ref AddSignals(ModelState& state, Arguments& arguments) {
                       [](Model& model, const Table& row) { model.AddSignal(row.Get(0)); });
 }
 
-/// Numbers what occurs, in the order in which they first do.
-class Numbering {
+/// Numbers signals in the order in which they first occur, in a table of open addresses: a design
+/// has millions of connections, and the table is what they cost.
+class SignalNumbers {
 public:
-    /// The number of what a key stands for; its name is needed when it is new.
-    std::int32_t Number(const void* key, std::string_view name) {
-        const auto [found, isNew] = numbers_.emplace(key, static_cast<std::int32_t>(names_.size()));
-        if (isNew) {
-            names_.push_back(name);
+    /// The number of a signal.
+    std::int32_t Number(const Orn_Hdl::Signal& signal) {
+        if (2 * names_.size() >= slots_.size()) {
+            Grow();
         }
-        return found->second;
+        Slot& slot = Find(&signal);
+        if (slot.signal == nullptr) {
+            slot = {&signal, static_cast<std::int32_t>(names_.size())};
+            names_.push_back(signal.GetNameView());
+        }
+        return slot.number;
     }
     const std::vector<std::string_view>& GetNames() const noexcept { return names_; }
 
 private:
-    std::unordered_map<const void*, std::int32_t> numbers_;
+    struct Slot {
+        const Orn_Hdl::Signal* signal = nullptr;
+        std::int32_t number = 0;
+    };
+
+    /// The slot of a signal, or the free one that it would get.
+    Slot& Find(const Orn_Hdl::Signal* signal) noexcept {
+        constexpr std::uint64_t Spread = 0x9E3779B97F4A7C15U;
+        constexpr unsigned UpperHalf = 32;
+        std::uint64_t place = (reinterpret_cast<std::uintptr_t>(signal) * Spread) >> UpperHalf;
+        for (;; ++place) {
+            Slot& slot = slots_[place & (slots_.size() - 1)];
+            if (slot.signal == signal || slot.signal == nullptr) {
+                return slot;
+            }
+        }
+    }
+
+    void Grow() {
+        constexpr std::size_t Least = 1024;
+        std::vector<Slot> former(std::max(Least, 4 * slots_.size()));
+        former.swap(slots_);
+        for (const Slot& slot : former) {
+            if (slot.signal != nullptr) {
+                Find(slot.signal) = slot;
+            }
+        }
+    }
+
+    std::vector<Slot> slots_;
     std::vector<std::string_view> names_;
 };
 
@@ -215,7 +249,7 @@ Ref MakeBytes(const std::vector<std::int32_t>& numbers) {
 /// each.
 Ref GetConnections(ModelState& state, Arguments& /*arguments*/) {
     const Orn_Hdl::Netlist& netlist = state.GetNetlist();
-    Numbering signalNames;
+    SignalNumbers numbers;
     std::vector<std::string_view> instanceNames;
     std::unordered_map<std::string_view, std::int32_t> pinNumbers;
     std::vector<std::string_view> pinNames;
@@ -237,15 +271,14 @@ Ref GetConnections(ModelState& state, Arguments& /*arguments*/) {
                 if (isNew) {
                     pinNames.push_back(pin->GetNameView());
                 }
-                signals.push_back(signalNames.Number(signal, signal->GetNameView()));
+                signals.push_back(numbers.Number(*signal));
                 instances.push_back(number);
                 pins.push_back(found->second);
             }
         }
     }
-    return MakeTuple(MakeNames(signalNames.GetNames()), MakeNames(instanceNames),
-                     MakeNames(pinNames), MakeBytes(signals), MakeBytes(instances),
-                     MakeBytes(pins));
+    return MakeTuple(MakeNames(numbers.GetNames()), MakeNames(instanceNames), MakeNames(pinNames),
+                     MakeBytes(signals), MakeBytes(instances), MakeBytes(pins));
 }
 
 } // namespace

@@ -54,7 +54,13 @@ Ref ReadCommands(ModelState& state, Arguments& arguments) {
     Model& model = state.Get();
     const char* const file = arguments.GetText(0);
     Orn_Hdl::CommandReader reader(model);
-    if (!reader.Open(file)) {
+    bool isOpen = false;
+    {
+        // A pipe is open when somebody writes into it, which may be another thread.
+        const Unlocked unlocked;
+        isOpen = reader.Open(file);
+    }
+    if (!isOpen) {
         ThrowSystemError(reader.GetError() != 0 ? reader.GetError() : ENOENT, file);
     }
     Stopped place;

@@ -30,6 +30,8 @@ Text::Text(PyObject* text) {
 
 Ref MakeText(std::string_view text) {
     const auto size = static_cast<Py_ssize_t>(text.size());
+    // A temporary lives until the call that it is made for returns.
+    // cppcheck-suppress danglingTemporaryLifetime
     PyObject* object = PyUnicode_FromStringAndSize(text.data(), size);
     if (object == nullptr) {
         PyErr_Clear();

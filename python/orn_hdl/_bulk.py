@@ -3,10 +3,7 @@
 from __future__ import annotations
 
 from array import array
-from typing import TYPE_CHECKING, Any, Iterable, List, NamedTuple, Sequence, Tuple, Union
-
-if TYPE_CHECKING:
-    import numpy
+from typing import Any, Iterable, List, NamedTuple, Sequence, Tuple, Union
 
 # One name for every row, a name a row, or the names with the index of one for each row.
 Column = Union[str, Iterable[str], Tuple[Sequence[str], Any]]
@@ -49,7 +46,7 @@ class Connections(NamedTuple):
     instance: array[int]
     pin: array[int]
 
-    def numpy(self) -> Tuple[numpy.ndarray[Any, Any], ...]:
+    def numpy(self) -> Tuple[Any, ...]:
         """The three columns of indices as arrays of NumPy, without a copy."""
         import numpy as np
         return tuple(np.frombuffer(part, dtype=np.int32) for part in (self.net, self.instance, self.pin))

@@ -43,7 +43,7 @@ Language ToLanguage(orn_hdl_language_t language) {
     return language == ORN_HDL_VERILOG ? Language::Verilog : Language::Vhdl;
 }
 
-orn_hdl_status_t TellError(const LastError& error, orn_hdl_error_t* result) noexcept {
+orn_hdl_status_t TellError(const LastError& error, orn_hdl_error_t* result) {
     return Attempt(nullptr, [&] {
         Require(result != nullptr);
         Texts texts;

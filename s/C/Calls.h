@@ -95,6 +95,6 @@ orn_hdl_status_t LookAt(orn_hdl_model_t model, const Action& action) noexcept {
 Language ToLanguage(orn_hdl_language_t language);
 
 /// Tells what the last failed call was.
-orn_hdl_status_t TellError(const LastError& error, orn_hdl_error_t* result) noexcept;
+orn_hdl_status_t TellError(const LastError& error, orn_hdl_error_t* result);
 
 } // namespace Orn_Hdl::CInterface

@@ -1,8 +1,6 @@
 // The functions of the C interface for engines.
 #include "C/Lines.h"
 
-#include <algorithm>
-
 namespace CInterface = Orn_Hdl::CInterface;
 
 using CInterface::Call;
@@ -79,10 +77,16 @@ orn_hdl_status_t orn_hdl_engine_remove_model(orn_hdl_engine_t engine, const char
         if (model.IsBusy()) {
             End(ORN_HDL_BUSY);
         }
-        entity.engine.RemoveModel(name);
-        auto& models = entity.models;
-        models.erase(std::find_if(models.begin(), models.end(),
-                                  [&](const auto& present) { return present.get() == &model; }));
+        entity.Remove(model);
+    });
+}
+
+orn_hdl_status_t orn_hdl_model_destroy(orn_hdl_model_t model) {
+    return Call<ModelEntity>(model.id, [](ModelEntity& entity) {
+        if (entity.IsBusy()) {
+            End(ORN_HDL_BUSY);
+        }
+        entity.engine.Remove(entity);
     });
 }
 

@@ -1,5 +1,6 @@
 #include "C/Handles.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <mutex>
@@ -154,12 +155,21 @@ ModelEntity* EngineEntity::Add(const char* name, const char* sourceFile) {
         return nullptr;
     }
     try {
-        models.push_back(std::make_unique<ModelEntity>(*engine.GetModel(name)));
+        models.push_back(std::make_unique<ModelEntity>(*this, *engine.GetModel(name)));
     } catch (...) {
         engine.RemoveModel(name);
         throw;
     }
     return models.back().get();
+}
+
+void EngineEntity::Remove(const ModelEntity& entity) {
+    // Commands can give two models one name, and the engine removes the first of a name.
+    const std::string name = "\x01" + std::to_string(entity.GetId());
+    entity.model.SetName(name);
+    engine.RemoveModel(name);
+    models.erase(std::find_if(models.begin(), models.end(),
+                              [&entity](const auto& present) { return present.get() == &entity; }));
 }
 
 bool EngineEntity::IsBusy() const noexcept {

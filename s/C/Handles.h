@@ -61,10 +61,13 @@ private:
     void* user_;
 };
 
+struct EngineEntity;
+
 /// A model and who is at work on it.
 struct ModelEntity final : Entity {
-    explicit ModelEntity(Model& ownModel) noexcept(false) : model(ownModel) {}
+    ModelEntity(EngineEntity& ownEngine, Model& ownModel) : engine(ownEngine), model(ownModel) {}
 
+    EngineEntity& engine;
     Model& model;
     /// Whether a call is under way that may change the model.
     bool isChanging = false;
@@ -89,6 +92,9 @@ struct EngineEntity final : Entity {
     ModelEntity* Find(const char* name) const;
     /// \throws std::bad_alloc, nothing added
     ModelEntity* Add(const char* name, const char* sourceFile);
+    /// Destroys a model with its entity.
+    /// \throws std::bad_alloc, nothing destroyed
+    void Remove(const ModelEntity& entity);
     bool IsBusy() const noexcept;
 };
 

@@ -22,8 +22,7 @@ namespace {
 
 /// Finds an object by name in a model.
 template <class Find>
-orn_hdl_status_t FindObject(orn_hdl_model_t model, orn_hdl_object_t* object,
-                            const Find& find) noexcept {
+orn_hdl_status_t FindObject(orn_hdl_model_t model, orn_hdl_object_t* object, const Find& find) {
     return LookAt(model, [&](const ModelEntity& entity) {
         Give(entity, find(*entity.model.GetNetlist()), object);
     });
@@ -32,7 +31,7 @@ orn_hdl_status_t FindObject(orn_hdl_model_t model, orn_hdl_object_t* object,
 /// Finds an object that belongs to another one.
 template <class Find>
 orn_hdl_status_t FindRelated(const orn_hdl_object_t& object, orn_hdl_object_t* result,
-                             const Find& find) noexcept {
+                             const Find& find) {
     return LookAt(object, [&](const ResolvedObject& from) {
         Give(*from.entity, find(*from.object), result);
     });
@@ -87,6 +86,18 @@ template <class Action> void WithWalk(Object& owner, std::int32_t list, const Ac
         return action(static_cast<CompoundBus&>(owner).GetBusMemberIterator());
     default:
         End(ORN_HDL_INVALID_ARGUMENT);
+    }
+}
+
+int WidthOf(Object& object) {
+    switch (KindOf(object)) {
+    case ORN_HDL_KIND_BUS_PIN:
+        return static_cast<const BusPin&>(object).GetWidth();
+    case ORN_HDL_KIND_SCALAR_PIN:
+    case ORN_HDL_KIND_BIT_PIN:
+        return 1;
+    default:
+        return CInterface::ToSignal(object).GetWidth();
     }
 }
 
@@ -274,18 +285,7 @@ orn_hdl_status_t orn_hdl_object_get_direction(orn_hdl_object_t object, int32_t* 
 orn_hdl_status_t orn_hdl_object_get_width(orn_hdl_object_t object, int32_t* width) {
     return LookAt(object, [&](const ResolvedObject& from) {
         Require(width != nullptr);
-        switch (KindOf(*from.object)) {
-        case ORN_HDL_KIND_BUS_PIN:
-            *width = static_cast<const BusPin*>(from.object)->GetWidth();
-            break;
-        case ORN_HDL_KIND_SCALAR_PIN:
-        case ORN_HDL_KIND_BIT_PIN:
-            *width = 1;
-            break;
-        default:
-            *width = CInterface::ToSignal(*from.object).GetWidth();
-            break;
-        }
+        *width = WidthOf(*from.object);
     });
 }
 

@@ -56,7 +56,7 @@ struct HolderPlace {
 template <class... Texts, class... Arguments>
 orn_hdl_status_t ChangeHolder(orn_hdl_model_t model, const HolderPlace& place,
                               const HolderOperation<Texts...>& operation,
-                              const Arguments*... arguments) noexcept {
+                              const Arguments*... arguments) {
     return Change(model, [&](Model& target) {
         switch (place.holder) {
         case ORN_HDL_OF_MODULE:
@@ -82,7 +82,7 @@ orn_hdl_status_t ChangeHolder(orn_hdl_model_t model, const HolderPlace& place,
 /// Carries out an action for each index, and counts those that succeed.
 template <class Action>
 orn_hdl_status_t ChangeMany(orn_hdl_model_t model, size_t count, size_t* done,
-                            const Action& action) noexcept {
+                            const Action& action) {
     size_t counted = 0;
     const orn_hdl_status_t status = Change(model, [&](Model& target) {
         for (; counted < count; ++counted) {

@@ -33,8 +33,7 @@ private:
 };
 
 /// Runs an action on the reader of either language.
-template <class Action>
-orn_hdl_status_t WithReader(orn_hdl_reader_t reader, const Action& action) noexcept {
+template <class Action> orn_hdl_status_t WithReader(orn_hdl_reader_t reader, const Action& action) {
     return Call<ReaderEntity>(reader.id, [&](ReaderEntity& entity) {
         const UsingReader use(entity);
         if (entity.verilog != nullptr) {
@@ -47,7 +46,7 @@ orn_hdl_status_t WithReader(orn_hdl_reader_t reader, const Action& action) noexc
 
 /// Runs an action on a reader of Verilog.
 template <class Action>
-orn_hdl_status_t WithVerilogReader(orn_hdl_reader_t reader, const Action& action) noexcept {
+orn_hdl_status_t WithVerilogReader(orn_hdl_reader_t reader, const Action& action) {
     return Call<ReaderEntity>(reader.id, [&](ReaderEntity& entity) {
         const UsingReader use(entity);
         if (entity.verilog == nullptr) {

@@ -78,6 +78,19 @@ TEST(CEngine, HandlesOfWhatIsGoneAreDead) {
     EXPECT_EQ(orn_hdl_engine_destroy(next), ORN_HDL_OK);
 }
 
+TEST(CEngine, AModelIsDestroyedWhateverItsName) {
+    const Session session;
+    orn_hdl_model_t other;
+    ASSERT_EQ(orn_hdl_engine_add_model(session.engine, "other", "", &other), ORN_HDL_OK);
+    ASSERT_EQ(orn_hdl_model_set_name(other, "top"), ORN_HDL_OK);
+    EXPECT_EQ(orn_hdl_model_destroy(other), ORN_HDL_OK);
+    EXPECT_EQ(orn_hdl_model_destroy(other), ORN_HDL_DEAD_HANDLE);
+    orn_hdl_text_t name;
+    ASSERT_EQ(orn_hdl_model_get_name(session.model, &name), ORN_HDL_OK);
+    EXPECT_EQ(ToString(name), "top");
+    EXPECT_EQ(orn_hdl_engine_execute(session.engine, "NOOP"), ORN_HDL_OK);
+}
+
 TEST(CEngine, HandlesOfOtherKindsAreRefused) {
     const Session session;
     EXPECT_EQ(orn_hdl_model_execute(orn_hdl_model_t{session.engine.id}, "NOOP"),

@@ -237,6 +237,7 @@ const std::vector<RandomCalls::Function>& RandomCalls::GetFunctions() {
         [](S& s) { return orn_hdl_engine_get_model(s.E(), s.T(), s.Out(s.model_)); },
         [](S& s) { return orn_hdl_engine_use_model(s.E(), s.T()); },
         [](S& s) { return orn_hdl_engine_remove_model(s.E(), s.T()); },
+        [](S& s) { return orn_hdl_model_destroy({s.Id()}); },
         [](S& s) { return orn_hdl_engine_execute(s.E(), s.Line()); },
         [](S& s) { return orn_hdl_engine_replay(s.E(), s.T(), s.File()); },
         [](S& s) { return orn_hdl_engine_error(s.E(), s.Out(s.error_)); },

@@ -199,5 +199,13 @@ TEST(CheckTargets, HaveNames) {
     EXPECT_FALSE(Check::FindTarget("ada", found));
 }
 
+TEST_F(CheckTest, ADesignMayHaveANameAsLongAsATargetTakes) {
+    constexpr std::size_t Longest = 127;
+    model_.SetName(std::string(Longest, 'n').c_str());
+    EXPECT_TRUE(Run().empty());
+    model_.SetName(std::string(Longest + 1, 'n').c_str());
+    EXPECT_EQ(Find("name-length").verdicts.Get(Check::Target::Verilator), Verdict::Rejects);
+}
+
 } // namespace
 } // namespace Orn_Hdl

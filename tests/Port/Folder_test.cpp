@@ -8,6 +8,7 @@
 #include <cerrno>
 #include <fcntl.h>
 #include <filesystem>
+#include <iterator>
 #include <string>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -143,6 +144,16 @@ TEST_F(Below, AClosedFileKeepsNoFolderOpen) {
         EXPECT_TRUE(file.close());
         EXPECT_EQ(Support::CountOpenFiles(), before) << mode;
     }
+}
+
+TEST_F(Below, AFolderThatOpensAnotherClosesTheFormer) {
+    const auto countDescriptors = [] {
+        const fs::directory_iterator all("/proc/self/fd");
+        return std::distance(begin(all), end(all));
+    };
+    const auto before = countDescriptors();
+    EXPECT_EQ(folder_.Open((base_ / "out").c_str()), 0);
+    EXPECT_EQ(countDescriptors(), before);
 }
 
 } // namespace

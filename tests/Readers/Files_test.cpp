@@ -120,6 +120,12 @@ TEST(VerilogMacros, AreReplaced) {
     EXPECT_NE(text.model.GetSignal("e"), nullptr);
 }
 
+TEST(VerilogMacros, ACommentIsABlankInTheirText) {
+    TextReader text;
+    text.Read("`define NET wire/* of one bit */n; \nmodule top;\n`NET\nendmodule\n");
+    EXPECT_NE(text.model.GetSignal("n"), nullptr);
+}
+
 TEST(VerilogMacros, ChooseOneBranch) {
     for (const char* defined : {"A", "B", "C", "D"}) {
         SCOPED_TRACE(defined);

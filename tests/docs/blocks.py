@@ -10,6 +10,8 @@ What follows the three back-quotes decides:
     orn               commands: replayed
     orn more          commands: replayed behind those of the blocks before
     verilog, vhdl     a passage of the netlist that the last commands give
+    python            run by Python behind the blocks before; a text block behind it is what it prints
+    tcl               run by tclsh with the installed package; a text block behind it is what it prints
     sh                run by bash; a text block behind it is what it prints
     LANGUAGE FILE     written to that file, for the blocks behind it
 
@@ -95,6 +97,8 @@ class Installed:
                 "PATH": f"{self.prefix / 'bin'}:{os.environ['PATH']}",
                 "CMAKE_PREFIX_PATH": str(self.prefix),
                 "PKG_CONFIG_PATH": str(self.libraries / "pkgconfig"),
+                "PYTHONPATH": str(self.prefix / "lib" / "python3" / "dist-packages"),
+                "TCLLIBPATH": str(self.libraries / "tcltk"),
                 "LD_LIBRARY_PATH": str(self.libraries)}
 
 
@@ -107,6 +111,7 @@ class Page:
         self.installed = installed
         self.printed: str | None = None
         self.commands = ""
+        self.program = ""
 
     def run(self, *command: str | Path) -> str:
         done = subprocess.run([str(word) for word in command], cwd=self.folder,
@@ -143,6 +148,11 @@ class Page:
             netlist = (self.folder / f"block.{block.language}").read_text()
             if _without_ends(block.code) not in _without_ends(netlist):
                 raise Failed(f"is no passage of\n{netlist}")
+        elif block.language == "python":
+            self.check_python(block.code)
+        elif block.language == "tcl":
+            (self.folder / "block.tcl").write_text(block.code)
+            self.printed = self.run("tclsh", "block.tcl")
         elif block.language == "sh":
             self.printed = self.run("bash", "-euo", "pipefail", "-c", block.code)
         else:
@@ -176,6 +186,15 @@ class Page:
             self.printed = self.run(program)
         else:
             self.run(*C_COMPILE, source, include, "-fsyntax-only")
+
+    def check_python(self, code: str) -> None:
+        """Runs a block with what those before have defined, and without what they print."""
+        (self.folder / "before.py").write_text(self.program)
+        program = ("import contextlib, io\n"
+                   "with contextlib.redirect_stdout(io.StringIO()):\n"
+                   "    exec(open('before.py').read())\n" + code)
+        self.printed = self.run(sys.executable, "-c", program)
+        self.program += code
 
     @staticmethod
     def check_printed(block: Block, printed: str | None) -> None:

@@ -65,7 +65,7 @@ class Layers(unittest.TestCase):
         self.assertEqual(upwards, UPWARDS)
 
     def test_every_place_of_the_table_exists(self) -> None:
-        self.assertEqual(len(LAYERS), 16)
+        self.assertEqual(len(LAYERS), 17)
         for name, places in LAYERS:
             for place in places:
                 self.assertTrue(any((PROJECT / root / place).exists()

@@ -70,7 +70,7 @@ def test_random_commands(seed: int, tmp_path: Path, monkeypatch: pytest.MonkeyPa
 
 def test_the_whole_catalogue_is_among_them() -> None:
     seen: Set[str] = set()
-    for seed in SEEDS:
+    for seed in range(40):
         text = generate(seed, KINDS[seed % len(KINDS)], DEFAULT_LINES).decode(errors="surrogateescape")
         seen |= phrases_in(text)
     assert len(orn_hdl.catalogue()) == 61

@@ -4,6 +4,7 @@ from __future__ import annotations
 
 import io
 import json
+import os
 import subprocess
 import sys
 from pathlib import Path
@@ -97,6 +98,8 @@ def test_without_the_tool(tmp_path: Path, monkeypatch: pytest.MonkeyPatch) -> No
         half_adder().import_json("x.json")
 
 
+@pytest.mark.skipif("ASAN_OPTIONS" in os.environ, reason="the interpreter needs the sanitizer's library, and the "
+                    "tool that takes its place must not have it")
 def test_the_tool_by_the_package(tmp_path: Path) -> None:
     arguments = ["commands", "ADD", "INSTANCE"]
     by_tool = subprocess.run([TOOL, *arguments], cwd=tmp_path, capture_output=True, check=True)

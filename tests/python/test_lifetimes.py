@@ -3,6 +3,7 @@
 from __future__ import annotations
 
 import gc
+import sys
 import weakref
 from pathlib import Path
 
@@ -210,6 +211,7 @@ def test_a_finalizer_cannot_work_on_the_design_meanwhile() -> None:
             Trap()
     finally:
         gc.set_threshold(*threshold)
+    assert refused or sys.version_info >= (3, 12), "the collector runs while the walk makes its items"
     assert sum(1 for _ in d.connections()) == 2006
 
 

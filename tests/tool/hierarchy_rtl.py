@@ -56,3 +56,32 @@ module pipe(input clk, input [4:0] a, input [4:0] b, output reg [5:0] y);
    end
 endmodule
 """
+
+# A memory with contents, in a module of its own.
+MEMORY = """\
+module store(input clk, input we, input [2:0] at, input [7:0] in, output [7:0] out);
+   reg [7:0] words [0:7];
+   integer i;
+   initial for (i = 0; i < 8; i = i + 1) words[i] = 3 * i + 1;
+   always @(posedge clk) if (we) words[at] <= in;
+   assign out = words[at];
+endmodule
+module memory(input clk, input we, input [2:0] at, input [7:0] word, output [7:0] y);
+   wire [7:0] q;
+   store data(.clk(clk), .we(we), .at(at), .in(word ^ 8'h5a), .out(q));
+   assign y = q;
+endmodule
+"""
+
+# Cells that only Yosys knows, with parameters in several sizes, and ports in either direction.
+WORDS = """\
+module unit #(parameter W = 3)(input signed [W-1:0] a, input [0:W-1] b, output [W:1] y, output less);
+   assign y = a + b;
+   assign less = a < b;
+endmodule
+module words(input [2:0] a, input [0:2] b, input [9:0] c, output [2:0] y, output [12:3] z,
+             output [1:0] less);
+   unit small(.a(a), .b(b), .y(y), .less(less[0]));
+   unit #(.W(10)) large(.a(c), .b({c[4:0], 5'd3}), .y(z), .less(less[1]));
+endmodule
+"""

@@ -276,8 +276,21 @@ class Cells(ImportTest):
         done = self.import_design(contents, "--x-as", "1")
         self.assertEqual(done.lines("ASSIGN CONSTANT"), ["y(1:0) 2:B:11", "u.I(2:0) 3:B:101"])
         self.assertIn("u -TYPE=BitVector P 2:B:11", done.lines("ADD INSTANCE ATTRIBUTE"))
+        self.assertEqual(done.warnings, [
+            "d.json: warning: modules.top.ports.y.bits[0]: the value x becomes 1 (and 1 more place)",
+            "d.json: warning: modules.top.ports.y.bits[1]: the value z becomes 1 (and 1 more place)",
+            "d.json: warning: modules.top.cells.u.parameters.P: x and z in a parameter become 1"])
         done = self.import_design(contents, "--x-as", "0")
         self.assertEqual(done.lines("ASSIGN CONSTANT"), ["y(1:0) 2:B:00", "u.I(2:0) 3:B:000"])
+
+    def test_replaced_values_are_counted(self) -> None:
+        """What is open is not replaced."""
+        done = self.import_design(design(
+            {"y": port("output", 9), "p": port("inout", "z")},
+            {f"u{i}": cell("LEAF", "iob", I=["x", "x"], O=["x"], P=["z"]) for i in range(3)}),
+            "--x-as", "0", allowed="")
+        self.assertEqual(done.warnings, ["d.json: warning: modules.top.cells.u0.connections.I[0]: "
+                                         "the value x becomes 0 (and 5 more places)"])
 
     def test_unconnected_pins_stay_open(self) -> None:
         done = self.import_design(design({}, {

@@ -8,7 +8,7 @@ import shutil
 import subprocess
 import unittest
 
-from hierarchy_rtl import COUNTERS, PIPE
+from hierarchy_rtl import COUNTERS, MEMORY, PIPE, WORDS
 from support import EXAMPLES, FAILED, SUCCESS, USAGE
 from yosys_json import MARK, ImportTest, Json, black_box, cell, design, net, port
 
@@ -339,6 +339,15 @@ class Files(HierarchyTest):
         self.expect(self.run_tool("import", "d.json", "-o", "there"), SUCCESS)
         self.assertEqual(self.read("there/commands.txt"), "there/sub.cmd\nthere/top.cmd\n")
 
+    def test_folders_of_netlists_in_the_languages(self) -> None:
+        self.write("m.v", "module m(input a, output y); INV u(.I(a), .O(y)); endmodule\n")
+        self.expect(self.run_tool("import", "m.v", "--output-dir", "out", "--vhdl", "-", "-o",
+                                  "c.list"), SUCCESS, "", "out/m.vhd\n")
+        self.assertEqual(self.read("c.list"), "out/m.cmd\n")
+        self.expect(self.run_tool("import", "m.v", "-o", "cmd/"), SUCCESS)
+        self.assertEqual(self.read("cmd/commands.txt"), "cmd/m.cmd\n")
+        self.assertIn("SET NETLIST NAME m\n", self.read("cmd/m.cmd"))
+
     def test_one_command_file_holds_one_module(self) -> None:
         self.refuse(self.contents, "the design has 2 modules, and a command file holds one: -o DIR/ "
                                    "writes one file a module")
@@ -418,39 +427,57 @@ class Clauses(HierarchyTest):
 class Designs(HierarchyTest):
     """Designs that Yosys has read, before and after synthesis; it proves the netlists equal."""
 
-    def check_design(self, source: str, top: str, commands: str) -> None:
+    def check_design(self, source: str, top: str, commands: str, *options: str,
+                     proof: str = "-tempinduct -seq 1") -> None:
         self.write("rtl.v", source)
         self.yosys(f"read_verilog rtl.v; hierarchy -check -top {top}; {commands}; "
                    "write_json d.json")
-        verilog, vhdl = self.import_both(message=None)
+        verilog, vhdl = self.import_both(None, *options, message=None)
         self.assertEqual(len(self.entities_of(vhdl)), len(self.modules_of(verilog)))
         self.write("bodies.v", self.make_bodies())
         self.yosys(
             f"read_verilog rtl.v; hierarchy -check -top {top}; proc; opt_clean; flatten; "
             f"memory; opt_clean; rename {top} gold; design -stash gold; "
             f"read_verilog d.v; read_verilog -icells bodies.v; hierarchy -check -top {top}; "
-            f"flatten; opt_clean; rename {top} gate; design -stash gate; "
+            f"flatten; opt_clean; memory_map; opt_clean; rename {top} gate; design -stash gate; "
             "design -copy-from gold gold; design -copy-from gate gate; "
             "miter -equiv -flatten -make_assert gold gate m; hierarchy -top m; "
-            "sat -verify -prove-asserts -tempinduct -set-init-zero -seq 1 m")
+            f"sat -verify -prove-asserts -set-init-zero {proof} m")
         self.analyse()
 
     def make_bodies(self) -> str:
-        """A module for each leaf cell, which is the cell of Yosys."""
+        """A module for each leaf component, which is the cell of Yosys with its parameters."""
         lines = [line.split("\t") for line in self.read("x.map").splitlines()]
-        old_modules = {old for kind, old, _ in lines if kind == "module"}
-        cells = {new: old for kind, old, new in lines
-                 if kind == "component" and old not in old_modules}
-        types = json.loads(self.read("d.json"))["modules"]
-        texts = []
-        for new, old in cells.items():
-            example = next(c for m in types.values() for c in m["cells"].values()
-                           if c["type"] == old)
-            ports = ", ".join(f"{direction} {pin}"
-                              for pin, direction in example["port_directions"].items())
-            wired = ", ".join(f".{pin}({pin})" for pin in example["port_directions"])
-            texts.append(f"module {new}({ports}); \\{old} g({wired}); endmodule\n")
-        return "".join(texts)
+        modules = json.loads(self.read("d.json"))["modules"]
+        cells = {c["type"]: c for m in modules.values() for c in m["cells"].values()
+                 if c["type"] not in modules}
+        parts: dict[tuple[str, str], tuple[dict[str, str], set[str]]] = {}
+        for kind, old, new in lines:
+            if kind == "component" and old in cells:
+                parts[new, old] = ({}, set())
+            elif kind in ("pin", "parameter") and old.rpartition(".")[0] in cells:
+                component, _, name = new.rpartition(".")
+                pins, parameters = parts[component, old.rpartition(".")[0]]
+                if kind == "parameter":
+                    parameters.add(name)
+                else:
+                    base, _, index = name.rstrip(")").partition("(")
+                    pins[base] = f"[{index}] " if index else ""
+        return "".join(self.make_body(new, cells[old], *parts[new, old]) for new, old in parts)
+
+    @staticmethod
+    def make_body(name: str, example: Json, pins: dict[str, str], parameters: set[str]) -> str:
+        """\param pins their ranges."""
+        ports = ", ".join(f"{example['port_directions'][pin]} {index}{pin}"
+                          for pin, index in pins.items())
+        wired = ", ".join(f".{pin}({pin})" for pin in pins)
+        # The name of a memory is an escaped text, which became bits.
+        told = sorted(parameters - {"MEMID"})
+        declared = "".join(f"parameter {parameter} = 0; " for parameter in sorted(parameters))
+        values = ", ".join([f".{parameter}({parameter})" for parameter in told] +
+                           [r'.MEMID("\\words")'] * ("MEMID" in parameters))
+        given = f" #({values})" if told else ""
+        return f"module {name}({ports}); {declared}\\{example['type']}{given} g({wired}); endmodule\n"
 
     def analyse(self) -> None:
         if shutil.which("ghdl") is None:
@@ -476,6 +503,17 @@ class Designs(HierarchyTest):
     def test_pipe(self) -> None:
         self.check_design(PIPE, "pipe", "synth")
         self.assertEqual(self.entities_of(self.read("d.vhd"))[:2], ["half", "full"])
+
+    def test_memory(self) -> None:
+        """The contents come over as a parameter of a cell without a definition."""
+        self.check_design(MEMORY, "memory", "proc; opt; memory -nomap", "--x-as", "0",
+                          proof="-seq 4")
+        contents = "".join(f"{3 * word + 1:08b}" for word in reversed(range(8)))
+        self.assertRegex(self.read("d.vhd"), rf'INIT => *\s+b"{contents}"')
+        self.assertRegex(self.read("d.v"), rf"INIT = *\s+64'b{contents};")
+
+    def test_pads_and_records(self) -> None:
+        self.check_design(WORDS, "words", "proc; opt_clean")
 
 
 if __name__ == "__main__":

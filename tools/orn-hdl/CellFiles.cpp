@@ -1,5 +1,6 @@
 #include "CellFiles.h"
 
+#include "Gzip.h"
 #include "Import.h"
 #include "cells/CellDeclaration.h"
 
@@ -22,6 +23,11 @@ constexpr std::size_t Margin = 4096;
 } // namespace
 
 Status ReadWholeFile(const std::string& name, std::string& text) {
+    if (IsGzip(name)) {
+        ReadGzip(name, text);
+        text.reserve(text.size() + Margin);
+        return Status::Success;
+    }
     Port::File file;
     if (!file.open(SystemFileName(name.c_str()), Port::File::Read, true)) {
         return ComplainUnreadable(name, file.GetError());
@@ -54,7 +60,7 @@ Status ReadCellFiles(const std::vector<std::string>& files, Import::CellLibrary&
             return read;
         }
         try {
-            library.Add(file, std::move(text));
+            library.Add(std::string(WithoutGzip(file)), std::move(text));
         } catch (const Cells::Error& error) {
             Diagnostic diagnostic = MakeFileDiagnostic(file, Severity::Error, error.what());
             diagnostic.place.line = error.GetLine();

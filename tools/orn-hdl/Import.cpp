@@ -1,5 +1,6 @@
 #include "Import.h"
 
+#include "Gzip.h"
 #include "JsonImport.h"
 #include "NetlistImport.h"
 #include "Progress.h"
@@ -40,7 +41,7 @@ constexpr Extension Extensions[] = {
 ImportFormat GetFormat(const ImportOptions& options) {
     const auto* const found =
         std::find_if(std::begin(Extensions), std::end(Extensions), [&](const Extension& extension) {
-            return HasExtension(options.file, extension.text);
+            return HasExtension(WithoutGzip(options.file), extension.text);
         });
     const ImportFormat told = found == std::end(Extensions) ? ImportFormat::Json : found->format;
     return options.format.value_or(told);
@@ -91,18 +92,28 @@ bool IsFolder(const std::string& file) {
 
 } // namespace
 
-std::string GetCommandFolder(const ImportOptions& options) {
-    if (options.commandFile.empty() || IsFolder(options.commandFile)) {
-        return options.commandFile;
-    }
-    return options.outputs.folder;
+bool HasCommandFolder(const ImportOptions& options) {
+    return IsFolder(options.commandFile) ||
+           (!options.commandFile.empty() && !options.outputs.folder.empty());
 }
 
-std::string GetCommandList(const ImportOptions& options) {
-    if (IsFolder(options.commandFile)) {
-        return (std::filesystem::path(options.commandFile) / "commands.txt").string();
+std::vector<std::string> MakeCommandFiles(const ImportOptions& options,
+                                          const std::vector<std::string>& modules) {
+    if (!HasCommandFolder(options)) {
+        return {options.commandFile};
     }
-    return options.outputs.folder.empty() ? std::string() : options.commandFile;
+    const std::string& folder =
+        IsFolder(options.commandFile) ? options.commandFile : options.outputs.folder;
+    return MakeFolder(folder) == Status::Success ? MakeFileNames(modules, folder, ".cmd")
+                                                 : std::vector<std::string>();
+}
+
+Status WriteCommandList(const ImportOptions& options, const std::vector<std::string>& files) {
+    if (!HasCommandFolder(options)) {
+        return Status::Success;
+    }
+    const std::filesystem::path list = options.commandFile;
+    return WriteFileList(IsFolder(list) ? (list / "commands.txt").string() : list.string(), files);
 }
 
 std::string DescribeOtherFile(const std::string& beginning) {

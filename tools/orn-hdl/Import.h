@@ -70,10 +70,14 @@ Status ImportDesign(const ImportOptions& options);
 /// The languages in which the names of an import must be legal: those asked for, or else those of
 /// the netlists. A command file can be written in both.
 Import::NameLanguages GetNameLanguages(const ImportOptions& options);
-/// The folder for one command file a module; empty for one command file.
-std::string GetCommandFolder(const ImportOptions& options);
-/// The file for the list of these command files; empty for none.
-std::string GetCommandList(const ImportOptions& options);
+/// Whether each module gets a command file of its own.
+bool HasCommandFolder(const ImportOptions& options);
+/// The command files of modules, in a folder that is made if need be; a single empty name for no
+/// command file.
+std::vector<std::string> MakeCommandFiles(const ImportOptions& options,
+                                          const std::vector<std::string>& modules);
+/// Writes the list of command files, if there is to be one.
+Status WriteCommandList(const ImportOptions& options, const std::vector<std::string>& files);
 /// Reports what keeps a netlist from being legal. \return whether anything does.
 bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file,
                      Reporter& reporter);

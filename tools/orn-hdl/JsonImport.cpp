@@ -55,27 +55,20 @@ public:
 
 private:
     const Netlists& netlists_;
-    /// The list of the files; empty for none.
-    const std::string list_;
-    const std::string folder_;
+    const ImportOptions& options_;
     std::vector<std::string> names_;
     std::vector<std::unique_ptr<OutputFile>> files_;
 };
 
 CommandFiles::CommandFiles(const Netlists& netlists, const ImportOptions& options)
-    : netlists_(netlists), list_(GetCommandList(options)), folder_(GetCommandFolder(options)) {
-    if (folder_.empty()) {
-        names_.push_back(options.commandFile);
-        return;
-    }
-    for (const ImportedNetlist& netlist : netlists) {
-        names_.push_back(netlist.name);
-    }
-    names_ = MakeFileNames(names_, folder_, ".cmd");
-}
+    : netlists_(netlists), options_(options) {}
 
 Status CommandFiles::Write() {
-    Status status = folder_.empty() ? Status::Success : MakeFolder(folder_);
+    for (const ImportedNetlist& netlist : netlists_) {
+        names_.push_back(netlist.name);
+    }
+    names_ = MakeCommandFiles(options_, names_);
+    Status status = names_.empty() ? Status::File : Status::Success;
     for (std::size_t i = 0; i < names_.size() && status == Status::Success; ++i) {
         files_.push_back(std::make_unique<OutputFile>(names_[i]));
         if (Port::Stream* const out = files_.back()->GetStream()) {
@@ -92,7 +85,7 @@ Status CommandFiles::Commit() {
     for (const std::unique_ptr<OutputFile>& file : files_) {
         status = Worse(status, file->Commit());
     }
-    return status == Status::Success && !list_.empty() ? WriteFileList(list_, names_) : status;
+    return status == Status::Success ? WriteCommandList(options_, names_) : status;
 }
 
 Status WriteImported(const Netlists& netlists, const ImportOptions& options, Reporter& reporter) {
@@ -183,7 +176,7 @@ Netlists MakeNetlists(ImportedDesign& design, const ImportOptions& options, Impo
     if (options.vhdl.configuration) {
         CheckConfigurationNames(netlists);
     }
-    if (netlists.size() > 1 && !options.commandFile.empty() && GetCommandFolder(options).empty()) {
+    if (netlists.size() > 1 && !options.commandFile.empty() && !HasCommandFolder(options)) {
         throw Error("the design has " + std::to_string(netlists.size()) +
                     " modules, and a command file holds one: -o DIR/ writes one file a module");
     }

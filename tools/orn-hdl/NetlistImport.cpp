@@ -2,6 +2,7 @@
 
 #include "CellFiles.h"
 #include "CommandsOutput.h"
+#include "Gzip.h"
 #include "NetlistNames.h"
 #include "Output.h"
 #include "diagnostics/SourceLines.h"
@@ -16,12 +17,14 @@
 #include <algorithm>
 #include <charconv>
 #include <cstdint>
+#include <filesystem>
 #include <map>
 #include <optional>
 #include <set>
 #include <string>
 #include <string_view>
 #include <utility>
+#include <vector>
 
 namespace Tool {
 
@@ -107,6 +110,10 @@ void AddNotes(Diagnostic& diagnostic) {
 Status CheckReadable(const std::string& name) {
     char first = '\0';
     Port::File file;
+    if (IsGzip(name)) {
+        SystemFileName(name.c_str());
+        return Status::Success;
+    }
     if (name != "-" && CanReadAgain(name)) {
         file.open(name.c_str(), Port::File::Read, true);
         file.read(&first, 1);
@@ -121,11 +128,12 @@ Status CheckReadable(const std::string& name) {
 
 /// The language of a library of cells; nothing for what no reader of the library reads.
 std::optional<ImportFormat> GetFormat(const std::string& library) {
-    if (HasExtension(library, ".vhd") || HasExtension(library, ".vhdl")) {
+    const string_view name = WithoutGzip(library);
+    if (HasExtension(name, ".vhd") || HasExtension(name, ".vhdl")) {
         return ImportFormat::Vhdl;
     }
-    const bool isOther = HasExtension(library, ".lib") || HasExtension(library, ".liberty") ||
-                         HasExtension(library, ".json");
+    const bool isOther =
+        HasExtension(name, ".lib") || HasExtension(name, ".liberty") || HasExtension(name, ".json");
     return isOther ? std::nullopt : std::optional<ImportFormat>(ImportFormat::Verilog);
 }
 
@@ -144,6 +152,7 @@ private:
     template <class Reader> Status Read(Reader& reader);
     template <class Reader> void SetUp(Reader& reader);
     void SetUpVerilog(Orn_Hdl::VerilogReader& reader);
+    void ShowCompressedName(std::string& file) const;
     bool KeepsName(string_view name) const;
     Status TellRenamedPorts(const std::vector<ReaderRenaming>& renamings);
     void TellUnknownDefaults();
@@ -168,7 +177,7 @@ Status Importer::ReadLibraries() {
         } else if (const Status status = CheckReadable(library); status != Status::Success) {
             return status;
         } else if (format != format_) {
-            Orn_Hdl::VhdlReader::ReadComponents(library.c_str(), cells_);
+            Orn_Hdl::VhdlReader::ReadComponents(SystemFileName(library.c_str()), cells_);
         }
     }
     Import::CellLibrary library;
@@ -196,13 +205,30 @@ template <class Reader> void Importer::SetUp(Reader& reader) {
     reader.SetKeptNames([this](string_view name) { return KeepsName(name); });
     for (const std::string& library : options_.libraries) {
         if (GetFormat(library) == format_) {
-            reader.AddLibrary(library.c_str());
+            reader.AddLibrary(SystemFileName(library.c_str()));
         }
     }
     reader.AddLibrary(cells_);
 }
 
+/// Messages name a compressed file, and not the contents that were read.
+void Importer::ShowCompressedName(std::string& file) const {
+    std::vector<std::string> names = options_.libraries;
+    names.push_back(options_.file);
+    for (const std::string& name : names) {
+        if (IsGzip(name) && file == SystemFileName(name.c_str())) {
+            file = name;
+            return;
+        }
+    }
+}
+
 void Importer::SetUpVerilog(Orn_Hdl::VerilogReader& reader) {
+    if (IsGzip(options_.file)) {
+        // The contents lie in another folder.
+        const std::string folder = std::filesystem::path(options_.file).parent_path().string();
+        reader.AddIncludeFolder(folder.empty() ? "." : folder.c_str());
+    }
     reader.SetUndeclared(ReaderUndeclared::Infer);
     for (const std::string& folder : options_.includeFolders) {
         reader.AddIncludeFolder(folder.c_str());
@@ -278,7 +304,12 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
     // The name of the netlist that was read is in no output.
     model_->SetSourceFileName("");
     // A write changes the design, so the commands come first.
-    CommandsOutput commands(options_.commandFile);
+    const std::vector<std::string> files =
+        MakeCommandFiles(options_, {std::string(model_->GetNetlist()->GetNameView())});
+    if (files.empty()) {
+        return Status::File;
+    }
+    CommandsOutput commands(files.front());
     OutputFile nameMap(options_.nameMap);
     if (Port::Stream* out = nameMap.GetStream()) {
         WriteNetlistNames(*model_->GetNetlist(), renamings, legal ? &*legal : nullptr, *out);
@@ -287,12 +318,15 @@ Status Importer::WriteAll(const std::vector<ReaderRenaming>& renamings) {
     if (status == Status::Success) {
         status = WriteNetlists(*model_, options_, legal ? &*legal : nullptr, reporter_);
     }
-    return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
+    if (status == Status::Success) {
+        status = Worse(commands.Commit(), nameMap.Commit());
+    }
+    return status == Status::Success ? WriteCommandList(options_, files) : status;
 }
 
 template <class Reader> Status Importer::Read(Reader& reader) {
     SetUp(reader);
-    reader.Read(options_.file.c_str(), *model_);
+    reader.Read(SystemFileName(options_.file.c_str()), *model_);
     const Status status = TellRenamedPorts(reader.GetRenamings());
     if (status == Status::Success && names_.HasVhdl()) {
         TellUnknownDefaults();
@@ -310,6 +344,7 @@ Status Importer::Run() {
         }
         Diagnostic diagnostic = ReadMessage(message);
         AddNotes(diagnostic);
+        ShowCompressedName(diagnostic.place.file);
         reporter_.Report(std::move(diagnostic));
         return Status::Failed;
     }

@@ -1,5 +1,6 @@
 #include "Output.h"
 
+#include "Gzip.h"
 #include "NetlistText.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Progress.h"
@@ -11,15 +12,18 @@ namespace Tool {
 
 namespace {
 
-/// Writes a netlist to standard output, by way of a temporary file: only a file that is opened by
-/// its name gets indentation, and standard output may be a socket, which cannot be opened.
-Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl::Language language,
-                   bool noHeader, Progress& progress) {
+/// Writes a netlist to standard output or into a compressed file, by way of a temporary file: only
+/// a file that is opened by its name gets indentation, and standard output may be a socket, which
+/// cannot be opened.
+Status WriteByTemporary(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal,
+                        Orn_Hdl::Language language, const std::string& target, bool noHeader,
+                        Progress& progress) {
+    const std::string shown = target == "-" ? "standard output" : target;
     const TemporaryFile file;
     if (!file.IsOpen()) {
         return Status::File;
     }
-    progress.Writing("standard output");
+    progress.Writing(shown);
     model.GetOptions()->writeHeader = !noHeader;
     Orn_Hdl::TextFileOutStream out;
     if (out.Open(file.GetName().c_str(), Orn_Hdl::TextFileOutStream::Overwrite)) {
@@ -28,12 +32,14 @@ Status PrintOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl:
     }
     if (model.GetOptions()->verify && out.GetError() == 0) {
         const Orn_Hdl::Proof::Written written = GetWritten(model, legal);
-        Orn_Hdl::Proof::Require(file.GetName().c_str(), "standard output", language,
-                                written.netlist, written.options);
+        Orn_Hdl::Proof::Require(file.GetName().c_str(), shown.c_str(), language, written.netlist,
+                                written.options);
     }
     progress.Erase();
-    return out.GetError() == 0 ? file.Print()
-                               : ComplainUnwritable("a temporary file", out.GetError());
+    if (out.GetError() != 0) {
+        return ComplainUnwritable("a temporary file", out.GetError());
+    }
+    return target == "-" ? file.Print() : WriteGzip(file, target);
 }
 
 /// Writes a legal netlist into a file, which is replaced once all of it has been written.
@@ -61,8 +67,8 @@ Status WriteOutput(Orn_Hdl::Model& model, Orn_Hdl::LegalNetlist* legal, Orn_Hdl:
     if (file.empty()) {
         return Status::Success;
     }
-    if (file == "-") {
-        return PrintOutput(model, legal, language, noHeader, progress);
+    if (file == "-" || IsGzip(file)) {
+        return WriteByTemporary(model, legal, language, file, noHeader, progress);
     }
     if (legal != nullptr) {
         return WriteLegally(model, *legal, language, file, noHeader, progress);
@@ -89,10 +95,20 @@ bool Outputs::IsEmpty() const {
 }
 
 OutputFile::OutputFile(const std::string& name) : name_(name) {
-    if (!name_.empty() &&
-        Check(file_.open(name_.c_str(), Port::File::Replace, true)) == Status::Success) {
+    if (!name_.empty() && Check(Open()) == Status::Success) {
         stream_.emplace(file_);
     }
+}
+
+OutputFile::~OutputFile() = default;
+
+bool OutputFile::Open() {
+    if (!IsGzip(name_)) {
+        return file_.open(name_.c_str(), Port::File::Replace, true);
+    }
+    contents_ = std::make_unique<TemporaryFile>();
+    return contents_->IsOpen() &&
+           file_.open(contents_->GetName().c_str(), Port::File::Overwrite, true);
 }
 
 Status OutputFile::Check(bool good) {
@@ -107,7 +123,10 @@ Status OutputFile::Flush() {
 }
 
 Status OutputFile::Commit() {
-    return stream_ && Flush() == Status::Success ? Check(file_.close()) : status_;
+    if (!stream_ || Flush() != Status::Success || Check(file_.close()) != Status::Success) {
+        return status_;
+    }
+    return contents_ == nullptr ? Status::Success : WriteGzip(*contents_, name_);
 }
 
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,

@@ -8,6 +8,7 @@
 
 #include <functional>
 #include <map>
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
@@ -20,6 +21,7 @@ class Model;
 namespace Tool {
 
 class Progress;
+class TemporaryFile;
 
 /// The netlists to write.
 struct Outputs {
@@ -40,6 +42,9 @@ class OutputFile {
 public:
     /// Prints a message if the file cannot be written.
     explicit OutputFile(const std::string& name);
+    OutputFile(const OutputFile&) = delete;
+    OutputFile& operator=(const OutputFile&) = delete;
+    ~OutputFile();
 
     /// The stream to write to; null if there is no file or it cannot be written.
     Port::Stream* GetStream() noexcept { return stream_ ? &*stream_ : nullptr; }
@@ -49,9 +54,12 @@ public:
     Status Commit();
 
 private:
+    bool Open();
     Status Check(bool good);
 
     const std::string name_;
+    /// What is written of a compressed file.
+    std::unique_ptr<TemporaryFile> contents_;
     Port::File file_;
     std::optional<Port::Stream> stream_;
     Status status_ = Status::Success;

@@ -1,6 +1,7 @@
 #include "Run.h"
 
 #include "CommandsOutput.h"
+#include "Gzip.h"
 #include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/Ascii.h"
@@ -163,7 +164,8 @@ std::string GetModelName(const std::string& file, const std::optional<std::strin
     if (file == "-") {
         return NamelessModel;
     }
-    return std::string(Port::FileName(file.c_str()).GetStem().GetView());
+    const std::string name(WithoutGzip(file));
+    return std::string(Port::FileName(name.c_str()).GetStem().GetView());
 }
 
 CommandFile::CommandFile(const std::string& fileName, const ReportOptions& report,

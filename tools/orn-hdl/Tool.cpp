@@ -1,5 +1,6 @@
 #include "Tool.h"
 
+#include "Gzip.h"
 #include "Port/File.h"
 
 #include <cerrno>
@@ -47,7 +48,10 @@ Status Print(std::string_view text) {
     return ComplainUnwritable("standard output", errno);
 }
 
-const char* SystemFileName(const char* file) noexcept {
+const char* SystemFileName(const char* file) {
+    if (IsGzip(file)) {
+        return UnpackGzip(file);
+    }
     return std::string_view(file) == "-" ? "/dev/stdin" : file;
 }
 

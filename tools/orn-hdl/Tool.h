@@ -33,7 +33,9 @@ Status ComplainUnwritable(std::string_view file, int error);
 /// Prints a text on standard output, or a message if that fails.
 Status Print(std::string_view text);
 
-/// The name to open for an input file on the command line: "-" is standard input.
-const char* SystemFileName(const char* file) noexcept;
+/// The name to open for an input file on the command line: "-" is standard input, and a compressed
+/// file is unpacked.
+/// \throws GzipError if a compressed file cannot be unpacked.
+const char* SystemFileName(const char* file);
 
 } // namespace Tool

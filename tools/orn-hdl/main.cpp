@@ -2,6 +2,7 @@
 
 #include "CommandsPage.h"
 #include "Draw.h"
+#include "Gzip.h"
 #include "Import.h"
 #include "Run.h"
 #include "Tool.h"
@@ -593,6 +594,9 @@ Status Main(int argc, const char* const* argv) {
         return CommandLine().Execute(argc, argv);
     } catch (const std::bad_alloc&) {
         Tool::Complain("out of memory");
+    } catch (const Tool::GzipError& error) {
+        Tool::Complain(error.what());
+        return Status::File;
     } catch (const std::exception& error) {
         Tool::Complain(error.what());
     }

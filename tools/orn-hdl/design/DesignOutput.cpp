@@ -1,5 +1,6 @@
 #include "design/DesignOutput.h"
 
+#include "Gzip.h"
 #include "NetlistText.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/NameScope.h"
@@ -28,7 +29,7 @@ public:
     Status Write();
 
 private:
-    Status Print();
+    Status WriteByTemporary();
     Status Replace();
     void WriteHeader(Orn_Hdl::OutStream& out) const;
     void WriteBodies(Orn_Hdl::TextFileOutStream& out);
@@ -50,7 +51,7 @@ Status DesignFileWriter::Write() {
         }
     }
     try {
-        return file_ == "-" ? Print() : Replace();
+        return file_ == "-" || IsGzip(file_) ? WriteByTemporary() : Replace();
     } catch (const Orn_Hdl::ProofException& exception) {
         return present_->tell(exception.GetDifferences(), file_ == "-" ? "standard output" : file_);
     }
@@ -58,7 +59,7 @@ Status DesignFileWriter::Write() {
 
 /// Only a file that is opened by its name gets indentation, and standard output may be a socket,
 /// which cannot be opened.
-Status DesignFileWriter::Print() {
+Status DesignFileWriter::WriteByTemporary() {
     const TemporaryFile file;
     Orn_Hdl::TextFileOutStream out;
     if (!file.IsOpen()) {
@@ -69,8 +70,10 @@ Status DesignFileWriter::Print() {
         WriteBodies(out);
         out.Close();
     }
-    return out.GetError() == 0 ? file.Print()
-                               : ComplainUnwritable("a temporary file", out.GetError());
+    if (out.GetError() != 0) {
+        return ComplainUnwritable("a temporary file", out.GetError());
+    }
+    return file_ == "-" ? file.Print() : WriteGzip(file, file_);
 }
 
 Status DesignFileWriter::Replace() {

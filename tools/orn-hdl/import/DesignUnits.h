@@ -32,6 +32,8 @@ public:
 
     /// The unit that cells of a type are of; null for a leaf cell.
     const DesignUnit* Find(std::uint32_t type) const;
+    /// The module of that name, with or without contents; null if there is none.
+    const Module* FindModule(std::string_view name) const { return hierarchy_.Find(name); }
     const DesignUnit& Get(const Module& module) const { return units_.at(&module); }
     /// Takes over the names of a module's ports. \param owners those of the module.
     void SetPorts(const Module& module, const BitOwners& owners);

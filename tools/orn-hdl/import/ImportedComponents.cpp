@@ -52,11 +52,10 @@ struct ComponentUse {
 
 class ComponentFinder {
 public:
-    ComponentFinder(const ImportedDesign& design, const Module& top,
-                    const std::vector<TypeUse>& types, const UnknownValues& unknown,
-                    const NameRules& rules, Warnings& warnings)
+    ComponentFinder(const ImportedDesign& design, const Module& top, const TypeUses& types,
+                    const UnknownValues& unknown, const NameRules& rules, Warnings& warnings)
         : design_(design), top_(top), types_(types), unknown_(unknown), rules_(rules),
-          warnings_(warnings), variants_(types.size()) {}
+          warnings_(warnings), variants_(types.CountUses()) {}
 
     /// The component of a cell. Its generics are added later.
     std::uint32_t GetOrAdd(const Cell& cell);
@@ -89,21 +88,21 @@ private:
 
     const ImportedDesign& design_;
     const Module& top_;
-    const std::vector<TypeUse>& types_;
+    const TypeUses& types_;
     const UnknownValues& unknown_;
     const NameRules& rules_;
     Warnings& warnings_;
     std::vector<ImportedComponent> components_;
     /// By the index of the component.
     std::vector<ComponentUse> uses_;
-    /// The components of each type.
+    /// The components of each type, by its place among the uses.
     std::vector<std::map<Variant, std::uint32_t>> variants_;
 };
 
 std::uint32_t ComponentFinder::GetOrAdd(const Cell& cell) {
     const Variant variant = GetVariant(types_[cell.type], cell);
-    const auto [place, isNew] =
-        variants_[cell.type].try_emplace(variant, static_cast<std::uint32_t>(components_.size()));
+    const auto [place, isNew] = variants_[types_.GetPlace(cell.type)].try_emplace(
+        variant, static_cast<std::uint32_t>(components_.size()));
     if (isNew) {
         Add(cell.type, variant, cell);
     }
@@ -410,7 +409,7 @@ const ImportedGeneric* ImportedComponent::FindGeneric(const NamedValue& paramete
 ImportedComponents FindComponents(ImportedDesign& design, const Module& top,
                                   const ImportRules& rules, UniqueNames& names,
                                   Warnings& warnings) {
-    const std::vector<TypeUse> types = CountTypeUses(design, top, rules, warnings);
+    const TypeUses types = CountTypeUses(design, top, rules, warnings);
     ComponentFinder finder(design, top, types, rules.unknown, names.GetRules(), warnings);
     std::vector<std::uint32_t> componentOf;
     componentOf.reserve(top.cells.size());

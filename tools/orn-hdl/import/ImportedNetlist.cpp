@@ -4,6 +4,7 @@
 #include "import/DesignUnits.h"
 #include "import/NetlistConnections.h"
 #include "import/NetlistNames.h"
+#include "import/ReplacedValues.h"
 #include "import/UniqueNames.h"
 #include "import/Values.h"
 
@@ -96,6 +97,7 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     const std::vector<std::string> portNames = ClaimPortNames(top, names);
     ImportedComponents components = FindComponents(design, top, rules, names, warnings);
     OpenConstantOutputs(top, components, warnings);
+    TellReplacedValues(top, components, unknown, warnings);
     const BitUses uses = BitUses::Count(top, components, unknown, portNames);
     BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
     WarnOfModule(top, warnings);

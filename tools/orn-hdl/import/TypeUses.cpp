@@ -39,15 +39,20 @@ class TypeUseCounter {
 public:
     TypeUseCounter(ImportedDesign& design, const Module& top, const ImportRules& rules)
         : design_(design), top_(top), rules_(rules), uses_(design.types.size()) {
+        // The modules of a design with hierarchy are indexed once.
         for (const Module& module : design.modules) {
+            if (rules.units != nullptr) {
+                break;
+            }
             modules_.emplace(module.name, &module);
         }
     }
 
     void CountCell(const Cell& cell);
-    std::vector<TypeUse>& GetUses() noexcept { return uses_; }
+    TypeUses& GetUses() noexcept { return uses_; }
 
 private:
+    const Module* FindModule(std::string_view name) const;
     void FindLeaf(std::uint32_t index, const Cell& firstCell);
     static void AddLeaf(TypeUse& type, CellType& cellType, const Module& leaf);
     void CountPins(TypeUse& type, const Cell& cell);
@@ -56,41 +61,51 @@ private:
     ImportedDesign& design_;
     const Module& top_;
     const ImportRules& rules_;
-    std::vector<TypeUse> uses_;
+    TypeUses uses_;
     std::unordered_map<std::string_view, const Module*> modules_;
 };
 
 void TypeUseCounter::CountCell(const Cell& cell) {
-    TypeUse& type = uses_[cell.type];
-    if (++type.cells == 1) {
+    if (!uses_.Has(cell.type)) {
+        TypeUse& added = uses_.Add(cell.type);
         FindLeaf(cell.type, cell);
-        type.pins.resize(design_.types[cell.type].pins.size());
+        added.pins.resize(design_.types[cell.type].pins.size());
     }
+    TypeUse& type = uses_[cell.type];
+    ++type.cells;
     CountPins(type, cell);
     CountParameters(type, cell);
+}
+
+const Module* TypeUseCounter::FindModule(std::string_view name) const {
+    if (rules_.units != nullptr) {
+        return rules_.units->FindModule(name);
+    }
+    const auto found = modules_.find(name);
+    return found == modules_.end() ? nullptr : found->second;
 }
 
 void TypeUseCounter::FindLeaf(std::uint32_t index, const Cell& firstCell) {
     TypeUse& type = uses_[index];
     CellType& cellType = design_.types[index];
     type.firstCell = &firstCell;
-    const auto module = modules_.find(cellType.name);
+    const Module* const module = FindModule(cellType.name);
     if (rules_.units != nullptr) {
         type.unit = rules_.units->Find(index);
     }
     if (type.unit != nullptr) {
-        AddLeaf(type, cellType, *module->second);
+        AddLeaf(type, cellType, *module);
         return;
     }
-    if (module != modules_.end() && !IsLeaf(*module->second)) {
+    if (module != nullptr && !IsLeaf(*module)) {
         Fail(top_.GetPath("cells", firstCell.name).AddKey("type"),
              "\"" + std::string(cellType.name) +
                  "\" is a module with contents; flatten the design first");
     }
     if (const Module* cell = rules_.library.Find(cellType.name)) {
         AddLeaf(type, cellType, *cell);
-    } else if (module != modules_.end()) {
-        AddLeaf(type, cellType, *module->second);
+    } else if (module != nullptr) {
+        AddLeaf(type, cellType, *module);
     }
 }
 
@@ -252,18 +267,20 @@ void WarnOfAmbiguousValues(const TypeUse& type, const Module& top, Warnings& war
 
 } // namespace
 
-std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
-                                   const ImportRules& rules, Warnings& warnings) {
+TypeUses CountTypeUses(ImportedDesign& design, const Module& top, const ImportRules& rules,
+                       Warnings& warnings) {
     TypeUseCounter counter(design, top, rules);
     for (const Cell& cell : top.cells) {
         counter.CountCell(cell);
     }
-    for (TypeUse& type : counter.GetUses()) {
+    for (std::uint32_t index = 0; index < counter.GetUses().CountTypes(); ++index) {
+        if (!counter.GetUses().Has(index)) {
+            continue;
+        }
+        TypeUse& type = counter.GetUses()[index];
         AdaptDefaults(type, design);
         CompareCells(type);
-        if (type.cells > 0) {
-            WarnOfAmbiguousValues(type, top, warnings);
-        }
+        WarnOfAmbiguousValues(type, top, warnings);
     }
     return std::move(counter.GetUses());
 }

@@ -5,6 +5,7 @@
 #include "import/ImportedDesign.h"
 #include "import/Warnings.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <optional>
 #include <string_view>
@@ -67,11 +68,40 @@ struct TypeUse {
     }
 };
 
-/// The uses of the types of a design, by the index of the type. Adds the ports of leaf modules to
+/// The uses of the types that a module has cells of. A design has many modules and types, so only
+/// those that are used take space.
+class TypeUses {
+public:
+    /// \param types the number of types of the design.
+    explicit TypeUses(std::size_t types) : places_(types, NoPlace) {}
+
+    bool Has(std::uint32_t type) const { return places_[type] != NoPlace; }
+    /// Adds the use of a type, which may move others.
+    TypeUse& Add(std::uint32_t type) {
+        places_[type] = static_cast<std::uint32_t>(uses_.size());
+        return uses_.emplace_back();
+    }
+    /// The place of a type among those that are used.
+    std::uint32_t GetPlace(std::uint32_t type) const { return places_[type]; }
+    /// The use of a type that the module has cells of.
+    TypeUse& operator[](std::uint32_t type) { return uses_[places_[type]]; }
+    const TypeUse& operator[](std::uint32_t type) const { return uses_[places_[type]]; }
+    std::uint32_t CountTypes() const noexcept { return static_cast<std::uint32_t>(places_.size()); }
+    std::size_t CountUses() const noexcept { return uses_.size(); }
+
+private:
+    static constexpr std::uint32_t NoPlace = 0xFFFFFFFF;
+
+    /// By the index of the type.
+    std::vector<std::uint32_t> places_;
+    std::vector<TypeUse> uses_;
+};
+
+/// The uses of the types that a module has cells of. Adds the ports of leaf modules to
 /// the pins of their types. Warns of values whose type the file does not contain.
 /// \param rules the cells of its library take the place of black boxes of the design.
 /// \throws Error if a cell has contents that are not imported, or does not match its module.
-std::vector<TypeUse> CountTypeUses(ImportedDesign& design, const Module& top,
-                                   const ImportRules& rules, Warnings& warnings);
+TypeUses CountTypeUses(ImportedDesign& design, const Module& top, const ImportRules& rules,
+                       Warnings& warnings);
 
 } // namespace Tool::Import

@@ -1,6 +1,7 @@
 #include "load/Load.h"
 
 #include "CellFiles.h"
+#include "Gzip.h"
 #include "NoWrites.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/Ascii.h"
@@ -70,10 +71,11 @@ Diagnostic MakeDiagnostic(const std::string& file, const Import::Error& error) {
 
 } // namespace
 
-DesignFormat GetFormatOf(const std::string& file) {
+DesignFormat GetFormatOf(const std::string& name) {
+    const std::string_view file = WithoutGzip(name);
     const std::size_t dot = file.rfind('.');
     const std::string_view extension =
-        std::string_view(file).substr(dot == std::string::npos ? file.size() : dot);
+        file.substr(dot == std::string_view::npos ? file.size() : dot);
     if (Port::EqualIgnoringCase(extension, ".v")) {
         return DesignFormat::Verilog;
     }
@@ -155,7 +157,7 @@ Status LoadedDesign::ReadOtherLibraries(const Libraries& libraries, Orn_Hdl::Net
     for (const std::string& name : libraries.files) {
         const DesignFormat format = GetFormatOf(name);
         if (format == DesignFormat::Vhdl && format != GetFormat()) {
-            Orn_Hdl::VhdlReader::ReadComponents(name.c_str(), components);
+            Orn_Hdl::VhdlReader::ReadComponents(SystemFileName(name.c_str()), components);
         } else if (format != GetFormat()) {
             others.push_back(name);
         }
@@ -179,7 +181,7 @@ Status LoadedDesign::ReadNetlist(const Libraries& libraries, Reporter& reporter)
         }
         for (const std::string& name : libraries.files) {
             if (GetFormatOf(name) == GetFormat()) {
-                reader.AddLibrary(name.c_str());
+                reader.AddLibrary(SystemFileName(name.c_str()));
             }
         }
         reader.AddLibrary(components);

@@ -18,7 +18,7 @@ namespace Tool {
 enum class DesignFormat { Commands, Verilog, Vhdl, Json };
 
 /// The format that the extension of a file tells; that of commands for any other one.
-DesignFormat GetFormatOf(const std::string& file);
+DesignFormat GetFormatOf(const std::string& name);
 
 /// A file with a design.
 struct DesignFile {

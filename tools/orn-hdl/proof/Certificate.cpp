@@ -1,5 +1,6 @@
 #include "proof/Certificate.h"
 
+#include "Gzip.h"
 #include "Output.h"
 #include "diagnostics/JsonWriter.h"
 #include "stats/Count.h"
@@ -51,7 +52,7 @@ Status Certificate::AddCommands(const std::string& name, const std::string& syst
     }
     File file;
     file.name = name;
-    const Status status = FindDigest(name, systemName, file.digest);
+    const Status status = FindDigest(name, IsGzip(name) ? name : systemName, file.digest);
     commands_.push_back(std::move(file));
     return status;
 }

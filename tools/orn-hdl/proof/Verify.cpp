@@ -1,5 +1,6 @@
 #include "proof/Verify.h"
 
+#include "Gzip.h"
 #include "NoWrites.h"
 #include "Progress.h"
 #include "Run.h"
@@ -20,9 +21,9 @@ using Orn_Hdl::Language;
 
 /// The language of the netlist; nothing when nothing tells it.
 std::optional<Language> FindLanguage(const VerifyOptions& options) {
-    Port::String extension(options.language.empty()
-                               ? options.netlist.substr(options.netlist.rfind('.') + 1).c_str()
-                               : options.language.c_str());
+    const std::string netlist(WithoutGzip(options.netlist));
+    Port::String extension(options.language.empty() ? netlist.substr(netlist.rfind('.') + 1).c_str()
+                                                    : options.language.c_str());
     extension.MakeLower();
     for (const char* word : {"v", "sv", "vh", "verilog"}) {
         if (extension == word) {
@@ -55,7 +56,7 @@ Status Compare(Orn_Hdl::Model& model, Language language, const VerifyOptions& op
     }
     const Orn_Hdl::Netlist& written = legal ? legal->GetWrittenNetlist() : *model.GetNetlist();
     const std::vector<Orn_Hdl::Proof::Difference> differences =
-        Orn_Hdl::Proof::Compare(options.netlist.c_str(), language, written,
+        Orn_Hdl::Proof::Compare(SystemFileName(options.netlist.c_str()), language, written,
                                 legal ? legal->GetWrittenOptions() : *model.GetOptions());
     if (!differences.empty()) {
         return ReportDifferences(differences, options.netlist, lines, file.lines, file.reporter);

@@ -1,0 +1,36 @@
+// Files that are compressed: those whose names end in ".gz".
+#pragma once
+
+#include "Tool.h"
+
+#include <stdexcept>
+#include <string>
+#include <string_view>
+
+namespace Tool {
+
+class TemporaryFile;
+
+/// Whether a file of that name is compressed.
+bool IsGzip(std::string_view file) noexcept;
+/// The name without ".gz", which tells what is compressed.
+std::string_view WithoutGzip(std::string_view file) noexcept;
+
+/// A compressed file cannot be read.
+class GzipError : public std::runtime_error {
+public:
+    using std::runtime_error::runtime_error;
+};
+
+/// Appends the contents of a compressed file to a text.
+/// \throws GzipError if the file cannot be read, or is damaged.
+void ReadGzip(const std::string& file, std::string& text);
+/// The name under which the system opens the contents of a compressed file. They are unpacked once,
+/// into a temporary file that lasts as long as the process.
+/// \throws GzipError if the file cannot be read, or is damaged.
+const char* UnpackGzip(const std::string& file);
+/// Writes the contents of a temporary file into a compressed file, which is replaced as a whole.
+/// Prints a message if that fails. The same contents give the same bytes.
+Status WriteGzip(const TemporaryFile& contents, const std::string& file);
+
+} // namespace Tool
