@@ -34,7 +34,7 @@ YOSYS = Path("/usr/share/yosys")
 # The steps after which a walk has brought all registers to a known state.
 WARM_UP = 400
 
-# The most inputs of a cell of which a long walk comes to every state and change.
+# The most inputs of a register whose every state and change a long walk meets.
 SMALL = 6
 
 # The model in simlib.v takes one bit in place of a part of several.
@@ -85,7 +85,7 @@ class Batch:
     cells: list[Cell]
     steps: list[str]
     warm_up: int = 0
-    # Whether the walk must change every input of each small cell in every state.
+    # Whether the walk must change every input of each cell in every state.
     is_exhaustive: bool = False
 
     @property
@@ -254,7 +254,7 @@ def compare(tool: Tool, batch: Batch, work: Path) -> None:
         low = high - cell.outputs
         shown = ([line[low:high] for line in vhdl], [line[low:high] for line in verilog])
         difference = first_difference(batch, cell, *shown)
-        if not difference and batch.is_exhaustive and cell.inputs <= SMALL:
+        if not difference and batch.is_exhaustive:
             difference = first_untried(batch, cell, shown[0])
         if difference:
             wrong.append(difference)
@@ -488,8 +488,10 @@ def word_batches(is_full: bool) -> Iterator[Batch]:
     yield from in_pieces("operators of more inputs", [c for c in cells if c not in small], 400)
     yield from in_pieces("other functions", other_functions(), 400)
     stored = list(registers())
-    yield Batch("registers", stored, walk(stored, 80000 if is_full else 3000, 7), WARM_UP,
-                is_full)
+    small = [cell for cell in stored if cell.inputs <= SMALL]
+    large = [cell for cell in stored if cell.inputs > SMALL]
+    yield Batch("registers", small, walk(small, 200000 if is_full else 3000, 7), WARM_UP, is_full)
+    yield Batch("registers of more inputs", large, walk(large, 30000 if is_full else 3000, 9), WARM_UP)
     memory = list(memories(60 if is_full else 12))
     yield Batch("memories", memory, walk(memory, 60000 if is_full else 4000, 8), WARM_UP)
 
