@@ -44,20 +44,20 @@ protected:
     const Session session;
 };
 
-using Texts = std::vector<std::string>;
+using TextList = std::vector<std::string>;
 
 TEST_F(CObjects, AreListedInTheirOrder) {
     const orn_hdl_object_t netlist = GetNetlist();
-    EXPECT_EQ(Names(netlist, ORN_HDL_COMPONENTS), (Texts{"INV", "ROM"}));
-    EXPECT_EQ(Names(netlist, ORN_HDL_INSTANCES), (Texts{"U1", "U2"}));
-    EXPECT_EQ(Names(session.GetInstance("U1"), ORN_HDL_PINS), (Texts{"I", "O"}));
-    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_ATTRIBUTES), (Texts{"LOC"}));
-    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_PINS), (Texts{"O"}));
+    EXPECT_EQ(Names(netlist, ORN_HDL_COMPONENTS), (TextList{"INV", "ROM"}));
+    EXPECT_EQ(Names(netlist, ORN_HDL_INSTANCES), (TextList{"U1", "U2"}));
+    EXPECT_EQ(Names(session.GetInstance("U1"), ORN_HDL_PINS), (TextList{"I", "O"}));
+    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_ATTRIBUTES), (TextList{"LOC"}));
+    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_PINS), (TextList{"O"}));
     EXPECT_EQ(Names(session.GetSignal("D(7:6),D(1:0)"), ORN_HDL_MEMBERS),
-              (Texts{"D(7:6)", "D(1:0)"}));
+              (TextList{"D(7:6)", "D(1:0)"}));
     EXPECT_EQ(Names(session.GetSignal("D(7:0)"), ORN_HDL_PARTS),
-              (Texts{"D(2)", "D(7:6)", "D(1:0)"}));
-    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_ALIASES), Texts());
+              (TextList{"D(2)", "D(7:6)", "D(1:0)"}));
+    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_ALIASES), TextList());
 }
 
 TEST_F(CObjects, HaveNoListsOfOtherKinds) {
@@ -255,14 +255,14 @@ TEST_F(CObjects, EveryKindIsRemoved) {
     orn_hdl_object_t object;
     ASSERT_EQ(orn_hdl_object_get_attribute(session.GetSignal("Y"), "LOC", &object), ORN_HDL_OK);
     EXPECT_EQ(orn_hdl_object_remove(object), ORN_HDL_OK);
-    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_ATTRIBUTES), Texts());
+    EXPECT_EQ(Names(session.GetSignal("Y"), ORN_HDL_ATTRIBUTES), TextList());
     ASSERT_EQ(orn_hdl_object_get_pin(session.GetInstance("U1"), "O", &object), ORN_HDL_OK);
     EXPECT_EQ(orn_hdl_object_remove(object), ORN_HDL_OK);
-    EXPECT_EQ(Names(session.GetInstance("U1"), ORN_HDL_PINS), (Texts{"I"}));
+    EXPECT_EQ(Names(session.GetInstance("U1"), ORN_HDL_PINS), (TextList{"I"}));
     ASSERT_EQ(orn_hdl_model_get_component(session.model, "INV", &object), ORN_HDL_OK);
     ASSERT_EQ(orn_hdl_object_get_pin(object, "I", &object), ORN_HDL_OK);
     EXPECT_EQ(orn_hdl_object_remove(object), ORN_HDL_OK);
-    EXPECT_EQ(Names(session.GetInstance("U1"), ORN_HDL_PINS), Texts());
+    EXPECT_EQ(Names(session.GetInstance("U1"), ORN_HDL_PINS), TextList());
     EXPECT_EQ(orn_hdl_object_remove(session.GetSignal("D(7:0)")), ORN_HDL_OK);
     EXPECT_EQ(orn_hdl_part_get_bus(session.GetSignal("D(2)"), &object), ORN_HDL_NOT_FOUND);
     ASSERT_EQ(orn_hdl_model_get_component(session.model, "INV", &object), ORN_HDL_OK);
