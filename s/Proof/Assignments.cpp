@@ -25,9 +25,37 @@ Assignments::Assignments(const Netlist& design, Language language, Findings& fin
 }
 
 /// A signal without a name is no signal, and "open" is none in VHDL.
-bool Assignments::IsNothing(const Signal& signal) const {
-    const std::string_view name = signal.GetNameView();
+bool Assignments::IsNothing(std::string_view name) const noexcept {
     return name.empty() || (language_ == Language::Vhdl && Port::EqualIgnoringCase(name, "open"));
+}
+
+bool Assignments::IsNothing(const Signal& signal) const noexcept {
+    return IsNothing(signal.GetNameView());
+}
+
+/// A net of the name "open" is one bit of Verilog that nobody drives. A bus may be its alias.
+bool Assignments::IsOpenInVerilog(const Signal& signal) const noexcept {
+    return language_ == Language::Verilog && Port::EqualIgnoringCase(signal.GetNameView(), "open");
+}
+
+/// Passes over the bits that VHDL leaves out, because there is no signal on one side.
+void Assignments::SkipNothing() noexcept {
+    const auto isNothing = [this](const BitQueue& bits) {
+        const Run& front = bits.GetFront();
+        return front.isScalar && IsNothing(front.base);
+    };
+    if (phase_ == Phase::Constants) {
+        while (!targetBits_.IsEmpty() && isNothing(targetBits_)) {
+            targetBits_.Drop(1);
+            ++tied_;
+        }
+        return;
+    }
+    while (!targetBits_.IsEmpty() && !sourceBits_.IsEmpty() &&
+           (isNothing(targetBits_) || isNothing(sourceBits_))) {
+        targetBits_.Drop(1);
+        sourceBits_.Drop(1);
+    }
 }
 
 /// Goes to the next constant or alias.
@@ -51,6 +79,10 @@ bool Assignments::FindConstant() {
             targetBits_.Set(signal);
             constant_ = BitsOfConstant(signal).value_or("");
             tied_ = 0;
+            SkipNothing();
+            if (targetBits_.IsEmpty()) {
+                continue;
+            }
             signals_.Next();
             return true;
         }
@@ -58,18 +90,26 @@ bool Assignments::FindConstant() {
     return false;
 }
 
+/// Takes the bits of an alias and of its signal. \return false when there are none to assign.
+bool Assignments::SetAlias() {
+    targetBits_.Set(*target_);
+    sourceBits_.Set(*source_);
+    if (!IsOpenInVerilog(*source_)) {
+        const std::int64_t width =
+            std::min(GetWidth(targetBits_.GetRuns()), GetWidth(sourceBits_.GetRuns()));
+        targetBits_.Truncate(width);
+        sourceBits_.Truncate(width);
+        SkipNothing();
+    }
+    return !targetBits_.IsEmpty();
+}
+
 bool Assignments::FindAlias() {
     for (;;) {
-        for (; !aliases_.IsAtEnd(); aliases_.Next()) {
+        while (!aliases_.IsAtEnd()) {
             source_ = aliases_.GetCurrent();
-            if (!IsNothing(*source_)) {
-                aliases_.Next();
-                targetBits_.Set(*target_);
-                sourceBits_.Set(*source_);
-                const std::int64_t width =
-                    std::min(GetWidth(targetBits_.GetRuns()), GetWidth(sourceBits_.GetRuns()));
-                targetBits_.Truncate(width);
-                sourceBits_.Truncate(width);
+            aliases_.Next();
+            if (!IsNothing(*source_) && SetAlias()) {
                 return true;
             }
         }
@@ -126,6 +166,7 @@ void Assignments::Tie(const Readers::Members& target, const std::string& bits,
         return;
     }
     tied_ += bits.size();
+    SkipNothing();
     if (targetBits_.IsEmpty()) {
         Advance();
     }
@@ -138,11 +179,18 @@ void Assignments::Assign(const Readers::Members& target, const Readers::Members&
     }
     SetRuns(target, targetRuns_);
     SetRuns(source, sourceRuns_);
+    const std::int64_t width = GetWidth(targetRuns_);
+    const std::int64_t sourceWidth = GetWidth(sourceRuns_);
+    if (width != sourceWidth && (source_ == nullptr || !IsOpenInVerilog(*source_))) {
+        Report(std::to_string(sourceWidth) + " bits assigned to " + std::to_string(width), place);
+        return;
+    }
     if (phase_ != Phase::Aliases || !targetBits_.Take(targetRuns_) ||
         !sourceBits_.Take(sourceRuns_)) {
         Report(TextOf(targetRuns_) + " = " + TextOf(sourceRuns_), place);
         return;
     }
+    SkipNothing();
     if (targetBits_.IsEmpty()) {
         Advance();
     }

@@ -29,10 +29,14 @@ public:
 private:
     enum class Phase { Constants, Aliases, Done };
 
-    bool IsNothing(const Signal& signal) const;
+    bool IsNothing(std::string_view name) const noexcept;
+    bool IsNothing(const Signal& signal) const noexcept;
+    bool IsOpenInVerilog(const Signal& signal) const noexcept;
+    void SkipNothing() noexcept;
     void Advance();
     bool FindConstant();
     bool FindAlias();
+    bool SetAlias();
     void Report(const std::string& found, const Readers::Place& place);
     std::string Describe() const;
 

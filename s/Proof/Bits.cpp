@@ -106,6 +106,14 @@ void BitQueue::Truncate(std::int64_t width) {
     runs_.resize(kept);
 }
 
+void BitQueue::Drop(std::int64_t count) noexcept {
+    if (count == GetFront().GetWidth()) {
+        ++first_;
+    } else {
+        Advance(runs_[first_], count);
+    }
+}
+
 bool BitQueue::Take(const Runs& runs) noexcept {
     return std::all_of(runs.begin(), runs.end(), [this](const Run& run) { return TakeOne(run); });
 }
@@ -115,18 +123,14 @@ bool BitQueue::TakeOne(Run run) noexcept {
         if (IsEmpty()) {
             return false;
         }
-        Run& front = runs_[first_];
+        const Run front = GetFront();
         const std::int64_t count = std::min(front.GetWidth(), run.GetWidth());
         const bool isSameWay = (front.left < front.right) == (run.left < run.right);
         if (front.base != run.base || front.isScalar != run.isScalar || front.left != run.left ||
             (count > 1 && !isSameWay)) {
             return false;
         }
-        if (count == front.GetWidth()) {
-            ++first_;
-        } else {
-            Advance(front, count);
-        }
+        Drop(count);
         if (count == run.GetWidth()) {
             return true;
         }

@@ -40,6 +40,10 @@ public:
     /// Keeps so many bits from the left.
     void Truncate(std::int64_t width);
     bool IsEmpty() const noexcept { return first_ == runs_.size(); }
+    /// The first run that is left. There has to be one.
+    const Run& GetFront() const noexcept { return runs_[first_]; }
+    /// Takes so many bits off the first run, which has to be that wide.
+    void Drop(std::int64_t count) noexcept;
     /// Takes bits off the front. \return false when the front is not these bits.
     bool Take(const Runs& runs) noexcept;
     const Runs& GetRuns() const noexcept { return runs_; }

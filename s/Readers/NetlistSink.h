@@ -62,7 +62,7 @@ public:
     virtual void Connect(const PortHead& port, const Members& members, const Place& place) = 0;
     /// A port of the present instance is connected to a constant.
     virtual void ConnectConstant(const PortHead& port, const Place& place) = 0;
-    /// Nets are assigned to as many others.
+    /// Nets are assigned to others, in Verilog not always to as many.
     virtual void Assign(const Members& target, const Members& source, const Place& place) = 0;
     /// Nets are tied to a constant. \param bits one of "01xz" for each, leftmost first.
     virtual void Tie(const Members& target, const std::string& bits, const Place& place) = 0;

@@ -67,6 +67,13 @@ protected:
             model_.Execute(line);
         }
     }
+    /// In VHDL a component declares its generics.
+    void DeclareGenerics() {
+        Do({"ADD COMPONENT ATTRIBUTE REG -TYPE=BitVector INIT 16:H:0000",
+            "SET COMPONENT ATTRIBUTE OPTION REG INIT -GENERIC=SYN",
+            "ADD COMPONENT ATTRIBUTE REG -TYPE=Float DELAY 0.5",
+            "SET COMPONENT ATTRIBUTE OPTION REG DELAY -GENERIC=NOSYN"});
+    }
     std::string GetFile() const { return folder_ / "top.v"; }
     void Write() { model_.ExecuteLine("WRITE VERILOG -NOHEADER " + GetFile()); }
     std::vector<Proof::Difference> Compare() {
@@ -209,11 +216,7 @@ class ProofOfVhdl : public ProofTest, public ::testing::WithParamInterface<Chang
 
 TEST_P(ProofOfVhdl, IsFound) {
     const std::string file = folder_ / "top.vhd";
-    // A component declares its generics.
-    Do({"ADD COMPONENT ATTRIBUTE REG -TYPE=BitVector INIT 16:H:0000",
-        "SET COMPONENT ATTRIBUTE OPTION REG INIT -GENERIC=SYN",
-        "ADD COMPONENT ATTRIBUTE REG -TYPE=Float DELAY 0.5",
-        "SET COMPONENT ATTRIBUTE OPTION REG DELAY -GENERIC=NOSYN"});
+    DeclareGenerics();
     model_.ExecuteLine("WRITE VHDL -NOHEADER " + file);
     const auto compare = [&] {
         return Proof::Compare(file, Language::Vhdl, *model_.GetNetlist(), *model_.GetOptions());
@@ -310,6 +313,29 @@ TEST_F(ProofTest, ANameOfTwoObjectsIsFound) {
     ASSERT_FALSE(Compare().empty());
     EXPECT_EQ(Compare().front().message,
               "the name of the instance \"n1\" is that of another object, too");
+}
+
+TEST_F(ProofTest, WhatIsAssignedToNothingIsLeftOutInVhdl) {
+    DeclareGenerics();
+    Do({"ADD SIGNAL v(3:0)", "CONNECT SIGNAL v(3:0) open,D(1:0),B", "ADD SIGNAL w(1:0)",
+        "ASSIGN CONSTANT w(1),open,w(0) 3:B:101"});
+    const std::string file = folder_ / "top.vhd";
+    model_.ExecuteLine("WRITE VHDL -NOHEADER " + file);
+    const std::vector<Proof::Difference> differences =
+        Proof::Compare(file.c_str(), Language::Vhdl, *model_.GetNetlist(), *model_.GetOptions());
+    EXPECT_TRUE(differences.empty()) << differences.front().message << ReadWholeFile(file);
+}
+
+TEST_F(ProofTest, ABusMayBeAnAliasOfNothingInVerilog) {
+    Do({"ADD SIGNAL v(3:0)", "CONNECT SIGNAL v(3:0) open"});
+    Write();
+    EXPECT_TRUE(Compare().empty()) << Compare().front().message;
+    model_.ExecuteLine("ADD SIGNAL x(3:0)");
+    model_.ExecuteLine("CONNECT SIGNAL x(3:0) A");
+    Write();
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message,
+              "the netlist has 1 bits assigned to 4, the design x(3:0) = A");
 }
 
 TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {

@@ -97,7 +97,7 @@ def tokens(text: str, language: str) -> list[str]:
     mark = "//" if language == "verilog" else "--"
     kept = []
     for line in text.split("\n"):
-        if mark in line and '"' not in line and not OBEYED.search(line):
+        if mark in line and '"' not in line[:line.index(mark)] and not OBEYED.search(line):
             line = line[:line.index(mark)]
         kept.append(line)
     text = "\n".join(kept)
@@ -121,7 +121,10 @@ def tokens(text: str, language: str) -> list[str]:
 
 def read_by_yosys(work: Path, file: str) -> object:
     """The module as Yosys reads it, without places; None when it does not."""
-    done = subprocess.run(["yosys", "-q", "-p", f"read_verilog {file}; write_json out.json"],
+    # Included files are not there.
+    text = (work / file).read_text("latin-1")
+    (work / "read.v").write_text(re.sub(r"(?m)^\s*`include.*$", "", text), "latin-1")
+    done = subprocess.run(["yosys", "-q", "-p", "read_verilog read.v; write_json out.json"],
                           cwd=work, capture_output=True, timeout=60)
     if done.returncode:
         return None

@@ -417,14 +417,14 @@ void ModuleReader::Assign(const Expression& target, const Expression& value) {
         Tie(*maker_.GetSignal(target.pieces), value);
         return;
     }
-    if (target.width != value.width) {
-        parser_.Fail(value.place, std::to_string(value.width) + " bits are assigned to " +
-                                      std::to_string(target.width));
-    }
     if (sink != nullptr) {
         const Members members = maker_.GetMembers(target.pieces);
         sink->Assign(members, maker_.GetMembers(value.pieces), target.place);
         return;
+    }
+    if (target.width != value.width) {
+        parser_.Fail(value.place, std::to_string(value.width) + " bits are assigned to " +
+                                      std::to_string(target.width));
     }
     Signal& signal = *maker_.GetSignal(target.pieces);
     Signal& source = *maker_.GetSignal(value.pieces);
