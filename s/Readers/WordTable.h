@@ -40,8 +40,8 @@ private:
 
     static constexpr std::size_t PlaceOf(std::string_view word) noexcept {
         constexpr std::uint32_t Factor = 0x9E3779B1U;
-        constexpr auto fold = [](char c) { return static_cast<unsigned char>(c) & 0x1FU; };
-        const std::uint32_t key = fold(word[0]) | fold(word[1]) << 5U | fold(word.back()) << 10U |
+        constexpr auto Fold = [](char c) { return static_cast<unsigned char>(c) & 0x1FU; };
+        const std::uint32_t key = Fold(word[0]) | Fold(word[1]) << 5U | Fold(word.back()) << 10U |
                                   static_cast<std::uint32_t>(word.size()) << 15U;
         return (key * Factor) >> (32U - PlaceBits);
     }
