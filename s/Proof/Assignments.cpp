@@ -60,7 +60,6 @@ void Assignments::SkipNothing() noexcept {
 
 /// Goes to the next constant or alias.
 void Assignments::Advance() {
-    target_ = nullptr;
     if (phase_ == Phase::Constants && !FindConstant()) {
         phase_ = Phase::Aliases;
         signals_ = design_.GetSignalIterator();

@@ -315,6 +315,12 @@ TEST_F(ProofTest, ANameOfTwoObjectsIsFound) {
               "the name of the instance \"n1\" is that of another object, too");
 }
 
+TEST_F(ProofTest, ASignalMayHaveSeveralAliases) {
+    Do({"CONNECT SIGNAL n2 A", "CONNECT SIGNAL n2 B", "CONNECT SIGNAL n2 D(0)"});
+    Write();
+    EXPECT_TRUE(Compare().empty()) << Compare().front().message;
+}
+
 TEST_F(ProofTest, WhatIsAssignedToNothingIsLeftOutInVhdl) {
     DeclareGenerics();
     Do({"ADD SIGNAL v(3:0)", "CONNECT SIGNAL v(3:0) open,D(1:0),B", "ADD SIGNAL w(1:0)",

@@ -47,6 +47,14 @@ TEST(VerilogAttributes, OfTheStandardHaveTheTypeOfTheirValue) {
     EXPECT_EQ(AttributesOf(text.model.GetInstance("p")), "");
 }
 
+TEST(VerilogAttributes, MayBeOfAnEscapedName) {
+    TextReader text;
+    text.Read("module m(input a);\n"
+              "INV \\table (a); // synthesis attribute LOC of \\table  is \"P1\"\nendmodule");
+    EXPECT_EQ(AttributesOf(text.model.GetNetlist()->GetInstanceIterator().GetCurrent()),
+              "LOC String P1 NONE ASSIGN\n");
+}
+
 TEST(VerilogAttributes, ArePassedOverWhenNotWanted) {
     TextReader text;
     text.reader.KeepAttributes(false);

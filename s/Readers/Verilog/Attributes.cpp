@@ -195,9 +195,11 @@ bool AttributeReader::TakeNamed(std::string_view text, const std::vector<std::st
     for (std::size_t i = 0; i < (isSentence ? 6U : FormWords); ++i) {
         TakeWord(text);
     }
-    const std::string object(words[isSentence ? 4 : 2]);
+    std::string_view object = words[isSentence ? 4 : 2];
+    // An escaped name is known without its mark.
+    object.remove_prefix(object.front() == '\\' ? 1 : 0);
     const std::string name(words[isSentence ? 2 : 3]);
-    const Target target = Find(object);
+    const Target target = Find(std::string(object));
     if (target.holder != nullptr && setup_.keepsAttributes) {
         const std::string_view value = isSentence ? WithoutQuotes(Trim(text)) : Trim(text);
         Set(target, name, Value{Attribute::String, std::string(value), {}}, place);
