@@ -6,8 +6,8 @@
 namespace Tool::Import {
 
 /// The gate-level cells, one entity each.
-std::string_view GetGateModels() noexcept;
+std::string_view GetGateModels();
 /// The word-level cells: a package, then one entity each.
-std::string_view GetWordModels() noexcept;
+std::string_view GetWordModels();
 
 } // namespace Tool::Import
