@@ -14,6 +14,9 @@ struct LiteralProblem {
     std::string text;
 };
 
+/// What becomes of a digit of the value x or z, which a model has only as the writers write it.
+enum class Unknowns { Refuse, Keep };
+
 /// The value of a parameter, a generic or an attribute.
 struct Value {
     Attribute::ValueType type = Attribute::String;

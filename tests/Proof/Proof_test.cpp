@@ -321,6 +321,21 @@ TEST_F(ProofTest, ASignalMayHaveSeveralAliases) {
     EXPECT_TRUE(Compare().empty()) << Compare().front().message;
 }
 
+/// The tools take the values x and z, which stand in constants of four-valued bits.
+TEST_F(ProofTest, ConstantsMayHoldUnknownBits) {
+    DeclareGenerics();
+    Do({"ADD SIGNAL v(3:0)", "ASSIGN CONSTANT v(3:0) 4:B:zz01", "ADD SIGNAL w(3:0)",
+        "ASSIGN CONSTANT w(3:0) 4:B:1xx0", "ADD SIGNAL x(7:0)", "ASSIGN CONSTANT x(7:0) 8:H:Z5"});
+    Write();
+    EXPECT_TRUE(Compare().empty()) << Compare().front().message << ReadWholeFile(GetFile());
+    std::string text = ReadWholeFile(GetFile());
+    const std::size_t bits = text.find("4'b1xx0");
+    ASSERT_NE(bits, std::string::npos) << text;
+    WriteWholeFile(GetFile(), text.replace(bits, 7, "4'b1x00"));
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message, "the netlist has w[3:0] = 1x00, the design w(3:0) = 1xx0");
+}
+
 TEST_F(ProofTest, WhatIsAssignedToNothingIsLeftOutInVhdl) {
     DeclareGenerics();
     Do({"ADD SIGNAL v(3:0)", "CONNECT SIGNAL v(3:0) open,D(1:0),B", "ADD SIGNAL w(1:0)",

@@ -51,9 +51,14 @@ int ValueOf(char digit) noexcept {
     return (digit | 0x20) - 'a' + 10;
 }
 
+/// Whether a digit or a bit stands for x or z.
+bool IsUnknown(char c) noexcept {
+    return c == '?' || (c | 0x20) == 'x' || (c | 0x20) == 'z';
+}
+
 void RefuseUnknown(std::string_view digits) {
     for (const char c : digits) {
-        if (c == '?' || (c | 0x20) == 'x' || (c | 0x20) == 'z') {
+        if (IsUnknown(c)) {
             throw LiteralProblem{std::string("the digit ") + c +
                                  ": a model has the values 0 and 1 alone"};
         }
@@ -61,7 +66,12 @@ void RefuseUnknown(std::string_view digits) {
 }
 
 void RefuseDigitsOfOtherBases(std::string_view digits, int base) {
+    // A decimal number can be x or z as a whole.
+    const bool mayBeUnknown = base != 10 || digits.size() == 1;
     for (const char c : digits) {
+        if (mayBeUnknown && IsUnknown(c)) {
+            continue;
+        }
         if (ValueOf(c) >= base) {
             throw LiteralProblem{std::string("the digit ") + c + " in a number of base " +
                                  std::to_string(base)};
@@ -81,7 +91,7 @@ std::uint32_t ReadSize(std::string_view text) {
 
 std::string DigitBits(const std::string& digits, int base) {
     const std::uint32_t count = BitsOfDigit(base);
-    if (count == 0) {
+    if (count == 0 && !IsUnknown(digits.front())) {
         return DecimalBits(digits);
     }
     if (digits.size() > MostBits) {
@@ -89,6 +99,10 @@ std::string DigitBits(const std::string& digits, int base) {
     }
     std::string bits;
     for (const char digit : digits) {
+        if (IsUnknown(digit)) {
+            bits.append(std::max(count, 1U), (digit | 0x20) == 'x' ? 'x' : 'z');
+            continue;
+        }
         for (std::uint32_t bit = count; bit-- > 0;) {
             bits += (ValueOf(digit) >> bit & 1) != 0 ? '1' : '0';
         }
@@ -96,7 +110,7 @@ std::string DigitBits(const std::string& digits, int base) {
     return bits;
 }
 
-Number ReadBased(std::string_view text, std::size_t apostrophe) {
+Number ReadBased(std::string_view text, std::size_t apostrophe, Unknowns unknowns) {
     Number number;
     number.isBased = true;
     if (apostrophe > 0) {
@@ -115,18 +129,20 @@ Number ReadBased(std::string_view text, std::size_t apostrophe) {
         text.remove_prefix(1);
     }
     number.digits = text;
-    RefuseUnknown(number.digits);
+    if (unknowns == Unknowns::Refuse) {
+        RefuseUnknown(number.digits);
+    }
     RefuseDigitsOfOtherBases(number.digits, number.base);
     return number;
 }
 
 } // namespace
 
-Number Number::Read(std::string_view withBlanks) {
+Number Number::Read(std::string_view withBlanks, Unknowns unknowns) {
     const std::string text = WithoutBlanks(withBlanks);
     const std::size_t apostrophe = text.find('\'');
     if (apostrophe != std::string::npos) {
-        return ReadBased(text, apostrophe);
+        return ReadBased(text, apostrophe, unknowns);
     }
     Number number;
     number.digits = text;
@@ -158,7 +174,7 @@ std::string Number::GetBits(std::uint32_t width) const {
         throw LiteralProblem{"a real number is no value of a net"};
     }
     if (kind == Fill) {
-        return std::string(width, digits.front());
+        return std::string(width, DigitBits(digits, base).front());
     }
     std::string bits = DigitBits(digits, base);
     const auto fit = [&bits](std::size_t count, char filler) {
@@ -168,8 +184,12 @@ std::string Number::GetBits(std::uint32_t width) const {
             bits.insert(0, count - bits.size(), filler);
         }
     };
-    fit(GetWidth(), '0');
-    fit(width, isSigned && bits.front() == '1' ? '1' : '0');
+    // A size or no size at all extends x and z (IEEE 1364-2005, clause 3.5.1).
+    const char first = bits.empty() || !IsUnknown(bits.front()) ? '0' : bits.front();
+    fit(GetWidth(), first);
+    fit(width, size == 0 && first != '0'         ? first
+               : isSigned && bits.front() != '0' ? bits.front()
+                                                 : '0');
     return bits;
 }
 
@@ -180,7 +200,8 @@ std::optional<std::int64_t> Number::GetValue() const {
     }
     const std::string bits = GetBits(GetWidth());
     const std::size_t first = std::min(bits.find('1'), bits.size());
-    if (bits.size() - first > MostValueBits || (size > 0 && isSigned && bits.front() == '1')) {
+    if (std::any_of(bits.begin(), bits.end(), IsUnknown) || bits.size() - first > MostValueBits ||
+        (size > 0 && isSigned && bits.front() == '1')) {
         return std::nullopt;
     }
     std::int64_t value = 0;

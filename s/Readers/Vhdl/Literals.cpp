@@ -126,21 +126,25 @@ std::string ReadString(std::string_view text) {
     return result;
 }
 
-char ReadBit(char character) {
+char ReadBit(char character, Unknowns unknowns) {
+    if (unknowns == Unknowns::Keep && (character == 'X' || character == 'Z')) {
+        return Port::ToLower(character);
+    }
     if (character != '0' && character != '1') {
         RefuseValue(character);
     }
     return character;
 }
 
-std::string ReadBits(std::string_view text) {
+std::string ReadBits(std::string_view text, Unknowns unknowns) {
     if (text.size() > MostBits) {
         throw LiteralProblem{"a string of more than " + std::to_string(MostBits) + " bits"};
     }
-    for (const char character : text) {
-        ReadBit(character);
+    std::string bits(text);
+    for (char& bit : bits) {
+        bit = ReadBit(bit, unknowns);
     }
-    return std::string(text);
+    return bits;
 }
 
 BitString BitString::Read(std::string_view text) {

@@ -18,12 +18,12 @@ bool IsReal(std::string_view text) noexcept;
 
 /// The characters of a string, in which two quotes stand for one.
 std::string ReadString(std::string_view text);
-/// The bit of a character literal.
-/// \throws LiteralProblem for a value other than 0 and 1.
-char ReadBit(char character);
-/// The bits of a string of 0 and 1.
+/// The bit of a character literal: 0 or 1, or x or z where these are kept.
+/// \throws LiteralProblem for another value.
+char ReadBit(char character, Unknowns unknowns = Unknowns::Refuse);
+/// The bits of a string.
 /// \throws LiteralProblem.
-std::string ReadBits(std::string_view text);
+std::string ReadBits(std::string_view text, Unknowns unknowns = Unknowns::Refuse);
 
 /// A bit string literal.
 struct BitString {
