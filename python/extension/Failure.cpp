@@ -32,17 +32,6 @@ void Raise(const Failure& failure, Ref details) {
     PyErr_SetObject(reinterpret_cast<PyObject*>(Py_TYPE(error.Get())), error.Get());
 }
 
-Ref MakeDifferences(const std::vector<Orn_Hdl::Proof::Difference>& differences) {
-    Ref list = MakeList();
-    for (const Orn_Hdl::Proof::Difference& difference : differences) {
-        Append(list, MakeTuple(MakeText(difference.message),
-                               MakeInt(static_cast<long long>(difference.line)),
-                               MakeInt(static_cast<long long>(difference.column)),
-                               MakeText(difference.source)));
-    }
-    return list;
-}
-
 void SetErrorFor(const std::exception_ptr& thrown) {
     try {
         std::rethrow_exception(thrown);
@@ -62,6 +51,17 @@ void SetErrorFor(const std::exception_ptr& thrown) {
 }
 
 } // namespace
+
+Ref MakeDifferences(const std::vector<Orn_Hdl::Proof::Difference>& differences) {
+    Ref list = MakeList();
+    for (const Orn_Hdl::Proof::Difference& difference : differences) {
+        Append(list, MakeTuple(MakeText(difference.message),
+                               MakeInt(static_cast<long long>(difference.line)),
+                               MakeInt(static_cast<long long>(difference.column)),
+                               MakeText(difference.source)));
+    }
+    return list;
+}
 
 void SetErrorMaker(PyObject* maker) noexcept {
     Py_XINCREF(maker);

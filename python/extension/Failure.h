@@ -4,8 +4,11 @@
 
 #include "Ref.h"
 
+#include "Orn_Hdl/Proof.h"
+
 #include <cstdint>
 #include <string>
+#include <vector>
 
 namespace Python {
 
@@ -22,6 +25,9 @@ struct Failure {
     /// The command that failed; empty for none.
     std::string command = {};
 };
+
+/// A list of tuples: the message, the line, the column and the source of each difference.
+Ref MakeDifferences(const std::vector<Orn_Hdl::Proof::Difference>& differences);
 
 /// Remembers the function of the package that makes exceptions; none for null.
 void SetErrorMaker(PyObject* maker) noexcept;

@@ -233,14 +233,7 @@ Ref VerifyNetlist(ModelState& state, Arguments& arguments) {
         }
         verify = before;
     }
-    Ref list = MakeList();
-    for (const Orn_Hdl::Proof::Difference& difference : differences) {
-        Append(list, MakeTuple(MakeText(difference.message),
-                               MakeInt(static_cast<long long>(difference.line)),
-                               MakeInt(static_cast<long long>(difference.column)),
-                               MakeText(difference.source)));
-    }
-    return list;
+    return MakeDifferences(differences);
 }
 
 Ref MakeRenamings(const std::vector<Orn_Hdl::ReaderRenaming>& renamings) {
