@@ -24,13 +24,8 @@ Assignments::Assignments(const Netlist& design, Language language, Findings& fin
     Advance();
 }
 
-/// A signal without a name is no signal, and "open" is none in VHDL.
-bool Assignments::IsNothing(std::string_view name) const noexcept {
-    return name.empty() || (language_ == Language::Vhdl && Port::EqualIgnoringCase(name, "open"));
-}
-
 bool Assignments::IsNothing(const Signal& signal) const noexcept {
-    return IsNothing(signal.GetNameView());
+    return Proving::IsNothing(signal.GetNameView(), language_);
 }
 
 /// A net of the name "open" is one bit of Verilog that nobody drives. A bus may be its alias.
@@ -42,7 +37,7 @@ bool Assignments::IsOpenInVerilog(const Signal& signal) const noexcept {
 void Assignments::SkipNothing() noexcept {
     const auto isNothing = [this](const BitQueue& bits) {
         const Run& front = bits.GetFront();
-        return front.isScalar && IsNothing(front.base);
+        return front.isScalar && Proving::IsNothing(front.base, language_);
     };
     if (phase_ == Phase::Constants) {
         while (!targetBits_.IsEmpty() && isNothing(targetBits_)) {

@@ -29,7 +29,6 @@ public:
 private:
     enum class Phase { Constants, Aliases, Done };
 
-    bool IsNothing(std::string_view name) const noexcept;
     bool IsNothing(const Signal& signal) const noexcept;
     bool IsOpenInVerilog(const Signal& signal) const noexcept;
     void SkipNothing() noexcept;

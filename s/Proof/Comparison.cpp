@@ -84,10 +84,8 @@ string_view Comparison::NameInFile(string_view name) const noexcept {
     return language_ == Language::Verilog ? NameInVerilog(name) : name;
 }
 
-/// A signal without a name is no signal, and "open" is none in VHDL.
 bool Comparison::IsNothing(const Signal& signal) const noexcept {
-    return signal.GetNameView().empty() ||
-           (language_ == Language::Vhdl && Port::EqualIgnoringCase(signal.GetNameView(), "open"));
+    return Proving::IsNothing(signal.GetNameView(), language_);
 }
 
 /// Whether the declaration of a signal bears the name.

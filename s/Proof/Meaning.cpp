@@ -215,6 +215,10 @@ string_view NameInVerilog(string_view name) noexcept {
     return name;
 }
 
+bool IsNothing(string_view name, Language language) noexcept {
+    return name.empty() || (language == Language::Vhdl && Port::EqualIgnoringCase(name, "open"));
+}
+
 std::optional<std::string> BitsOf(const BitVectorValue& value, std::size_t width) {
     if (width == 0 || width > MostBits) {
         return std::nullopt;

@@ -16,6 +16,9 @@ namespace Orn_Hdl::Proving {
 /// The name that a reader finds for a name of a design, whose escaped names have their marks.
 std::string_view NameInVerilog(std::string_view name) noexcept;
 
+/// Whether a name stands for no signal: the empty one, and in VHDL "open".
+bool IsNothing(std::string_view name, Language language) noexcept;
+
 /// The bits of a constant on a signal of so many bits, leftmost first, each one of "01xz"; nothing
 /// when the digits do not say which.
 std::optional<std::string> BitsOf(const BitVectorValue& value, std::size_t width);
