@@ -51,7 +51,7 @@ std::vector<std::size_t> Ascending(std::size_t count) {
 
 TEST(OrderedWork, ResultsComeInOrder) {
     for (const unsigned workers : {0U, 1U, 2U, 7U}) {
-        for (const std::size_t ahead : {1, 2, 3, 20}) {
+        for (const std::size_t ahead : {1U, 2U, 3U, 20U}) {
             for (const bool isSerial : {false, true}) {
                 EXPECT_EQ(GivenBy({workers, ahead, isSerial}), Ascending(Jobs))
                     << workers << ' ' << ahead << ' ' << isSerial;
