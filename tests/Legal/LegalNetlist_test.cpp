@@ -264,6 +264,17 @@ TEST_F(LegalNetlistTest, ClausesAreMended) {
         << text;
 }
 
+TEST_F(LegalNetlistTest, LegalClausesStay) {
+    // The default library comes with clauses of its own, and a clause may stand twice.
+    Do({"ADD LIBRARY ieee,ieee", "ADD USE LIBRARY ieee.numeric_std.all", "ADD SIGNAL begin"});
+    const std::string renamed = WriteLegally(Language::Vhdl);
+    EXPECT_NE(renamed.find("library ieee,ieee;\n"), std::string::npos) << renamed;
+    Do({"ADD LIBRARY 2x"});
+    const std::string mended = WriteLegally(Language::Vhdl);
+    EXPECT_NE(mended.find("library ieee;\nuse"), std::string::npos) << mended;
+    EXPECT_EQ(mended.find("ieee,"), std::string::npos) << mended;
+}
+
 TEST_F(LegalNetlistTest, WriteCommandLeavesTheFileAlone) {
     const std::string file = ::testing::TempDir() + "legal_refused.v";
     std::remove(file.c_str());
