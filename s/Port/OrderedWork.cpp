@@ -27,6 +27,16 @@ private:
 
 } // namespace
 
+unsigned OrderedWork::GetWorkersFor(unsigned threads) noexcept {
+    constexpr unsigned MostByDefault = 8;
+    // More are of no use, and each takes memory for its results.
+    constexpr unsigned Most = 64;
+    if (threads == 0) {
+        threads = std::clamp(std::thread::hardware_concurrency(), 1U, MostByDefault);
+    }
+    return std::min(threads, Most) - 1;
+}
+
 OrderedWork::OrderedWork(const Settings& settings, Job job)
     : settings_(settings), job_(std::move(job)),
       results_(std::max<std::size_t>(settings.ahead, 1)) {

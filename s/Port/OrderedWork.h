@@ -38,6 +38,10 @@ public:
     /// none of a higher number. What it throws is thrown by the `Next` that would give its result.
     using Job = std::function<bool(std::size_t number)>;
 
+    /// How many workers make up that many threads together with the owner; 0 threads are as many as
+    /// the system gives, at most 8.
+    static unsigned GetWorkersFor(unsigned threads) noexcept;
+
     /// Begins. If the system gives fewer threads than asked for, the work is done by those there
     /// are.
     OrderedWork(const Settings& settings, Job job);

@@ -58,6 +58,21 @@ TEST_F(COutput, EveryOptionIsSetAndTold) {
     EXPECT_EQ(lists, 3);
 }
 
+TEST_F(COutput, ThreadsAreANumber) {
+    int threads = 0;
+    ASSERT_EQ(orn_hdl_model_get_number(session.model, ORN_HDL_THREADS, &threads), ORN_HDL_OK);
+    EXPECT_EQ(threads, 1);
+    for (const int other : {0, 3}) {
+        ASSERT_EQ(orn_hdl_model_set_number(session.model, ORN_HDL_THREADS, other), ORN_HDL_OK);
+        ASSERT_EQ(orn_hdl_model_get_number(session.model, ORN_HDL_THREADS, &threads), ORN_HDL_OK);
+        EXPECT_EQ(threads, other);
+    }
+    EXPECT_EQ(orn_hdl_model_set_number(session.model, ORN_HDL_THREADS, -1),
+              ORN_HDL_INVALID_ARGUMENT);
+    EXPECT_EQ(orn_hdl_model_set_text(session.model, ORN_HDL_THREADS, "2"),
+              ORN_HDL_INVALID_ARGUMENT);
+}
+
 TEST_F(COutput, OptionsAreThoseOfTheCommands) {
     session.Run("SET SYNTHESIS SYNPLICITY\nLOWERCASE instance\nADD LIBRARY cells\n"
                 "SUPPRESS COMPONENT\n");

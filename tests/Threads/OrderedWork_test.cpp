@@ -142,6 +142,13 @@ TEST(OrderedWork, WithoutWorkersTheOwnerDoesAll) {
     }
 }
 
+TEST(OrderedWork, OneThreadHasNoWorkers) {
+    EXPECT_EQ(OrderedWork::GetWorkersFor(1), 0U);
+    EXPECT_EQ(OrderedWork::GetWorkersFor(5), 4U);
+    EXPECT_LT(OrderedWork::GetWorkersFor(0), 8U);
+    EXPECT_LT(OrderedWork::GetWorkersFor(static_cast<unsigned>(-1)), 100U);
+}
+
 std::atomic<bool> wasHandledByOwner = false;
 std::thread::id ownerOfSignals;
 

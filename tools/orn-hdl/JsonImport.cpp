@@ -93,6 +93,7 @@ Status WriteImported(const Netlists& netlists, const ImportOptions& options, Rep
         return Status::Success;
     }
     Orn_Hdl::Engine engine;
+    engine.SetThreads(options.threads);
     std::vector<Orn_Hdl::Model*> models;
     for (const ImportedNetlist& netlist : netlists) {
         engine.CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
