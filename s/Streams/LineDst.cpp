@@ -53,8 +53,9 @@ void LineDst::FreeBuffer() noexcept {
     DropAll();
 }
 
-void LineDst::Grow(std::size_t size) {
-    const std::size_t capacity = std::max({FirstBuffer, capacity_ * 2, used_ + size});
+void LineDst::Grow(std::size_t size, std::size_t most) {
+    const std::size_t capacity =
+        std::min(std::max({FirstBuffer, capacity_ * 2, used_ + size}), most);
     std::unique_ptr<char[]> buffer(new char[capacity]);
     std::copy_n(buffer_.get(), used_, buffer.get());
     buffer_ = std::move(buffer);

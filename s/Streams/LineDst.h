@@ -57,8 +57,8 @@ protected:
     /// Drops the complete lines and the current one.
     void DropAll() noexcept;
     void FreeBuffer() noexcept;
-    /// Makes the buffer larger, for `size` characters more at least.
-    void Grow(std::size_t size);
+    /// Makes the buffer larger, for `size` characters more at least, and `most` in all.
+    void Grow(std::size_t size, std::size_t most = static_cast<std::size_t>(-1));
     std::size_t GetCapacity() const noexcept { return capacity_; }
     std::size_t GetRoom() const noexcept { return capacity_ - used_; }
 

@@ -1,5 +1,7 @@
 #include "Streams/TextFileDst.h"
 
+#include "Streams/BranchDst.h"
+
 #include <algorithm>
 #include <string>
 
@@ -101,6 +103,19 @@ bool TextFileDst::MakeRoom(std::size_t size) {
     if (size > GetRoom() || GetCapacity() < LargeBuffer) {
         Grow(size);
     }
+    return true;
+}
+
+std::unique_ptr<BranchDst> TextFileDst::MakeBranch() const {
+    return IsOpen() ? std::make_unique<BranchDst>(GetIndentLevel()) : nullptr;
+}
+
+bool TextFileDst::TakeLines(std::string_view lines) {
+    if (!GetLine().empty()) {
+        return false;
+    }
+    SendLines();
+    Send(lines);
     return true;
 }
 

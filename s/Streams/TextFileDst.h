@@ -36,6 +36,9 @@ public:
     void Flush() override;
 
 private:
+    std::unique_ptr<BranchDst> MakeBranch() const override;
+    bool TakeLines(std::string_view lines) override;
+    bool IsWriting() const noexcept override { return isGood_; }
     bool MakeRoom(std::size_t size) override;
     void WriteLongLine(std::string_view text) override;
     void Send(std::string_view text);
