@@ -60,6 +60,14 @@ TEST_F(CheckTest, SoundDesignHasNoFindings) {
     EXPECT_TRUE(Run().empty());
 }
 
+TEST_F(CheckTest, YosysDoesNotReadWhatIsHiddenFromSynthesis) {
+    Do({"ADD MODULE ATTRIBUTE NOTE \"7\\\" wide\"",
+        "SET MODULE ATTRIBUTE OPTION NOTE -GENERIC=NOSYN"});
+    const Finding finding = Find("quote-in-value");
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Yosys), Verdict::Accepts);
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Icarus), Verdict::Rejects);
+}
+
 TEST_F(CheckTest, EmptyNetlistIsChecked) {
     const Netlist netlist;
     const HdlOptions options;

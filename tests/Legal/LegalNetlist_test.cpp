@@ -275,6 +275,20 @@ TEST_F(LegalNetlistTest, LegalClausesStay) {
     EXPECT_EQ(mended.find("ieee,"), std::string::npos) << mended;
 }
 
+TEST_F(LegalNetlistTest, ANewNameIsNoneOfAComponent) {
+    Do({"ADD COMPONENT begin_1", "ADD PIN begin_1 I input", "ADD INSTANCE begin_1 U2",
+        "ADD SIGNAL begin", "CONNECT SIGNAL begin U2.I", "CONNECT SIGNAL begin A"});
+    EXPECT_EQ(NameOfSignal("begin"), "begin_2");
+}
+
+TEST_F(LegalNetlistTest, AQuotedTextOfAUsersTypeLosesItsQuotes) {
+    Do({"ADD INSTANCE ATTRIBUTE U1 -TYPE=User DELAY \"\\\"1 ns\\\"\"",
+        "SET INSTANCE ATTRIBUTE USERTYPE U1 DELAY string",
+        "SET INSTANCE ATTRIBUTE OPTION U1 DELAY -SYNATTR=ASSIGN", "ADD SIGNAL begin"});
+    const std::string text = WriteLegally(Language::Vhdl);
+    EXPECT_NE(text.find("attribute DELAY of U1 : label is \"1 ns\";"), std::string::npos) << text;
+}
+
 TEST_F(LegalNetlistTest, WriteCommandLeavesTheFileAlone) {
     const std::string file = ::testing::TempDir() + "legal_refused.v";
     std::remove(file.c_str());

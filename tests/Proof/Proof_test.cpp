@@ -361,6 +361,19 @@ TEST_F(ProofTest, ABusMayBeAnAliasOfNothingInVerilog) {
               "the netlist has 1 bits assigned to 4, the design x(3:0) = A");
 }
 
+TEST_F(ProofTest, OfLongConcatenationsTheFirstPartsAreShown) {
+    Do({"ADD SIGNAL v(8:0)", "CONNECT SIGNAL v(8:0) A,B,A,B,A,B,A,B,A"});
+    Write();
+    std::string text = ReadWholeFile(GetFile());
+    const std::size_t last = text.find("B, A}");
+    ASSERT_NE(last, std::string::npos) << text;
+    WriteWholeFile(GetFile(), text.replace(last, 5, "B, B}"));
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message,
+              "the netlist has v[8:0] = A, B, A, B, A, B, A, B, ..., the design v(8:0) = "
+              "A,B,A,B,A,B,A,B,A");
+}
+
 TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {
     model_.GetSignal("T")->SetName("n1");
     Write();
