@@ -37,8 +37,9 @@ struct Directive {
     string_view words;
     string_view verdicts;
 };
-constexpr Directive Directives[] = {{"synopsys translate_off", "......wr."},
-                                    {"synthesis translate_off", "......wr."},
+constexpr Directive Directives[] = {{"synopsys translate_off", "......wrm"},
+                                    {"synthesis translate_off", "......wrm"},
+                                    {"pragma translate_off", "........m"},
                                     {"synopsys translate_on", ".......w"},
                                     {"synthesis translate_on", ".......w"},
                                     {"synopsys full_case", "......wr."},
