@@ -383,6 +383,11 @@ TEST_F(ProofTest, TheRuleThatTellsOfADifferenceIsNamed) {
     };
     // A bus and a scalar signal of the same name.
     EXPECT_EQ(findRule({"ADD SIGNAL N(7:4)", "ADD SIGNAL N", "ADD PORT A input"}), "name-clash");
+    // An instance and the signal that a write makes for an open pin.
+    EXPECT_EQ(findRule({"ADD PORT A input", "SET OPEN PIN false", "ADD COMPONENT INV",
+                        "ADD PIN INV I input", "ADD INSTANCE INV U1",
+                        "ADD INSTANCE INV U1_I_openSignal", "CONNECT SIGNAL A U1_I_openSignal.I"}),
+              "name-clash");
     EXPECT_EQ(findRule({"ADD PORT W(99999999999:99999999990) input"}), "wide-bus");
     EXPECT_EQ(findRule({"ADD PORT W(0:99999999999999999999) input"}), "wide-bus");
     EXPECT_EQ(findRule({"ADD PORT Y(3:0) output", "ASSIGN CONSTANT Y(3:0) -4:B:1010"}),
