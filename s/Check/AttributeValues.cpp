@@ -68,6 +68,7 @@ public:
 private:
     void CheckText(string_view text, bool isInVhdl);
     void CheckDigits();
+    void CheckLength(const Digits& digits);
     void CheckUser();
     Finding* Add(RuleId rule, const Verdicts& verdicts) {
         return AddFinding(context_, rule, verdicts, holder_, attribute_);
@@ -160,29 +161,39 @@ void ValueCheck::CheckDigits() {
         finding->message = "the value " + Quoted(digits.digits) + " of " +
                            holder_.Describe(attribute_) + " has a character that is no digit";
     }
-    if (!places_.verilogNumber || !isNumber) {
-        return;
-    }
-    Verdicts verdicts;
-    RuleId rule = RuleId::ConstantLength;
     if (digits.hasLength) {
+        CheckLength(digits);
+    } else if (places_.verilogNumber && isNumber) {
+        const BitText read = digits.ReadVerilog(digits.digits.size());
+        const bool isLong = digits.GetNeededBits() > 32;
+        const bool differs = !read || *read != digits.digits || isLong;
+        const Verdicts verdicts(!differs ? "" : isLong ? "mmm..mrm" : "mmm..mmm");
+        if (Finding* finding = Add(RuleId::GenericDigits, verdicts)) {
+            finding->message = "the value " + Quoted(digits.digits) + " of " +
+                               holder_.Describe(attribute_) + " is a decimal number in Verilog";
+        }
+    }
+}
+
+/// The length that stands before the digits. VHDL has as many bits as the digits stand for.
+void ValueCheck::CheckLength(const Digits& digits) {
+    Verdicts verdicts;
+    if (places_.verilogNumber && digits.IsVerilogNumber()) {
         const bool isCut =
             digits.length > 0 && digits.GetNeededBits() > static_cast<std::size_t>(digits.length);
         verdicts = Verdicts(digits.length == 0  ? "rrr..r.r"
                             : digits.length < 0 ? "mmm..mmm"
                             : isCut             ? "mmm..mrm"
                                                 : "");
-    } else {
-        rule = RuleId::GenericDigits;
-        const BitText read = digits.ReadVerilog(digits.digits.size());
-        const bool isLong = digits.GetNeededBits() > 32;
-        const bool differs = !read || *read != digits.digits || isLong;
-        verdicts = Verdicts(!differs ? "" : isLong ? "mmm..mrm" : "mmm..mmm");
     }
-    if (Finding* finding = Add(rule, verdicts)) {
-        finding->message =
-            "the value " + Quoted(digits.digits) + " of " + holder_.Describe(attribute_) +
-            (digits.hasLength ? " does not fit its length" : " is a decimal number in Verilog");
+    const bool isAsLong =
+        digits.length >= 0 && digits.GetVhdlLength() == static_cast<std::size_t>(digits.length);
+    if (places_.vhdl && places_.typed && digits.IsVhdlBitVector() && !isAsLong) {
+        verdicts.Worsen(Verdicts("...mm...m"));
+    }
+    if (Finding* finding = Add(RuleId::ConstantLength, verdicts)) {
+        finding->message = "the value " + Quoted(digits.digits) + " of " +
+                           holder_.Describe(attribute_) + " does not fit its length";
     }
 }
 

@@ -37,8 +37,9 @@ struct Directive {
     string_view words;
     string_view verdicts;
 };
-constexpr Directive Directives[] = {{"synopsys translate_off", "......wr."},
-                                    {"synthesis translate_off", "......wr."},
+constexpr Directive Directives[] = {{"synopsys translate_off", "......wrm"},
+                                    {"synthesis translate_off", "......wrm"},
+                                    {"pragma translate_off", "........m"},
                                     {"synopsys translate_on", ".......w"},
                                     {"synthesis translate_on", ".......w"},
                                     {"synopsys full_case", "......wr."},
@@ -70,6 +71,7 @@ private:
     void CheckDummySignals();
     void CheckOpenSignals();
     void CheckOpenPin(const Instance& instance, const Pin& pin);
+    void CheckFormerOpenPin(const Signal& signal);
     void CheckGenerics();
     void CheckAttributeNames();
     void CheckComponents();
@@ -191,9 +193,14 @@ void Scopes::CheckOpenSignals() {
     }
     for (const Instance* instance : netlist_.GetInstanceIterator()) {
         for (const Pin* pin : instance->GetPinIterator()) {
-            if (pin->GetSignal() == nullptr && pin->GetPinType() != PinTypeBusIndex &&
-                pin->GetPolarity().GetValue() == Polarity::Input) {
+            if (pin->GetPinType() == PinTypeBusIndex ||
+                pin->GetPolarity().GetValue() != Polarity::Input) {
+                continue;
+            }
+            if (pin->GetSignal() == nullptr) {
                 CheckOpenPin(*instance, *pin);
+            } else {
+                CheckFormerOpenPin(*pin->GetSignal());
             }
         }
     }
@@ -219,6 +226,17 @@ void Scopes::CheckOpenPin(const Instance& instance, const Pin& pin) {
     Declared open;
     open.what = "the signal " + Quoted(name) + " of an open pin";
     open.cause = Named(Kind::Instance, instance.GetNameView());
+    ForEachInScope(base, open, [&](const Declared& other) { ReportClash(open, other, ""); });
+}
+
+/// A signal that an earlier write made for an open pin can have the name of another object.
+void Scopes::CheckFormerOpenPin(const Signal& signal) {
+    constexpr string_view Ending = "_openSignal";
+    const string_view base = Names::BaseName(signal.GetNameView());
+    if (base.size() < Ending.size() || base.substr(base.size() - Ending.size()) != Ending) {
+        return;
+    }
+    const Declared open = DescribeSignal(signal);
     ForEachInScope(base, open, [&](const Declared& other) { ReportClash(open, other, ""); });
 }
 

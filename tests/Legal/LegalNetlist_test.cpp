@@ -169,6 +169,22 @@ TEST_F(LegalNetlistTest, ConstantsGetTheirBits) {
     ExpectInBoth("assign G = 8'b00000101;", "G(7 downto 0) <= \"00000101\";");
 }
 
+TEST_F(LegalNetlistTest, GenericsGetAsManyBitsAsTheirLengthSays) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=BitVector INIT 6:H:05",
+        "SET COMPONENT ATTRIBUTE OPTION INV INIT -GENERIC=SYN"});
+    ExpectInBoth("6'b000101", "INIT => b\"000101\"");
+    model_.GetComponent("INV")->GetAttr("INIT")->SetValue("4:H:A5");
+    EXPECT_EQ(FindErrors(), std::vector<std::string>{"constant-length"});
+    model_.GetComponent("INV")->GetAttr("INIT")->SetValue("-4:H:5");
+    EXPECT_EQ(FindErrors(), std::vector<std::string>{"constant-length"});
+}
+
+TEST_F(LegalNetlistTest, VectorsOfAttributesThatDoNotFitAreTexts) {
+    Do({"USE ATTRTYPE true", "ADD SIGNAL ATTRIBUTE A -TYPE=BitVector TAG 4:H:A5",
+        "SET SIGNAL ATTRIBUTE OPTION A TAG -SYNATTR=ASSIGN"});
+    ExpectInBoth("TAG", "attribute TAG of A : signal is \"A5\"");
+}
+
 TEST_F(LegalNetlistTest, ConstantWithTwoMeaningsIsRefused) {
     Do({"ADD PORT D(7:0) output", "ASSIGN CONSTANT D(7:0) 10"});
     const std::vector<std::string> errors = FindErrors();

@@ -380,6 +380,41 @@ TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {
     EXPECT_FALSE(Compare().empty());
 }
 
+TEST_F(ProofTest, TheRuleThatTellsOfADifferenceIsNamed) {
+    const auto findRule = [this](std::initializer_list<const char*> lines) {
+        Model model(&factory_);
+        model.GetOptions()->writeHeader = false;
+        for (const char* line : lines) {
+            model.Execute(line);
+        }
+        const std::string file = folder_ / "other.vhd";
+        model.ExecuteLine("WRITE VHDL " + file);
+        std::string rules;
+        for (const Proof::Difference& difference :
+             Proof::Compare(file, Language::Vhdl, *model.GetNetlist(), *model.GetOptions())) {
+            rules.append(difference.rule == nullptr ? "none" : difference.rule->name).append(" ");
+        }
+        return rules.substr(0, rules.find(' '));
+    };
+    // A bus and a scalar signal of the same name.
+    EXPECT_EQ(findRule({"ADD SIGNAL N(7:4)", "ADD SIGNAL N", "ADD PORT A input"}), "name-clash");
+    // An instance and the signal that a write makes for an open pin.
+    EXPECT_EQ(findRule({"ADD PORT A input", "SET OPEN PIN false", "ADD COMPONENT INV",
+                        "ADD PIN INV I input", "ADD INSTANCE INV U1",
+                        "ADD INSTANCE INV U1_I_openSignal", "CONNECT SIGNAL A U1_I_openSignal.I"}),
+              "name-clash");
+    EXPECT_EQ(findRule({"ADD PORT W(99999999999:99999999990) input"}), "wide-bus");
+    EXPECT_EQ(findRule({"ADD PORT W(0:99999999999999999999) input"}), "wide-bus");
+    EXPECT_EQ(findRule({"ADD PORT Y(3:0) output", "ASSIGN CONSTANT Y(3:0) -4:B:1010"}),
+              "constant-length");
+    EXPECT_EQ(findRule({"ADD PORT A input", "USE ATTRTYPE true",
+                        "ADD SIGNAL ATTRIBUTE A -TYPE=BitVector TAG 4:H:A5",
+                        "SET SIGNAL ATTRIBUTE OPTION A TAG -SYNATTR=ASSIGN"}),
+              "constant-length");
+    EXPECT_EQ(findRule({"ADD PORT A input", "ADD SIGNAL N", "ADD NOTES synthesis translate_off"}),
+              "directive-comment");
+}
+
 TEST_F(ProofTest, AFileThatIsNotThereIsAnException) {
     EXPECT_NE(FailureOf([this] { Compare(); }).find("Cannot read "), std::string::npos);
 }
