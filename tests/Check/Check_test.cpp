@@ -68,6 +68,13 @@ TEST_F(CheckTest, YosysDoesNotReadWhatIsHiddenFromSynthesis) {
     EXPECT_EQ(finding.verdicts.Get(Check::Target::Icarus), Verdict::Rejects);
 }
 
+TEST_F(CheckTest, AnExtendedNameMayHoldABackslashTwice) {
+    Do({"ADD SIGNAL \\a\\\\b\\", "CONNECT SIGNAL \\a\\\\b\\ A"});
+    const Finding name = Find("illegal-name");
+    EXPECT_EQ(name.verdicts.Get(Check::Target::Vhdl93), Verdict::Accepts);
+    EXPECT_EQ(name.verdicts.Get(Check::Target::Verilog2005), Verdict::Rejects);
+}
+
 TEST_F(CheckTest, EmptyNetlistIsChecked) {
     const Netlist netlist;
     const HdlOptions options;

@@ -291,6 +291,12 @@ TEST_F(LegalNetlistTest, LegalClausesStay) {
     EXPECT_EQ(mended.find("ieee,"), std::string::npos) << mended;
 }
 
+TEST_F(LegalNetlistTest, ANameThatCannotBeEscapedIsReplaced) {
+    model_.GetOptions()->escapeNames = true;
+    Do({"ADD SIGNAL x\x01y", "CONNECT SIGNAL x\x01y A"});
+    EXPECT_EQ(NameOfSignal("x\x01y"), "x_y");
+}
+
 TEST_F(LegalNetlistTest, ANewNameIsNoneOfAComponent) {
     Do({"ADD COMPONENT begin_1", "ADD PIN begin_1 I input", "ADD INSTANCE begin_1 U2",
         "ADD SIGNAL begin", "CONNECT SIGNAL begin U2.I", "CONNECT SIGNAL begin A"});
