@@ -27,12 +27,12 @@ using namespace Orn_Hdl;
 namespace {
 
 /// More than a reader takes in at a time.
-constexpr std::size_t Long = 300000;
+constexpr std::size_t LongSize = 300000;
 
 /// Lines without a word, as many bytes as make a file long.
 std::string Padding() {
     std::string text;
-    while (text.size() < Long) {
+    while (text.size() < LongSize) {
         text += std::string(9999, ' ') + '\n';
     }
     return text;
@@ -113,7 +113,7 @@ protected:
 } // namespace
 
 TEST_F(LongFiles, TellTheSameWithAnyNumberOfThreads) {
-    const std::string text = NumberedLines(4 * Long);
+    const std::string text = NumberedLines(4 * LongSize);
     const std::string told = Read(text);
     EXPECT_NE(told.find("LINE|0|8 0\nLINE|1|x|"), std::string::npos);
     EXPECT_NE(told.find("\nend " + std::to_string(text.size()) + " 0\n"), std::string::npos);
@@ -122,13 +122,14 @@ TEST_F(LongFiles, TellTheSameWithAnyNumberOfThreads) {
 TEST_F(LongFiles, MayEndAnyhow) {
     for (const std::string& end :
          {std::string(), std::string("LAST"), std::string("\r"), std::string("\n\n"),
-          std::string("a\0b\nc\0", 6), std::string(Long, 'z'), "ADD " + std::string(Long, ' ')}) {
-        Read(NumberedLines(2 * Long) + end);
+          std::string("a\0b\nc\0", 6), std::string(LongSize, 'z'),
+          "ADD " + std::string(LongSize, ' ')}) {
+        Read(NumberedLines(2 * LongSize) + end);
     }
 }
 
 TEST_F(LongFiles, HaveSizesAroundThatOfABuffer) {
-    const std::string text = NumberedLines(Long);
+    const std::string text = NumberedLines(LongSize);
     for (std::size_t size = (1 << 18) - 2; size < (1 << 18) + 3; ++size) {
         Read(text.substr(0, size));
     }
@@ -145,7 +146,7 @@ TEST_F(LongFiles, HaveLinesOfMegabytes) {
 }
 
 TEST_F(LongFiles, AFailureComesBehindTheLinesThatWereRead) {
-    Support::WriteWholeFile(name_, NumberedLines(8 * Long));
+    Support::WriteWholeFile(name_, NumberedLines(8 * LongSize));
     for (int call = 1; call < 6; ++call) {
         std::string told[2];
         for (const unsigned threads : {1U, 2U}) {
@@ -160,9 +161,9 @@ TEST_F(LongFiles, AFailureComesBehindTheLinesThatWereRead) {
 }
 
 TEST_F(LongFiles, MayBeLeftAtAnyLine) {
-    Support::WriteWholeFile(name_, NumberedLines(4 * Long));
+    Support::WriteWholeFile(name_, NumberedLines(4 * LongSize));
     const std::string other = folder_ / "other.cmd";
-    Support::WriteWholeFile(other, NumberedLines(2 * Long));
+    Support::WriteWholeFile(other, NumberedLines(2 * LongSize));
     model_.GetOptions()->threads = 2;
     CommandReader reader(model_);
     for (int count = 1; count < 20000; count = count * 3 + 1) {
@@ -185,7 +186,7 @@ TEST_F(LongFiles, MayBeLeftAtAnyLine) {
 
 TEST_F(LongFiles, ThatBecomeShorterEnd) {
     model_.GetOptions()->threads = 2;
-    Support::WriteWholeFile(name_, NumberedLines(20 * Long));
+    Support::WriteWholeFile(name_, NumberedLines(20 * LongSize));
     CommandReader reader(model_);
     ASSERT_TRUE(reader.Open(name_.c_str()));
     ASSERT_NE(reader.Next(), nullptr);
@@ -193,7 +194,7 @@ TEST_F(LongFiles, ThatBecomeShorterEnd) {
     while (reader.Next() != nullptr) {
     }
     EXPECT_EQ(reader.GetError(), 0);
-    EXPECT_LT(reader.GetPosition(), 20 * Long);
+    EXPECT_LT(reader.GetPosition(), 20 * LongSize);
 }
 
 TEST_F(LongFiles, OfOtherKindsAreReadAsTheyCome) {
@@ -274,7 +275,7 @@ TEST_F(LongFiles, ACommandMayDoAnything) {
 
 namespace {
 
-rc::Gen<std::string> Lines() {
+rc::Gen<std::string> CommandLines() {
     return rc::gen::element<std::string>(
         "ADD COMPONENT INV", "ADD PIN INV A INPUT", "ADD PIN INV Y OUTPUT", "ADD INSTANCE INV u1",
         "ADD INSTANCE INV u2", "CONNECT SIGNAL n(3) u1.A", "CONNECT SIGNAL n(2:1) u2.Y",
@@ -284,7 +285,7 @@ rc::Gen<std::string> Lines() {
 
 /// What becomes of a file whose failing lines are passed over: each failure with its position, then
 /// the netlist.
-std::string Replay(unsigned threads, const std::string& name) {
+std::string ReplayFile(unsigned threads, const std::string& name) {
     Support::EngineScript script;
     script.GetModel().GetOptions()->threads = threads;
     CommandReader reader(script.GetModel());
@@ -303,11 +304,11 @@ std::string Replay(unsigned threads, const std::string& name) {
 } // namespace
 
 RC_GTEST_FIXTURE_PROP(LongFiles, LeaveTheSameDesign, ()) {
-    const auto lines = *rc::gen::container<std::vector<std::string>>(Lines());
+    const auto lines = *rc::gen::container<std::vector<std::string>>(CommandLines());
     std::string text = Padding();
     for (const std::string& line : lines) {
         text += line + '\n';
     }
     Support::WriteWholeFile(name_, text);
-    RC_ASSERT(Replay(1, name_) == Replay(2, name_));
+    RC_ASSERT(ReplayFile(1, name_) == ReplayFile(2, name_));
 }
