@@ -51,6 +51,14 @@ bool IsQuotedBy(string_view text, char quote) {
     return text.size() >= 2 && text.front() == quote && text.back() == quote;
 }
 
+/// Whether a text is a string literal of these characters.
+bool IsStringOf(string_view characters, string_view text) {
+    return IsQuotedBy(text, '"') &&
+           text.substr(1, text.size() - 2).find_first_not_of(characters) == string_view::npos;
+}
+
+constexpr string_view StdLogic = "UX01ZWLH-";
+
 bool IsControl(char c) {
     const auto byte = static_cast<unsigned char>(c);
     return byte < 0x20 || (byte >= 0x7F && byte < 0xA0);
@@ -249,9 +257,16 @@ bool CanBeValueOf(string_view type, string_view text) {
         return text == "'0'" || text == "'1'";
     }
     if (type == "std_logic" || type == "std_ulogic" || type == "character") {
-        return text.size() == 3 && IsQuotedBy(text, '\'');
+        return text.size() == 3 && IsQuotedBy(text, '\'') &&
+               (type == "character" || StdLogic.find(text[1]) != string_view::npos);
     }
-    if (type == "string" || type == "bit_vector" || type == "std_logic_vector") {
+    if (type == "bit_vector") {
+        return text.empty() || IsStringOf("01", text);
+    }
+    if (type == "std_logic_vector") {
+        return text.empty() || IsStringOf(StdLogic, text);
+    }
+    if (type == "string") {
         return text.empty() || (IsQuotedBy(text, '"') &&
                                 text.substr(1, text.size() - 2).find('"') == string_view::npos);
     }

@@ -1,6 +1,7 @@
 // Names that meet in one scope, hide a library or a type, or bear the name of the design.
 
 #include "Check/Context.h"
+#include "HdlModel/Names/GeneratedNames.h"
 #include "HdlModel/Names/Names.h"
 #include "Port/Ascii.h"
 #include "Writers/Generics.h"
@@ -58,6 +59,7 @@ public:
     void CheckAll() {
         CheckBuses();
         CheckDummySignals();
+        CheckMadeSignals();
         CheckOpenSignals();
         CheckGenerics();
         CheckAttributeNames();
@@ -69,9 +71,9 @@ public:
 private:
     void CheckBuses();
     void CheckDummySignals();
+    void CheckMadeSignals();
     void CheckOpenSignals();
     void CheckOpenPin(const Instance& instance, const Pin& pin);
-    void CheckFormerOpenPin(const Signal& signal);
     void CheckGenerics();
     void CheckAttributeNames();
     void CheckComponents();
@@ -193,14 +195,9 @@ void Scopes::CheckOpenSignals() {
     }
     for (const Instance* instance : netlist_.GetInstanceIterator()) {
         for (const Pin* pin : instance->GetPinIterator()) {
-            if (pin->GetPinType() == PinTypeBusIndex ||
-                pin->GetPolarity().GetValue() != Polarity::Input) {
-                continue;
-            }
-            if (pin->GetSignal() == nullptr) {
+            if (pin->GetSignal() == nullptr && pin->GetPinType() != PinTypeBusIndex &&
+                pin->GetPolarity().GetValue() == Polarity::Input) {
                 CheckOpenPin(*instance, *pin);
-            } else {
-                CheckFormerOpenPin(*pin->GetSignal());
             }
         }
     }
@@ -229,15 +226,19 @@ void Scopes::CheckOpenPin(const Instance& instance, const Pin& pin) {
     ForEachInScope(base, open, [&](const Declared& other) { ReportClash(open, other, ""); });
 }
 
-/// A signal that an earlier write made for an open pin can have the name of another object.
-void Scopes::CheckFormerOpenPin(const Signal& signal) {
-    constexpr string_view Ending = "_openSignal";
-    const string_view base = Names::BaseName(signal.GetNameView());
-    if (base.size() < Ending.size() || base.substr(base.size() - Ending.size()) != Ending) {
-        return;
+/// A signal that an earlier write made can have the name of another object. Buses are looked at as
+/// all others are.
+void Scopes::CheckMadeSignals() {
+    for (const Signal* signal : context_.survey.GetSignals()) {
+        const string_view name = signal->GetNameView();
+        if (signal->GetSignalType() != SignalTypeScalar || !Names::IsGenerated(name)) {
+            continue;
+        }
+        const Declared made = DescribeSignal(*signal);
+        ForEachInScope(name, made, [&](const Declared& other) {
+            ReportClash(made, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
+        });
     }
-    const Declared open = DescribeSignal(signal);
-    ForEachInScope(base, open, [&](const Declared& other) { ReportClash(open, other, ""); });
 }
 
 void Scopes::CheckGenerics() {

@@ -174,6 +174,27 @@ TEST_F(CheckTest, AnIndexOfMoreThan32BitsIsWrittenAsAnotherOne) {
               "misread: the bus \"P(0:4294967296)\" has an index of more than 32 bits");
 }
 
+TEST_F(CheckTest, AValueOfAUserTypeIsALiteralOfIt) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=User W x",
+        "SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=SYN"});
+    const auto isWrong = [this](const char* type, const char* value) {
+        Do({("SET COMPONENT ATTRIBUTE USERTYPE INV W " + std::string(type)).c_str()});
+        model_.GetComponent("INV")->GetAttr("W")->SetValue(value);
+        const Findings found = Run(Check::Targets::Vhdl());
+        return std::any_of(found.begin(), found.end(), [](const Finding& finding) {
+            return finding.rule->name == "user-value";
+        });
+    };
+    EXPECT_TRUE(isWrong("bit_vector", "\"text\""));
+    EXPECT_TRUE(isWrong("bit_vector", "\"0X\""));
+    EXPECT_FALSE(isWrong("bit_vector", "\"0110\""));
+    EXPECT_TRUE(isWrong("std_logic_vector", "\"0x\""));
+    EXPECT_FALSE(isWrong("std_logic_vector", "\"0XZ-\""));
+    EXPECT_TRUE(isWrong("std_logic", "'x'"));
+    EXPECT_FALSE(isWrong("std_logic", "'X'"));
+    EXPECT_FALSE(isWrong("character", "'x'"));
+}
+
 TEST_F(CheckTest, CommentsHideWhatFollowsFromSynthesis) {
     Do({"ADD NOTES synthesis translate_off"});
     EXPECT_EQ(Find("directive-comment").verdicts.Get(Check::Target::Ghdl), Verdict::Misreads);

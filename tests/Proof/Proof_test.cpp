@@ -380,6 +380,25 @@ TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {
     EXPECT_FALSE(Compare().empty());
 }
 
+TEST_F(ProofTest, NegativeNumbersAndEscapedNamesOfParametersAreRead) {
+    Do({"ADD MODULE ATTRIBUTE -TYPE=Float RATE -3.25",
+        "SET MODULE ATTRIBUTE OPTION RATE -GENERIC=SYN",
+        "ADD MODULE ATTRIBUTE -TYPE=Integer SHIFT -4",
+        "SET MODULE ATTRIBUTE OPTION SHIFT -GENERIC=SYN",
+        "ADD MODULE ATTRIBUTE -TYPE=Integer \"\\\\a+b \" 5",
+        "SET MODULE ATTRIBUTE OPTION \"\\\\a+b \" -GENERIC=SYN",
+        "ADD SIGNAL ATTRIBUTE A \"\\\\n+m \" yes",
+        "SET SIGNAL ATTRIBUTE OPTION A \"\\\\n+m \" -SYNATTR=ASSIGN"});
+    EXPECT_EQ(FindFirst("RATE = -3.25", "RATE = -3.250"), "");
+    EXPECT_EQ(FindFirst("RATE = -3.25", "RATE = 3.25"),
+              "the parameter RATE of the module has the value \"3.25\", in the design \"-3.25\"");
+    EXPECT_EQ(FindFirst("SHIFT = -4", "SHIFT = -5"),
+              "the parameter SHIFT of the module has the value \"-5\", in the design \"-4\"");
+    EXPECT_EQ(FindFirst("\\a+b ", "\\a+b  "), "");
+    EXPECT_NE(FindFirst("\\a+b ", "\\a+c "), "");
+    EXPECT_NE(FindFirst("\\n+m ", "\\n+k "), "");
+}
+
 TEST_F(ProofTest, TheRuleThatTellsOfADifferenceIsNamed) {
     const auto findRule = [this](std::initializer_list<const char*> lines) {
         Model model(&factory_);
@@ -402,6 +421,10 @@ TEST_F(ProofTest, TheRuleThatTellsOfADifferenceIsNamed) {
     EXPECT_EQ(findRule({"ADD PORT A input", "SET OPEN PIN false", "ADD COMPONENT INV",
                         "ADD PIN INV I input", "ADD INSTANCE INV U1",
                         "ADD INSTANCE INV U1_I_openSignal", "CONNECT SIGNAL A U1_I_openSignal.I"}),
+              "name-clash");
+    // An instance and the signal that a write makes for a port that is read.
+    EXPECT_EQ(findRule({"ADD PORT Y output", "ADD COMPONENT INV", "ADD PIN INV I input",
+                        "ADD INSTANCE INV Y_DUMMY", "CONNECT SIGNAL Y Y_DUMMY.I"}),
               "name-clash");
     EXPECT_EQ(findRule({"ADD PORT W(99999999999:99999999990) input"}), "wide-bus");
     EXPECT_EQ(findRule({"ADD PORT W(0:99999999999999999999) input"}), "wide-bus");
