@@ -137,6 +137,7 @@ TEST_F(COutput, ACheckTellsItsFindings) {
     EXPECT_EQ(ToString(finding.cause), "Signal");
     EXPECT_EQ(ToString(finding.first), "module");
     EXPECT_NE(ToString(finding.rule), "");
+    EXPECT_NE(ToString(finding.message).find("module"), std::string::npos);
     EXPECT_EQ(finding.verdicts[0], ORN_HDL_REJECTS);
     EXPECT_EQ(orn_hdl_findings_get(findings, count, &finding), ORN_HDL_END);
     EXPECT_EQ(orn_hdl_findings_destroy(findings), ORN_HDL_OK);

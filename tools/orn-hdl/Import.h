@@ -63,6 +63,8 @@ struct ImportOptions {
     bool verify = false;
     /// How many threads may work together; 0 is what the system gives.
     unsigned threads = 0;
+    /// The file for the certificate of the netlists; empty for none.
+    std::string certificate;
     ReportOptions report;
 };
 

@@ -450,8 +450,11 @@ private:
                          "Import the attributes of cells and nets");
         command.add_flag("--comments", import_.comments, "Import the comments of objects");
         command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
-        command.add_flag("--verify", import_.verify,
-                         "Read each netlist back and compare it with the design");
+        CLI::Option* verify = command.add_flag(
+            "--verify", import_.verify, "Read each netlist back and compare it with the design");
+        AddFile(command, "--certificate", import_.certificate,
+                "Write what was proven, with the SHA-256 of the files, as JSON")
+            ->needs(verify);
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddFile(command, "--write-cells", import_.cellModels,
                 "Write simulation models in VHDL of the cells of Yosys");

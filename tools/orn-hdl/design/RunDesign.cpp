@@ -8,6 +8,7 @@
 #include "design/DesignOutput.h"
 #include "design/LegalDesign.h"
 #include "design/ModelLinks.h"
+#include "proof/Certificate.h"
 #include "warnings/SlipFinder.h"
 
 #include <algorithm>
@@ -240,7 +241,8 @@ Status DesignRun::Write() {
                              TellOf(file.file, file.replayed.lines)};
     }
     Progress progress(options_.quiet, options_.files.front());
-    status = Worse(status, WriteDesign(models, outputs, progress));
+    Certificate none("");
+    status = Worse(status, WriteDesign(models, outputs, progress, none));
     return status == Status::Success ? nameMap.Commit() : status;
 }
 
