@@ -3,6 +3,7 @@
 #pragma once
 
 #include "Port/Ascii.h"
+#include "Port/TextSet.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -10,7 +11,6 @@
 #include <string>
 #include <string_view>
 #include <unordered_map>
-#include <unordered_set>
 
 namespace Port {
 
@@ -24,16 +24,15 @@ public:
     NameScope& operator=(const NameScope&) = delete;
 
     /// Makes room for a number of names.
-    void Reserve(std::size_t count) { taken_.reserve(count); }
+    void Reserve(std::size_t count) { taken_.Reserve(count); }
     /// Claims a name. \return false if it is claimed already.
-    bool Claim(std::string_view name) { return !IsTaken(name) && taken_.insert(Keep(name)).second; }
-    /// Whether a name is claimed.
-    bool IsTaken(std::string_view name) const { return taken_.count(name) != 0; }
-    /// How a claimed name is spelled; empty for any other name.
-    std::string_view GetSpelling(std::string_view name) const {
-        const auto taken = taken_.find(name);
-        return taken == taken_.end() ? std::string_view() : *taken;
+    bool Claim(std::string_view name) {
+        return taken_.Add(name, [this](std::string_view text) { return Keep(text); });
     }
+    /// Whether a name is claimed.
+    bool IsTaken(std::string_view name) const { return taken_.Find(name) != nullptr; }
+    /// How a claimed name is spelled; empty for any other name.
+    std::string_view GetSpelling(std::string_view name) const { return taken_.Get(name); }
 
     /// Claims the wanted name, or else the first of it with _1, _2 and so on that is free.
     /// \param isAllowed whether the wanted name itself may be had.
@@ -41,7 +40,7 @@ public:
     template <class IsFree>
     std::string ClaimNumbered(const std::string& wanted, bool isAllowed, const IsFree& isFree) {
         if (isAllowed && !IsTaken(wanted) && isFree(wanted)) {
-            taken_.insert(Keep(wanted));
+            Claim(wanted);
             return wanted;
         }
         auto number = numbers_.find(wanted);
@@ -52,19 +51,20 @@ public:
         do {
             numbered = wanted + "_" + std::to_string(++number->second);
         } while (IsTaken(numbered) || !isFree(numbered));
-        taken_.insert(Keep(numbered));
+        Claim(numbered);
         return numbered;
     }
 
 private:
     struct Hash {
-        std::size_t operator()(std::string_view name) const noexcept {
-            // FNV-1a over the letters in one case.
+        std::uint64_t operator()(std::string_view name) const noexcept {
+            // FNV-1a over the letters in one case. What the last ones change of it reaches the
+            // upper bits in the end.
             std::uint64_t hash = 14695981039346656037U;
             for (const char c : name) {
                 hash = (hash ^ static_cast<unsigned char>(ToUpper(c))) * 1099511628211U;
             }
-            return static_cast<std::size_t>(hash);
+            return (hash ^ (hash >> 32U)) * 0x9E3779B97F4A7C15U;
         }
     };
     struct Equal {
@@ -80,7 +80,7 @@ private:
     }
 
     std::pmr::monotonic_buffer_resource memory_;
-    std::pmr::unordered_set<std::string_view, Hash, Equal> taken_{&memory_};
+    TextSet<Hash, Equal> taken_;
     /// The last number of each numbered name.
     std::pmr::unordered_map<std::string_view, std::size_t, Hash, Equal> numbers_{&memory_};
 };

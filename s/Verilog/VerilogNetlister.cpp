@@ -35,10 +35,17 @@ public:
           dialect_(DialectOf(options.verilog.synthesisType)),
           connection_(out, WriteSignalVisitor::Connection),
           reference_(out, WriteSignalVisitor::Assignment) {}
+    /// Writes parts of what `whole` writes to a stream of their own.
+    Writer(OutStream& out, VerilogStatements& statements, const Writer& whole)
+        : NetlistPass(out, whole), statements_(statements), dialect_(whole.dialect_),
+          connection_(out, WriteSignalVisitor::Connection),
+          reference_(out, WriteSignalVisitor::Assignment) {}
 
     void Write();
 
 private:
+    class Instances;
+
     void Prepare();
     void SetNameCase();
     static void SetNameCase(Object& object, HdlOptions::VerilogOption::CaseType nameCase);
@@ -54,6 +61,7 @@ private:
     void WriteReference(Signal& signal);
     void WriteInstances();
     void WriteInstance(const Instance& instance);
+    void WriteInstantiation(const Instance& instance);
     void WriteConnections(const Instance& instance, std::size_t column);
     void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
 
@@ -70,6 +78,21 @@ private:
     WriteSignalVisitor reference_;
     PtrArray<Attribute*> effectiveAttrs_;
     Writers::GenericAttrs genericAttrs_;
+};
+
+/// Writes instances to a stream of its own.
+class VerilogNetlister::Writer::Instances {
+public:
+    Instances(OutStream& out, const Writer& whole)
+        : statements_(out), writer_(out, statements_, whole) {}
+    Instances(const Instances&) = delete;
+    Instances& operator=(const Instances&) = delete;
+
+    void operator()(const Instance& instance) { writer_.WriteInstance(instance); }
+
+private:
+    VerilogStatements statements_;
+    Writer writer_;
 };
 
 VerilogNetlister::VerilogNetlister(OutStream& out)
@@ -230,15 +253,17 @@ void VerilogNetlister::Writer::WriteReference(Signal& signal) {
 }
 
 void VerilogNetlister::Writer::WriteInstances() {
-    ForEachInstance([this](const Instance& instance) {
-        WriteInstance(instance);
-        Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
-        EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
-        WriteDefParam(instance, effectiveAttrs_);
-    });
+    WriteEachInstance([this](OutStream& out) { return Instances(out, *this); });
 }
 
 void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {
+    WriteInstantiation(instance);
+    Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+    EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
+    WriteDefParam(instance, effectiveAttrs_);
+}
+
+void VerilogNetlister::Writer::WriteInstantiation(const Instance& instance) {
     const Component* const component = instance.GetComponent();
     string_view componentName;
     if (component != nullptr) {

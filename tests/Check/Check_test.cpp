@@ -60,6 +60,21 @@ TEST_F(CheckTest, SoundDesignHasNoFindings) {
     EXPECT_TRUE(Run().empty());
 }
 
+TEST_F(CheckTest, YosysDoesNotReadWhatIsHiddenFromSynthesis) {
+    Do({"ADD MODULE ATTRIBUTE NOTE \"7\\\" wide\"",
+        "SET MODULE ATTRIBUTE OPTION NOTE -GENERIC=NOSYN"});
+    const Finding finding = Find("quote-in-value");
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Yosys), Verdict::Accepts);
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Icarus), Verdict::Rejects);
+}
+
+TEST_F(CheckTest, AnExtendedNameMayHoldABackslashTwice) {
+    Do({"ADD SIGNAL \\a\\\\b\\", "CONNECT SIGNAL \\a\\\\b\\ A"});
+    const Finding name = Find("illegal-name");
+    EXPECT_EQ(name.verdicts.Get(Check::Target::Vhdl93), Verdict::Accepts);
+    EXPECT_EQ(name.verdicts.Get(Check::Target::Verilog2005), Verdict::Rejects);
+}
+
 TEST_F(CheckTest, EmptyNetlistIsChecked) {
     const Netlist netlist;
     const HdlOptions options;

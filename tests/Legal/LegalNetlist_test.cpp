@@ -280,6 +280,37 @@ TEST_F(LegalNetlistTest, ClausesAreMended) {
         << text;
 }
 
+TEST_F(LegalNetlistTest, LegalClausesStay) {
+    // The default library comes with clauses of its own, and a clause may stand twice.
+    Do({"ADD LIBRARY ieee,ieee", "ADD USE LIBRARY ieee.numeric_std.all", "ADD SIGNAL begin"});
+    const std::string renamed = WriteLegally(Language::Vhdl);
+    EXPECT_NE(renamed.find("library ieee,ieee;\n"), std::string::npos) << renamed;
+    Do({"ADD LIBRARY 2x"});
+    const std::string mended = WriteLegally(Language::Vhdl);
+    EXPECT_NE(mended.find("library ieee;\nuse"), std::string::npos) << mended;
+    EXPECT_EQ(mended.find("ieee,"), std::string::npos) << mended;
+}
+
+TEST_F(LegalNetlistTest, ANameThatCannotBeEscapedIsReplaced) {
+    model_.GetOptions()->escapeNames = true;
+    Do({"ADD SIGNAL x\x01y", "CONNECT SIGNAL x\x01y A"});
+    EXPECT_EQ(NameOfSignal("x\x01y"), "x_y");
+}
+
+TEST_F(LegalNetlistTest, ANewNameIsNoneOfAComponent) {
+    Do({"ADD COMPONENT begin_1", "ADD PIN begin_1 I input", "ADD INSTANCE begin_1 U2",
+        "ADD SIGNAL begin", "CONNECT SIGNAL begin U2.I", "CONNECT SIGNAL begin A"});
+    EXPECT_EQ(NameOfSignal("begin"), "begin_2");
+}
+
+TEST_F(LegalNetlistTest, AQuotedTextOfAUsersTypeLosesItsQuotes) {
+    Do({"ADD INSTANCE ATTRIBUTE U1 -TYPE=User DELAY \"\\\"1 ns\\\"\"",
+        "SET INSTANCE ATTRIBUTE USERTYPE U1 DELAY string",
+        "SET INSTANCE ATTRIBUTE OPTION U1 DELAY -SYNATTR=ASSIGN", "ADD SIGNAL begin"});
+    const std::string text = WriteLegally(Language::Vhdl);
+    EXPECT_NE(text.find("attribute DELAY of U1 : label is \"1 ns\";"), std::string::npos) << text;
+}
+
 TEST_F(LegalNetlistTest, WriteCommandLeavesTheFileAlone) {
     const std::string file = ::testing::TempDir() + "legal_refused.v";
     std::remove(file.c_str());

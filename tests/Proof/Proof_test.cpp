@@ -8,6 +8,8 @@
 
 #include <ostream>
 #include <string>
+#include <sys/resource.h>
+#include <unistd.h>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -359,6 +361,19 @@ TEST_F(ProofTest, ABusMayBeAnAliasOfNothingInVerilog) {
               "the netlist has 1 bits assigned to 4, the design x(3:0) = A");
 }
 
+TEST_F(ProofTest, OfLongConcatenationsTheFirstPartsAreShown) {
+    Do({"ADD SIGNAL v(8:0)", "CONNECT SIGNAL v(8:0) A,B,A,B,A,B,A,B,A"});
+    Write();
+    std::string text = ReadWholeFile(GetFile());
+    const std::size_t last = text.find("B, A}");
+    ASSERT_NE(last, std::string::npos) << text;
+    WriteWholeFile(GetFile(), text.replace(last, 5, "B, B}"));
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message,
+              "the netlist has v[8:0] = A, B, A, B, A, B, A, B, ..., the design v(8:0) = "
+              "A,B,A,B,A,B,A,B,A");
+}
+
 TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {
     model_.GetSignal("T")->SetName("n1");
     Write();
@@ -464,6 +479,45 @@ TEST_F(ProofTest, AppendedTextIsProvenFirst) {
     Do({"ADD SIGNAL L(3:0)", "ASSIGN CONSTANT L(3:0) 1010"});
     EXPECT_THROW(model_.ExecuteLine(append), ProofException);
     EXPECT_EQ(ReadWholeFile(GetFile()), written);
+}
+
+/// As long as it lives, the program can open no file.
+class NoMoreFiles {
+public:
+    NoMoreFiles() {
+        getrlimit(RLIMIT_NOFILE, &former_);
+        const int firstFree = dup(0);
+        close(firstFree);
+        const rlimit none = {static_cast<rlim_t>(firstFree), former_.rlim_max};
+        setrlimit(RLIMIT_NOFILE, &none);
+    }
+    NoMoreFiles(const NoMoreFiles&) = delete;
+    NoMoreFiles& operator=(const NoMoreFiles&) = delete;
+    ~NoMoreFiles() { setrlimit(RLIMIT_NOFILE, &former_); }
+
+private:
+    rlimit former_;
+};
+
+TEST_F(ProofTest, WithoutATemporaryFileNothingIsAppended) {
+    WriteWholeFile(GetFile(), "// former\n");
+    TextFileOutStream out(GetFile().c_str(), TextFileOutStream::Append);
+    ASSERT_TRUE(out.IsOpen());
+    const auto write = [this, &out] {
+        Proof::Write(
+            out, GetFile().c_str(), Language::Verilog, [](OutStream& stream) { stream << "text"; },
+            [this] {
+                return Proof::Written{*model_.GetNetlist(), *model_.GetOptions()};
+            });
+    };
+    std::string failure;
+    {
+        const NoMoreFiles limit;
+        failure = FailureOf(write);
+    }
+    EXPECT_NE(failure.find("A temporary file for the proof cannot be used"), std::string::npos);
+    out.Close();
+    EXPECT_EQ(ReadWholeFile(GetFile()), "// former\n");
 }
 
 } // namespace

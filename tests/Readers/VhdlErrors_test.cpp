@@ -341,7 +341,8 @@ constexpr Refused Table[] = {
      "u3 : entity work.ABC port map (a);\n"
      "u4 : DEF port map (a);\n"
      "end architecture a;\n",
-     "top.vhd:4:13: error: the cells \"XYZ\", \"ABC\", \"DEF\" are not declared: a library file has "
+     "top.vhd:4:13: error: the cells \"XYZ\", \"ABC\", \"DEF\" are not declared: a library file "
+     "has "
      "to say which ports they have"},
     {"undeclared components",
      "entity m is  end entity m;\n"

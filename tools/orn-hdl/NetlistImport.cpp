@@ -360,6 +360,7 @@ Status Importer::ReadAndWrite() {
     }
     engine_.CreateAndAddModel("import", options_.file.c_str());
     model_ = engine_.GetModel("import");
+    model_->GetOptions()->threads = options_.threads;
     if (format_ == ImportFormat::Vhdl) {
         Orn_Hdl::VhdlReader reader;
         return Read(reader);

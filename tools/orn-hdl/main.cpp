@@ -137,6 +137,15 @@ void AddReport(CLI::App& command, Tool::ReportOptions& report) {
     AddColor(command, report);
 }
 
+void AddThreads(CLI::App& command, unsigned& threads) {
+    command
+        .add_option("--threads", threads,
+                    "Use up to N processors; 0, the default, is what the system gives, up to 8")
+        ->type_name("N")
+        ->envname("ORN_HDL_THREADS")
+        ->check(CLI::Range(0, 64));
+}
+
 /// Drops the warnings of a list of names with commas between them. \return what is wrong with it.
 std::string DropWarnings(const std::string& list, Tool::WarningOptions& warnings) {
     std::istringstream rest(list);
@@ -383,6 +392,7 @@ private:
             ->needs(legal);
         AddFile(command, "--name-map", run_.nameMap, "Write a table of old and new names")
             ->needs(legal);
+        AddThreads(command, run_.threads);
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
 
@@ -448,6 +458,7 @@ private:
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddFile(command, "--write-cells", import_.cellModels,
                 "Write simulation models in VHDL of the cells of Yosys");
+        AddThreads(command, import_.threads);
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
     }
@@ -465,6 +476,7 @@ private:
                                "What makes the exit status 1");
         AddFormat(command, "--format,--diagnostics", check_.report, "How the findings are printed");
         AddColor(command, check_.report);
+        AddThreads(command, check_.threads);
         command.add_flag("--list", check_.list, "List the rules");
         command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
@@ -506,6 +518,7 @@ private:
         command.add_option("--limit", diff_.limit, "Show N differences; 0 shows all")
             ->type_name("N");
         AddReport(command, diff_.report);
+        AddThreads(command, diff_.threads);
         command.add_flag("--quiet", diff_.quiet, "Do not show progress");
         command.footer("The exit status is 0 for equal designs, 1 for different ones, 2 for "
                        "trouble.");
@@ -533,6 +546,7 @@ private:
         AddFile(command, "--certificate", verify_.certificate,
                 "Write what was proven, with the SHA-256 of the files, as JSON");
         AddReport(command, verify_.report);
+        AddThreads(command, verify_.threads);
         command.add_flag("--quiet", verify_.quiet, "Do not show progress");
         command.footer("WRITE commands in the file do nothing.");
     }
@@ -561,6 +575,7 @@ private:
             {{"text", Tool::StatsFormat::Text}, {"json", Tool::StatsFormat::Json}},
             "Print the counts as text or JSON");
         AddReport(command, stats_.report);
+        AddThreads(command, stats_.threads);
         command.add_flag("--quiet", stats_.quiet, "Do not show progress");
         command.footer("WRITE commands in the file do nothing.");
     }

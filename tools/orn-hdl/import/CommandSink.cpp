@@ -132,6 +132,11 @@ void CommandSink::Connect(const std::string& signal, const std::string& instance
     WriteLine("CONNECT SIGNAL", signal, instance + "." + pin);
 }
 
+void CommandSink::ConnectScalar(std::uint32_t /*number*/, const std::string& signal,
+                                const std::string& instance, const std::string& pin) {
+    Connect(signal, instance, pin);
+}
+
 void CommandSink::AssignPin(const std::string& instance, const std::string& pin,
                             const std::string& value) {
     WriteLine("ASSIGN CONSTANT", instance + "." + pin, value);

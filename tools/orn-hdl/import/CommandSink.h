@@ -39,6 +39,8 @@ public:
     void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) override;
     void Connect(const std::string& signal, const std::string& instance,
                  const std::string& pin) override;
+    void ConnectScalar(std::uint32_t number, const std::string& signal, const std::string& instance,
+                       const std::string& pin) override;
     void AssignPin(const std::string& instance, const std::string& pin,
                    const std::string& value) override;
 

@@ -16,7 +16,8 @@ class NetlistEmitter {
 public:
     NetlistEmitter(const ImportedNetlist& netlist, Sink& sink)
         : netlist_(netlist), top_(netlist.top), owners_(netlist.owners),
-          references_(netlist.top, netlist.owners, netlist.unknown), sink_(sink) {}
+          references_(netlist.top, netlist.owners, netlist.unknown), sink_(sink),
+          isScalar_(netlist.owners.GetSignals().size()) {}
 
     void Emit();
 
@@ -31,6 +32,7 @@ private:
     void LeaveOutGenerics(const std::string& name, const Cell& cell,
                           const ImportedComponent& component);
     void EmitConnection(const std::string& cell, const ImportedPin& pin, std::uint32_t index);
+    void EmitSignal(const std::string& cell, const ImportedPin& pin, const Span& bits);
     void EmitAttributes();
     template <class Add> void ForEachAttribute(const Span& attributes, Add add) const;
 
@@ -39,6 +41,9 @@ private:
     const BitOwners& owners_;
     const SignalReferences references_;
     Sink& sink_;
+    /// Of each signal. Most pins are connected to such a signal, and these flags stay in the
+    /// processor's caches, other than the signals.
+    std::vector<bool> isScalar_;
 };
 
 void NetlistEmitter::Emit() {
@@ -83,17 +88,19 @@ void NetlistEmitter::EmitComponents() {
 }
 
 void NetlistEmitter::EmitSignals() {
+    const std::vector<ImportedSignal>& signals = owners_.GetSignals();
     sink_.BeginGroup();
-    for (const ImportedSignal& signal : owners_.GetSignals()) {
+    for (const ImportedSignal& signal : signals) {
         if (signal.port != nullptr) {
             sink_.AddPort(GetFullName(signal), GetDirectionName(signal.port->direction));
         }
     }
     sink_.BeginGroup();
-    for (const ImportedSignal& signal : owners_.GetSignals()) {
-        if (signal.port == nullptr) {
-            sink_.AddSignal(GetFullName(signal));
+    for (std::size_t i = 0; i < signals.size(); ++i) {
+        if (signals[i].port == nullptr) {
+            sink_.AddSignal(GetFullName(signals[i]));
         }
+        isScalar_[i] = signals[i].IsScalar();
     }
     EmitConstantSignal(Zero, "0");
     EmitConstantSignal(One, "1");
@@ -210,9 +217,21 @@ void NetlistEmitter::EmitConnection(const std::string& cell, const ImportedPin& 
         sink_.AssignPin(cell, pin.name, MakeConstant(references_.GetDigits(bits), pin.scalar));
         break;
     case ConnectionKind::Signal:
-        sink_.Connect(references_.GetReference(bits), cell, pin.name);
+        EmitSignal(cell, pin, bits);
         break;
     }
+}
+
+void NetlistEmitter::EmitSignal(const std::string& cell, const ImportedPin& pin, const Span& bits) {
+    if (bits.count == 1) {
+        const Bit bit = references_.GetBit(bits, 0);
+        const std::uint32_t owner = IsNet(bit) ? owners_.Get(bit).signal : BitOwner::NoSignal;
+        if (owner != BitOwner::NoSignal && isScalar_[owner]) {
+            sink_.ConnectScalar(owner, owners_.GetSignals()[owner].name, cell, pin.name);
+            return;
+        }
+    }
+    sink_.Connect(references_.GetReference(bits), cell, pin.name);
 }
 
 template <class Add> void NetlistEmitter::ForEachAttribute(const Span& attributes, Add add) const {

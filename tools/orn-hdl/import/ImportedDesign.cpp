@@ -22,7 +22,7 @@ std::uint32_t CellType::GetOrAddPin(std::string_view pin) {
 
 std::string_view ImportedDesign::Keep(std::string_view text) {
     if (text.empty()) {
-        return std::string_view();
+        return "";
     }
     char* copy = static_cast<char*>(texts_.allocate(text.size(), 1));
     std::memcpy(copy, text.data(), text.size());

@@ -2,6 +2,8 @@
 
 #include "Orn_Hdl/Model.h"
 
+#include <string_view>
+
 namespace Tool::Import {
 
 namespace {
@@ -50,12 +52,13 @@ void ModelSink::AddComponentGeneric(const std::string& component, const TypedVal
 }
 
 void ModelSink::AddPort(const std::string& name, const char* direction) {
-    model_.AddSignal(name.c_str());
-    model_.GetSignal(name.c_str())->SetPortPolarity(Orn_Hdl::Polarity(direction));
+    AddSignal(name);
+    signals_.back()->SetPortPolarity(Orn_Hdl::Polarity(direction));
 }
 
 void ModelSink::AddSignal(const std::string& name) {
     model_.AddSignal(name.c_str());
+    signals_.push_back(model_.GetNetlist()->GetSignal(std::string_view(name)));
 }
 
 void ModelSink::Alias(const std::string& target, const std::string& source) {
@@ -74,6 +77,7 @@ void ModelSink::AddSignalAttribute(const std::string& signal, const TypedValue& 
 
 void ModelSink::AddInstance(const std::string& name, const std::string& component) {
     model_.AddInstance(name.c_str(), component.c_str());
+    instance_ = model_.GetNetlist()->GetInstance(std::string_view(name));
 }
 
 void ModelSink::AddInstanceGeneric(const std::string& instance, const TypedValue& generic) {
@@ -98,6 +102,11 @@ void ModelSink::AddInstanceAttribute(const std::string& instance, const TypedVal
 void ModelSink::Connect(const std::string& signal, const std::string& instance,
                         const std::string& pin) {
     model_.ConnectSignalToPin(signal.c_str(), instance.c_str(), pin.c_str());
+}
+
+void ModelSink::ConnectScalar(std::uint32_t number, const std::string& /*signal*/,
+                              const std::string& /*instance*/, const std::string& pin) {
+    signals_[number]->Connect(instance_->GetPin(std::string_view(pin)));
 }
 
 void ModelSink::AssignPin(const std::string& instance, const std::string& pin,

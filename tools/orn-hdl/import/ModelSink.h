@@ -3,11 +3,15 @@
 
 #include "import/Sink.h"
 
+#include <cstdint>
 #include <string>
+#include <vector>
 
 namespace Orn_Hdl {
+class Instance;
 class Model;
-}
+class Signal;
+} // namespace Orn_Hdl
 
 namespace Tool::Import {
 
@@ -38,11 +42,17 @@ public:
     void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) override;
     void Connect(const std::string& signal, const std::string& instance,
                  const std::string& pin) override;
+    void ConnectScalar(std::uint32_t number, const std::string& signal, const std::string& instance,
+                       const std::string& pin) override;
     void AssignPin(const std::string& instance, const std::string& pin,
                    const std::string& value) override;
 
 private:
     Orn_Hdl::Model& model_;
+    /// By number, so that most connections look up no signal.
+    std::vector<Orn_Hdl::Signal*> signals_;
+    /// The one that was added last.
+    Orn_Hdl::Instance* instance_ = nullptr;
 };
 
 } // namespace Tool::Import

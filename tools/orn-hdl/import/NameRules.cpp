@@ -5,6 +5,7 @@
 #include "Port/Ascii.h"
 
 #include <algorithm>
+#include <unordered_set>
 
 namespace Tool::Import {
 
@@ -13,10 +14,28 @@ namespace {
 using Port::IsDigit;
 using Port::IsLetter;
 
+/// Words that are looked up for every name of a design.
+class WordSet {
+public:
+    /// \param words with blanks between them; not copied.
+    explicit WordSet(std::string_view words) {
+        while (!words.empty()) {
+            const std::size_t size = std::min(words.find(' '), words.size());
+            words_.insert(words.substr(0, size));
+            words.remove_prefix(std::min(size + 1, words.size()));
+        }
+    }
+
+    bool Has(std::string_view word) const { return words_.count(word) != 0; }
+
+private:
+    std::unordered_set<std::string_view> words_;
+};
+
 /// Words added to Verilog after IEEE 1364-1995, including SystemVerilog's (IEEE 1800-2017, annex
-/// B), and "force". Each has a blank before and after it.
-constexpr std::string_view VerilogWords =
-    " accept_on alias always_comb always_ff always_latch assert assume automatic"
+/// B), and "force".
+constexpr std::string_view VerilogWordList =
+    "accept_on alias always_comb always_ff always_latch assert assume automatic"
     " before bind bins binsof bit break byte cell chandle checker class clocking"
     " config const constraint context continue cover covergroup coverpoint cross"
     " design dist do endchecker endclass endclocking endconfig endgenerate endgroup"
@@ -32,25 +51,23 @@ constexpr std::string_view VerilogWords =
     " strong struct super sync_accept_on sync_reject_on tagged this throughout"
     " timeprecision timeunit type typedef union unique unique0 unsigned until"
     " until_with untyped use uwire var virtual void wait_order weak wildcard with"
-    " within ";
+    " within";
 
 /// The classes of SystemVerilog, which Verilator takes for types even where the name is escaped.
-/// Each has a blank before and after it.
-constexpr std::string_view VerilogClasses = " mailbox process semaphore ";
+constexpr std::string_view VerilogClassList = "mailbox process semaphore";
 
 /// Words added to VHDL after IEEE 1076-1993, the names of types, literals and libraries that
-/// written VHDL mentions, and of the architecture, in lower case. Each has a blank before and
-/// after it.
-constexpr std::string_view VhdlWords =
-    " assume assume_guarantee behavioral bit bit_vector boolean context cover default"
+/// written VHDL mentions, and of the architecture, in lower case.
+constexpr std::string_view VhdlWordList =
+    "assume assume_guarantee behavioral bit bit_vector boolean context cover default"
     " fairness false force ieee integer kestra numeric_std parameter private property"
     " protected real release restrict restrict_guarantee sequence std std_logic"
     " std_logic_1164 std_logic_vector string strong true vcomponents view vmode vprop"
-    " vunit work ";
+    " vunit work";
 
 /// Names with a meaning of their own: ADD SIGNAL COMMENT and ADD INSTANCE ATTRIBUTE are other
-/// commands, and the signal "open" is none. Each has a blank before and after it.
-constexpr std::string_view LibraryWords = " attribute comment open ";
+/// commands, and the signal "open" is none.
+constexpr std::string_view LibraryWordList = "attribute comment open";
 
 /// The length of the longest reserved word.
 constexpr std::size_t LongestWord = 20;
@@ -61,18 +78,25 @@ std::string ToLower(std::string_view text) {
     return result;
 }
 
-bool IsListed(std::string_view words, std::string_view word) {
-    return words.find(std::string(" ").append(word).append(" ")) != std::string_view::npos;
+bool IsVerilogClass(std::string_view name) {
+    static const WordSet words(VerilogClassList);
+    return words.Has(name);
 }
 
 bool IsVerilogWord(std::string_view name) {
-    return Orn_Hdl::Engine::IsVerilogKeyword(std::string(name).c_str()) ||
-           IsListed(VerilogWords, name) || IsListed(VerilogClasses, name);
+    static const WordSet words(VerilogWordList);
+    return Orn_Hdl::Engine::IsVerilogKeyword(std::string(name).c_str()) || words.Has(name) ||
+           IsVerilogClass(name);
 }
 
 bool IsVhdlWord(std::string_view name) {
-    return Orn_Hdl::Engine::IsVhdlKeyword(std::string(name).c_str()) ||
-           IsListed(VhdlWords, ToLower(name));
+    static const WordSet words(VhdlWordList);
+    return Orn_Hdl::Engine::IsVhdlKeyword(std::string(name).c_str()) || words.Has(ToLower(name));
+}
+
+bool IsLibraryWord(std::string_view name) {
+    static const WordSet words(LibraryWordList);
+    return words.Has(ToLower(name));
 }
 
 /// A letter, then letters and digits with single "_" between them.
@@ -153,8 +177,7 @@ bool NameRules::IsLegal(std::string_view name) const {
 
 bool NameRules::IsReserved(std::string_view name) const {
     return name.size() <= LongestWord &&
-           (IsListed(LibraryWords, ToLower(name)) ||
-            (languages_ != NameLanguages::Vhdl && IsVerilogWord(name)) ||
+           (IsLibraryWord(name) || (languages_ != NameLanguages::Vhdl && IsVerilogWord(name)) ||
             (languages_ != NameLanguages::Verilog && IsVhdlWord(name)));
 }
 
@@ -178,8 +201,7 @@ bool NameRules::IsEscapable(std::string_view name) const {
     };
     // In a command, a period stands between an instance and its pin.
     return !name.empty() && std::all_of(name.begin(), name.end(), isAllowed) &&
-           !IsListed(VerilogClasses, name) &&
-           (!forCommands_ || name.find('.') == std::string_view::npos) &&
+           !IsVerilogClass(name) && (!forCommands_ || name.find('.') == std::string_view::npos) &&
            name.find("//") == std::string_view::npos && name.find("/*") == std::string_view::npos &&
            name.find("*/") == std::string_view::npos && !IsGenerated(name);
 }

@@ -5,11 +5,12 @@
 #include "import/ImportedDesign.h"
 #include "import/JsonWalker.h"
 
+#include "Port/TextSet.h"
+
 #include <cstddef>
 #include <cstdint>
-#include <memory_resource>
+#include <functional>
 #include <string_view>
-#include <unordered_set>
 
 namespace Tool::Import {
 
@@ -37,11 +38,11 @@ public:
     /// Calls `visit` with the name, kept in the design, and the value of each field. Fails if a
     /// name occurs twice.
     template <class Visit> void ForEachNamed(JsonValue& value, Visit visit) {
-        std::pmr::monotonic_buffer_resource memory;
-        std::pmr::unordered_set<std::string_view> names(&memory);
+        Port::TextSet<Hash, std::equal_to<>> names;
         walker_.ForEachField(value, [&](std::string_view name, JsonValue& member) {
-            const std::string_view kept = design_.Keep(name);
-            if (!names.insert(kept).second) {
+            std::string_view kept;
+            if (!names.Add(name,
+                           [&](std::string_view text) { return kept = design_.Keep(text); })) {
                 walker_.Fail("the name occurs twice");
             }
             visit(kept, member);
@@ -49,6 +50,14 @@ public:
     }
 
 private:
+    struct Hash {
+        std::uint64_t operator()(std::string_view text) const noexcept {
+            // The upper bits of the product depend on all bits, however wide the hash is.
+            const std::uint64_t hash = std::hash<std::string_view>()(text);
+            return (hash ^ (hash >> 32U)) * 0x9E3779B97F4A7C15U;
+        }
+    };
+
     Bit ReadBit(JsonValue& value);
 
     ImportedDesign& design_;

@@ -2,6 +2,7 @@
 // operations, so that replaying the command file gives the same netlist.
 #pragma once
 
+#include <cstdint>
 #include <string>
 
 namespace Tool::Import {
@@ -43,6 +44,7 @@ public:
     virtual void LeaveUnconfigured(const std::string& component) = 0;
     virtual void AddComponentGeneric(const std::string& component, const TypedValue& generic) = 0;
 
+    /// Ports and signals are numbered from 0 on, in the order of `AddPort` and `AddSignal`.
     virtual void AddPort(const std::string& name, const char* direction) = 0;
     virtual void AddSignal(const std::string& name) = 0;
     /// The source drives the target.
@@ -59,6 +61,10 @@ public:
     virtual void AddInstanceAttribute(const std::string& instance, const TypedValue& attribute) = 0;
     virtual void Connect(const std::string& signal, const std::string& instance,
                          const std::string& pin) = 0;
+    /// Connects a pin of the instance that was added last to a signal of one bit.
+    /// \param number that of the signal. \param signal its name.
+    virtual void ConnectScalar(std::uint32_t number, const std::string& signal,
+                               const std::string& instance, const std::string& pin) = 0;
     virtual void AssignPin(const std::string& instance, const std::string& pin,
                            const std::string& value) = 0;
 };
