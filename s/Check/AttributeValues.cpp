@@ -57,8 +57,6 @@ bool IsStringOf(string_view characters, string_view text) {
            text.substr(1, text.size() - 2).find_first_not_of(characters) == string_view::npos;
 }
 
-constexpr string_view StdLogic = "UX01ZWLH-";
-
 bool IsControl(char c) {
     const auto byte = static_cast<unsigned char>(c);
     return byte < 0x20 || (byte >= 0x7F && byte < 0xA0);
