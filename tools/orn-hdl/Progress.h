@@ -30,8 +30,11 @@ public:
     /// Shows the progress. Reads the clock, so call it once for some thousand lines.
     void Update(std::uint64_t lines, std::uint64_t bytes);
     /// Shows how much of the file was read. Reads the clock, so call it once for some thousand
-    /// bytes. \param isUnpacked whether the bytes are those of the contents of a compressed file,
-    /// whose size is not known.
+    /// bytes.
+    ///
+    /// \param isUnpacked whether the bytes are what was unpacked of a compressed file, so that
+    /// their
+    ///        number is not known before.
     void Reading(std::uint64_t bytes, bool isUnpacked);
     /// Shows that the design of a netlist is being made.
     void Making(std::string_view design);

@@ -4,13 +4,16 @@
 #include "import/JsonWalker.h"
 #include "import/PartReader.h"
 
-#include <cstddef>
+#include <cstdint>
 #include <string_view>
 #include <utility>
 
 namespace Tool::Import {
 
 namespace {
+
+/// The attribute of a net with the value that registers have before they are loaded.
+constexpr std::string_view FirstValue("init");
 
 class DesignReader {
 public:
@@ -29,6 +32,7 @@ private:
     void ReadMemories(Module& module);
     void ReadPort(Module& module, std::string_view name);
     void ReadNet(Module& module, std::string_view name);
+    void ReadNetAttributes(Module& module, Net& net);
 
     ImportedDesign& design_;
     const bool keepAttributes_;
@@ -136,13 +140,36 @@ void DesignReader::ReadNet(Module& module, std::string_view name) {
             net.hidden = walker_.ReadFlag();
         } else if (key == "bits") {
             net.bits = parts_.ReadBits(module);
-        } else if (key == "attributes" && keepAttributes_) {
-            net.attributes = parts_.ReadValues(module);
+        } else if (key == "attributes") {
+            ReadNetAttributes(module, net);
         } else if (!parts_.ReadRange(key, net.range)) {
             walker_.Skip();
         }
     });
     module.nets.push_back(net);
+}
+
+void DesignReader::ReadNetAttributes(Module& module, Net& net) {
+    const auto note = [&net](std::string_view name, const Value& value) {
+        net.hasFirstValue |=
+            name == FirstValue && (value.kind == Value::Integer ||
+                                   value.text.find_first_of("01") != std::string_view::npos);
+    };
+    if (keepAttributes_) {
+        net.attributes = parts_.ReadValues(module);
+        for (std::uint32_t i = 0; i < net.attributes.count; ++i) {
+            const NamedValue& attribute = module.values[net.attributes.start + i];
+            note(attribute.name, attribute.value);
+        }
+        return;
+    }
+    walker_.ForEachField([&](std::string_view name) {
+        if (name == FirstValue) {
+            note(name, parts_.ReadValue());
+        } else {
+            walker_.Skip();
+        }
+    });
 }
 
 } // namespace
