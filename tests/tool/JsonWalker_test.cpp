@@ -5,7 +5,7 @@
 
 #include <algorithm>
 #include <cstddef>
-#include <cstdint>
+#include <initializer_list>
 #include <string>
 #include <string_view>
 
@@ -92,7 +92,7 @@ std::string Walk(std::string_view text, std::size_t piece) {
 /// What a walk finds, which is the same for pieces of any size.
 std::string Walk(std::string_view text) {
     std::string whole = Walk(text, std::max<std::size_t>(text.size(), 1));
-    for (const std::size_t piece : {1, 2, 3, 7, 64}) {
+    for (const std::size_t piece : std::initializer_list<std::size_t>{1, 2, 3, 7, 64}) {
         EXPECT_EQ(Walk(text, piece), whole) << "in pieces of " << piece << " bytes: " << text;
     }
     return whole;

@@ -1,5 +1,6 @@
 #include "import/JsonScanner.h"
 
+#include "Port/Ascii.h"
 #include "diagnostics/Utf8.h"
 
 #include <algorithm>
@@ -26,14 +27,11 @@ constexpr const char* WrongNumber = "a malformed number";
 constexpr bool IsBlank(char c) noexcept {
     return c == ' ' || c == '\n' || c == '\r' || c == '\t';
 }
-constexpr bool IsDigit(char c) noexcept {
-    return c >= '0' && c <= '9';
-}
-constexpr bool IsLetter(char c) noexcept {
+constexpr bool IsWordPart(char c) noexcept {
     return c >= 'a' && c <= 'z';
 }
 constexpr bool IsNumberPart(char c) noexcept {
-    return IsDigit(c) || c == '-' || c == '+' || c == '.' || c == 'e' || c == 'E';
+    return Port::IsDigit(c) || c == '-' || c == '+' || c == '.' || c == 'e' || c == 'E';
 }
 
 /// What a character in a text is; `Stop` ends the search for the end of the text.
@@ -51,7 +49,7 @@ constexpr std::array<std::uint8_t, 256> MakeTextClasses() noexcept {
 constexpr std::array<std::uint8_t, 256> TextClasses = MakeTextClasses();
 
 std::size_t CountDigits(std::string_view text) noexcept {
-    return static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), IsDigit) -
+    return static_cast<std::size_t>(std::find_if_not(text.begin(), text.end(), Port::IsDigit) -
                                     text.begin());
 }
 
@@ -68,7 +66,7 @@ bool TakeOneOf(std::string_view& text, std::string_view marks) noexcept {
     return isThere;
 }
 
-bool IsNumber(std::string_view text) noexcept {
+bool IsJsonNumber(std::string_view text) noexcept {
     TakeOneOf(text, "-");
     const bool isWhole = TakeOneOf(text, "0") || TakeDigits(text);
     const bool hasFraction = !TakeOneOf(text, ".") || TakeDigits(text);
@@ -219,10 +217,10 @@ JsonScanner::Kind JsonScanner::GetKind() {
     case '"':
         return Kind::Text;
     default:
-        if (IsDigit(*at_) || *at_ == '-') {
+        if (Port::IsDigit(*at_) || *at_ == '-') {
             return Kind::Number;
         }
-        if (!IsLetter(*at_)) {
+        if (!IsWordPart(*at_)) {
             FailStructure();
         }
         return Kind::Word;
@@ -365,7 +363,7 @@ template <class Accept> std::size_t JsonScanner::Measure(const Accept& accept) {
 JsonScanner::Number JsonScanner::TakeNumber() {
     const std::size_t size = Measure(IsNumberPart);
     const std::string_view text(at_, size);
-    if (!IsNumber(text)) {
+    if (!IsJsonNumber(text)) {
         throw JsonSyntaxError{WrongNumber};
     }
     Number number;
@@ -376,7 +374,7 @@ JsonScanner::Number JsonScanner::TakeNumber() {
 }
 
 void JsonScanner::TakeWord() {
-    const std::size_t size = Measure(IsLetter);
+    const std::size_t size = Measure(IsWordPart);
     const std::string_view word(at_, size);
     if (word != "true" && word != "false" && word != "null") {
         throw JsonSyntaxError{"a word that is not true, false or null"};
