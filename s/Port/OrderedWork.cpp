@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <csignal>
-#include <system_error>
 #include <utility>
 
 namespace Port {
@@ -62,7 +61,7 @@ void OrderedWork::StartWorkers() {
         while (workers_.size() < settings_.workers) {
             workers_.emplace_back([this] { Work(); });
         }
-    } catch (const std::system_error&) {
+    } catch (const std::exception&) {
         // Those that were started do the work, or `Next` alone.
     }
 }

@@ -4,6 +4,7 @@
 #include "Support/EngineScript.h"
 #include "Support/Environment.h"
 #include "Support/TemporaryFolder.h"
+#include "Threads/SmallRanges.h"
 #include "Writers/ItemWriter.h"
 
 #include <gtest/gtest.h>
@@ -25,25 +26,10 @@ using Orn_Hdl::Language;
 using Orn_Hdl::OutStream;
 using Orn_Hdl::TextFileOutStream;
 using Orn_Hdl::TextMemOutStream;
-using Orn_Hdl::Writers::GetRangeSizes;
 using Orn_Hdl::Writers::ItemWriter;
-using Orn_Hdl::Writers::RangeSizes;
+using ThreadTests::SmallRanges;
 
 constexpr unsigned Threads[] = {2, 3, 8};
-
-/// Cuts lists into small ranges for a while.
-class SmallRanges {
-public:
-    SmallRanges(std::size_t items, std::size_t memory) : former_(GetRangeSizes()) {
-        GetRangeSizes() = {items, 1, memory};
-    }
-    SmallRanges(const SmallRanges&) = delete;
-    SmallRanges& operator=(const SmallRanges&) = delete;
-    ~SmallRanges() { GetRangeSizes() = former_; }
-
-private:
-    const RangeSizes former_;
-};
 
 /// Calls `check` with ranges of several sizes and little or much memory for their texts.
 template <class Check> void WithSmallRanges(const Check& check) {
