@@ -3,7 +3,7 @@
 # missing. Usage: setup.sh build | test
 set -euo pipefail
 
-build_packages=(g++ cmake make ninja-build libcli11-dev libsimdjson-dev nettle-dev zlib1g-dev
+build_packages=(g++ cmake make ninja-build libcli11-dev nettle-dev zlib1g-dev
     pkg-config)
 test_packages=(ccache clang clang-tidy clang-format cppcheck doxygen gcovr ghdl git graphviz iverilog
     libbenchmark-dev libclang-rt-14-dev libgtest-dev librapidcheck-dev llvm lintian locales man-db mypy

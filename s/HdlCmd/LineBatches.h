@@ -44,7 +44,7 @@ public:
         /// How many threads there are besides the owner's; they take turns.
         unsigned workers = 1;
         /// How many batches there are.
-        std::size_t batches = 4;
+        std::size_t batches = 8;
         /// The most lines of a batch.
         std::size_t lines = 256;
         /// A batch ends with the line that reaches this many bytes.

@@ -44,7 +44,7 @@ public:
     void Write();
 
 private:
-    class Instances;
+    class Part;
 
     void Prepare();
     void SetNameCase();
@@ -55,6 +55,7 @@ private:
     void WriteParameters();
     void WritePortDeclarations(const std::vector<Signal*>& ports);
     void WriteSignalDeclarations(const std::vector<Signal*>& signals);
+    void WriteSignalDeclaration(const Signal& signal);
     void WriteSignalAssignments(const Writers::SignalLists& signals);
     void WriteConstantAssignment(Signal& signal);
     void WriteAlias(Signal& signal, Signal& alias);
@@ -80,13 +81,15 @@ private:
     Writers::GenericAttrs genericAttrs_;
 };
 
-/// Writes instances to a stream of its own.
-class VerilogNetlister::Writer::Instances {
+/// Writes declarations of signals and instances to a stream of its own.
+class VerilogNetlister::Writer::Part {
 public:
-    Instances(OutStream& out, const Writer& whole)
+    Part(OutStream& out, const Writer& whole)
         : statements_(out), writer_(out, statements_, whole) {}
-    Instances(const Instances&) = delete;
-    Instances& operator=(const Instances&) = delete;
+    Part(const Part&) = delete;
+    Part& operator=(const Part&) = delete;
+
+    void operator()(const Signal& signal) { writer_.WriteSignalDeclaration(signal); }
 
     void operator()(const Instance& instance) { writer_.WriteInstance(instance); }
 
@@ -208,12 +211,14 @@ void VerilogNetlister::Writer::WritePortDeclarations(const std::vector<Signal*>&
 }
 
 void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*>& signals) {
-    for (const Signal* signal : signals) {
-        statements_.WriteComment(signal);
-        statements_.WriteSignalDeclaration(signal->GetNameView());
-        EndStatement(signal->GetAttrIterator(), Names::BaseName(signal->GetNameView()));
-    }
+    WriteEachSignal(signals, [this](OutStream& out) { return Part(out, *this); });
     out_.WriteEmptyLine();
+}
+
+void VerilogNetlister::Writer::WriteSignalDeclaration(const Signal& signal) {
+    statements_.WriteComment(&signal);
+    statements_.WriteSignalDeclaration(signal.GetNameView());
+    EndStatement(signal.GetAttrIterator(), Names::BaseName(signal.GetNameView()));
 }
 
 void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists& signals) {
@@ -253,7 +258,7 @@ void VerilogNetlister::Writer::WriteReference(Signal& signal) {
 }
 
 void VerilogNetlister::Writer::WriteInstances() {
-    WriteEachInstance([this](OutStream& out) { return Instances(out, *this); });
+    WriteEachInstance([this](OutStream& out) { return Part(out, *this); });
 }
 
 void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {

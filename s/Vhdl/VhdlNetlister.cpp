@@ -86,6 +86,7 @@ public:
     void Write();
 
 private:
+    class Declarations;
     class Instances;
 
     void Prepare();
@@ -129,6 +130,22 @@ private:
     int attrWidth_ = 0;
     PtrArray<Attribute*> effectiveAttrs_;
     Writers::GenericAttrs genericAttrs_;
+};
+
+/// Writes declarations of signals to a stream of its own.
+class VhdlNetlister::Writer::Declarations {
+public:
+    Declarations(OutStream& out, const Writer& whole, int width)
+        : statements_(out), writer_(out, statements_, whole), width_(width) {}
+    Declarations(const Declarations&) = delete;
+    Declarations& operator=(const Declarations&) = delete;
+
+    void operator()(const Signal& signal) { writer_.WriteSignalDeclaration(signal, width_); }
+
+private:
+    VhdlStatements statements_;
+    Writer writer_;
+    const int width_;
 };
 
 /// Writes instances to a stream of its own.
@@ -261,9 +278,8 @@ void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signal
     out_.Indent();
     WriteAttrDeclarations(signals.internals, instances);
     const int width = Netlist::GetLongestSignalName(netlist_.GetSignalIterator());
-    for (const Signal* signal : signals.internals) {
-        WriteSignalDeclaration(*signal, width);
-    }
+    WriteEachSignal(signals.internals,
+                    [this, width](OutStream& out) { return Declarations(out, *this, width); });
     if (!options_.vhdl.suppressComponent) {
         WriteComponents(instances.GetComponents());
     }

@@ -61,6 +61,21 @@ private:
     std::optional<SignalsAhead> ahead_;
 };
 
+/// Writes signals by a writer that `MakeWriter` makes for a stream.
+template <class MakeWriter> class SignalWriter final : public ItemWriter {
+public:
+    SignalWriter(const std::vector<Signal*>& signals, const MakeWriter& makeWriter, OutStream& out)
+        : signals_(signals), write_(makeWriter(out)) {}
+
+    void GoTo(std::size_t item) override { present_ = item; }
+    void WriteNext() override { write_(*signals_[present_++]); }
+
+private:
+    const std::vector<Signal*>& signals_;
+    std::invoke_result_t<const MakeWriter&, OutStream&> write_;
+    std::size_t present_ = 0;
+};
+
 /// One write of one netlist: first the netlist is prepared, then it is only read. The writer of
 /// each language derives from it.
 class NetlistPass {
@@ -92,6 +107,10 @@ protected:
     /// Writes the instances. `makeWriter(out)` makes what writes an instance to a stream by the
     /// call `(instance)`. Several of them may be in use at once.
     template <class MakeWriter> void WriteEachInstance(const MakeWriter& makeWriter);
+    /// Writes signals, each by the call `(signal)` of what `makeWriter(out)` makes, in the way in
+    /// which instances are written.
+    template <class MakeWriter>
+    void WriteEachSignal(const std::vector<Signal*>& signals, const MakeWriter& makeWriter);
     /// The attribute INIT of an instance whose value is the module's own INIT; null if there is
     /// none, or if this netlist does not pass it on.
     Attribute* FindPassedInit(const GenericAttrs& attributes) const;
@@ -128,6 +147,14 @@ template <class MakeWriter> void NetlistPass::WriteEachInstance(const MakeWriter
     const InstanceStarts starts(netlist_);
     WriteItems(out_, starts.GetCount(), options_.threads, [&](OutStream& out) {
         return std::make_unique<InstanceWriter<MakeWriter>>(starts, makeWriter, out);
+    });
+}
+
+template <class MakeWriter>
+void NetlistPass::WriteEachSignal(const std::vector<Signal*>& signals,
+                                  const MakeWriter& makeWriter) {
+    WriteItems(out_, signals.size(), options_.threads, [&](OutStream& out) {
+        return std::make_unique<SignalWriter<MakeWriter>>(signals, makeWriter, out);
     });
 }
 

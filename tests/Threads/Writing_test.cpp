@@ -47,8 +47,8 @@ private:
 
 /// Calls `check` with ranges of several sizes and little or much memory for their texts.
 template <class Check> void WithSmallRanges(const Check& check) {
-    for (const std::size_t items : {1, 2, 7}) {
-        for (const std::size_t memory : {0, 1 << 11, 1 << 20}) {
+    for (const std::size_t items : {1U, 2U, 7U}) {
+        for (const std::size_t memory : {0U, 1U << 11U, 1U << 20U}) {
             SCOPED_TRACE(std::to_string(items) + " items, " + std::to_string(memory) + " bytes");
             const SmallRanges ranges(items, memory);
             check();

@@ -7,7 +7,6 @@
 #include "diagnostics/Utf8.h"
 #include "diagnostics/WordPlaces.h"
 #include "explain/Additions.h"
-#include "import/JsonErrors.h"
 
 #include "Support/TemporaryFolder.h"
 
@@ -274,21 +273,6 @@ TEST(NearestWord, KnowsEveryDistanceWithinItsLimit) {
             }
         });
     }
-}
-
-TEST(JsonPlaces, LineAndColumn) {
-    const auto text = [](std::string_view json, std::size_t byte) {
-        const Tool::Import::TextPlace place = Tool::Import::FindPlace(json, byte);
-        return std::to_string(place.line) + ":" + std::to_string(place.column) + ":" + place.source;
-    };
-    EXPECT_EQ(text("ab\ncd\r\nef", 0), "1:0:ab");
-    EXPECT_EQ(text("ab\ncd\r\nef", 2), "1:2:ab");
-    EXPECT_EQ(text("ab\ncd\r\nef", 4), "2:1:cd");
-    EXPECT_EQ(text("ab\ncd\r\nef", 9), "3:2:ef");
-    EXPECT_EQ(text("", 0), "1:0:");
-    EXPECT_EQ(Tool::Import::FindBadUtf8("a\xc3\xa4\xff"), 3U);
-    EXPECT_EQ(Tool::Import::FindBadUtf8("a\xc3\xa4"), 3U);
-    EXPECT_EQ(Tool::Import::FindBadUtf8("\xed\xa0\x80"), 0U);
 }
 
 } // namespace

@@ -55,6 +55,25 @@ TEST_F(ProgressLine, ShowsLinesAndPercentAndIsErased) {
     EXPECT_EQ(GetShown(), "orn-hdl: 12 lines, 34 %\r\033[K");
 }
 
+TEST_F(ProgressLine, ShowsWhatWasReadOfANetlist) {
+    Progress progress = Make(file_);
+    now_ += 1s;
+    progress.Reading(345, false);
+    now_ += 1s;
+    progress.Reading(7654321, true);
+    now_ += 1s;
+    progress.Making("top");
+    EXPECT_EQ(GetShown(), "orn-hdl: reading, 34 %\r\033[Korn-hdl: reading, 7 MB\r\033[K"
+                          "orn-hdl: making the design top");
+}
+
+TEST_F(ProgressLine, ShowsMegabytesOfAPipe) {
+    Progress progress = Make("-");
+    now_ += 1s;
+    progress.Reading(12345678, false);
+    EXPECT_EQ(GetShown(), "orn-hdl: reading, 12 MB");
+}
+
 TEST_F(ProgressLine, IsRenewedTenTimesASecond) {
     Progress progress = Make(file_);
     now_ += 1s;

@@ -418,6 +418,16 @@ class Cells(ImportTest):
         self.assertEqual(done.warnings, ["d.json: warning: modules.top.memories: memories are not "
                                          "imported; map them to cells first"])
 
+    def test_first_values_of_registers_give_a_warning(self) -> None:
+        nets = {"q": net(2, 3, attributes={"init": "x1"}), "r": net(4, attributes={"init": 0}),
+                "s": net(5, attributes={"init": "x"}), "t": net(6, attributes={"src": "01"})}
+        contents = design({"a": port("input", 2)}, {}, nets)
+        warning = ("d.json: warning: modules.top.netnames.q.attributes.init: the first values of "
+                   "registers are not imported: a register is unknown until it is reset or loaded "
+                   "(and 1 more place)")
+        self.assertEqual(self.import_design(contents).warnings, [warning])
+        self.assertIn(warning, self.import_design(contents, "--attributes").warnings)
+
 
 class Parameters(ImportTest):
     def one(self, value: str | int, *options: str) -> str:

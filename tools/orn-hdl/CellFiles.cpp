@@ -14,18 +14,11 @@
 
 namespace Tool {
 
-namespace {
-
-/// Room for the padding that the JSON parser needs behind the text; without it the parser would
-/// copy the text.
-constexpr std::size_t Margin = 4096;
-
-} // namespace
+namespace {} // namespace
 
 Status ReadWholeFile(const std::string& name, std::string& text) {
     if (IsGzip(name)) {
         ReadGzip(name, text);
-        text.reserve(text.size() + Margin);
         return Status::Success;
     }
     Port::File file;
@@ -35,7 +28,7 @@ Status ReadWholeFile(const std::string& name, std::string& text) {
     constexpr std::size_t Piece = std::size_t(1) << 20;
     std::error_code unknown;
     const std::uintmax_t expected = std::filesystem::file_size(name, unknown);
-    text.reserve((unknown ? 0 : expected) + Piece + Margin);
+    text.reserve((unknown ? 0 : expected) + Piece);
     std::size_t size = 0;
     std::size_t count = 0;
     do {

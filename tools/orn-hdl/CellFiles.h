@@ -4,15 +4,14 @@
 #include "Tool.h"
 #include "diagnostics/Reporter.h"
 #include "import/CellLibrary.h"
-#include "import/JsonErrors.h"
+#include "import/JsonPath.h"
 
 #include <string>
 #include <vector>
 
 namespace Tool {
 
-/// Reads a file, and prints a message if that fails. Behind the text is room for what a JSON parser
-/// needs there.
+/// Reads a file, and prints a message if that fails.
 Status ReadWholeFile(const std::string& name, std::string& text);
 
 /// A place in a JSON file.

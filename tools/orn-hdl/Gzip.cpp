@@ -4,13 +4,12 @@
 #include "Port/Ascii.h"
 #include "Port/File.h"
 
+#include <algorithm>
 #include <array>
 #include <cerrno>
 #include <cstddef>
 #include <cstdio>
 #include <map>
-#include <memory>
-#include <type_traits>
 
 #include <zlib.h>
 
@@ -27,25 +26,10 @@ constexpr std::size_t PieceSize = 65536;
 
 /// Hands the contents of a compressed file over, piece by piece.
 template <class Take> void Read(const std::string& file, const Take& take) {
-    errno = 0;
-    const std::unique_ptr<std::remove_pointer_t<gzFile>, int (*)(gzFile)> input(
-        gzopen(file.c_str(), "rb"), &gzclose);
-    if (input == nullptr) {
-        Fail(file, std::string(Port::ErrorText(errno).GetView()));
-    }
+    GzipReader reader(file);
     std::array<char, PieceSize> piece;
-    int count = 0;
-    while ((count = gzread(input.get(), piece.data(), PieceSize)) > 0) {
-        take(std::string_view(piece.data(), static_cast<std::size_t>(count)));
-    }
-    int error = Z_OK;
-    gzerror(input.get(), &error);
-    if (error == Z_ERRNO) {
-        Fail(file, std::string(Port::ErrorText(errno).GetView()));
-    }
-    if (count < 0 || error != Z_OK) {
-        Fail(file, error == Z_BUF_ERROR ? "the compressed file ends too early"
-                                        : "the compressed file is damaged");
+    while (const std::size_t count = reader.Read(piece.data(), piece.size())) {
+        take(std::string_view(piece.data(), count));
     }
 }
 
@@ -85,6 +69,37 @@ private:
 };
 
 } // namespace
+
+GzipReader::GzipReader(const std::string& file) : file_(file) {
+    errno = 0;
+    input_ = gzopen(file.c_str(), "rb");
+    if (input_ == nullptr) {
+        Fail(file_, std::string(Port::ErrorText(errno).GetView()));
+    }
+}
+
+GzipReader::~GzipReader() {
+    gzclose(input_);
+}
+
+std::size_t GzipReader::Read(char* to, std::size_t count) {
+    constexpr std::size_t Most = std::size_t(1) << 30;
+    errno = 0;
+    const int read = gzread(input_, to, static_cast<unsigned>(std::min(count, Most)));
+    if (read > 0) {
+        return static_cast<std::size_t>(read);
+    }
+    int error = Z_OK;
+    gzerror(input_, &error);
+    if (error == Z_ERRNO) {
+        Fail(file_, std::string(Port::ErrorText(errno).GetView()));
+    }
+    if (read < 0 || error != Z_OK) {
+        Fail(file_, error == Z_BUF_ERROR ? "the compressed file ends too early"
+                                         : "the compressed file is damaged");
+    }
+    return 0;
+}
 
 bool IsGzip(std::string_view file) noexcept {
     return file.size() > Suffix.size() &&

@@ -3,9 +3,13 @@
 
 #include "Tool.h"
 
+#include <cstddef>
 #include <stdexcept>
 #include <string>
 #include <string_view>
+
+/// An open file of zlib.
+struct gzFile_s; // NOLINT(readability-identifier-naming)
 
 namespace Tool {
 
@@ -20,6 +24,24 @@ std::string_view WithoutGzip(std::string_view file) noexcept;
 class GzipError : public std::runtime_error {
 public:
     using std::runtime_error::runtime_error;
+};
+
+/// Reads the contents of a compressed file piece by piece.
+class GzipReader {
+public:
+    /// \throws GzipError if the file cannot be opened.
+    explicit GzipReader(const std::string& file);
+    GzipReader(const GzipReader&) = delete;
+    GzipReader& operator=(const GzipReader&) = delete;
+    ~GzipReader();
+
+    /// Reads the next bytes, at most `count`. \return how many were read; 0 at the end.
+    /// \throws GzipError if the file cannot be read, or is damaged.
+    std::size_t Read(char* to, std::size_t count);
+
+private:
+    std::string file_;
+    gzFile_s* input_ = nullptr;
 };
 
 /// Appends the contents of a compressed file to a text.

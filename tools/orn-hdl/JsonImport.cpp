@@ -1,6 +1,7 @@
 #include "JsonImport.h"
 
 #include "CellFiles.h"
+#include "JsonFile.h"
 #include "design/DesignOutput.h"
 #include "explain/FileKind.h"
 #include "import/CellLibrary.h"
@@ -88,7 +89,8 @@ Status CommandFiles::Commit() {
     return status == Status::Success ? WriteCommandList(options_, names_) : status;
 }
 
-Status WriteImported(const Netlists& netlists, const ImportOptions& options, Reporter& reporter) {
+Status WriteImported(const Netlists& netlists, const ImportOptions& options, Progress& progress,
+                     Reporter& reporter) {
     if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
@@ -103,14 +105,17 @@ Status WriteImported(const Netlists& netlists, const ImportOptions& options, Rep
         engine->CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
         models.push_back(engine->GetModel(netlist.name.c_str()));
         ModelSink sink(*models.back());
+        progress.Making(netlist.name);
         EmitNetlist(netlist, sink);
     }
+    progress.Erase();
     return WriteNetlists(models, options, reporter);
 }
 
 /// Writes all files. The command files and the name map are replaced last, and only if every file
 /// was written.
-Status WriteAll(const Netlists& netlists, const ImportOptions& options, Reporter& reporter) {
+Status WriteAll(const Netlists& netlists, const ImportOptions& options, Progress& progress,
+                Reporter& reporter) {
     CommandFiles commands(netlists, options);
     OutputFile nameMap(options.nameMap);
     if (Port::Stream* out = nameMap.GetStream()) {
@@ -120,7 +125,7 @@ Status WriteAll(const Netlists& netlists, const ImportOptions& options, Reporter
     }
     Status status = Worse(commands.Write(), nameMap.Flush());
     if (status == Status::Success) {
-        status = WriteImported(netlists, options, reporter);
+        status = WriteImported(netlists, options, progress, reporter);
     }
     return status == Status::Success ? Worse(commands.Commit(), nameMap.Commit()) : status;
 }
@@ -199,13 +204,31 @@ Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
     return diagnostic;
 }
 
-/// Imports the text of a file.
-Status ImportText(std::string text, const ImportOptions& options, const CellLibrary& library,
-                  Reporter& reporter) {
-    const std::string beginning = text.substr(0, BeginningSize);
+/// Reads a file.
+/// \return the design; null if the file cannot be read, of which a message was printed.
+std::unique_ptr<ImportedDesign> ReadFile(JsonFile& file, const ImportOptions& options) {
+    std::unique_ptr<ImportedDesign> design;
     try {
-        const std::unique_ptr<ImportedDesign> design =
-            ReadDesign(std::move(text), options.attributes);
+        design = ReadDesign(file, options.attributes);
+    } catch (const Import::Error&) {
+        // A file that cannot be read to its end seems to end too early, and a damaged one is no
+        // JSON.
+        file.CheckRest();
+        if (file.GetStatus() == Status::Success) {
+            throw;
+        }
+        return nullptr;
+    }
+    return file.GetStatus() == Status::Success ? std::move(design) : nullptr;
+}
+
+Status ImportFile(JsonFile& file, const ImportOptions& options, const CellLibrary& library,
+                  Progress& progress, Reporter& reporter) {
+    try {
+        const std::unique_ptr<ImportedDesign> design = ReadFile(file, options);
+        if (design == nullptr) {
+            return Status::File;
+        }
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());
         const ImportRules rules{
@@ -217,8 +240,9 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
         }
         Status written = models.Flush();
         if (written == Status::Success) {
-            written = WriteAll(netlists, options, reporter);
+            written = WriteAll(netlists, options, progress, reporter);
         }
+        progress.Erase();
         written = written == Status::Success ? models.Commit() : written;
         for (std::string& warning : warnings.GetLines()) {
             reporter.Report(
@@ -226,7 +250,8 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
         }
         return written;
     } catch (const Import::Error& error) {
-        reporter.Report(MakeError(options, error, beginning));
+        progress.Erase();
+        reporter.Report(MakeError(options, error, file.GetBeginning()));
         return Status::Failed;
     }
 }
@@ -235,14 +260,13 @@ Status ImportText(std::string text, const ImportOptions& options, const CellLibr
 
 Status ImportJson(const ImportOptions& options, Reporter& reporter) {
     CellLibrary library;
-    Status status = ReadCellFiles(options.libraries, library, reporter);
+    const Status status = ReadCellFiles(options.libraries, library, reporter);
     if (status != Status::Success) {
         return status;
     }
-    std::string text;
-    status = ReadWholeFile(options.file, text);
-    return status == Status::Success ? ImportText(std::move(text), options, library, reporter)
-                                     : status;
+    Progress progress(false, options.file);
+    JsonFile file(options.file, progress);
+    return ImportFile(file, options, library, progress, reporter);
 }
 
 } // namespace Tool

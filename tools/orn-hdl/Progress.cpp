@@ -37,16 +37,34 @@ void Progress::Update(std::uint64_t lines, std::uint64_t bytes) {
     }
     std::string text = std::to_string(lines) + " lines";
     if (totalBytes_ > 0) {
-        text +=
-            ", " + std::to_string(std::min<std::uint64_t>(bytes * 100 / totalBytes_, 100)) + " %";
+        text += ", " + GetPercentage(bytes);
     }
     Show(text);
+}
+
+void Progress::Reading(std::uint64_t bytes, bool isUnpacked) {
+    constexpr std::uint64_t Megabyte = 1000000;
+    if (IsDue()) {
+        Show("reading, " + (totalBytes_ > 0 && !isUnpacked
+                                ? GetPercentage(bytes)
+                                : std::to_string(bytes / Megabyte) + " MB"));
+    }
+}
+
+void Progress::Making(std::string_view design) {
+    if (IsDue()) {
+        Show(std::string("making the design ").append(design));
+    }
 }
 
 void Progress::Writing(std::string_view file) {
     if (IsDue()) {
         Show(std::string("writing ").append(file));
     }
+}
+
+std::string Progress::GetPercentage(std::uint64_t bytes) const {
+    return std::to_string(std::min<std::uint64_t>(bytes * 100 / totalBytes_, 100)) + " %";
 }
 
 bool Progress::IsDue() {

@@ -1,4 +1,4 @@
-// The progress line of a long replay.
+// The progress line of a long replay or import.
 #pragma once
 
 #include <chrono>
@@ -29,12 +29,23 @@ public:
 
     /// Shows the progress. Reads the clock, so call it once for some thousand lines.
     void Update(std::uint64_t lines, std::uint64_t bytes);
+    /// Shows how much of the file was read. Reads the clock, so call it once for some thousand
+    /// bytes.
+    ///
+    /// \param isUnpacked whether the bytes are what was unpacked of a compressed file, so that
+    /// their
+    ///        number is not known before.
+    void Reading(std::uint64_t bytes, bool isUnpacked);
+    /// Shows that the design of a netlist is being made.
+    void Making(std::string_view design);
     /// Shows that a file is being written.
     void Writing(std::string_view file);
     /// Erases the line on the terminal, so that a message can be printed.
     void Erase();
 
 private:
+    /// How much of the file's bytes these are; there are some.
+    std::string GetPercentage(std::uint64_t bytes) const;
     bool IsDue();
     void Show(const std::string& text);
 

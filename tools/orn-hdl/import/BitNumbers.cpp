@@ -15,15 +15,23 @@ void BitNumbers::StartModule() {
     first_ = next_;
 }
 
-Bit BitNumbers::GetIndex(std::int64_t number) {
+Bit BitNumbers::GetIndex(std::int64_t number, std::size_t limit) {
     const auto place = static_cast<std::uint64_t>(number);
-    if (place > limit_) {
-        return Claim(others_[number]);
-    }
     if (place >= table_.size()) {
-        table_.resize(std::max<std::size_t>(place + 1, table_.size() * 2));
+        if (place > limit) {
+            return Claim(others_[number]);
+        }
+        Grow(std::max<std::size_t>(place + 1, table_.size() * 2));
     }
     return Claim(table_[place]);
+}
+
+void BitNumbers::Grow(std::size_t size) {
+    table_.resize(size);
+    while (!others_.empty() && static_cast<std::uint64_t>(others_.begin()->first) < size) {
+        table_[static_cast<std::size_t>(others_.begin()->first)] = others_.begin()->second;
+        others_.erase(others_.begin());
+    }
 }
 
 Bit BitNumbers::Claim(Entry& entry) {

@@ -16,12 +16,10 @@ namespace Tool::Import {
 /// modules, each with a few bits of large numbers.
 class BitNumbers {
 public:
-    /// \param limit the greatest number in the table.
-    explicit BitNumbers(std::size_t limit) : limit_(limit) {}
-
     /// Begins a module, whose first index is 0.
     void StartModule();
-    Bit GetIndex(std::int64_t number);
+    /// \param limit the greatest number for which the table may grow.
+    Bit GetIndex(std::int64_t number, std::size_t limit);
     /// The number of indices that the present module has.
     std::uint32_t GetCount() const noexcept { return next_ - first_; }
 
@@ -31,8 +29,8 @@ private:
     using Entry = std::uint32_t;
 
     Bit Claim(Entry& entry);
+    void Grow(std::size_t size);
 
-    std::size_t limit_;
     Entry first_ = 1;
     Entry next_ = 1;
     std::vector<Entry> table_;

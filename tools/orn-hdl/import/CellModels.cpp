@@ -1,8 +1,6 @@
 #include "import/CellModels.h"
 
 #include "import/CellModelTexts.h"
-#include "import/JsonErrors.h"
-#include "import/JsonPath.h"
 #include "import/Spelling.h"
 
 #include "Port/Ascii.h"

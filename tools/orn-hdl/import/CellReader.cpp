@@ -9,14 +9,13 @@ constexpr std::string_view ScopeInfo("$scopeinfo");
 
 } // namespace
 
-void CellReader::Read(Module& module, std::string_view name, JsonValue& value) {
+void CellReader::Read(Module& module, std::string_view name) {
     Cell cell;
     cell.name = name;
-    type_ = std::string_view();
+    type_.clear();
     connections_.clear();
     directions_.clear();
-    walker_.ForEachField(
-        value, [&](std::string_view key, JsonValue& part) { ReadPart(module, cell, key, part); });
+    walker_.ForEachField([&](std::string_view key) { ReadPart(module, cell, key); });
     if (type_.empty()) {
         walker_.Fail("a cell needs a type");
     }
@@ -28,25 +27,27 @@ void CellReader::Read(Module& module, std::string_view name, JsonValue& value) {
     module.cells.push_back(cell);
 }
 
-void CellReader::ReadPart(Module& module, Cell& cell, std::string_view key, JsonValue& part) {
+void CellReader::ReadPart(Module& module, Cell& cell, std::string_view key) {
     if (key == "hide_name") {
-        cell.hidden = walker_.ReadFlag(part);
+        cell.hidden = walker_.ReadFlag();
     } else if (key == "type") {
-        type_ = walker_.ReadText(part);
+        type_ = walker_.ReadText();
     } else if (key == "parameters") {
-        cell.parameters = parts_.ReadValues(module, part);
+        cell.parameters = parts_.ReadValues(module);
     } else if (key == "attributes" && keepAttributes_) {
-        cell.attributes = parts_.ReadValues(module, part);
+        cell.attributes = parts_.ReadValues(module);
     } else if (key == "port_directions") {
-        walker_.ForEachField(part, [&](std::string_view pin, JsonValue& direction) {
-            directions_.emplace_back(pin, parts_.ReadDirection(direction));
+        walker_.ForEachField([&](std::string_view pin) {
+            const std::string_view name = parts_.KeepOnce(pin);
+            directions_.emplace_back(name, parts_.ReadDirection());
         });
     } else if (key == "connections") {
-        walker_.ForEachField(part, [&](std::string_view pin, JsonValue& bits) {
-            connections_.emplace_back(pin, parts_.ReadBits(module, bits));
+        walker_.ForEachField([&](std::string_view pin) {
+            const std::string_view name = parts_.KeepOnce(pin);
+            connections_.emplace_back(name, parts_.ReadBits(module));
         });
     } else {
-        walker_.Skip(part);
+        walker_.Skip();
     }
 }
 
@@ -62,15 +63,18 @@ std::uint32_t CellReader::GetOrAddType(std::string_view name) {
     return index;
 }
 
-std::uint32_t CellReader::GetOrAddPin(CellType& type, std::string_view name) {
-    const auto known = type.pinIndex.find(name);
-    return known != type.pinIndex.end() ? known->second : type.GetOrAddPin(design_.Keep(name));
+std::uint32_t CellReader::GetOrAddPin(CellType& type, std::string_view name, std::size_t guess) {
+    // Cells of one type mostly have their pins in one order. Of equal names there is one copy.
+    return guess < type.pins.size() && type.pins[guess].name.data() == name.data()
+               ? static_cast<std::uint32_t>(guess)
+               : type.GetOrAddPin(name);
 }
 
 void CellReader::AddPins(Module& module, Cell& cell) {
     CellType& type = design_.types[cell.type];
-    for (const auto& [name, direction] : directions_) {
-        TypePin& pin = type.pins[GetOrAddPin(type, name)];
+    for (std::size_t i = 0; i < directions_.size(); ++i) {
+        const auto& [name, direction] = directions_[i];
+        TypePin& pin = type.pins[GetOrAddPin(type, name, i)];
         if (pin.direction == Direction::Unspecified) {
             pin.direction = direction;
         }
@@ -78,8 +82,9 @@ void CellReader::AddPins(Module& module, Cell& cell) {
     cell.connections.start = static_cast<std::uint32_t>(module.connections.size());
     cell.connections.count = static_cast<std::uint32_t>(connections_.size());
     ++cellNumber_;
-    for (const auto& [name, bits] : connections_) {
-        const std::uint32_t pin = GetOrAddPin(type, name);
+    for (std::size_t i = 0; i < connections_.size(); ++i) {
+        const auto& [name, bits] = connections_[i];
+        const std::uint32_t pin = GetOrAddPin(type, name, i);
         if (lastCells_.size() <= pin) {
             lastCells_.resize(pin + 1);
         }

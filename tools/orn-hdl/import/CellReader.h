@@ -5,7 +5,9 @@
 #include "import/JsonWalker.h"
 #include "import/PartReader.h"
 
+#include <cstddef>
 #include <cstdint>
+#include <string>
 #include <string_view>
 #include <unordered_map>
 #include <utility>
@@ -20,12 +22,14 @@ public:
 
     /// Reads a cell into a module. Cells that only record the origin of flattened cells are
     /// omitted.
-    void Read(Module& module, std::string_view name, JsonValue& value);
+    void Read(Module& module, std::string_view name);
 
 private:
-    void ReadPart(Module& module, Cell& cell, std::string_view key, JsonValue& part);
+    void ReadPart(Module& module, Cell& cell, std::string_view key);
     std::uint32_t GetOrAddType(std::string_view name);
-    std::uint32_t GetOrAddPin(CellType& type, std::string_view name);
+    /// The index of a pin.
+    /// \param name as `PartReader::KeepOnce` returns it. \param guess the index that it may have.
+    std::uint32_t GetOrAddPin(CellType& type, std::string_view name, std::size_t guess);
     /// Adds the pins of the cell that was just read to its type.
     void AddPins(Module& module, Cell& cell);
 
@@ -36,7 +40,7 @@ private:
     std::unordered_map<std::string_view, std::uint32_t> typeIndex_;
 
     // Parts of the present cell; members, so that a cell needs no allocation.
-    std::string_view type_;
+    std::string type_;
     std::vector<std::pair<std::string_view, Span>> connections_;
     std::vector<std::pair<std::string_view, Direction>> directions_;
     /// For each pin, the number of the last cell that connects it.

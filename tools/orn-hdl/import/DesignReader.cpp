@@ -4,7 +4,7 @@
 #include "import/JsonWalker.h"
 #include "import/PartReader.h"
 
-#include <cstddef>
+#include <cstdint>
 #include <string_view>
 #include <utility>
 
@@ -12,23 +12,27 @@ namespace Tool::Import {
 
 namespace {
 
+/// The attribute of a net with the value that registers have before they are loaded.
+constexpr std::string_view FirstValue("init");
+
 class DesignReader {
 public:
-    DesignReader(ImportedDesign& design, bool keepAttributes, std::size_t fileSize)
-        : design_(design), keepAttributes_(keepAttributes), parts_(design, walker_, fileSize),
-          cells_(design, walker_, parts_, keepAttributes) {}
+    DesignReader(TextSource& source, ImportedDesign& design, bool keepAttributes)
+        : design_(design), keepAttributes_(keepAttributes), walker_(source),
+          parts_(design, walker_), cells_(design, walker_, parts_, keepAttributes) {}
 
-    void Read(std::string text);
+    void Read();
 
 private:
-    void ReadFile(JsonValue& root);
-    void ReadModule(std::string_view name, JsonValue& value);
-    void ReadModulePart(Module& module, std::string_view key, JsonValue& part);
-    void ReadModuleAttributes(Module& module, JsonValue& value);
-    void ReadDefaults(Module& module, JsonValue& value);
-    void ReadMemories(Module& module, JsonValue& value);
-    void ReadPort(Module& module, std::string_view name, JsonValue& value);
-    void ReadNet(Module& module, std::string_view name, JsonValue& value);
+    void ReadFile();
+    void ReadModule(std::string_view name);
+    void ReadModulePart(Module& module, std::string_view key);
+    void ReadModuleAttributes(Module& module);
+    void ReadDefaults(Module& module);
+    void ReadMemories(Module& module);
+    void ReadPort(Module& module, std::string_view name);
+    void ReadNet(Module& module, std::string_view name);
+    void ReadNetAttributes(Module& module, Net& net);
 
     ImportedDesign& design_;
     const bool keepAttributes_;
@@ -37,20 +41,18 @@ private:
     CellReader cells_;
 };
 
-void DesignReader::Read(std::string text) {
-    walker_.Walk(std::move(text), [this](JsonValue& root) { ReadFile(root); });
+void DesignReader::Read() {
+    walker_.Walk([this] { ReadFile(); });
 }
 
-void DesignReader::ReadFile(JsonValue& root) {
+void DesignReader::ReadFile() {
     bool hasModules = false;
-    walker_.ForEachField(root, [&](std::string_view key, JsonValue& value) {
+    walker_.ForEachField([&](std::string_view key) {
         if (key == "modules") {
             hasModules = true;
-            parts_.ForEachNamed(value, [this](std::string_view name, JsonValue& module) {
-                ReadModule(name, module);
-            });
+            parts_.ForEachNamed([this](std::string_view name) { ReadModule(name); });
         } else {
-            walker_.Skip(value);
+            walker_.Skip();
         }
     });
     if (!hasModules) {
@@ -58,39 +60,35 @@ void DesignReader::ReadFile(JsonValue& root) {
     }
 }
 
-void DesignReader::ReadModule(std::string_view name, JsonValue& value) {
+void DesignReader::ReadModule(std::string_view name) {
     Module& module = design_.modules.emplace_back();
     module.name = name;
     parts_.StartModule();
-    walker_.ForEachField(
-        value, [&](std::string_view key, JsonValue& part) { ReadModulePart(module, key, part); });
+    walker_.ForEachField([&](std::string_view key) { ReadModulePart(module, key); });
     module.netBits = parts_.CountNetBits();
 }
 
-void DesignReader::ReadModulePart(Module& module, std::string_view key, JsonValue& part) {
+void DesignReader::ReadModulePart(Module& module, std::string_view key) {
     if (key == "attributes") {
-        ReadModuleAttributes(module, part);
+        ReadModuleAttributes(module);
     } else if (key == "parameter_default_values") {
-        ReadDefaults(module, part);
+        ReadDefaults(module);
     } else if (key == "ports") {
-        parts_.ForEachNamed(
-            part, [&](std::string_view name, JsonValue& port) { ReadPort(module, name, port); });
+        parts_.ForEachNamed([&](std::string_view name) { ReadPort(module, name); });
     } else if (key == "cells") {
-        parts_.ForEachNamed(
-            part, [&](std::string_view name, JsonValue& cell) { cells_.Read(module, name, cell); });
+        parts_.ForEachNamed([&](std::string_view name) { cells_.Read(module, name); });
     } else if (key == "netnames") {
-        parts_.ForEachNamed(
-            part, [&](std::string_view name, JsonValue& net) { ReadNet(module, name, net); });
+        parts_.ForEachNamed([&](std::string_view name) { ReadNet(module, name); });
     } else if (key == "memories") {
-        ReadMemories(module, part);
+        ReadMemories(module);
     } else {
-        walker_.Skip(part);
+        walker_.Skip();
     }
 }
 
-void DesignReader::ReadModuleAttributes(Module& module, JsonValue& value) {
-    walker_.ForEachField(value, [&](std::string_view key, JsonValue& attribute) {
-        const Value read = parts_.ReadValue(attribute);
+void DesignReader::ReadModuleAttributes(Module& module) {
+    walker_.ForEachField([&](std::string_view key) {
+        const Value read = parts_.ReadValue();
         const bool isSet = read.kind == Value::Integer
                                ? read.integer != 0
                                : read.text.find_first_not_of("0xz") != std::string_view::npos;
@@ -99,30 +97,30 @@ void DesignReader::ReadModuleAttributes(Module& module, JsonValue& value) {
     });
 }
 
-void DesignReader::ReadDefaults(Module& module, JsonValue& value) {
-    walker_.ForEachField(value, [&](std::string_view parameter, JsonValue& defaultValue) {
-        module.defaults.push_back(
-            NamedValue{design_.Keep(parameter), parts_.ReadValue(defaultValue)});
+void DesignReader::ReadDefaults(Module& module) {
+    walker_.ForEachField([&](std::string_view parameter) {
+        const std::string_view kept = parts_.KeepOnce(parameter);
+        module.defaults.push_back(NamedValue{kept, parts_.ReadValue()});
     });
 }
 
-void DesignReader::ReadMemories(Module& module, JsonValue& value) {
-    walker_.ForEachField(value, [&](std::string_view, JsonValue& memory) {
+void DesignReader::ReadMemories(Module& module) {
+    walker_.ForEachField([&](std::string_view) {
         module.hasMemories = true;
-        walker_.Skip(memory);
+        walker_.Skip();
     });
 }
 
-void DesignReader::ReadPort(Module& module, std::string_view name, JsonValue& value) {
+void DesignReader::ReadPort(Module& module, std::string_view name) {
     ModulePort port;
     port.name = name;
-    walker_.ForEachField(value, [&](std::string_view key, JsonValue& part) {
+    walker_.ForEachField([&](std::string_view key) {
         if (key == "direction") {
-            port.direction = parts_.ReadDirection(part);
+            port.direction = parts_.ReadDirection();
         } else if (key == "bits") {
-            port.bits = parts_.ReadBits(module, part);
-        } else if (!parts_.ReadRange(key, part, port.range)) {
-            walker_.Skip(part);
+            port.bits = parts_.ReadBits(module);
+        } else if (!parts_.ReadRange(key, port.range)) {
+            walker_.Skip();
         }
     });
     if (port.direction == Direction::Unspecified) {
@@ -134,30 +132,57 @@ void DesignReader::ReadPort(Module& module, std::string_view name, JsonValue& va
     module.ports.push_back(port);
 }
 
-void DesignReader::ReadNet(Module& module, std::string_view name, JsonValue& value) {
+void DesignReader::ReadNet(Module& module, std::string_view name) {
     Net net;
     net.name = name;
-    walker_.ForEachField(value, [&](std::string_view key, JsonValue& part) {
+    walker_.ForEachField([&](std::string_view key) {
         if (key == "hide_name") {
-            net.hidden = walker_.ReadFlag(part);
+            net.hidden = walker_.ReadFlag();
         } else if (key == "bits") {
-            net.bits = parts_.ReadBits(module, part);
-        } else if (key == "attributes" && keepAttributes_) {
-            net.attributes = parts_.ReadValues(module, part);
-        } else if (!parts_.ReadRange(key, part, net.range)) {
-            walker_.Skip(part);
+            net.bits = parts_.ReadBits(module);
+        } else if (key == "attributes") {
+            ReadNetAttributes(module, net);
+        } else if (!parts_.ReadRange(key, net.range)) {
+            walker_.Skip();
         }
     });
     module.nets.push_back(net);
 }
 
+void DesignReader::ReadNetAttributes(Module& module, Net& net) {
+    const auto note = [&net](std::string_view name, const Value& value) {
+        net.hasFirstValue |=
+            name == FirstValue && (value.kind == Value::Integer ||
+                                   value.text.find_first_of("01") != std::string_view::npos);
+    };
+    if (keepAttributes_) {
+        net.attributes = parts_.ReadValues(module);
+        for (std::uint32_t i = 0; i < net.attributes.count; ++i) {
+            const NamedValue& attribute = module.values[net.attributes.start + i];
+            note(attribute.name, attribute.value);
+        }
+        return;
+    }
+    walker_.ForEachField([&](std::string_view name) {
+        if (name == FirstValue) {
+            note(name, parts_.ReadValue());
+        } else {
+            walker_.Skip();
+        }
+    });
+}
+
 } // namespace
 
-std::unique_ptr<ImportedDesign> ReadDesign(std::string text, bool keepAttributes) {
+std::unique_ptr<ImportedDesign> ReadDesign(TextSource& source, bool keepAttributes) {
     auto design = std::make_unique<ImportedDesign>();
-    const std::size_t size = text.size();
-    DesignReader(*design, keepAttributes, size).Read(std::move(text));
+    DesignReader(source, *design, keepAttributes).Read();
     return design;
+}
+
+std::unique_ptr<ImportedDesign> ReadDesign(std::string_view text, bool keepAttributes) {
+    TextInMemory source(text);
+    return ReadDesign(source, keepAttributes);
 }
 
 } // namespace Tool::Import

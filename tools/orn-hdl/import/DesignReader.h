@@ -2,15 +2,18 @@
 #pragma once
 
 #include "import/ImportedDesign.h"
+#include "import/TextSource.h"
 
 #include <memory>
-#include <string>
+#include <string_view>
 
 namespace Tool::Import {
 
-/// Reads the text of a whole file. Parts that the import does not need are only checked to be JSON.
-/// \param keepAttributes whether the attributes of cells and nets are kept.
-/// \throws Error if the text is not JSON, or not a netlist.
-std::unique_ptr<ImportedDesign> ReadDesign(std::string text, bool keepAttributes);
+/// Reads a whole text, piece by piece. Parts that the import does not need are only checked to be
+/// JSON. \param keepAttributes whether the attributes of cells and nets are kept. \throws Error if
+/// the text is not JSON, or not a netlist.
+std::unique_ptr<ImportedDesign> ReadDesign(TextSource& source, bool keepAttributes);
+/// Reads a text in memory.
+std::unique_ptr<ImportedDesign> ReadDesign(std::string_view text, bool keepAttributes);
 
 } // namespace Tool::Import

@@ -77,6 +77,8 @@ struct Net {
     BitRange range;
     Span bits;
     Span attributes;
+    /// Whether registers that drive the net start with a known value, by its attribute "init".
+    bool hasFirstValue = false;
 };
 
 struct Connection {

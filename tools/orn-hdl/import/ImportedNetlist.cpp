@@ -56,6 +56,13 @@ void WarnOfModule(const Module& top, Warnings& warnings) {
         warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("memories"),
                      "memories are not imported; map them to cells first");
     }
+    for (const Net& net : top.nets) {
+        if (net.hasFirstValue) {
+            warnings.Add(top.GetPath("netnames", net.name).AddKey("attributes").AddKey("init"),
+                         "the first values of registers are not imported: a register is unknown "
+                         "until it is reset or loaded");
+        }
+    }
     if (top.ports.empty()) {
         warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("ports"),
                      "VHDL does not allow a design without ports");

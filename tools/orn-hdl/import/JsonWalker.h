@@ -1,7 +1,8 @@
 // Walks over a JSON text and keeps track of the place for messages.
 #pragma once
 
-#include <simdjson.h>
+#include "import/JsonScanner.h"
+#include "import/TextSource.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -12,30 +13,23 @@
 
 namespace Tool::Import {
 
-using JsonValue = simdjson::ondemand::value;
-
+/// A visit of a value takes this value, by one of the functions below, exactly once.
 class JsonWalker {
 public:
-    /// Parses a text and calls `visit` with its value. \throws Error if the text is not JSON; the
+    /// \param source not owned.
+    explicit JsonWalker(TextSource& source);
+
+    /// Calls `visit` for the value that the text is. \throws Error if the text is not JSON; the
     /// message contains the place that the walk has reached.
-    template <class Visit> void Walk(std::string text, Visit visit) {
-        const std::size_t size = text.size();
-        text.resize(size + simdjson::SIMDJSON_PADDING);
-        // The parser owns the keys of the path in a message, so it outlives the try block.
-        simdjson::ondemand::parser parser;
-        simdjson::ondemand::document document;
-        const std::string_view json = std::string_view(text).substr(0, size);
-        bool isOpen = false;
+    template <class Visit> void Walk(const Visit& visit) {
         try {
-            document = parser.iterate(text.data(), size, text.size());
-            isOpen = true;
-            JsonValue root = document.get_value();
-            visit(root);
-            if (document.current_location().error() != simdjson::OUT_OF_BOUNDS) {
+            scanner_.CheckBeginning();
+            visit();
+            if (!scanner_.IsAtEnd()) {
                 Fail("nothing may follow the netlist");
             }
-        } catch (const simdjson::simdjson_error& error) {
-            FailToParse(error.error(), json, isOpen ? &document : nullptr);
+        } catch (const JsonSyntaxError& error) {
+            FailToScan(error);
         }
     }
 
@@ -45,58 +39,70 @@ public:
     [[noreturn]] void FailAt(std::string_view field, std::string_view member,
                              const std::string& text);
 
-    /// Calls `visit` with the name and value of each field. During the call, and when an error ends
-    /// the walk, the present place includes the field.
-    template <class Visit> void ForEachField(JsonValue& value, Visit visit) {
-        if (value.type() != simdjson::ondemand::json_type::object) {
-            Fail("an object is expected");
+    /// Calls `visit` with the name of each field of the present object. During the call, and when
+    /// an error ends the walk, the present place includes the field. The name is valid during the
+    /// call.
+    template <class Visit> void ForEachField(const Visit& visit) {
+        Expect(JsonScanner::Kind::Object, "an object is expected");
+        if (!scanner_.TakeOpening('}')) {
+            return;
         }
-        for (auto field : value.get_object()) {
-            const std::string_view key = field.unescaped_key();
-            Enter(Step{key, NoIndex});
-            JsonValue member = field.value();
-            visit(key, member);
+        do {
+            const std::string_view key = EnterField(scanner_.TakeKey());
+            scanner_.TakeColon();
+            visit(key);
             steps_.pop_back();
-        }
+        } while (scanner_.TakeSeparator('}'));
     }
-    /// Calls `visit` with each element of a list. During the call, and when an error ends the walk,
-    /// the present place includes the index.
-    template <class Visit> void ForEachElement(JsonValue& value, Visit visit) {
-        if (value.type() != simdjson::ondemand::json_type::array) {
-            Fail("a list is expected");
+    /// Calls `visit` for each element of the present list. During the call, and when an error ends
+    /// the walk, the present place includes the index.
+    template <class Visit> void ForEachElement(const Visit& visit) {
+        Expect(JsonScanner::Kind::Array, "a list is expected");
+        if (!scanner_.TakeOpening(']')) {
+            return;
         }
         std::size_t index = 0;
-        for (auto element : value.get_array()) {
-            Enter(Step{std::string_view(), index++});
-            JsonValue member = element.value();
-            visit(member);
+        do {
+            Enter(index++);
+            visit();
             steps_.pop_back();
-        }
+        } while (scanner_.TakeSeparator(']'));
     }
-    /// Checks that a value is valid JSON, and ignores it.
-    void Skip(JsonValue& value);
+    /// Checks that the present value is valid JSON, and ignores it.
+    void Skip();
 
-    std::string_view ReadText(JsonValue& value) const;
-    std::int64_t ReadInteger(JsonValue& value) const;
+    bool IsNumber() { return scanner_.GetKind() == JsonScanner::Kind::Number; }
+    /// The present value, a text. It is valid until the walk goes on.
+    std::string_view ReadText();
+    std::int64_t ReadInteger();
     /// Whether an integer is not 0.
-    bool ReadFlag(JsonValue& value) const { return ReadInteger(value) != 0; }
+    bool ReadFlag() { return ReadInteger() != 0; }
+
+    /// How many bytes of the text were read so far.
+    std::size_t GetBytesRead() const noexcept { return scanner_.GetBytesRead(); }
 
 private:
-    /// A step on the path from the top of the file to the present value: a key, or an index.
-    struct Step {
-        std::string_view key;
-        std::size_t index;
-    };
+    /// More than the depth of any netlist, and far less than would overflow the stack.
+    static constexpr std::size_t DeepestNesting = 200;
+    /// Stands for the index in a step to a field.
     static constexpr std::size_t NoIndex = std::numeric_limits<std::size_t>::max();
 
     /// The path of the present value, and a text behind it.
     std::string GetMessage(const std::string& text) const;
-    /// \param document null if parsing could not even begin.
-    [[noreturn]] void FailToParse(simdjson::error_code error, std::string_view text,
-                                  simdjson::ondemand::document* document) const;
-    void Enter(Step step);
+    [[noreturn]] void FailToScan(const JsonSyntaxError& error);
+    void Expect(JsonScanner::Kind kind, const char* complaint) {
+        if (scanner_.GetKind() != kind) {
+            Fail(complaint);
+        }
+    }
+    std::string_view EnterField(std::string_view key);
+    void Enter(std::size_t index);
 
-    std::vector<Step> steps_;
+    JsonScanner scanner_;
+    /// The path from the top of the text to the present value: indices, or `NoIndex` for a field.
+    std::vector<std::size_t> steps_;
+    /// The names of the fields, by the number of the step. The texts stay where they are.
+    std::vector<std::string> keys_;
 };
 
 } // namespace Tool::Import
