@@ -192,6 +192,13 @@ class Cells(HierarchyTest):
         self.refuse(self.with_cell(cell("sub", "i", B=[2])),
                     'modules.top.cells.u.connections.B: the module "sub" has no such port')
 
+    def test_directions_of_ports_that_are_none(self) -> None:
+        wrong = cell("sub", "io", A=[2, 3], Y=[4])
+        wrong["port_directions"]["B"] = "input"
+        self.refuse(self.with_cell(wrong),
+                    'modules.top.cells.u.type: the module "sub" has no port "B", which the '
+                    "directions of a cell name")
+
     def test_library_does_not_replace_a_module(self) -> None:
         self.write("c.v", "module sub(input I); endmodule")
         verilog, _ = self.import_both(self.with_cell(cell("sub", "io", A=[2, 3], Y=[4])), "-l",

@@ -208,6 +208,17 @@ void AdaptDefaults(TypeUse& type, ImportedDesign& design) {
     }
 }
 
+/// Cells of an imported module have its ports, and no others that only their directions name.
+void CheckPorts(const TypeUse& type, const CellType& cellType, const Module& top) {
+    for (std::size_t i = 0; type.unit != nullptr && i < type.pins.size(); ++i) {
+        if (type.pins[i].port == nullptr) {
+            Fail(top.GetPath("cells", type.firstCell->name).AddKey("type"),
+                 "the module \"" + std::string(cellType.name) + "\" has no port " +
+                     Quote(cellType.pins[i].name) + ", which the directions of a cell name");
+        }
+    }
+}
+
 /// Determines the common parameters of the components of a type, and how it is split.
 void CompareCells(TypeUse& type) {
     for (TypeUse::Pin& pin : type.pins) {
@@ -278,6 +289,7 @@ TypeUses CountTypeUses(ImportedDesign& design, const Module& top, const ImportRu
             continue;
         }
         TypeUse& type = counter.GetUses()[index];
+        CheckPorts(type, design.types[index], top);
         AdaptDefaults(type, design);
         CompareCells(type);
         WarnOfAmbiguousValues(type, top, warnings);
