@@ -1,5 +1,6 @@
-// The input is two bytes of options and a JSON netlist. If the netlist is not refused, it is
-// imported into a model and into a command file, and both give the same netlist.
+// The input is two bytes of options and a JSON netlist. If the netlist is not refused, each of its
+// modules is imported into a model and into a command file, and both give the same netlist. The
+// modules of a design with hierarchy agree in their ports, as do their legal netlists.
 
 #include "Bytes.h"
 #include "Check.h"
@@ -8,9 +9,12 @@
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Writes.h"
+#include "design/LegalDesign.h"
 #include "import/CommandSink.h"
 #include "import/DesignReader.h"
+#include "import/DesignUnits.h"
 #include "import/EmitNetlist.h"
+#include "import/Hierarchy.h"
 #include "import/ImportedNetlist.h"
 #include "import/ModelSink.h"
 #include "import/TopModule.h"
@@ -65,18 +69,98 @@ void Replay(Model& model, std::string_view commands) {
     }
 }
 
-void CheckImport(const Import::ImportedNetlist& netlist) {
-    CommandFactory factory;
-    Model direct(&factory);
+/// Makes the model of a module, and checks it.
+Model& ImportModule(const Import::ImportedNetlist& netlist, Engine& engine) {
+    engine.CreateAndAddModel(netlist.name.c_str(), "design.json");
+    Model& direct = *engine.GetModel(netlist.name.c_str());
     Import::ModelSink sink(direct);
     Import::EmitNetlist(netlist, sink);
     Fuzz::CheckNetlist(*direct.GetNetlist());
     Fuzz::CheckNames(*direct.GetNetlist());
+    return direct;
+}
+
+/// Compares the model with what the command file makes. Writing changes it.
+void CheckCommands(const Import::ImportedNetlist& netlist, Model& direct) {
+    CommandFactory factory;
     Model replayed(&factory);
     Replay(replayed, WriteCommands(netlist));
     Check(Fuzz::WriteWithChecks(*direct.GetNetlist(), *direct.GetOptions()) ==
               Fuzz::WriteThreeTimes(*replayed.GetNetlist(), *replayed.GetOptions()),
           "the command file makes the same netlist");
+}
+
+/// The modules of a design, used ones first, as an import makes them.
+std::vector<Import::ImportedNetlist> MakeNetlists(Import::ImportedDesign& design,
+                                                  Import::ImportRules rules) {
+    Import::Warnings warnings;
+    const Import::Hierarchy hierarchy(design);
+    const std::vector<Import::Module*> modules = hierarchy.Order({&Import::FindTop(design, "")});
+    std::optional<Import::DesignUnits> units;
+    if (modules.size() > 1) {
+        units.emplace(design, hierarchy, rules.names, warnings);
+        rules.units = &*units;
+    }
+    std::vector<Import::ImportedNetlist> netlists;
+    for (Import::Module* module : modules) {
+        netlists.push_back(Import::MakeNetlist(design, *module, rules, warnings));
+    }
+    return netlists;
+}
+
+/// Checks that the components of modules have pins as the modules have ports.
+void CheckAgreement(const std::vector<Model*>& models) {
+    for (const Model* user : models) {
+        for (const Model* used : models) {
+            const Netlist& module = *used->GetNetlist();
+            const Component* const component =
+                user->GetNetlist()->GetComponent(module.GetNameView());
+            if (component == nullptr) {
+                continue;
+            }
+            for (const Pin* pin : component->GetPinIterator()) {
+                const Signal* const port = module.GetSignal(pin->GetNameView());
+                Check(port != nullptr && port->IsPort(), "a pin of a module is one of its ports");
+                Check(port->GetPortPolarity().GetValue() == pin->GetPolarity().GetValue(),
+                      "a pin of a module has the direction of its port");
+            }
+        }
+    }
+}
+
+/// Writes all modules legally, unless something keeps them from it.
+void WriteLegally(const std::vector<Model*>& models) {
+    const Tool::LegalDesign legal(models);
+    for (std::size_t i = 0; i < models.size(); ++i) {
+        if (!legal.GetProblem().empty() || !legal.Get(i).GetErrors().empty()) {
+            return;
+        }
+    }
+    for (const Language language : {Language::Verilog, Language::Vhdl}) {
+        for (std::size_t i = 0; i < models.size(); ++i) {
+            TextMemOutStream out;
+            legal.Get(i).Write(language, out);
+            Check(!out.GetValue().IsEmpty(), "a legal netlist is written");
+            Fuzz::CheckNetlist(*models[i]->GetNetlist());
+        }
+    }
+}
+
+void CheckImport(Import::ImportedDesign& design, const Import::ImportRules& rules, bool isLegal) {
+    const std::vector<Import::ImportedNetlist> netlists = MakeNetlists(design, rules);
+    Engine engine;
+    std::vector<Model*> models;
+    for (const Import::ImportedNetlist& netlist : netlists) {
+        models.push_back(&ImportModule(netlist, engine));
+    }
+    CheckAgreement(models);
+    if (isLegal) {
+        WriteLegally(models);
+        return;
+    }
+    for (std::size_t i = 0; i < models.size(); ++i) {
+        CheckCommands(netlists[i], *models[i]);
+    }
 }
 
 } // namespace
@@ -85,13 +169,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Fuzz::Bytes bytes(data, size);
     const Import::CellLibrary library;
     const Import::ImportRules rules = PickRules(bytes, library);
-    const bool keepAttributes = bytes.Choose(2) == 0;
+    const int choice = bytes.Choose(4);
     try {
         const std::unique_ptr<Import::ImportedDesign> design =
-            Import::ReadDesign(std::string(bytes.Rest()), keepAttributes);
-        Import::Module& top = Import::FindTop(*design, "");
-        Import::Warnings warnings;
-        CheckImport(Import::MakeNetlist(*design, top, rules, warnings));
+            Import::ReadDesign(std::string(bytes.Rest()), choice % 2 == 0);
+        CheckImport(*design, rules, choice >= 2);
     } catch (const Import::Error&) {
         // The input is no netlist, or cannot be imported.
     }

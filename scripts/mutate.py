@@ -6,6 +6,7 @@
     scripts/mutate.py --file s/Port/File.cpp --count 20
     scripts/mutate.py --sources --count 300       # none in headers, of which each rebuilds much
     scripts/mutate.py --settle                    # the other test programs, for what is still open
+    scripts/mutate.py --settle --sanitize         # all programs with sanitizers, for what is not found
     scripts/mutate.py --list --count 20           # only shows them
     scripts/mutate.py --report                    # what the results say, with every survivor
 
@@ -43,7 +44,6 @@ from pathlib import Path
 PROJECT = Path(__file__).resolve().parents[1]
 WORK = PROJECT / "build" / "mutation"
 TREE = WORK / "tree"
-BUILD = WORK / "build"
 REASONS = PROJECT / "scripts" / "mutants.txt"
 
 # All programs, quick ones first; the folder of the changed file comes before them.
@@ -62,6 +62,22 @@ MOST_WRITTEN = 4 << 30
 
 
 @dataclasses.dataclass(frozen=True)
+class Build:
+    """How the copy is built."""
+
+    folder: Path
+    flags: str
+    most_memory: int
+
+
+PLAIN = Build(WORK / "build", "-O0", MOST_MEMORY)
+# AddressSanitizer maps far more memory than there is.
+SANITIZED = Build(WORK / "sanitized", "-O1 -fsanitize=address,undefined -fno-sanitize-recover=undefined",
+                  resource.RLIM_INFINITY)
+in_use = PLAIN
+
+
+@dataclasses.dataclass(frozen=True)
 class Mutant:
     """One change of one line."""
 
@@ -70,11 +86,14 @@ class Mutant:
     operator: str
     before: str
     after: str
+    # How many equal lines stand above this one.
+    equals: int = 0
 
     @property
     def name(self) -> str:
         """Stays the same while lines are added above."""
-        text = "\0".join([self.file, self.operator, self.before, self.after])
+        text = "\0".join([self.file, self.operator, self.before, self.after] +
+                         ([str(self.equals)] if self.equals else []))
         return hashlib.sha256(text.encode()).hexdigest()[:12]
 
 
@@ -159,13 +178,16 @@ def mutants_of(file: str) -> list[Mutant]:
     """Every mistake that can be put into a file."""
     found = []
     former = ""
+    met = Counter()
     for number, line in enumerate((PROJECT / file).read_text().splitlines(), 1):
         code, comment = re.fullmatch(r"(.*?)(\s*//.*)?", line).groups()
         if not hidden(code):
             for operator in OPERATORS:
-                found += [Mutant(file, number, operator.__name__, line, after + (comment or ""))
+                found += [Mutant(file, number, operator.__name__, line, after + (comment or ""), met[line])
                           for after in operator(code)]
-            found += [Mutant(file, number, "removals", line, after) for after in removals(code, former)]
+            found += [Mutant(file, number, "removals", line, after, met[line])
+                      for after in removals(code, former)]
+        met[line] += 1
         former = line
     return found
 
@@ -190,7 +212,7 @@ def environment() -> dict[str, str]:
 
 
 def build(*targets: str) -> bool:
-    return subprocess.run(["nice", "ninja", "-C", BUILD, f"-j{JOBS}", *targets], env=environment(), check=False,
+    return subprocess.run(["nice", "ninja", "-C", in_use.folder, f"-j{JOBS}", *targets], env=environment(), check=False,
                           stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL).returncode == 0
 
 
@@ -211,8 +233,8 @@ def prepare() -> None:
     for copy in list(TREE.rglob("*")):
         if copy.is_file() and copy.relative_to(TREE).as_posix() not in kept:
             copy.unlink()
-    subprocess.run(["cmake", "-S", TREE, "-B", BUILD, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
-                    "-DCMAKE_CXX_FLAGS_DEBUG=-O0", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON",
+    subprocess.run(["cmake", "-S", TREE, "-B", in_use.folder, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
+                    f"-DCMAKE_CXX_FLAGS_DEBUG={in_use.flags}", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON",
                     "-DORN_HDL_BUILD_TOOL=OFF"],
                    env=environment(), check=True, stdout=subprocess.DEVNULL)
 
@@ -232,14 +254,14 @@ def usual_time(program: str) -> float:
 
 def limit() -> None:
     """What a program gone wild may take."""
-    resource.setrlimit(resource.RLIMIT_AS, (MOST_MEMORY, MOST_MEMORY))
+    resource.setrlimit(resource.RLIMIT_AS, (in_use.most_memory, in_use.most_memory))
     resource.setrlimit(resource.RLIMIT_FSIZE, (MOST_WRITTEN, MOST_WRITTEN))
 
 
 def run(program: str, seconds: float, cases: str = SEED) -> str:
     """Why a test program fails; empty when it passes."""
     with tempfile.TemporaryDirectory(dir=WORK / "tmp") as folder:
-        command = [BUILD / "tests" / target(program), "--gtest_brief=1", "--gtest_fail_fast",
+        command = [in_use.folder / "tests" / target(program), "--gtest_brief=1", "--gtest_fail_fast",
                    f"--gtest_filter={FILTER}"]
         try:
             ended = subprocess.run(command, env=environment() | {"TMPDIR": folder, "RC_PARAMS": cases}, cwd=folder,
@@ -342,13 +364,21 @@ def main() -> None:
     parser.add_argument("--sources", action="store_true", help="none in headers")
     parser.add_argument("--settle", action="store_true",
                         help="run all programs on those that are still open")
+    parser.add_argument("--sanitize", action="store_true",
+                        help="with --settle: use AddressSanitizer and UndefinedBehaviorSanitizer, on "
+                             "what survived, too")
     parser.add_argument("--results", type=Path, default=WORK / "results.jsonl", help="one JSON a line")
     parser.add_argument("--list", action="store_true", help="show the mistakes and stop")
     parser.add_argument("--report", action="store_true", help="show what is known and stop")
     options = parser.parse_args()
+    if options.sanitize and not options.settle:
+        parser.error("--sanitize goes with --settle")
     if options.report:
         report(options.results)
         return
+    if options.sanitize:
+        global in_use  # pylint: disable=global-statement
+        in_use = SANITIZED
     pattern = "*.cpp" if options.sources else "*.[ch]*"
     files = options.file or [path.relative_to(PROJECT).as_posix()
                              for path in (PROJECT / "s").rglob(pattern)]
@@ -357,8 +387,9 @@ def main() -> None:
     known = latest(options.results)
     if options.settle:
         excused = reasons()
+        unsettled = ["open", "survived"] if options.sanitize else ["open"]
         mutants = [mutant for mutant in mutants if mutant.name not in excused and
-                   known.get(mutant.name, {}).get("status") == "open"]
+                   known.get(mutant.name, {}).get("status") in unsettled]
     else:
         mutants = mutants[:options.count]
     if options.list:

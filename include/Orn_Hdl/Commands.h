@@ -164,7 +164,8 @@ private:
 
 /// Reads the lines of a command file for a model, split into words. What has come in of the file is
 /// split some lines ahead, so that in a large design the things that a line names are at hand when
-/// it is executed.
+/// it is executed. With `HdlOptions::threads`, a regular file of more than 256 kB is read and split
+/// in a thread of the reader's own.
 ///
 /// \code
 /// CommandReader reader(model);
@@ -186,6 +187,7 @@ public:
     bool Open(const char* fileName);
     /// The words of the next line, none for an empty line; valid until the next call. Null at the
     /// end of the file or on a failure.
+    /// \throws std::bad_alloc if a line ahead finds no memory; the reader then goes on behind it.
     const StringArray* Next();
     /// How many bytes the lines that `Next` has given take in the file.
     std::uint64_t GetPosition() const noexcept;

@@ -68,6 +68,13 @@ public:
     /// The model of that name, owned by the engine; null if there is none.
     Model* GetModel(const Port::TextArgument& name) const;
 
+    /// Sets `HdlOptions::threads` of all models, and of those that are made later.
+    /// \param threads how many threads may write a netlist or read a command file together: 1, the
+    /// default, for the caller's alone, 0 for as many as the system gives, at most 8.
+    void SetThreads(unsigned threads) noexcept;
+    /// The number of threads that `SetThreads` has set.
+    unsigned GetThreads() const noexcept;
+
     /// Runs one command line on the current model.
     /// \throws Exception if the line fails; "Missing Model.\n" if there is no current model.
     void Execute(const Port::TextArgument& text);

@@ -96,6 +96,12 @@ struct ORN_HDL_API HdlOptions {
     /// Whether the write commands read each netlist back and compare it with the design (`Proof`)
     /// before it replaces its file. A netlist that differs is an error, and the file stays.
     bool verify = false;
+    /// How many threads may write a netlist or read a command file together: 1 for the caller's
+    /// alone, 0 for as many as the system gives, at most 8. What is written is the same, and small
+    /// designs and files have one thread in any case. With more than one, the virtual functions of
+    /// classes that a program has derived from those of the library are called by several threads
+    /// at once while a netlist is written.
+    unsigned threads = 1;
 };
 
 /// Helpers that both writers share.

@@ -20,6 +20,9 @@ class Folder;
 
 namespace Orn_Hdl {
 
+class BranchDst;
+class StreamBranch;
+
 /// Where an `OutStream` sends its text.
 class ORN_HDL_API StreamDst {
 public:
@@ -58,6 +61,17 @@ protected:
     StreamDst& operator=(const StreamDst&) noexcept = default;
 
 private:
+    friend class StreamBranch;
+
+    /// A destination in memory that formats lines as this one does, with the present indentation;
+    /// null in the base: all text is then written here, by one thread.
+    virtual std::unique_ptr<BranchDst> MakeBranch() const;
+    /// Writes the lines of a branch as they are. \return false, nothing written, if that would not
+    /// be the same as writing them here, as in the base.
+    virtual bool TakeLines(std::string_view lines);
+    /// Whether text goes anywhere; false after a failure.
+    virtual bool IsWriting() const noexcept;
+
     int indentLevel_ = 0;
 };
 
@@ -118,6 +132,8 @@ protected:
     StreamDst* GetDestination() const noexcept { return destination_.get(); }
 
 private:
+    friend class StreamBranch;
+
     std::unique_ptr<StreamDst> destination_;
 };
 

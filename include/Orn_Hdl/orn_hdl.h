@@ -692,7 +692,10 @@ enum {
     /** Number: legal netlists escape names where that is enough, instead of changing them. */
     ORN_HDL_ESCAPE_NAMES = 22,
     /** Number: each netlist is read back and compared before it replaces its file. */
-    ORN_HDL_VERIFY = 23
+    ORN_HDL_VERIFY = 23,
+    /** Number: how many threads may write a netlist or read a command file together. 1 is the
+     * caller's alone, 0 as many as the system gives, at most 8. */
+    ORN_HDL_THREADS = 24
 };
 
 enum {

@@ -133,6 +133,8 @@ private:
     std::size_t lineEnd_ = 0;
     std::size_t lineSize_ = 0;
     bool atEnd_ = false;
+    /// Whether a regular file is open: reading it never waits for another process.
+    bool isRegular_ = false;
 };
 
 /// Buffers text for a file.

@@ -1,6 +1,7 @@
 // The options of a model by name.
 #include "Objects.h"
 
+#include <climits>
 #include <map>
 #include <string>
 #include <variant>
@@ -13,12 +14,13 @@ using Orn_Hdl::HdlOptions;
 using VerilogOption = HdlOptions::VerilogOption;
 
 /// Where an option lies.
-using Place = std::variant<bool*, Port::StringBase<char>*, Orn_Hdl::StringArray*>;
+using Place = std::variant<bool*, unsigned*, Port::StringBase<char>*, Orn_Hdl::StringArray*>;
 
 std::map<std::string_view, Place> GetPlaces(HdlOptions& options) {
     return {{"legal", &options.legal},
             {"escape_names", &options.escapeNames},
             {"verify", &options.verify},
+            {"threads", &options.threads},
             {"application", &options.application},
             {"command", &options.command},
             {"device", &options.device},
@@ -53,10 +55,22 @@ Ref MakeTexts(const Orn_Hdl::StringArray& texts) {
     return list;
 }
 
+unsigned GetCount(const Arguments& arguments, Py_ssize_t i) {
+    const long count = arguments.GetInt(i);
+    if (count < 0 || count > INT_MAX) {
+        PyErr_SetString(PyExc_ValueError, "a number from 0 is needed");
+        throw ErrorIsSet();
+    }
+    return static_cast<unsigned>(count);
+}
+
 Ref GetOption(ModelState& state, Arguments& arguments) {
     const Place place = FindPlace(*state.Get().GetOptions(), arguments.GetText(0));
     if (const auto* const flag = std::get_if<bool*>(&place)) {
         return MakeBool(**flag);
+    }
+    if (const auto* const number = std::get_if<unsigned*>(&place)) {
+        return MakeInt(static_cast<long>(**number));
     }
     if (const auto* const text = std::get_if<Port::StringBase<char>*>(&place)) {
         return MakeText(**text);
@@ -69,6 +83,8 @@ Ref SetOption(ModelState& state, Arguments& arguments) {
     const Place place = FindPlace(*state.Get().GetOptions(), arguments.GetText(0));
     if (const auto* const flag = std::get_if<bool*>(&place)) {
         **flag = arguments.GetBool(1);
+    } else if (const auto* const number = std::get_if<unsigned*>(&place)) {
+        **number = GetCount(arguments, 1);
     } else if (const auto* const text = std::get_if<Port::StringBase<char>*>(&place)) {
         **text = arguments.GetText(1);
     } else {

@@ -96,6 +96,9 @@ int GetNumber(HdlOptions& options, orn_hdl_option_t option) {
     if (const auto* const letterCase = FindCase(options, option)) {
         return *letterCase - HdlOptions::VerilogOption::DEFSULT;
     }
+    if (option == ORN_HDL_THREADS) {
+        return static_cast<int>(options.threads);
+    }
     Require(option == ORN_HDL_VERILOG_SYNTHESIS);
     return options.verilog.synthesisType;
 }
@@ -108,6 +111,9 @@ void SetNumber(HdlOptions& options, orn_hdl_option_t option, int value) {
         Require(value >= ORN_HDL_CASE_KEPT && value <= ORN_HDL_CASE_LOWER);
         *letterCase = static_cast<HdlOptions::VerilogOption::CaseType>(
             HdlOptions::VerilogOption::DEFSULT + value);
+    } else if (option == ORN_HDL_THREADS) {
+        Require(value >= 0);
+        options.threads = static_cast<unsigned>(value);
     } else {
         Require(option == ORN_HDL_VERILOG_SYNTHESIS && value >= HdlOptions::VerilogOption::QSN &&
                 value <= HdlOptions::VerilogOption::PRECISION);

@@ -284,10 +284,10 @@ void Assignments::CheckLength(const Signal& signal, const Digits& digits) {
             text = "is a decimal number of more than 32 bits in Verilog";
         }
     } else if (digits.length == 0) {
-        verdicts = Verdicts("rrr..r.r");
+        verdicts = Verdicts("rrrmmr.rm");
         text = "has the length 0";
     } else if (digits.length < 0) {
-        verdicts = Verdicts("mmm..mmm");
+        verdicts = Verdicts("mmmmmmmmm");
         text = "has a length below 0, which Verilog reads as a sign";
     } else if (digits.GetNeededBits() > static_cast<std::size_t>(digits.length)) {
         verdicts = Verdicts("wwwwwwrww");

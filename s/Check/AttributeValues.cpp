@@ -51,6 +51,12 @@ bool IsQuotedBy(string_view text, char quote) {
     return text.size() >= 2 && text.front() == quote && text.back() == quote;
 }
 
+/// Whether a text is a string literal of these characters.
+bool IsStringOf(string_view characters, string_view text) {
+    return IsQuotedBy(text, '"') &&
+           text.substr(1, text.size() - 2).find_first_not_of(characters) == string_view::npos;
+}
+
 bool IsControl(char c) {
     const auto byte = static_cast<unsigned char>(c);
     return byte < 0x20 || (byte >= 0x7F && byte < 0xA0);
@@ -68,6 +74,7 @@ public:
 private:
     void CheckText(string_view text, bool isInVhdl);
     void CheckDigits();
+    void CheckLength(const Digits& digits);
     void CheckUser();
     Finding* Add(RuleId rule, const Verdicts& verdicts) {
         return AddFinding(context_, rule, verdicts, holder_, attribute_);
@@ -160,29 +167,39 @@ void ValueCheck::CheckDigits() {
         finding->message = "the value " + Quoted(digits.digits) + " of " +
                            holder_.Describe(attribute_) + " has a character that is no digit";
     }
-    if (!places_.verilogNumber || !isNumber) {
-        return;
-    }
-    Verdicts verdicts;
-    RuleId rule = RuleId::ConstantLength;
     if (digits.hasLength) {
+        CheckLength(digits);
+    } else if (places_.verilogNumber && isNumber) {
+        const BitText read = digits.ReadVerilog(digits.digits.size());
+        const bool isLong = digits.GetNeededBits() > 32;
+        const bool differs = !read || *read != digits.digits || isLong;
+        const Verdicts verdicts(!differs ? "" : isLong ? "mmm..mrm" : "mmm..mmm");
+        if (Finding* finding = Add(RuleId::GenericDigits, verdicts)) {
+            finding->message = "the value " + Quoted(digits.digits) + " of " +
+                               holder_.Describe(attribute_) + " is a decimal number in Verilog";
+        }
+    }
+}
+
+/// The length that stands before the digits. VHDL has as many bits as the digits stand for.
+void ValueCheck::CheckLength(const Digits& digits) {
+    Verdicts verdicts;
+    if (places_.verilogNumber && digits.IsVerilogNumber()) {
         const bool isCut =
             digits.length > 0 && digits.GetNeededBits() > static_cast<std::size_t>(digits.length);
         verdicts = Verdicts(digits.length == 0  ? "rrr..r.r"
                             : digits.length < 0 ? "mmm..mmm"
                             : isCut             ? "mmm..mrm"
                                                 : "");
-    } else {
-        rule = RuleId::GenericDigits;
-        const BitText read = digits.ReadVerilog(digits.digits.size());
-        const bool isLong = digits.GetNeededBits() > 32;
-        const bool differs = !read || *read != digits.digits || isLong;
-        verdicts = Verdicts(!differs ? "" : isLong ? "mmm..mrm" : "mmm..mmm");
     }
-    if (Finding* finding = Add(rule, verdicts)) {
-        finding->message =
-            "the value " + Quoted(digits.digits) + " of " + holder_.Describe(attribute_) +
-            (digits.hasLength ? " does not fit its length" : " is a decimal number in Verilog");
+    const bool isAsLong =
+        digits.length >= 0 && digits.GetVhdlLength() == static_cast<std::size_t>(digits.length);
+    if (places_.vhdl && places_.typed && digits.IsVhdlBitVector() && !isAsLong) {
+        verdicts.Worsen(Verdicts("...mm...m"));
+    }
+    if (Finding* finding = Add(RuleId::ConstantLength, verdicts)) {
+        finding->message = "the value " + Quoted(digits.digits) + " of " +
+                           holder_.Describe(attribute_) + " does not fit its length";
     }
 }
 
@@ -238,9 +255,16 @@ bool CanBeValueOf(string_view type, string_view text) {
         return text == "'0'" || text == "'1'";
     }
     if (type == "std_logic" || type == "std_ulogic" || type == "character") {
-        return text.size() == 3 && IsQuotedBy(text, '\'');
+        return text.size() == 3 && IsQuotedBy(text, '\'') &&
+               (type == "character" || StdLogic.find(text[1]) != string_view::npos);
     }
-    if (type == "string" || type == "bit_vector" || type == "std_logic_vector") {
+    if (type == "bit_vector") {
+        return text.empty() || IsStringOf("01", text);
+    }
+    if (type == "std_logic_vector") {
+        return text.empty() || IsStringOf(StdLogic, text);
+    }
+    if (type == "string") {
         return text.empty() || (IsQuotedBy(text, '"') &&
                                 text.substr(1, text.size() - 2).find('"') == string_view::npos);
     }

@@ -51,19 +51,6 @@ const Bus* GetParent(const Signal& part) {
 
 } // namespace
 
-const Signal* GetDeclared(const Signal& signal) {
-    switch (signal.GetSignalType()) {
-    case SignalTypeScalar:
-    case SignalTypeBus:
-        return &signal;
-    case SignalTypeBusSlice:
-    case SignalTypeBusIndex:
-        return GetParent(signal);
-    default:
-        return nullptr;
-    }
-}
-
 bool GetRun(const Signal& signal, Run& run) {
     run = Run();
     run.reference = &signal;

@@ -26,10 +26,6 @@ struct Run {
     const Signal* reference = nullptr;
 };
 
-/// The declared signal of which a scalar signal, a bus, a slice or a bit is the whole or a part;
-/// null for a compound, and for a part of no bus.
-const Signal* GetDeclared(const Signal& signal);
-
 /// The bits that a scalar signal, a bus, a slice or a bit stands for.
 /// \return false for a compound, and for what has no declared signal.
 bool GetRun(const Signal& signal, Run& run);

@@ -42,8 +42,6 @@ bool HasProperUnderscores(string_view text) {
            (text.front() != '_' && text.back() != '_' && text.find("__") == string_view::npos);
 }
 
-constexpr string_view StdLogic = "UX01ZWLH-";
-
 /// A decimal number's bits, lowest last, by repeated halving.
 std::string ToBinary(std::string decimal) {
     std::string bits;

@@ -10,6 +10,9 @@
 
 namespace Orn_Hdl::Checking {
 
+/// The values of std_logic.
+constexpr std::string_view StdLogic = "UX01ZWLH-";
+
 /// A value's bits, leftmost first, each of "01xz"; nothing when the text is no number.
 using BitText = std::optional<std::string>;
 

@@ -7,6 +7,7 @@
 #include "Check/ReservedWords.h"
 #include "Writers/Text.h"
 
+#include <algorithm>
 #include <limits>
 
 namespace Orn_Hdl::Checking {
@@ -106,6 +107,18 @@ void CheckReserved(Context& context, const NameUse& use) {
     }
 }
 
+/// Whether the writers write another index, the greatest or least of 32 bits.
+bool IsCut(std::string_view text, int index) {
+    const bool isLimit =
+        index == std::numeric_limits<int>::max() || index == std::numeric_limits<int>::min();
+    if (!isLimit) {
+        return false;
+    }
+    text.remove_prefix(!text.empty() && (text.front() == '+' || text.front() == '-') ? 1 : 0);
+    text.remove_prefix(std::min(text.find_first_not_of('0'), text.size()));
+    return text != (index < 0 ? "2147483648" : "2147483647");
+}
+
 /// The names of the design's objects.
 class NameWalk {
 public:
@@ -121,6 +134,7 @@ public:
 private:
     void CheckModule();
     void CheckSignals();
+    bool CheckIndices(const Names::BusName& range, const Cause& cause, const Object& object);
     void CheckRange(const Signal& signal);
     void CheckInstances();
     void CheckComponents();
@@ -161,6 +175,19 @@ void NameWalk::CheckSignals() {
     }
 }
 
+/// \return whether there is an index of more than 32 bits.
+bool NameWalk::CheckIndices(const Names::BusName& range, const Cause& cause, const Object& object) {
+    if (!IsCut(range.left, range.leftIndex) && !IsCut(range.right, range.rightIndex)) {
+        return false;
+    }
+    if (Finding* finding = context_.Add(RuleId::WideBus, Verdicts("mmmmmmmrm"), cause)) {
+        finding->objects = {&object};
+        finding->message =
+            "the bus " + Quoted(object.GetNameView()) + " has an index of more than 32 bits";
+    }
+    return true;
+}
+
 void NameWalk::CheckRange(const Signal& signal) {
     constexpr std::int64_t MostInStandard = 65536;
     constexpr std::int64_t MostInYosys = 16000000;
@@ -168,6 +195,9 @@ void NameWalk::CheckRange(const Signal& signal) {
     constexpr int GreatestIndex = std::numeric_limits<int>::max() - 64;
     Names::BusName range;
     if (!Names::ParseBus(signal.GetNameView(), range)) {
+        return;
+    }
+    if (CheckIndices(range, SignalCause(range.base), signal)) {
         return;
     }
     const std::int64_t bits = range.GetBits();
@@ -242,6 +272,10 @@ void NameWalk::CheckPins(const Component& component) {
                 finding->other =
                     Named(Kind::Pin, component.GetNameView(), other->second->GetNameView());
             }
+        }
+        Names::BusName range;
+        if (Names::ParseBus(pin->GetNameView(), range)) {
+            CheckIndices(range, cause, *pin);
         }
         if (pin->GetPinType() == PinTypeBusIndex) {
             if (Finding* finding = context_.Add(RuleId::BitPin, cause)) {

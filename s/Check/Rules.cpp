@@ -86,7 +86,8 @@ constexpr Check::Rule Rules[] = {
      "CONNECT SIGNAL Y(3:0) A,B", "signals of one width"},
     {"wide-bus", Verdicts("wwwwwwwww"), "a bus that is wider, or indexed higher, than a tool takes",
      "A Verilog tool need not take more than 65,536 bits (IEEE 1364-2005, 4.3.1). Yosys rejects "
-     "indices near 2,147,483,647.",
+     "indices near 2,147,483,647. The writers write an index of more than 32 bits as the nearest "
+     "one.",
      "ADD PORT D(2147483647:2147483640) Input", "narrower buses with smaller indices"},
     {"constant-digits", Verdicts("mmm..mmm."),
      "a constant without length and base, whose digits Verilog reads as a decimal number",
@@ -217,8 +218,10 @@ constexpr Check::Rule Rules[] = {
     {"character-in-value", Verdicts("...rr...r"), "a value with a control character",
      "A VHDL string holds graphic characters only (IEEE 1076-2008, 15.7).",
      "ADD SIGNAL ATTRIBUTE A NOTE with a tab in the value", "a value without it"},
-    {"directive-comment", Verdicts("......rr."), "a comment that a tool obeys",
-     "Comments that begin with synopsys, synthesis or verilator are commands to some tools.",
+    {"directive-comment", Verdicts("......rrm"), "a comment that a tool obeys",
+     "Comments that begin with synopsys, synthesis, pragma or verilator are commands to some "
+     "tools. "
+     "Synthesis leaves out what follows translate_off, in VHDL too.",
      "ADD NOTES synopsys translate_off", "other words at the comment's beginning"},
     {"missing-configuration", Verdicts("...ww...w"),
      "a configuration that uses a component's configuration, which WORK may not have",

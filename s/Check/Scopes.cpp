@@ -1,6 +1,7 @@
 // Names that meet in one scope, hide a library or a type, or bear the name of the design.
 
 #include "Check/Context.h"
+#include "HdlModel/Names/GeneratedNames.h"
 #include "HdlModel/Names/Names.h"
 #include "Port/Ascii.h"
 #include "Writers/Generics.h"
@@ -37,8 +38,9 @@ struct Directive {
     string_view words;
     string_view verdicts;
 };
-constexpr Directive Directives[] = {{"synopsys translate_off", "......wr."},
-                                    {"synthesis translate_off", "......wr."},
+constexpr Directive Directives[] = {{"synopsys translate_off", "......wrm"},
+                                    {"synthesis translate_off", "......wrm"},
+                                    {"pragma translate_off", "........m"},
                                     {"synopsys translate_on", ".......w"},
                                     {"synthesis translate_on", ".......w"},
                                     {"synopsys full_case", "......wr."},
@@ -57,6 +59,7 @@ public:
     void CheckAll() {
         CheckBuses();
         CheckDummySignals();
+        CheckMadeSignals();
         CheckOpenSignals();
         CheckGenerics();
         CheckAttributeNames();
@@ -68,6 +71,7 @@ public:
 private:
     void CheckBuses();
     void CheckDummySignals();
+    void CheckMadeSignals();
     void CheckOpenSignals();
     void CheckOpenPin(const Instance& instance, const Pin& pin);
     void CheckGenerics();
@@ -220,6 +224,21 @@ void Scopes::CheckOpenPin(const Instance& instance, const Pin& pin) {
     open.what = "the signal " + Quoted(name) + " of an open pin";
     open.cause = Named(Kind::Instance, instance.GetNameView());
     ForEachInScope(base, open, [&](const Declared& other) { ReportClash(open, other, ""); });
+}
+
+/// A signal that an earlier write made can have the name of another object. Buses are looked at as
+/// all others are.
+void Scopes::CheckMadeSignals() {
+    for (const Signal* signal : context_.survey.GetSignals()) {
+        const string_view name = signal->GetNameView();
+        if (signal->GetSignalType() != SignalTypeScalar || !Names::IsGenerated(name)) {
+            continue;
+        }
+        const Declared made = DescribeSignal(*signal);
+        ForEachInScope(name, made, [&](const Declared& other) {
+            ReportClash(made, other, other.isInstance ? "rrr..rrr" : "rrr..rwr");
+        });
+    }
 }
 
 void Scopes::CheckGenerics() {

@@ -3,6 +3,7 @@
 #include "Check/Identifier.h"
 #include "Check/ReservedWords.h"
 #include "Check/Rules.h"
+#include "HdlModel/Names/GeneratedNames.h"
 #include "Orn_Hdl/Model/Component.h"
 #include "Orn_Hdl/Model/Signals.h"
 
@@ -33,7 +34,8 @@ void Survey::Look(const Signal& signal) {
     const bool isPlain = signal.GetSignalType() == SignalTypeScalar && !signal.IsPort() &&
                          !signal.HasAttrs() && signal.GetConstantValue().GetValue().IsEmpty() &&
                          signal.GetSignalIterator().IsAtEnd() && signal.GetCommentView().empty() &&
-                         IsPlain(signal.GetNameView(), options_.verilog.signalCase);
+                         IsPlain(signal.GetNameView(), options_.verilog.signalCase) &&
+                         !Names::IsGenerated(signal.GetNameView());
     if (!isPlain) {
         signals_.push_back(&signal);
     }

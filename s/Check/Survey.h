@@ -21,7 +21,7 @@ public:
     /// \}
 
     /// Signals that are buses, ports or open, or have attributes, a comment, a constant, an alias,
-    /// or a name that a target may reject.
+    /// a name that a target may reject, or one that the library gives to signals of its own.
     const std::vector<const Signal*>& GetSignals() const noexcept { return signals_; }
     /// Instances with attributes, their component's included, with a comment, or with a name that a
     /// target may reject.

@@ -1,43 +1,99 @@
+#include "HdlCmd/LineBatches.h"
 #include "HdlModel/Netlist/ReadAhead.h"
 #include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 #include "Port/LinesAtHand.h"
+#include "Port/OrderedWork.h"
 
 #include <array>
+#include <memory>
 
 namespace Orn_Hdl {
 
 struct CommandReader::Implementation {
-    struct Line {
-        StringArray words;
-        std::uint64_t bytes = 0;
-    };
-
     static constexpr std::size_t Distance = ReadAhead::Distance;
     /// Room for a line as long as this is kept for the next.
     static constexpr std::uint64_t LongLine = 1 << 20;
 
     explicit Implementation(Model& owner) noexcept : model(owner) {}
 
-    void Split(std::string_view text) {
-        Line& line = lines[(first + count) % Distance];
-        line.bytes = file.GetLineSize();
-        line.words.Empty();
-        line.words.ParseCommandLine(text.substr(0, text.find('\0')));
-        ++count;
-        ReadAhead::Note(*model.GetNetlist(), line.words);
+    SplitLine& GetFree() noexcept { return lines[(first + count) % Distance]; }
+    bool HasThreads() const {
+        return Port::OrderedWork::GetWorkersFor(model.GetOptions()->threads) > 0;
     }
+    void Split(std::string_view text);
+    void Leave() noexcept;
+    void LookAhead();
+    void LookAheadInBuffer();
+    void LookAheadInBatches();
 
     Model& model;
     Port::File file;
     /// A ring of the line in hand, if `Next` has given one, and those behind it.
-    std::array<Line, Distance> lines;
+    std::array<SplitLine, Distance> lines;
     std::size_t first = 0;
     std::size_t count = 0;
     bool isInHand = false;
     std::uint64_t position = 0;
+    /// The lines behind the ring, if they are split on another processor; the file is then theirs.
+    std::unique_ptr<LineBatches> batches;
 };
+
+void CommandReader::Implementation::Split(std::string_view text) {
+    SplitLine& line = GetFree();
+    line.Set(file, text);
+    ++count;
+    ReadAhead::Note(*model.GetNetlist(), line.words);
+}
+
+/// Gives up the line in hand.
+void CommandReader::Implementation::Leave() noexcept {
+    if (isInHand) {
+        lines[first].Release(batches == nullptr ? LongLine : LineBatches::LongLine);
+        first = (first + 1) % Distance;
+        --count;
+        isInHand = false;
+    }
+}
+
+/// Fills the ring.
+void CommandReader::Implementation::LookAhead() {
+    if (batches == nullptr) {
+        LookAheadInBuffer();
+    }
+    if (batches != nullptr) {
+        LookAheadInBatches();
+    }
+}
+
+void CommandReader::Implementation::LookAheadInBuffer() {
+    std::string_view text;
+    while (count < Distance && Port::LinesAtHand::Next(file, text)) {
+        Split(text);
+    }
+    if (count == Distance) {
+        return;
+    }
+    if (Port::LinesAtHand::GoesOn(file) && HasThreads()) {
+        batches = std::make_unique<LineBatches>(file, LineBatches::Settings());
+    } else if (count == 0 && file.NextLine(text)) {
+        // Only for the line that is asked for is it worth waiting.
+        Split(text);
+        LookAheadInBuffer();
+    }
+}
+
+void CommandReader::Implementation::LookAheadInBatches() {
+    Foresight::Hashes names;
+    while (count < Distance && batches->Next(GetFree(), names)) {
+        ++count;
+        ReadAhead::Note(*model.GetNetlist(), names);
+    }
+    if (count == 0) {
+        batches.reset();
+    }
+}
 
 CommandReader::CommandReader(Model& model)
     : implementation_(std::make_unique<Implementation>(model)) {}
@@ -46,6 +102,7 @@ CommandReader::~CommandReader() = default;
 
 bool CommandReader::Open(const char* fileName) {
     Implementation& own = *implementation_;
+    own.batches.reset();
     own.count = 0;
     own.isInHand = false;
     own.position = 0;
@@ -54,23 +111,8 @@ bool CommandReader::Open(const char* fileName) {
 
 const StringArray* CommandReader::Next() {
     Implementation& own = *implementation_;
-    if (own.isInHand) {
-        Implementation::Line& done = own.lines[own.first];
-        if (done.bytes > Implementation::LongLine) {
-            done.words = StringArray();
-        }
-        own.first = (own.first + 1) % Implementation::Distance;
-        --own.count;
-        own.isInHand = false;
-    }
-    std::string_view text;
-    // Only for the line that is asked for is it worth waiting.
-    if (own.count == 0 && own.file.NextLine(text)) {
-        own.Split(text);
-    }
-    while (own.count < Implementation::Distance && Port::LinesAtHand::Next(own.file, text)) {
-        own.Split(text);
-    }
+    own.Leave();
+    own.LookAhead();
     if (own.count == 0) {
         return nullptr;
     }
@@ -84,7 +126,8 @@ std::uint64_t CommandReader::GetPosition() const noexcept {
 }
 
 int CommandReader::GetError() const noexcept {
-    return implementation_->file.GetError();
+    // A failure is told when the lines before it have been given.
+    return implementation_->batches != nullptr ? 0 : implementation_->file.GetError();
 }
 
 } // namespace Orn_Hdl

@@ -19,6 +19,7 @@ struct Engine::Implementation {
     CommandFactory factory;
     ModelRegistry models;
     Model* current = nullptr;
+    unsigned threads = HdlOptions().threads;
 
     Model* Find(const char* name) const { return models.Find(Port::ViewOf(name)); }
 
@@ -54,6 +55,7 @@ bool Engine::CreateAndAddModel(const Port::TextArgument& name,
     std::unique_ptr<Model> model(implementation_->factory.CreateModel());
     model->SetName(name.GetView());
     model->SetSourceFileName(sourceFile);
+    model->GetOptions()->threads = implementation_->threads;
     implementation_->models.Add(std::move(model));
     return true;
 }
@@ -80,6 +82,16 @@ bool Engine::RemoveModel(const Port::TextArgument& name) {
 
 Model* Engine::GetModel(const Port::TextArgument& name) const {
     return implementation_->Find(name);
+}
+
+void Engine::SetThreads(unsigned threads) noexcept {
+    implementation_->threads = threads;
+    implementation_->models.ForEach(
+        [threads](Model& model) { model.GetOptions()->threads = threads; });
+}
+
+unsigned Engine::GetThreads() const noexcept {
+    return implementation_->threads;
 }
 
 void Engine::Execute(const Port::TextArgument& text) {

@@ -27,6 +27,12 @@ public:
     Model* Find(std::string_view name) const;
     /// Removes and returns the first model of that name; null if there is none.
     std::unique_ptr<Model> Remove(std::string_view name);
+    /// Calls `look` for each model.
+    template <class Look> void ForEach(const Look& look) const {
+        for (const auto& [number, entry] : entries_) {
+            look(*entry.model);
+        }
+    }
 
 private:
     /// Models are numbered in the order in which they are added.

@@ -270,9 +270,9 @@ void Plan::NoteAttributeDigits(Check::Finding& finding) {
         options_.vhdl.useAttrType = false;
         return;
     }
-    const std::string digits(attribute.GetValueString().GetView());
-    const bool isBinary = !digits.empty() && digits.find_first_not_of("01") == std::string::npos;
-    if (Is(finding, RuleId::GenericDigits) && isBinary) {
+    const BitVectorValue value =
+        static_cast<const AttributeBitVector&>(attribute).GetBitVectorValue();
+    if (!Is(finding, RuleId::ConstantCharacter) && FindBits(value)) {
         digits_.insert(&attribute);
     } else {
         Refuse(finding);

@@ -72,8 +72,8 @@ public:
     bool IsUsed(const Component& component) const { return used_.count(&component) != 0; }
     /// Whether the constant of the signal has to be written with its bits.
     bool HasFaultyConstant(const Signal& signal) const { return constants_.count(&signal) != 0; }
-    /// Whether the attribute's digits need a length and a base.
-    bool NeedsLength(const Attribute& attribute) const { return digits_.count(&attribute) != 0; }
+    /// Whether the attribute's value has to be written with its bits.
+    bool NeedsBits(const Attribute& attribute) const { return digits_.count(&attribute) != 0; }
     /// Whether the attributes of a name lose the type that the user names, and are texts.
     bool IsText(const Attribute& attribute) const;
     /// Whether the attribute has to be declared although its option says that it is not.

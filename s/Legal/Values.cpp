@@ -150,6 +150,14 @@ std::optional<std::string> FindBits(const BitVectorValue& value, std::size_t wid
     return digits.hasLength ? FindSizedBits(digits, width) : FindPlainBits(digits, width);
 }
 
+std::optional<std::string> FindBits(const BitVectorValue& value) {
+    const Digits digits(value);
+    const std::optional<std::string> bits =
+        digits.hasLength ? FindBits(value, static_cast<std::size_t>(std::max(digits.length, 0)))
+                         : digits.digits;
+    return bits && !bits->empty() && AreAllOf("01", *bits) ? bits : std::nullopt;
+}
+
 BitVectorValue MakeConstant(const std::string& bits, Language language) {
     if (language == Language::Verilog) {
         return BitVectorValue((std::to_string(bits.size()) + ":B:" + bits).c_str());
@@ -163,10 +171,10 @@ BitVectorValue MakeConstant(const std::string& bits, Language language) {
 std::unique_ptr<Attribute> CopyAttribute(const Attribute& attribute, const Plan& plan,
                                          Language language) {
     std::unique_ptr<Attribute> copy = Clone(attribute);
-    if (plan.NeedsLength(attribute)) {
+    if (plan.NeedsBits(attribute)) {
         const auto& vector = static_cast<const AttributeBitVector&>(attribute);
-        const std::string digits(vector.GetValue().GetView());
-        copy->SetValue((std::to_string(digits.size()) + ":B:" + digits).c_str());
+        const std::string bits = FindBits(vector.GetBitVectorValue()).value_or("");
+        copy->SetValue((std::to_string(bits.size()) + ":B:" + bits).c_str());
     } else if (IsWrittenAsText(attribute, plan, language)) {
         const Port::String text = Writers::GetUnquotedValue(attribute);
         const std::string escaped =
@@ -189,7 +197,8 @@ bool CanBeEscaped(const Attribute& attribute) {
 }
 
 std::string WithoutDirective(string_view line) {
-    static constexpr std::array<string_view, 3> Words = {"synopsys", "synthesis", "verilator"};
+    static constexpr std::array<string_view, 4> Words = {"synopsys", "synthesis", "pragma",
+                                                         "verilator"};
     const string_view text = line.substr(std::min(line.find_first_not_of(' '), line.size()));
     const bool isDirective = std::any_of(Words.begin(), Words.end(), [text](string_view word) {
         return text.substr(0, word.size()) == word;

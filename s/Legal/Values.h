@@ -16,6 +16,10 @@ namespace Orn_Hdl::Legal {
 /// or one that the languages do not share.
 std::optional<std::string> FindBits(const BitVectorValue& value, std::size_t width);
 
+/// The bits of the value of an attribute: as many as its length says, or one a digit when it has
+/// none. Nothing when the digits do not fit the length, or there are others than 0 and 1.
+std::optional<std::string> FindBits(const BitVectorValue& value);
+
 /// A constant of these bits as the writer of a language takes it.
 BitVectorValue MakeConstant(const std::string& bits, Language language);
 

@@ -169,6 +169,7 @@ bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
     lineEnd_ = 0;
     lineSize_ = 0;
     atEnd_ = false;
+    isRegular_ = false;
     appends_ = false;
     written_ = 0;
     leftover_ = 0;
@@ -189,7 +190,8 @@ bool File::OpenNamed(const char* name, Mode mode, bool fromStart) {
         Discard();
         return false;
     }
-    if (mode == Append && (!isKnown || S_ISREG(status.st_mode))) {
+    isRegular_ = isKnown && S_ISREG(status.st_mode);
+    if (mode == Append && (!isKnown || isRegular_)) {
         // If the status is unknown, the inode is zero, which no file has.
         appends_ = true;
         device_ = static_cast<std::uint64_t>(status.st_dev);

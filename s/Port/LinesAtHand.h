@@ -20,6 +20,11 @@ public:
         line = file.TakeLine(length);
         return true;
     }
+    /// Whether the file is a regular one that goes on behind its buffer, as far as is known.
+    static bool GoesOn(const File& file) noexcept {
+        return file.isRegular_ && !file.atEnd_ && file.lineCapacity_ > 0 &&
+               file.lineEnd_ == file.lineCapacity_;
+    }
 };
 
 } // namespace Port

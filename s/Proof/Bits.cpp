@@ -7,13 +7,22 @@ namespace Orn_Hdl::Proving {
 
 namespace {
 
+/// No index is greater, so that widths fit into 64 bits.
+constexpr std::int64_t GreatestIndex = std::int64_t(1) << 60;
+
 /// Reads an integer off the front of a text. \return false when there is none.
 bool TakeIndex(std::string_view& text, std::int64_t& index) noexcept {
     if (!text.empty() && text.front() == '+') {
         text.remove_prefix(1);
     }
+    const bool isNegative = !text.empty() && text.front() == '-';
     const auto result = std::from_chars(text.data(), text.data() + text.size(), index);
     text.remove_prefix(static_cast<std::size_t>(result.ptr - text.data()));
+    if (result.ec == std::errc::result_out_of_range) {
+        index = isNegative ? -GreatestIndex : GreatestIndex;
+        return true;
+    }
+    index = std::clamp(index, -GreatestIndex, GreatestIndex);
     return result.ec == std::errc();
 }
 

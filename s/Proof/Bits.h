@@ -26,6 +26,7 @@ struct Run {
 using Runs = std::vector<Run>;
 
 /// Reads "D(7:0)" or "D(3)"; any other name is that of a scalar signal. The run refers to the name.
+/// Indices of more than 60 bits are cut to 60.
 Run ReadRun(std::string_view name) noexcept;
 /// Appends the bits of a signal: of a compound, those of its members.
 void AppendRuns(const Signal& signal, Runs& runs);

@@ -37,17 +37,26 @@ string_view BaseOf(const Pin& pin) {
     return pin.GetPinType() == PinTypeScalar ? name : name.substr(0, name.find('('));
 }
 
-std::string Show(const std::optional<Readers::Range>& range) {
-    return range ? "[" + std::to_string(range->left) + ":" + std::to_string(range->right) + "]"
-                 : std::string("one bit");
+std::string ShowRange(std::int64_t left, std::int64_t right) {
+    return "[" + std::to_string(left) + ":" + std::to_string(right) + "]";
 }
 
-std::optional<Readers::Range> RangeOf(const Signal& signal) {
-    const Run run = ReadRun(signal.GetNameView());
-    if (signal.GetSignalType() != SignalTypeBus || run.isScalar) {
-        return std::nullopt;
-    }
-    return Readers::Range{static_cast<int>(run.left), static_cast<int>(run.right)};
+std::string Show(const std::optional<Readers::Range>& range) {
+    return range ? ShowRange(range->left, range->right) : std::string("one bit");
+}
+
+std::string Show(const Run& run) {
+    return run.isScalar ? std::string("one bit") : ShowRange(run.left, run.right);
+}
+
+/// The range that a signal is declared with.
+Run DeclaredRun(const Signal& signal) {
+    return signal.GetSignalType() == SignalTypeBus ? ReadRun(signal.GetNameView()) : Run();
+}
+
+bool IsRange(const std::optional<Readers::Range>& range, const Run& run) {
+    return range ? !run.isScalar && range->left == run.left && range->right == run.right
+                 : run.isScalar;
 }
 
 std::string ShowDirection(int direction) {
@@ -184,11 +193,12 @@ bool Comparison::CheckDeclared(const Signal& signal, const std::optional<Readers
                           ", in the design " + ShowDirection(meant),
                       place, CauseOf(signal));
     }
-    if (range == RangeOf(signal)) {
+    const Run run = DeclaredRun(signal);
+    if (IsRange(range, run)) {
         return true;
     }
     findings_.Add(Quoted(BaseOf(signal)) + " is declared as " + Show(range) +
-                      ", in the design as " + Show(RangeOf(signal)),
+                      ", in the design as " + Show(run),
                   place, CauseOf(signal));
     return false;
 }
@@ -289,15 +299,11 @@ void Comparison::ComparePorts(const Component& component, const Readers::ModuleH
         }
         const Readers::PortHead& port = head.ports[next++];
         const Run run = pin->GetPinType() == PinTypeBus ? ReadRun(pin->GetNameView()) : Run();
-        std::optional<Readers::Range> range;
-        if (!run.isScalar) {
-            range = Readers::Range{static_cast<int>(run.left), static_cast<int>(run.right)};
-        }
         if (!port.problem.empty()) {
             report("cannot be declared like this: " + port.problem, *pin, port.place);
         } else if (port.name != BaseOf(*pin)) {
             report("is declared as " + Quoted(port.name), *pin, port.place);
-        } else if (port.range != range) {
+        } else if (!IsRange(port.range, run)) {
             report("is declared as " + Show(port.range), *pin, port.place);
         } else if (port.direction != pin->GetPolarity().GetValue()) {
             report("is declared as " + ShowDirection(port.direction), *pin, port.place);

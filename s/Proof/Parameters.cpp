@@ -179,6 +179,14 @@ void Parameters::ExpectOfInstances() {
     }
 }
 
+/// Whether an attribute has a name of the netlist. A reader leaves the mark of an escaped name out,
+/// and in comments the blank that ends it.
+bool Parameters::IsNamed(const Attribute& attribute, string_view name) const {
+    const string_view own = attribute.GetNameView();
+    return own == name || (language_ == Language::Verilog && !own.empty() && own.front() == '\\' &&
+                           (NameInVerilog(own) == name || own.substr(0, own.find(' ')) == name));
+}
+
 Cause Parameters::CauseOf(const Holder& holder, const Attribute* attribute) const {
     const bool isModule = holder.instance == nullptr && holder.component == nullptr;
     const std::string name(attribute == nullptr ? string_view() : attribute->GetNameView());
@@ -212,7 +220,7 @@ void Parameters::Take(Expected& expected, const Holder& holder, const std::strin
     if (attribute == nullptr) {
         findings_.Add(what + " is one that the design does not set there", place,
                       CauseOf(holder, nullptr));
-    } else if (attribute->GetNameView() != name) {
+    } else if (!IsNamed(*attribute, name)) {
         findings_.Add(what + " stands where the design has " +
                           std::string(attribute->GetNameView()),
                       place, CauseOf(holder, attribute));
@@ -263,7 +271,7 @@ void Parameters::CompareAttribute(const Holder& holder, const Attribute* attribu
     if (attribute == nullptr) {
         findings_.Add(what + " is one that the design does not have there", place,
                       CauseOf(holder, nullptr));
-    } else if (attribute->GetNameView() != name) {
+    } else if (!IsNamed(*attribute, name)) {
         findings_.Add(what + " stands where the design has " +
                           std::string(attribute->GetNameView()),
                       place, CauseOf(holder, attribute));
@@ -318,7 +326,7 @@ void Parameters::TakeAttribute(const Signal& signal, const std::string& name,
     }
     const OfSignal& expected = ofSignals_[readOfSignals_++];
     const Attribute& attribute = *expected.attribute;
-    if (expected.signal != &signal || attribute.GetNameView() != name) {
+    if (expected.signal != &signal || !IsNamed(attribute, name)) {
         findings_.Add(what + " stands where the design has " +
                           std::string(attribute.GetNameView()) + " of " +
                           std::string(expected.signal->GetNameView()),

@@ -9,6 +9,7 @@
 
 #include <cstddef>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Orn_Hdl::Proving {
@@ -80,6 +81,7 @@ private:
     void CompareAttribute(const Holder& holder, const Attribute* attribute, const std::string& name,
                           const Readers::Value& value, bool isDeclared,
                           const Readers::Place& place);
+    bool IsNamed(const Attribute& attribute, std::string_view name) const;
     bool IsSame(const Attribute& attribute, const Readers::Value& value) const;
     Cause CauseOf(const Holder& holder, const Attribute* attribute) const;
     Cause CauseOf(const Signal& signal, const Attribute& attribute) const;

@@ -171,6 +171,13 @@ void AddLines(std::vector<Proof::Difference>& differences, const char* fileName)
     }
 }
 
+/// Whether both name the same command. Only the check tells a bus from a scalar signal of the same
+/// name.
+bool AreSame(const Check::Cause& found, const Check::Cause& wanted) {
+    return found.kind == wanted.kind && found.first == wanted.first &&
+           (found.second == wanted.second || wanted.kind == Check::Cause::Kind::Signal);
+}
+
 /// Adds the rules that tell of what differs.
 void AddRules(std::vector<Proof::Difference>& differences, Language language,
               const Netlist& netlist, const HdlOptions& options) {
@@ -182,13 +189,10 @@ void AddRules(std::vector<Proof::Difference>& differences, Language language,
         return finding.GetSeverity() == Check::Severity::Error;
     });
     for (Proof::Difference& difference : differences) {
-        const auto isSame = [&difference](const Check::Cause& cause) {
-            return cause.kind == difference.cause.kind && cause.first == difference.cause.first &&
-                   cause.second == difference.cause.second;
-        };
         const bool hasCause = difference.cause.kind != Check::Cause::Kind::Design;
         auto match = std::find_if(found.begin(), found.end(), [&](const Check::Finding& finding) {
-            return hasCause && (isSame(finding.cause) || isSame(finding.other));
+            return hasCause && (AreSame(finding.cause, difference.cause) ||
+                                AreSame(finding.other, difference.cause));
         });
         // What cannot be read is whatever the check holds against the whole.
         if (!hasCause && !found.empty()) {

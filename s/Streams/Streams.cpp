@@ -1,6 +1,7 @@
 #include "Orn_Hdl/Streams.h"
 
 #include "Port/Ascii.h"
+#include "Streams/BranchDst.h"
 #include "Streams/TextFileDst.h"
 #include "Streams/TextMemDst.h"
 
@@ -22,6 +23,18 @@ void StreamDst::WritePieces(const std::string_view* pieces, std::size_t count) {
     for (std::size_t i = 0; i < count; ++i) {
         WriteView(pieces[i]);
     }
+}
+
+std::unique_ptr<BranchDst> StreamDst::MakeBranch() const {
+    return nullptr;
+}
+
+bool StreamDst::TakeLines(std::string_view /*lines*/) {
+    return false;
+}
+
+bool StreamDst::IsWriting() const noexcept {
+    return true;
 }
 
 OutStream::OutStream(StreamDst* destination) : destination_(destination) {}

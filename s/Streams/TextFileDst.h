@@ -1,22 +1,18 @@
-// The file destination: indentation, and lines broken after 80 columns.
+// The file destination.
 #pragma once
 
-#include "Orn_Hdl/Streams.h"
 #include "Port/File.h"
+#include "Streams/LineDst.h"
 
 #include <cstddef>
 #include <cstdint>
-#include <cstring>
-#include <memory>
 #include <string>
 #include <string_view>
 
 namespace Orn_Hdl {
 
-class TextFileDst final : public StreamDst {
+class TextFileDst final : public LineDst {
 public:
-    static constexpr std::size_t Width = 80;
-
     TextFileDst() = default;
     TextFileDst(const char* fileName, TextFileOutStream::Mode mode);
     /// Opens the file at `path` below a folder.
@@ -38,50 +34,13 @@ public:
     int CopyFile(const char* fileName);
 
     void Flush() override;
-    void Write(const char* text) override;
-    void Write(int number) override;
-    void WriteView(std::string_view text) override;
-    void WritePieces(const std::string_view* pieces, std::size_t count) override;
 
 private:
-    /// The state of the search for a position to break the line. The search continues where it
-    /// stopped, so a line of any length is searched once.
-    struct BreakSearch {
-        std::size_t searched = 0;
-        std::size_t afterSpace = 0;
-        std::size_t afterComma = 0;
-        /// Between double quotes, if a backslash does not escape a quote, as in VHDL.
-        bool inLiteral = false;
-        /// Between double quotes, if a backslash escapes a quote, as in Verilog.
-        bool inEscapingLiteral = false;
-        bool isEscaped = false;
-        bool isComment = false;
-    };
-
-    std::string_view GetLine() const noexcept {
-        return std::string_view(buffer_.get() + lineStart_, used_ - lineStart_);
-    }
-    void WritePiece(std::string_view text);
-    void WriteToLineEnd(std::string_view text);
-    void BeginLine();
-    void AppendWrapping(std::string_view text);
-    void Wrap();
-    void SearchBreak();
-    void BreakAt(std::size_t position);
-    void AppendIndentation(int levels);
-    void Append(std::string_view text) {
-        if (text.size() > capacity_ - used_) {
-            MakeRoom(text.size());
-        }
-        std::memcpy(buffer_.get() + used_, text.data(), text.size());
-        used_ += text.size();
-    }
-    void MakeRoom(std::size_t size);
-    /// Ends the current line, which will not change any more.
-    void StartLine() noexcept {
-        lineStart_ = used_;
-        search_ = BreakSearch();
-    }
+    std::unique_ptr<BranchDst> MakeBranch() const override;
+    bool TakeLines(std::string_view lines) override;
+    bool IsWriting() const noexcept override { return isGood_; }
+    bool MakeRoom(std::size_t size) override;
+    void WriteLongLine(std::string_view text) override;
     void Send(std::string_view text);
     void SendLines();
 
@@ -89,12 +48,6 @@ private:
     bool replaces_ = false;
     bool isGood_ = true;
     Port::StringBase<char> fileName_;
-    /// Lines that are not written to the file yet, followed by the current line.
-    std::unique_ptr<char[]> buffer_;
-    std::size_t capacity_ = 0;
-    std::size_t used_ = 0;
-    std::size_t lineStart_ = 0;
-    BreakSearch search_;
 };
 
 } // namespace Orn_Hdl

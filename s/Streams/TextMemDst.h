@@ -3,7 +3,9 @@
 
 #include "Orn_Hdl/Streams.h"
 #include "Port/Ascii.h"
+#include "Streams/BranchDst.h"
 
+#include <memory>
 #include <string>
 #include <string_view>
 
@@ -21,6 +23,14 @@ public:
     void WriteView(std::string_view text) override { text_ += text; }
 
 private:
+    std::unique_ptr<BranchDst> MakeBranch() const override {
+        return std::make_unique<PlainBranchDst>(GetIndentLevel());
+    }
+    bool TakeLines(std::string_view lines) override {
+        text_ += lines;
+        return true;
+    }
+
     std::string text_;
 };
 

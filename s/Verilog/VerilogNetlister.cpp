@@ -35,10 +35,17 @@ public:
           dialect_(DialectOf(options.verilog.synthesisType)),
           connection_(out, WriteSignalVisitor::Connection),
           reference_(out, WriteSignalVisitor::Assignment) {}
+    /// Writes parts of what `whole` writes to a stream of their own.
+    Writer(OutStream& out, VerilogStatements& statements, const Writer& whole)
+        : NetlistPass(out, whole), statements_(statements), dialect_(whole.dialect_),
+          connection_(out, WriteSignalVisitor::Connection),
+          reference_(out, WriteSignalVisitor::Assignment) {}
 
     void Write();
 
 private:
+    class Part;
+
     void Prepare();
     void SetNameCase();
     static void SetNameCase(Object& object, HdlOptions::VerilogOption::CaseType nameCase);
@@ -48,12 +55,14 @@ private:
     void WriteParameters();
     void WritePortDeclarations(const std::vector<Signal*>& ports);
     void WriteSignalDeclarations(const std::vector<Signal*>& signals);
+    void WriteSignalDeclaration(const Signal& signal);
     void WriteSignalAssignments(const Writers::SignalLists& signals);
     void WriteConstantAssignment(Signal& signal);
     void WriteAlias(Signal& signal, Signal& alias);
     void WriteReference(Signal& signal);
     void WriteInstances();
     void WriteInstance(const Instance& instance);
+    void WriteInstantiation(const Instance& instance);
     void WriteConnections(const Instance& instance, std::size_t column);
     void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
 
@@ -70,6 +79,23 @@ private:
     WriteSignalVisitor reference_;
     PtrArray<Attribute*> effectiveAttrs_;
     Writers::GenericAttrs genericAttrs_;
+};
+
+/// Writes declarations of signals and instances to a stream of its own.
+class VerilogNetlister::Writer::Part {
+public:
+    Part(OutStream& out, const Writer& whole)
+        : statements_(out), writer_(out, statements_, whole) {}
+    Part(const Part&) = delete;
+    Part& operator=(const Part&) = delete;
+
+    void operator()(const Signal& signal) { writer_.WriteSignalDeclaration(signal); }
+
+    void operator()(const Instance& instance) { writer_.WriteInstance(instance); }
+
+private:
+    VerilogStatements statements_;
+    Writer writer_;
 };
 
 VerilogNetlister::VerilogNetlister(OutStream& out)
@@ -185,12 +211,14 @@ void VerilogNetlister::Writer::WritePortDeclarations(const std::vector<Signal*>&
 }
 
 void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*>& signals) {
-    for (const Signal* signal : signals) {
-        statements_.WriteComment(signal);
-        statements_.WriteSignalDeclaration(signal->GetNameView());
-        EndStatement(signal->GetAttrIterator(), Names::BaseName(signal->GetNameView()));
-    }
+    WriteEachSignal(signals, [this](OutStream& out) { return Part(out, *this); });
     out_.WriteEmptyLine();
+}
+
+void VerilogNetlister::Writer::WriteSignalDeclaration(const Signal& signal) {
+    statements_.WriteComment(&signal);
+    statements_.WriteSignalDeclaration(signal.GetNameView());
+    EndStatement(signal.GetAttrIterator(), Names::BaseName(signal.GetNameView()));
 }
 
 void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists& signals) {
@@ -230,15 +258,17 @@ void VerilogNetlister::Writer::WriteReference(Signal& signal) {
 }
 
 void VerilogNetlister::Writer::WriteInstances() {
-    ForEachInstance([this](const Instance& instance) {
-        WriteInstance(instance);
-        Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
-        EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
-        WriteDefParam(instance, effectiveAttrs_);
-    });
+    WriteEachInstance([this](OutStream& out) { return Part(out, *this); });
 }
 
 void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {
+    WriteInstantiation(instance);
+    Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+    EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
+    WriteDefParam(instance, effectiveAttrs_);
+}
+
+void VerilogNetlister::Writer::WriteInstantiation(const Instance& instance) {
     const Component* const component = instance.GetComponent();
     string_view componentName;
     if (component != nullptr) {

@@ -79,10 +79,16 @@ public:
            const HdlOptions& options)
         : NetlistPass(Language::Vhdl, out, netlist, options), statements_(statements),
           declared_(declared) {}
+    /// Writes parts of what `whole` writes to a stream of their own.
+    Writer(OutStream& out, VhdlStatements& statements, const Writer& whole)
+        : NetlistPass(out, whole), statements_(statements), declared_(whole.declared_) {}
 
     void Write();
 
 private:
+    class Declarations;
+    class Instances;
+
     void Prepare();
     void WriteHead();
     void WriteEntity(const std::vector<Signal*>& ports);
@@ -124,6 +130,39 @@ private:
     int attrWidth_ = 0;
     PtrArray<Attribute*> effectiveAttrs_;
     Writers::GenericAttrs genericAttrs_;
+};
+
+/// Writes declarations of signals to a stream of its own.
+class VhdlNetlister::Writer::Declarations {
+public:
+    Declarations(OutStream& out, const Writer& whole, int width)
+        : statements_(out), writer_(out, statements_, whole), width_(width) {}
+    Declarations(const Declarations&) = delete;
+    Declarations& operator=(const Declarations&) = delete;
+
+    void operator()(const Signal& signal) { writer_.WriteSignalDeclaration(signal, width_); }
+
+private:
+    VhdlStatements statements_;
+    Writer writer_;
+    const int width_;
+};
+
+/// Writes instances to a stream of its own.
+class VhdlNetlister::Writer::Instances {
+public:
+    Instances(OutStream& out, const Writer& whole)
+        : statements_(out), writer_(out, statements_, whole),
+          portMap_(whole.options_.onePortPerLine ? AssociationPerLine : ", "sv, statements_, out) {}
+    Instances(const Instances&) = delete;
+    Instances& operator=(const Instances&) = delete;
+
+    void operator()(const Instance& instance) { writer_.WriteInstance(instance, portMap_); }
+
+private:
+    VhdlStatements statements_;
+    Writer writer_;
+    WritePortAssignmentVisitor portMap_;
 };
 
 VhdlNetlister::VhdlNetlister(OutStream& out)
@@ -239,9 +278,8 @@ void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signal
     out_.Indent();
     WriteAttrDeclarations(signals.internals, instances);
     const int width = Netlist::GetLongestSignalName(netlist_.GetSignalIterator());
-    for (const Signal* signal : signals.internals) {
-        WriteSignalDeclaration(*signal, width);
-    }
+    WriteEachSignal(signals.internals,
+                    [this, width](OutStream& out) { return Declarations(out, *this, width); });
     if (!options_.vhdl.suppressComponent) {
         WriteComponents(instances.GetComponents());
     }
@@ -427,10 +465,7 @@ void VhdlNetlister::Writer::WriteAliasBits(const StringArray& bits, const String
 }
 
 void VhdlNetlister::Writer::WriteInstances() {
-    const string_view separator = options_.onePortPerLine ? AssociationPerLine : ", "sv;
-    WritePortAssignmentVisitor portMap(separator, statements_, out_);
-    ForEachInstance(
-        [this, &portMap](const Instance& instance) { WriteInstance(instance, portMap); });
+    WriteEachInstance([this](OutStream& out) { return Instances(out, *this); });
 }
 
 void VhdlNetlister::Writer::WriteInstance(const Instance& instance,

@@ -2,6 +2,24 @@
 
 namespace Orn_Hdl::Writers {
 
+InstanceStarts::InstanceStarts(const Netlist& netlist) : distance_(GetRangeSizes().items) {
+    const Iterator<Instance*> instances = netlist.GetInstanceIterator();
+    for (Cursor place = instances.begin(); place != instances.end(); ++place) {
+        if (count_ % distance_ == 0) {
+            places_.push_back(place);
+        }
+        ++count_;
+    }
+}
+
+InstanceStarts::Cursor InstanceStarts::Find(std::size_t instance) const noexcept {
+    Cursor place = places_[instance / distance_];
+    for (std::size_t i = instance % distance_; i > 0; --i) {
+        ++place;
+    }
+    return place;
+}
+
 void NetlistPass::Prepare() {
     netlist_.SortNetlist();
     netlist_.CreateVhdlDummySignals();

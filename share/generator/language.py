@@ -108,7 +108,7 @@ def _read_options(section: str) -> list[Option]:
     section = re.sub(r"\n {10,}", "  ", section)
     options = []
     for left, help_text in re.findall(r"^  (\S.*?) {2,}(\S.*)$", section, re.M):
-        left = re.sub(r" (REQUIRED|(Needs|Excludes): \S+)", "", left)
+        left = re.sub(r" (REQUIRED|\(Env:\w+\)|(Needs|Excludes): \S+)", "", left)
         names, _, value = left.partition(" ")
         if value.endswith(" ..."):
             names, value = f"{names}...", ""

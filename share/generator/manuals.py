@@ -95,6 +95,9 @@ The time to write in headers, in seconds since 1970, instead of the current time
 .TP
 .B NO_COLOR
 If it is set and not empty, messages on a terminal are not coloured, unless \\-\\-color says so.
+.TP
+.B ORN_HDL_THREADS
+How many processors \\-\\-threads uses, unless it stands on the command line.
 .SH EXAMPLE
 .EX
 orn\\-hdl run \\-\\-verilog top.v \\-\\-vhdl top.vhd top.cmd

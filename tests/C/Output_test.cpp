@@ -58,6 +58,21 @@ TEST_F(COutput, EveryOptionIsSetAndTold) {
     EXPECT_EQ(lists, 3);
 }
 
+TEST_F(COutput, ThreadsAreANumber) {
+    int threads = 0;
+    ASSERT_EQ(orn_hdl_model_get_number(session.model, ORN_HDL_THREADS, &threads), ORN_HDL_OK);
+    EXPECT_EQ(threads, 1);
+    for (const int other : {0, 3}) {
+        ASSERT_EQ(orn_hdl_model_set_number(session.model, ORN_HDL_THREADS, other), ORN_HDL_OK);
+        ASSERT_EQ(orn_hdl_model_get_number(session.model, ORN_HDL_THREADS, &threads), ORN_HDL_OK);
+        EXPECT_EQ(threads, other);
+    }
+    EXPECT_EQ(orn_hdl_model_set_number(session.model, ORN_HDL_THREADS, -1),
+              ORN_HDL_INVALID_ARGUMENT);
+    EXPECT_EQ(orn_hdl_model_set_text(session.model, ORN_HDL_THREADS, "2"),
+              ORN_HDL_INVALID_ARGUMENT);
+}
+
 TEST_F(COutput, OptionsAreThoseOfTheCommands) {
     session.Run("SET SYNTHESIS SYNPLICITY\nLOWERCASE instance\nADD LIBRARY cells\n"
                 "SUPPRESS COMPONENT\n");
@@ -122,6 +137,7 @@ TEST_F(COutput, ACheckTellsItsFindings) {
     EXPECT_EQ(ToString(finding.cause), "Signal");
     EXPECT_EQ(ToString(finding.first), "module");
     EXPECT_NE(ToString(finding.rule), "");
+    EXPECT_NE(ToString(finding.message).find("module"), std::string::npos);
     EXPECT_EQ(finding.verdicts[0], ORN_HDL_REJECTS);
     EXPECT_EQ(orn_hdl_findings_get(findings, count, &finding), ORN_HDL_END);
     EXPECT_EQ(orn_hdl_findings_destroy(findings), ORN_HDL_OK);

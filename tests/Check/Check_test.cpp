@@ -60,6 +60,21 @@ TEST_F(CheckTest, SoundDesignHasNoFindings) {
     EXPECT_TRUE(Run().empty());
 }
 
+TEST_F(CheckTest, YosysDoesNotReadWhatIsHiddenFromSynthesis) {
+    Do({"ADD MODULE ATTRIBUTE NOTE \"7\\\" wide\"",
+        "SET MODULE ATTRIBUTE OPTION NOTE -GENERIC=NOSYN"});
+    const Finding finding = Find("quote-in-value");
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Yosys), Verdict::Accepts);
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Icarus), Verdict::Rejects);
+}
+
+TEST_F(CheckTest, AnExtendedNameMayHoldABackslashTwice) {
+    Do({"ADD SIGNAL \\a\\\\b\\", "CONNECT SIGNAL \\a\\\\b\\ A"});
+    const Finding name = Find("illegal-name");
+    EXPECT_EQ(name.verdicts.Get(Check::Target::Vhdl93), Verdict::Accepts);
+    EXPECT_EQ(name.verdicts.Get(Check::Target::Verilog2005), Verdict::Rejects);
+}
+
 TEST_F(CheckTest, EmptyNetlistIsChecked) {
     const Netlist netlist;
     const HdlOptions options;
@@ -107,6 +122,88 @@ TEST_F(CheckTest, DigitsThatMeanOneThingAreNot) {
     for (const Finding& finding : Run()) {
         EXPECT_EQ(finding.GetSeverity(), Check::Severity::Warning) << finding.message;
     }
+}
+
+TEST_F(CheckTest, AVectorOfVhdlIsAsLongAsItsDigits) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=BitVector W 4:H:A", "USE ATTRTYPE true",
+        "SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=SYN"});
+    const auto isMisread = [this](const char* value) {
+        model_.GetComponent("INV")->GetAttr("W")->SetValue(value);
+        for (const Finding& finding : Run(Check::Targets::Vhdl())) {
+            if (finding.rule->name == "constant-length") {
+                EXPECT_EQ(finding.cause.first, "INV");
+                EXPECT_EQ(finding.cause.second, "W");
+                EXPECT_EQ(finding.verdicts.GetWorst(), Verdict::Misreads);
+                return true;
+            }
+        }
+        return false;
+    };
+    for (const char* value : {"4:H:A5", "6:H:05", "8:H:5", "-4:B:1010", "0:B:1"}) {
+        EXPECT_TRUE(isMisread(value)) << value;
+    }
+    for (const char* value : {"4:H:A", "8:H:A5", "6:O:17", "8:B:1010_1010", "1010"}) {
+        EXPECT_FALSE(isMisread(value)) << value;
+    }
+    // A text is written as it stands.
+    Do({"SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=NONE",
+        "SET COMPONENT ATTRIBUTE OPTION INV W -SYNATTR=ASSIGN"});
+    EXPECT_TRUE(isMisread("4:H:A5"));
+    model_.GetOptions()->vhdl.useAttrType = false;
+    EXPECT_FALSE(isMisread("4:H:A5"));
+}
+
+TEST_F(CheckTest, AnIndexOfMoreThan32BitsIsWrittenAsAnotherOne) {
+    const auto findMessage = [this](const std::string& command, const char* bus) {
+        Do({(command + bus + " input").c_str()});
+        for (const Finding& finding : Run()) {
+            if (finding.rule->name == "wide-bus" && finding.objects.front()->GetName() == bus) {
+                const bool isMisread =
+                    finding.verdicts.Get(Check::Target::Vhdl93) == Verdict::Misreads;
+                return (isMisread ? "misread: " : "") + finding.message;
+            }
+        }
+        return std::string();
+    };
+    EXPECT_EQ(findMessage("ADD PORT ", "W(2147483648:2147483640)"),
+              "misread: the bus \"W(2147483648:2147483640)\" has an index of more than 32 bits");
+    EXPECT_EQ(findMessage("ADD PORT ", "N(02147483647:2147483640)"),
+              "the bus \"N(02147483647:2147483640)\" has 8 bits");
+    EXPECT_EQ(findMessage("ADD PORT ", "M(-3:4)"), "");
+    EXPECT_EQ(findMessage("ADD PIN INV ", "P(0:4294967296)"),
+              "misread: the bus \"P(0:4294967296)\" has an index of more than 32 bits");
+}
+
+TEST_F(CheckTest, AValueOfAUserTypeIsALiteralOfIt) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=User W x",
+        "SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=SYN"});
+    const auto isWrong = [this](const char* type, const char* value) {
+        Do({("SET COMPONENT ATTRIBUTE USERTYPE INV W " + std::string(type)).c_str()});
+        model_.GetComponent("INV")->GetAttr("W")->SetValue(value);
+        const Findings found = Run(Check::Targets::Vhdl());
+        return std::any_of(found.begin(), found.end(), [](const Finding& finding) {
+            return finding.rule->name == "user-value";
+        });
+    };
+    EXPECT_TRUE(isWrong("bit_vector", "\"text\""));
+    EXPECT_TRUE(isWrong("bit_vector", "\"0X\""));
+    EXPECT_FALSE(isWrong("bit_vector", "\"0110\""));
+    EXPECT_TRUE(isWrong("std_logic_vector", "\"0x\""));
+    EXPECT_FALSE(isWrong("std_logic_vector", "\"0XZ-\""));
+    EXPECT_TRUE(isWrong("std_logic", "'x'"));
+    EXPECT_FALSE(isWrong("std_logic", "'X'"));
+    EXPECT_FALSE(isWrong("character", "'x'"));
+}
+
+TEST_F(CheckTest, CommentsHideWhatFollowsFromSynthesis) {
+    Do({"ADD NOTES synthesis translate_off"});
+    EXPECT_EQ(Find("directive-comment").verdicts.Get(Check::Target::Ghdl), Verdict::Misreads);
+    Do({"ADD NOTES pragma translate_off"});
+    const Findings found = Run(Check::Targets::Vhdl());
+    EXPECT_EQ(std::count_if(
+                  found.begin(), found.end(),
+                  [](const Finding& finding) { return finding.rule->name == "directive-comment"; }),
+              2);
 }
 
 TEST_F(CheckTest, ChangesNothing) {

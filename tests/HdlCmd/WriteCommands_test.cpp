@@ -171,6 +171,16 @@ TEST_P(WriteCommands, AFullDiskIsRecorded) {
     EXPECT_EQ(script_.GetModel().GetWriteError(), ENOSPC);
 }
 
+TEST_P(WriteCommands, ALegalNetlistIsWrittenWhereTheOptionsAskForIt) {
+    script_.Run("ADD PORT begin Input");
+    script_.GetOptions().legal = true;
+    Write("legal");
+    EXPECT_NE(Read("legal").find("begin_"), std::string::npos);
+    script_.GetOptions().legal = false;
+    Write("literal");
+    EXPECT_EQ(Read("literal").find("begin_"), std::string::npos);
+}
+
 TEST_P(WriteCommands, TheFileIsClosedWhenTheCommandEnds) {
     Write("out");
     const int before = Support::CountOpenFiles();

@@ -342,6 +342,20 @@ TEST(EngineModels, DestructionDeletesManyModelsWithDesigns) {
     EXPECT_EQ(endedRemovers, Models) << "each model has ended, with the commands that it keeps";
 }
 
+TEST(EngineModels, ThreadsAreThoseOfAllModels) {
+    Engine engine;
+    engine.CreateAndAddModel("first", "");
+    EXPECT_EQ(engine.GetThreads(), 1U);
+    EXPECT_EQ(engine.GetModel("first")->GetOptions()->threads, 1U);
+    engine.SetThreads(3);
+    engine.CreateAndAddModel("second", "");
+    EXPECT_EQ(engine.GetThreads(), 3U);
+    EXPECT_EQ(engine.GetModel("first")->GetOptions()->threads, 3U);
+    EXPECT_EQ(engine.GetModel("second")->GetOptions()->threads, 3U);
+    const Engine taken(std::move(engine));
+    EXPECT_EQ(taken.GetThreads(), 3U);
+}
+
 TEST(EngineModels, AnEngineIsNotCopied) {
     EXPECT_FALSE(std::is_copy_constructible_v<Engine>);
     EXPECT_FALSE(std::is_copy_assignable_v<Engine>);

@@ -1,4 +1,5 @@
 // Objects that end, move and change in every order: no list, pin or map may ever name a dead one.
+#include "Orn_Hdl/Commands.h"
 #include "Orn_Hdl/Model.h"
 
 #include "Support/Names.h"
@@ -178,6 +179,21 @@ TEST(Lifetime, AForeignSignalOnABusMayEndFirst) {
     for (Signal* part : bus.GetBusSliceIterator()) {
         ADD_FAILURE() << "a dead part, " << part;
     }
+}
+
+TEST(Lifetime, AForeignSignalOnABusThatWasWidenedMayEndFirst) {
+    CommandFactory factory;
+    Model model(&factory);
+    model.ConnectSignals("A", "D(3:0)");
+    const Bus* const narrow = model.GetNetlist()->GetParentBus("D");
+    auto scalar = std::make_unique<ScalarSignal>("N");
+    model.GetNetlist()->GetParentBus("D")->AddBusSlice(scalar.get());
+    model.ConnectSignals("B", "D(7:0)");
+    const Bus* const wide = model.GetNetlist()->GetParentBus("D");
+    ASSERT_NE(wide, narrow);
+    EXPECT_EQ(NamesOf(wide->GetBusSliceIterator()), (Names{"D(3:0)", "N"}));
+    scalar.reset();
+    EXPECT_EQ(NamesOf(wide->GetBusSliceIterator()), Names{"D(3:0)"});
 }
 
 TEST(Lifetime, ACompoundAndItsMembersMayEndInAnyOrder) {

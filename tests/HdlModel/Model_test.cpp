@@ -518,6 +518,9 @@ TEST_F(ModelTest, FilesOfCommandsThatCannotBeReadAreFalse) {
     EXPECT_FALSE(model_.Read((folder / "missing").c_str()));
     EXPECT_FALSE(model_.Read(folder.GetPath().c_str())) << "a folder";
     EXPECT_FALSE(model_.Read(nullptr));
+    model_.SetModifiedFlag(true);
+    EXPECT_FALSE(model_.Read((folder / "missing").c_str()));
+    EXPECT_FALSE(model_.IsModified());
     EXPECT_EQ(Support::CountOpenFiles(), before);
 }
 

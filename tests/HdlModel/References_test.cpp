@@ -29,6 +29,13 @@ struct Alias {
     static void Drop(Class& by, Signal& named) { by.Disconnect(&named); }
     static Iterator<Signal*> Get(const Class& by) { return by.GetSignalIterator(); }
 };
+struct AliasOfBus {
+    using Class = Bus;
+    static std::unique_ptr<Class> Make() { return std::make_unique<Class>("D(7:0)"); }
+    static void Name(Class& by, Signal& named) { by.Connect(&named); }
+    static void Drop(Class& by, Signal& named) { by.Disconnect(&named); }
+    static Iterator<Signal*> Get(const Class& by) { return by.GetSignalIterator(); }
+};
 struct Slice {
     using Class = Bus;
     static std::unique_ptr<Class> Make() { return std::make_unique<Class>("D(7:0)"); }
@@ -64,7 +71,7 @@ protected:
     bool IsEmpty() const { return Way::Get(*by_).IsAtEnd(); }
 };
 
-using Ways = testing::Types<Alias, Slice, Member>;
+using Ways = testing::Types<Alias, AliasOfBus, Slice, Member>;
 TYPED_TEST_SUITE(References, Ways);
 
 TYPED_TEST(References, NameASignalOnce) {

@@ -169,6 +169,22 @@ TEST_F(LegalNetlistTest, ConstantsGetTheirBits) {
     ExpectInBoth("assign G = 8'b00000101;", "G(7 downto 0) <= \"00000101\";");
 }
 
+TEST_F(LegalNetlistTest, GenericsGetAsManyBitsAsTheirLengthSays) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=BitVector INIT 6:H:05",
+        "SET COMPONENT ATTRIBUTE OPTION INV INIT -GENERIC=SYN"});
+    ExpectInBoth("6'b000101", "INIT => b\"000101\"");
+    model_.GetComponent("INV")->GetAttr("INIT")->SetValue("4:H:A5");
+    EXPECT_EQ(FindErrors(), std::vector<std::string>{"constant-length"});
+    model_.GetComponent("INV")->GetAttr("INIT")->SetValue("-4:H:5");
+    EXPECT_EQ(FindErrors(), std::vector<std::string>{"constant-length"});
+}
+
+TEST_F(LegalNetlistTest, VectorsOfAttributesThatDoNotFitAreTexts) {
+    Do({"USE ATTRTYPE true", "ADD SIGNAL ATTRIBUTE A -TYPE=BitVector TAG 4:H:A5",
+        "SET SIGNAL ATTRIBUTE OPTION A TAG -SYNATTR=ASSIGN"});
+    ExpectInBoth("TAG", "attribute TAG of A : signal is \"A5\"");
+}
+
 TEST_F(LegalNetlistTest, ConstantWithTwoMeaningsIsRefused) {
     Do({"ADD PORT D(7:0) output", "ASSIGN CONSTANT D(7:0) 10"});
     const std::vector<std::string> errors = FindErrors();
@@ -262,6 +278,37 @@ TEST_F(LegalNetlistTest, ClausesAreMended) {
     EXPECT_NE(text.find("library ieee;\nuse ieee.numeric_std.all;\nuse ieee.std_logic_1164.all;\n"),
               std::string::npos)
         << text;
+}
+
+TEST_F(LegalNetlistTest, LegalClausesStay) {
+    // The default library comes with clauses of its own, and a clause may stand twice.
+    Do({"ADD LIBRARY ieee,ieee", "ADD USE LIBRARY ieee.numeric_std.all", "ADD SIGNAL begin"});
+    const std::string renamed = WriteLegally(Language::Vhdl);
+    EXPECT_NE(renamed.find("library ieee,ieee;\n"), std::string::npos) << renamed;
+    Do({"ADD LIBRARY 2x"});
+    const std::string mended = WriteLegally(Language::Vhdl);
+    EXPECT_NE(mended.find("library ieee;\nuse"), std::string::npos) << mended;
+    EXPECT_EQ(mended.find("ieee,"), std::string::npos) << mended;
+}
+
+TEST_F(LegalNetlistTest, ANameThatCannotBeEscapedIsReplaced) {
+    model_.GetOptions()->escapeNames = true;
+    Do({"ADD SIGNAL x\x01y", "CONNECT SIGNAL x\x01y A"});
+    EXPECT_EQ(NameOfSignal("x\x01y"), "x_y");
+}
+
+TEST_F(LegalNetlistTest, ANewNameIsNoneOfAComponent) {
+    Do({"ADD COMPONENT begin_1", "ADD PIN begin_1 I input", "ADD INSTANCE begin_1 U2",
+        "ADD SIGNAL begin", "CONNECT SIGNAL begin U2.I", "CONNECT SIGNAL begin A"});
+    EXPECT_EQ(NameOfSignal("begin"), "begin_2");
+}
+
+TEST_F(LegalNetlistTest, AQuotedTextOfAUsersTypeLosesItsQuotes) {
+    Do({"ADD INSTANCE ATTRIBUTE U1 -TYPE=User DELAY \"\\\"1 ns\\\"\"",
+        "SET INSTANCE ATTRIBUTE USERTYPE U1 DELAY string",
+        "SET INSTANCE ATTRIBUTE OPTION U1 DELAY -SYNATTR=ASSIGN", "ADD SIGNAL begin"});
+    const std::string text = WriteLegally(Language::Vhdl);
+    EXPECT_NE(text.find("attribute DELAY of U1 : label is \"1 ns\";"), std::string::npos) << text;
 }
 
 TEST_F(LegalNetlistTest, WriteCommandLeavesTheFileAlone) {

@@ -26,7 +26,8 @@ TEST(Exception, TellsWhereItWasRaisedAndWhatHappened) {
 
 TEST(Exception, ReportHoldsEverything) {
     const std::string report(MakeException().report().GetView());
-    for (const char* part : {"DesignEntry", "../s/HdlModel", "42", "Invalid Name.\n"}) {
+    for (const char* part :
+         {"DesignEntry", "../s/HdlModel", "$Revision: 1.8 $", "42", "Invalid Name.\n"}) {
         EXPECT_NE(report.find(part), std::string::npos) << part << " in " << report;
     }
 }

@@ -8,7 +8,6 @@
 #include <cerrno>
 #include <fcntl.h>
 #include <filesystem>
-#include <iterator>
 #include <string>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -147,13 +146,19 @@ TEST_F(Below, AClosedFileKeepsNoFolderOpen) {
 }
 
 TEST_F(Below, AFolderThatOpensAnotherClosesTheFormer) {
-    const auto countDescriptors = [] {
-        const fs::directory_iterator all("/proc/self/fd");
-        return std::distance(begin(all), end(all));
-    };
-    const auto before = countDescriptors();
+    const int before = Support::CountOpenFiles();
     EXPECT_EQ(folder_.Open((base_ / "out").c_str()), 0);
-    EXPECT_EQ(countDescriptors(), before);
+    EXPECT_EQ(Support::CountOpenFiles(), before);
+}
+
+TEST_F(Below, ADestroyedFolderIsClosed) {
+    const int before = Support::CountOpenFiles();
+    {
+        Port::Folder folder;
+        EXPECT_EQ(folder.Open((base_ / "out").c_str()), 0);
+        EXPECT_EQ(Support::CountOpenFiles(), before + 1);
+    }
+    EXPECT_EQ(Support::CountOpenFiles(), before);
 }
 
 } // namespace

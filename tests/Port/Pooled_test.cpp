@@ -24,6 +24,10 @@ struct alignas(64) Aligned : Port::Pooled<Port::Pool::Commands> {
     int value = 7;
 };
 
+struct alignas(16) Wide : Port::Pooled<Port::Pool::DesignObjects> {
+    int value = 7;
+};
+
 bool IsAligned(const void* address, std::size_t alignment) {
     return reinterpret_cast<std::uintptr_t>(address) % alignment == 0;
 }
@@ -50,6 +54,14 @@ TEST(Pooled, KeepsALargerAlignment) {
     EXPECT_TRUE(IsAligned(one.get(), 64));
     EXPECT_TRUE(IsAligned(two.get(), 64));
     EXPECT_EQ(one->value + two->value, 14);
+}
+
+TEST(Pooled, AlignsWhatFollowsASmallerObject) {
+    for (int i = 0; i < 4; ++i) {
+        const std::unique_ptr<Small> small(new Small(i));
+        const std::unique_ptr<Wide> wide(new Wide);
+        EXPECT_TRUE(IsAligned(wide.get(), 16));
+    }
 }
 
 TEST(Pooled, BuildsInAGivenPlace) {

@@ -8,6 +8,8 @@
 
 #include <ostream>
 #include <string>
+#include <sys/resource.h>
+#include <unistd.h>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -359,10 +361,81 @@ TEST_F(ProofTest, ABusMayBeAnAliasOfNothingInVerilog) {
               "the netlist has 1 bits assigned to 4, the design x(3:0) = A");
 }
 
+TEST_F(ProofTest, OfLongConcatenationsTheFirstPartsAreShown) {
+    Do({"ADD SIGNAL v(8:0)", "CONNECT SIGNAL v(8:0) A,B,A,B,A,B,A,B,A"});
+    Write();
+    std::string text = ReadWholeFile(GetFile());
+    const std::size_t last = text.find("B, A}");
+    ASSERT_NE(last, std::string::npos) << text;
+    WriteWholeFile(GetFile(), text.replace(last, 5, "B, B}"));
+    ASSERT_FALSE(Compare().empty());
+    EXPECT_EQ(Compare().front().message,
+              "the netlist has v[8:0] = A, B, A, B, A, B, A, B, ..., the design v(8:0) = "
+              "A,B,A,B,A,B,A,B,A");
+}
+
 TEST_F(ProofTest, TwoSignalsOfOneNameAreFound) {
     model_.GetSignal("T")->SetName("n1");
     Write();
     EXPECT_FALSE(Compare().empty());
+}
+
+TEST_F(ProofTest, NegativeNumbersAndEscapedNamesOfParametersAreRead) {
+    Do({"ADD MODULE ATTRIBUTE -TYPE=Float RATE -3.25",
+        "SET MODULE ATTRIBUTE OPTION RATE -GENERIC=SYN",
+        "ADD MODULE ATTRIBUTE -TYPE=Integer SHIFT -4",
+        "SET MODULE ATTRIBUTE OPTION SHIFT -GENERIC=SYN",
+        "ADD MODULE ATTRIBUTE -TYPE=Integer \"\\\\a+b \" 5",
+        "SET MODULE ATTRIBUTE OPTION \"\\\\a+b \" -GENERIC=SYN",
+        "ADD SIGNAL ATTRIBUTE A \"\\\\n+m \" yes",
+        "SET SIGNAL ATTRIBUTE OPTION A \"\\\\n+m \" -SYNATTR=ASSIGN"});
+    EXPECT_EQ(FindFirst("RATE = -3.25", "RATE = -3.250"), "");
+    EXPECT_EQ(FindFirst("RATE = -3.25", "RATE = 3.25"),
+              "the parameter RATE of the module has the value \"3.25\", in the design \"-3.25\"");
+    EXPECT_EQ(FindFirst("SHIFT = -4", "SHIFT = -5"),
+              "the parameter SHIFT of the module has the value \"-5\", in the design \"-4\"");
+    EXPECT_EQ(FindFirst("\\a+b ", "\\a+b  "), "");
+    EXPECT_NE(FindFirst("\\a+b ", "\\a+c "), "");
+    EXPECT_NE(FindFirst("\\n+m ", "\\n+k "), "");
+}
+
+TEST_F(ProofTest, TheRuleThatTellsOfADifferenceIsNamed) {
+    const auto findRule = [this](std::initializer_list<const char*> lines) {
+        Model model(&factory_);
+        model.GetOptions()->writeHeader = false;
+        for (const char* line : lines) {
+            model.Execute(line);
+        }
+        const std::string file = folder_ / "other.vhd";
+        model.ExecuteLine("WRITE VHDL " + file);
+        std::string rules;
+        for (const Proof::Difference& difference :
+             Proof::Compare(file, Language::Vhdl, *model.GetNetlist(), *model.GetOptions())) {
+            rules.append(difference.rule == nullptr ? "none" : difference.rule->name).append(" ");
+        }
+        return rules.substr(0, rules.find(' '));
+    };
+    // A bus and a scalar signal of the same name.
+    EXPECT_EQ(findRule({"ADD SIGNAL N(7:4)", "ADD SIGNAL N", "ADD PORT A input"}), "name-clash");
+    // An instance and the signal that a write makes for an open pin.
+    EXPECT_EQ(findRule({"ADD PORT A input", "SET OPEN PIN false", "ADD COMPONENT INV",
+                        "ADD PIN INV I input", "ADD INSTANCE INV U1",
+                        "ADD INSTANCE INV U1_I_openSignal", "CONNECT SIGNAL A U1_I_openSignal.I"}),
+              "name-clash");
+    // An instance and the signal that a write makes for a port that is read.
+    EXPECT_EQ(findRule({"ADD PORT Y output", "ADD COMPONENT INV", "ADD PIN INV I input",
+                        "ADD INSTANCE INV Y_DUMMY", "CONNECT SIGNAL Y Y_DUMMY.I"}),
+              "name-clash");
+    EXPECT_EQ(findRule({"ADD PORT W(99999999999:99999999990) input"}), "wide-bus");
+    EXPECT_EQ(findRule({"ADD PORT W(0:99999999999999999999) input"}), "wide-bus");
+    EXPECT_EQ(findRule({"ADD PORT Y(3:0) output", "ASSIGN CONSTANT Y(3:0) -4:B:1010"}),
+              "constant-length");
+    EXPECT_EQ(findRule({"ADD PORT A input", "USE ATTRTYPE true",
+                        "ADD SIGNAL ATTRIBUTE A -TYPE=BitVector TAG 4:H:A5",
+                        "SET SIGNAL ATTRIBUTE OPTION A TAG -SYNATTR=ASSIGN"}),
+              "constant-length");
+    EXPECT_EQ(findRule({"ADD PORT A input", "ADD SIGNAL N", "ADD NOTES synthesis translate_off"}),
+              "directive-comment");
 }
 
 TEST_F(ProofTest, AFileThatIsNotThereIsAnException) {
@@ -406,6 +479,45 @@ TEST_F(ProofTest, AppendedTextIsProvenFirst) {
     Do({"ADD SIGNAL L(3:0)", "ASSIGN CONSTANT L(3:0) 1010"});
     EXPECT_THROW(model_.ExecuteLine(append), ProofException);
     EXPECT_EQ(ReadWholeFile(GetFile()), written);
+}
+
+/// As long as it lives, the program can open no file.
+class NoMoreFiles {
+public:
+    NoMoreFiles() {
+        getrlimit(RLIMIT_NOFILE, &former_);
+        const int firstFree = dup(0);
+        close(firstFree);
+        const rlimit none = {static_cast<rlim_t>(firstFree), former_.rlim_max};
+        setrlimit(RLIMIT_NOFILE, &none);
+    }
+    NoMoreFiles(const NoMoreFiles&) = delete;
+    NoMoreFiles& operator=(const NoMoreFiles&) = delete;
+    ~NoMoreFiles() { setrlimit(RLIMIT_NOFILE, &former_); }
+
+private:
+    rlimit former_;
+};
+
+TEST_F(ProofTest, WithoutATemporaryFileNothingIsAppended) {
+    WriteWholeFile(GetFile(), "// former\n");
+    TextFileOutStream out(GetFile().c_str(), TextFileOutStream::Append);
+    ASSERT_TRUE(out.IsOpen());
+    const auto write = [this, &out] {
+        Proof::Write(
+            out, GetFile().c_str(), Language::Verilog, [](OutStream& stream) { stream << "text"; },
+            [this] {
+                return Proof::Written{*model_.GetNetlist(), *model_.GetOptions()};
+            });
+    };
+    std::string failure;
+    {
+        const NoMoreFiles limit;
+        failure = FailureOf(write);
+    }
+    EXPECT_NE(failure.find("A temporary file for the proof cannot be used"), std::string::npos);
+    out.Close();
+    EXPECT_EQ(ReadWholeFile(GetFile()), "// former\n");
 }
 
 } // namespace

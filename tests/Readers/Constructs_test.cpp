@@ -119,6 +119,13 @@ constexpr Accepted Table[] = {
      "2.5;\n"
      "wire [1:0] v;\nwire [7:0] w;\nassign v = 2'b10;\n"
      "REG u (.C(), .D(w[3:0]), .Q());\ndefparam u.W = 7;\nendmodule\n"},
+    {"quotients in a range, exponents of real numbers",
+     "module m #(parameter A = 1.25e1, B = 25.0e-1, C = 3e2)(); wire [8/2-1:9%4] w; endmodule",
+     "module m();\nparameter A = 12.5;\nparameter B = 2.50;\nparameter C = 300.0;\nwire [3:1] w;\n"
+     "endmodule\n"},
+    {"a repetition as often as a local parameter says, behind a net",
+     "module m; localparam P = 2; wire a, b; wire [2:0] v; assign v = {a, {P{b}}}; endmodule",
+     "module m();\nwire a;\nwire b;\nwire [2:0] v;\nassign v[2:0] = {a, b, b};\nendmodule\n"},
     {"escaped names",
      "module \\m ; wire \\a , \\b.c , \\d[3] , \\wire ; wire [1:0] \\e/f ; INV \\u.1 (\\a , \\b.c "
      ");\n"

@@ -47,6 +47,23 @@ TEST(VerilogAttributes, OfTheStandardHaveTheTypeOfTheirValue) {
     EXPECT_EQ(AttributesOf(text.model.GetInstance("p")), "");
 }
 
+TEST(VerilogAttributes, ThatTookThePlaceOfOthersLeaveTheirHolder) {
+    TextReader text;
+    text.Read("module m; (* keep, n = 1, n = \"text\" *) wire w; endmodule");
+    Orn_Hdl::Signal* const signal = text.model.GetSignal("w");
+    EXPECT_EQ(AttributesOf(signal), "keep Integer 1 NONE ASSIGN\nn String text NONE ASSIGN\n");
+    delete signal->GetAttr("n");
+    EXPECT_EQ(signal->GetAttr("n"), nullptr);
+    EXPECT_EQ(AttributesOf(signal), "keep Integer 1 NONE ASSIGN\n");
+}
+
+TEST(VerilogAttributes, OfAModuleAreNotThoseOfTheModuleInFront) {
+    TextReader text;
+    text.reader.SetTop("m");
+    text.Read("(* first *) module other; endmodule\n(* second *) module m; endmodule");
+    EXPECT_EQ(AttributesOf(text.model.GetNetlist()), "second Integer 1 NONE ASSIGN\n");
+}
+
 TEST(VerilogAttributes, MayBeOfAnEscapedName) {
     TextReader text;
     text.Read("module m(input a);\n"

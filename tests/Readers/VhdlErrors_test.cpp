@@ -332,6 +332,27 @@ constexpr Refused Table[] = {
      "end architecture a;\n",
      "top.vhd:4:12: error: the entity \"XYZ\" is not declared: a library file has to say "
      "which ports it has"},
+    {"undeclared cells",
+     "entity m is  end entity m;\n"
+     "architecture a of m is signal a, b : std_logic;\n"
+     "begin\n"
+     "u1 : entity work.XYZ port map (a);\n"
+     "u2 : entity work.xyz port map (a);\n"
+     "u3 : entity work.ABC port map (a);\n"
+     "u4 : DEF port map (a);\n"
+     "end architecture a;\n",
+     "top.vhd:4:13: error: the cells \"XYZ\", \"ABC\", \"DEF\" are not declared: a library file "
+     "has "
+     "to say which ports they have"},
+    {"undeclared components",
+     "entity m is  end entity m;\n"
+     "architecture a of m is signal a, b : std_logic;\n"
+     "begin\n"
+     "u1 : XYZ port map (a);\n"
+     "u2 : ABC port map (a);\n"
+     "end architecture a;\n",
+     "top.vhd:4:6: error: the cells \"XYZ\", \"ABC\" are not declared: declare them, or give a "
+     "library file that does"},
     {"undeclared configuration",
      "entity m is  end entity m;\n"
      "architecture a of m is signal a, b : std_logic; signal v, w : std_logic_vector(3 "

@@ -66,6 +66,37 @@ TEST(VhdlFiles, TheTopAndItsArchitectureCanBeChosen) {
               "top.vhd:1:8: error: the entity \"e\" has no architecture \"three\" in this file");
 }
 
+TEST(VhdlFiles, AnArchitectureMayNameItsEntityInOtherLetterCase) {
+    VhdlTextReader text;
+    text.Read("entity top is port (a : in bit); end;\n" + ArchitectureOf("TOP", "rtl", ""));
+    EXPECT_NE(text.model.GetSignal("a"), nullptr);
+}
+
+TEST(VhdlFiles, AGenericThatIsATypeMayBeTheLast) {
+    VhdlTextReader text;
+    text.Put("box.vhd", "package boxes is component BOX generic (N : integer := 1; type T); "
+                        "port (I : in bit); end component; end package;\n");
+    text.reader.AddLibrary(text.GetPath("box.vhd").c_str());
+    text.Read("entity top is port (a : in bit); end;\n" +
+              ArchitectureOf("top", "rtl", "u : BOX port map (a);"));
+    EXPECT_NE(text.model.GetInstance("u"), nullptr);
+}
+
+TEST(VhdlFiles, OtherGenericsThanThosePortsDependOnCanBeGiven) {
+    VhdlTextReader text;
+    text.Put("box.vhd", "entity BOX is generic (W : integer := 4; NAME : string := \"x\"); "
+                        "port (I : in bit_vector(W - 1 downto 0)); end;\n");
+    text.reader.AddLibrary(text.GetPath("box.vhd").c_str());
+    const auto design = [](const std::string& generics) {
+        return "entity top is port (a : in bit_vector(3 downto 0)); end;\n" +
+               ArchitectureOf("top", "rtl",
+                              "u : entity work.BOX generic map (" + generics + ") port map (a);");
+    };
+    text.Read(design("W => 4, NAME => \"y\""));
+    EXPECT_EQ(text.model.GetInstance("u")->GetAttr("NAME")->GetValueString(), "y");
+    EXPECT_NE(text.GetFailure(design("W => 5")).find("depends on this generic"), std::string::npos);
+}
+
 TEST(VhdlFiles, WhatBehavesElsewhereIsPassedOver) {
     VhdlTextReader text;
     text.Put("lib.vhd", R"(

@@ -430,6 +430,57 @@ TEST(FailingAllocation, AModelThatIsNotReadStaysAsItWas) {
     EXPECT_EQ(Support::CountOpenFiles(), openFiles);
 }
 
+/// Reads numbered lines; after some allocations one fails, and reading goes on. \return whether one
+/// did fail.
+bool ReadOn(Orn_Hdl::Model& model, const std::string& file, int lines, long allocations) {
+    int failed = 0;
+    int last = -1;
+    int given = 0;
+    Orn_Hdl::CommandReader reader(model);
+    EXPECT_TRUE(reader.Open(file.c_str()));
+    allowed = allocations;
+    for (bool more = true; more;) {
+        try {
+            const Orn_Hdl::StringArray* const words = reader.Next();
+            more = words != nullptr;
+            if (more) {
+                const int number = std::atoi(std::string(words->GetView(1)).c_str());
+                EXPECT_GT(number, last);
+                last = number;
+                ++given;
+            }
+        } catch (const std::bad_alloc&) {
+            ++failed;
+        }
+    }
+    allowed = -1;
+    EXPECT_LE(failed, 1);
+    EXPECT_GE(given, lines - failed);
+    EXPECT_EQ(reader.GetError(), 0);
+    return failed > 0;
+}
+
+TEST(FailingAllocation, AFileThatIsReadOnTwoProcessorsGoesOn) {
+    constexpr int Count = 10000;
+    const Support::TemporaryFolder folder;
+    const std::string file = folder / "lines.cmd";
+    std::string text;
+    for (int i = 0; i < Count; ++i) {
+        text += "NOOP " + std::to_string(i) + " a name that finds no room in a small string\n";
+    }
+    Support::WriteWholeFile(file, text);
+    Orn_Hdl::CommandFactory factory;
+    Orn_Hdl::Model model(&factory);
+    model.GetOptions()->threads = 2;
+    // Each of the first, and some of the thousands that the lines need.
+    bool failed = true;
+    for (long count = 0; failed; count += count < 150 ? 1 : 501) {
+        const long before = alive;
+        failed = ReadOn(model, file, Count, count);
+        ASSERT_EQ(alive, before) << "allocation " << count << " failed, and something leaked";
+    }
+}
+
 TEST(FailingAllocation, AnyOneMayFail) {
     const Support::TemporaryFolder folder;
     const std::string file = folder / "netlist";

@@ -62,10 +62,10 @@ class Pass : public NetlistPass {
 public:
     Pass(OutStream& out, Netlist& netlist, const HdlOptions& options)
         : NetlistPass(Language::Verilog, out, netlist, options) {}
-    using NetlistPass::ForEachInstance;
+    using NetlistPass::WriteEachInstance;
 };
 
-TEST(ForEachInstance, VisitsEachOnceInOrderInDesignsOfAnySize) {
+TEST(WriteEachInstance, VisitsEachOnceInOrderInDesignsOfAnySize) {
     for (const int count : {0, 1, 3, 4, 5, 12, 13, 40}) {
         Netlist netlist;
         Component* const component = Support::MakeBuffer().release();
@@ -78,8 +78,10 @@ TEST(ForEachInstance, VisitsEachOnceInOrderInDesignsOfAnySize) {
         Names visited;
         TextMemOutStream out;
         const HdlOptions options;
-        Pass(out, netlist, options).ForEachInstance([&](const Instance& instance) {
-            visited.push_back(Support::Text(instance.GetName()));
+        Pass(out, netlist, options).WriteEachInstance([&](OutStream&) {
+            return [&](const Instance& instance) {
+                visited.push_back(Support::Text(instance.GetName()));
+            };
         });
         EXPECT_EQ(visited, expected);
     }

@@ -30,6 +30,7 @@ class Tally:
     def __init__(self) -> None:
         self.passed = 0
         self.failed = 0
+        self.refused = 0
 
     def check(self, what: str, judge_: Callable[..., Result],
               *arguments: Any) -> Result | bool:
@@ -43,9 +44,15 @@ class Tally:
         self.passed += 1
         return True if answer is None else answer
 
+    def refuse(self, what: str, message: str) -> None:
+        """Counts what cannot be checked because orn-hdl refuses it with the right message."""
+        self.refused += 1
+        print(f"refused {what}: {message}", flush=True)
+
     def close(self) -> int:
         """Prints the closing line; returns the exit status."""
-        print(f"{self.passed} passed, {self.failed} failed")
+        refused = f", {self.refused} refused with a reason" if self.refused else ""
+        print(f"{self.passed} passed, {self.failed} failed{refused}")
         return 1 if self.failed else 0
 
 

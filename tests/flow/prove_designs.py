@@ -4,14 +4,14 @@
     prove_designs.py --tool build/release/tools/orn-hdl/orn-hdl --seeds 1-10000
 
 Each design is written twice. With --legal, every netlist has to be proven, or nothing may be written
-because of a rule that no netlist can mend. As it stands, a netlist that is not proven has to be one in
-which `orn-hdl check` finds something for its language. The exit status tells whether all of that holds.
+because of a rule that no netlist can mend. As it stands, a netlist that is not proven has to be one of
+which a rule of `orn-hdl check` tells: the message names it. The exit status tells whether all of that
+holds.
 """
 
 from __future__ import annotations
 
 import argparse
-import json
 import os
 import subprocess
 import sys
@@ -25,8 +25,7 @@ from check_designs import generate
 RULES = Path(__file__).resolve().parents[1] / "check" / "rules"
 UNPROVEN = 4
 LANGUAGES = {"verilog": "v", "vhdl": "vhd"}
-TARGETS = {"verilog": "verilog-1995,verilog-2005,systemverilog-2017,icarus,verilator,yosys",
-           "vhdl": "vhdl-93,vhdl-2008,ghdl"}
+RULE_IS_NAMED = "note: what helps: "
 
 
 def run(tool: Path, work: Path, *options: str) -> tuple[int, str]:
@@ -34,13 +33,6 @@ def run(tool: Path, work: Path, *options: str) -> tuple[int, str]:
                            "--no-warn", "all", *options, "X.cmd"],
                           cwd=work, capture_output=True, timeout=120)
     return done.returncode, done.stderr.decode("latin-1")
-
-
-def has_findings(tool: Path, work: Path, language: str) -> bool:
-    done = subprocess.run([tool, "check", "--format", "json", "--target", TARGETS[language],
-                           "X.cmd"],
-                          cwd=work, capture_output=True, timeout=120)
-    return bool(json.loads(done.stdout.decode() or '{"findings": []}')["findings"])
 
 
 def without_failing_lines(tool: Path, work: Path, text: str) -> str:
@@ -79,11 +71,9 @@ def try_design(tool: Path, text: str, languages: list[str], names: str) -> tuple
                                  f"{'stays' if is_old else 'is gone'}")
                 elif status == 1 and not legal:
                     wrong.append(f"{what}: {complaint}")
-                elif status == UNPROVEN and (legal or not has_findings(tool, work, language)):
+                elif status == UNPROVEN and (legal or RULE_IS_NAMED not in complaint):
                     wrong.append(f"{what}: {complaint}")
                 counts[what, {0: "proven", 1: "refused", UNPROVEN: "not proven"}.get(status, "")] += 1
-                if status == UNPROVEN and not legal:
-                    counts[what, "with its rule" if "what helps" in complaint else "without"] += 1
     return counts, wrong
 
 

@@ -155,8 +155,11 @@ def test_options() -> None:
     options.net_case = "upper"
     assert options.legal and options.libraries == ["cells", "ieee2"] and options.device == "xc1"
     assert options.synthesis == "SYNOPSYS"
+    assert options.threads == 1
+    options.threads = 2
+    assert options.threads == 2
     assert (options.net_case, options.instance_case, options.component_case) == ("upper", "keep", "keep")
-    for name, value in (("synthesis", "NONE"), ("net_case", "mixed")):
+    for name, value in (("synthesis", "NONE"), ("net_case", "mixed"), ("threads", -1)):
         with pytest.raises(ValueError):
             setattr(options, name, value)
     with pytest.raises(AttributeError):
@@ -169,7 +172,7 @@ def test_every_option_can_be_set() -> None:
         if name.startswith("_") or name == "synthesis" or name.endswith("_case"):
             continue
         value = getattr(d.options, name)
-        other = {bool: not value, str: "text", list: ["text"]}[type(value)]
+        other = {bool: not value, int: 2, str: "text", list: ["text"]}[type(value)]
         setattr(d.options, name, other)
         assert getattr(d.options, name) == other
 

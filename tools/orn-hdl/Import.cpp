@@ -8,6 +8,7 @@
 #include "design/LegalDesign.h"
 #include "explain/FileKind.h"
 #include "explain/Syntax.h"
+#include "proof/Certificate.h"
 #include "proof/Differences.h"
 
 #include "Orn_Hdl/LegalNetlist.h"
@@ -82,6 +83,33 @@ DesignModel MakeDesignModel(Orn_Hdl::Model& model, const ImportOptions& options,
                         const std::string& file) {
                 return ReportDifferences(differences, file, reporter);
             }};
+}
+
+/// Writes the netlists, and the certificate if there is to be one. An input is hashed first, since
+/// a netlist can take its place.
+Status WriteCertified(const std::vector<DesignModel>& models, const ImportOptions& options) {
+    Progress progress(false, options.file);
+    Certificate certificate(options.certificate);
+    if (!certificate.IsWanted()) {
+        return WriteDesign(models, options.outputs, progress, certificate);
+    }
+    Status status = certificate.AddInput(options.file);
+    for (const std::string& library : options.libraries) {
+        status = Worse(status, certificate.AddInput(library));
+    }
+    if (status == Status::Success) {
+        status = WriteDesign(models, options.outputs, progress, certificate);
+    }
+    return status == Status::Success ? certificate.Write() : status;
+}
+
+/// Whether a certificate can name what is read and written.
+bool HasOnlyFiles(const ImportOptions& options) {
+    const auto& files = options.outputs.files;
+    return options.file != "-" && !options.outputs.IsEmpty() &&
+           std::none_of(files.begin(), files.end(), [&](const auto& output) {
+               return output.second == "-" && options.outputs.folder.empty();
+           });
 }
 
 /// Whether the command file is a folder, for one file a module.
@@ -168,9 +196,7 @@ bool TellWhyNotLegal(const Orn_Hdl::LegalNetlist& legal, const std::string& file
 
 Status WriteNetlists(Orn_Hdl::Model& model, const ImportOptions& options,
                      Orn_Hdl::LegalNetlist* legal, Reporter& reporter) {
-    Progress progress(false, options.file);
-    return WriteDesign({MakeDesignModel(model, options, legal, reporter)}, options.outputs,
-                       progress);
+    return WriteCertified({MakeDesignModel(model, options, legal, reporter)}, options);
 }
 
 Status WriteNetlists(const std::vector<Orn_Hdl::Model*>& models, const ImportOptions& options,
@@ -194,8 +220,7 @@ Status WriteNetlists(const std::vector<Orn_Hdl::Model*>& models, const ImportOpt
         design.push_back(
             MakeDesignModel(*models[i], options, legal ? &legal->Get(i) : nullptr, reporter));
     }
-    Progress progress(false, options.file);
-    return WriteDesign(design, options.outputs, progress);
+    return WriteCertified(design, options);
 }
 
 Status ImportDesign(const ImportOptions& options) {
@@ -205,6 +230,10 @@ Status ImportDesign(const ImportOptions& options) {
         Complain(std::string(foreign) + (format == ImportFormat::Json
                                              ? " does not apply to a JSON netlist; see --help"
                                              : " applies to JSON netlists alone; see --help"));
+        return Status::Usage;
+    }
+    if (!options.certificate.empty() && !HasOnlyFiles(options)) {
+        Complain("a certificate is of files: name the netlist to read and those to write");
         return Status::Usage;
     }
     if (!options.cellModels.empty() && GetNameLanguages(options) == NameLanguages::Verilog) {

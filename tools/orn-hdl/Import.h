@@ -61,6 +61,10 @@ struct ImportOptions {
     bool legal = false;
     /// Read each netlist back and compare it with the design before it replaces its file.
     bool verify = false;
+    /// How many threads may work together; 0 is what the system gives.
+    unsigned threads = 0;
+    /// The file for the certificate of the netlists; empty for none.
+    std::string certificate;
     ReportOptions report;
 };
 

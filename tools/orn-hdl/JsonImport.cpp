@@ -99,6 +99,7 @@ Status WriteImported(const Netlists& netlists, const ImportOptions& options, Pro
     static Orn_Hdl::Engine* engine = nullptr;
     delete std::exchange(engine, nullptr); // From an earlier import.
     engine = new Orn_Hdl::Engine;
+    engine->SetThreads(options.threads);
     std::vector<Orn_Hdl::Model*> models;
     for (const ImportedNetlist& netlist : netlists) {
         engine->CreateAndAddModel(netlist.name.c_str(), options.file.c_str());

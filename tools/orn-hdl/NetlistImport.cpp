@@ -97,7 +97,7 @@ std::string DescribeIfOther(const std::string& name) {
 
 /// Adds what helps.
 void AddNotes(Diagnostic& diagnostic) {
-    if (diagnostic.message.find("a library file has to") != std::string::npos) {
+    if (diagnostic.message.find(" a library file ") != std::string::npos) {
         diagnostic.notes.push_back(
             {"-l FILE names a file that declares cells: Verilog, VHDL, Liberty or JSON"});
     }
@@ -360,6 +360,7 @@ Status Importer::ReadAndWrite() {
     }
     engine_.CreateAndAddModel("import", options_.file.c_str());
     model_ = engine_.GetModel("import");
+    model_->GetOptions()->threads = options_.threads;
     if (format_ == ImportFormat::Vhdl) {
         Orn_Hdl::VhdlReader reader;
         return Read(reader);

@@ -4,6 +4,7 @@
 #include "NetlistText.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Progress.h"
+#include "proof/Certificate.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -130,12 +131,16 @@ Status OutputFile::Commit() {
 }
 
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,
-                    Orn_Hdl::LegalNetlist* legal, const TellDifferences& tell) {
+                    Orn_Hdl::LegalNetlist* legal, const TellDifferences& tell,
+                    Certificate& certificate) {
     Status status = Status::Success;
     for (const auto& [language, file] : outputs.files) {
         try {
-            status = Worse(status,
-                           WriteOutput(model, legal, language, file, outputs.noHeader, progress));
+            Status written = WriteOutput(model, legal, language, file, outputs.noHeader, progress);
+            if (written == Status::Success && !file.empty() && certificate.IsWanted()) {
+                written = certificate.AddNetlist(file, language, GetWritten(model, legal).netlist);
+            }
+            status = Worse(status, written);
         } catch (const Orn_Hdl::ProofException& exception) {
             progress.Erase();
             status = Worse(

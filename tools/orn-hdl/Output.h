@@ -20,6 +20,7 @@ class Model;
 
 namespace Tool {
 
+class Certificate;
 class Progress;
 class TemporaryFile;
 
@@ -74,7 +75,9 @@ using TellDifferences = std::function<Status(
 /// \param legal the legal netlist of the model, without errors; null to write the design as it
 ///        stands.
 /// \param tell reports what the proof finds that the model's options ask for.
+/// \param certificate gets what was proven.
 Status WriteOutputs(Orn_Hdl::Model& model, const Outputs& outputs, Progress& progress,
-                    Orn_Hdl::LegalNetlist* legal, const TellDifferences& tell);
+                    Orn_Hdl::LegalNetlist* legal, const TellDifferences& tell,
+                    Certificate& certificate);
 
 } // namespace Tool

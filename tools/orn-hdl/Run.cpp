@@ -17,6 +17,7 @@
 
 #include <algorithm>
 #include <cstdint>
+#include <optional>
 #include <string_view>
 #include <system_error>
 #include <utility>
@@ -100,9 +101,20 @@ private:
 
     bool Certify(const Orn_Hdl::StringArray& words) {
         const bool isVerilog = Port::EqualIgnoringCase(words.GetView(1), "VERILOG");
-        const Status status = certificate_->AddNetlist(
-            std::string(model_.GetWrittenFileName().GetView()),
-            isVerilog ? Orn_Hdl::Language::Verilog : Orn_Hdl::Language::Vhdl, *model_.GetNetlist());
+        const auto language = isVerilog ? Orn_Hdl::Language::Verilog : Orn_Hdl::Language::Vhdl;
+        std::optional<Orn_Hdl::LegalNetlist> legal;
+        if (model_.GetOptions()->legal) {
+            legal.emplace(*model_.GetNetlist(), *model_.GetOptions());
+        }
+        // The command does not keep what it wrote in the design's place.
+        const bool isOther = legal && !legal->IsUnchanged();
+        if (isOther) {
+            Orn_Hdl::OutStream nothing(nullptr);
+            legal->Write(language, nothing);
+        }
+        const Status status =
+            certificate_->AddNetlist(std::string(model_.GetWrittenFileName().GetView()), language,
+                                     isOther ? legal->GetWrittenNetlist() : *model_.GetNetlist());
         status_ = Worse(status_, status);
         return status == Status::Success;
     }
@@ -215,7 +227,7 @@ namespace {
 
 /// Writes the outputs and the table of names, or tells why there is no legal netlist.
 Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOptions& options,
-                    std::uint64_t lines, CommandFile& file) {
+                    std::uint64_t lines, CommandFile& file, Certificate& certificate) {
     if (outputs.IsEmpty() && options.nameMap.empty()) {
         return Status::Success;
     }
@@ -229,7 +241,8 @@ Status WriteLegally(Orn_Hdl::Model& model, const Outputs& outputs, const RunOpti
     }
     Status status = nameMap.Flush();
     if (status == Status::Success) {
-        status = WriteOutputs(model, outputs, file.progress, &legal, TellOf(file, lines));
+        status =
+            WriteOutputs(model, outputs, file.progress, &legal, TellOf(file, lines), certificate);
     }
     return status == Status::Success ? nameMap.Commit() : status;
 }
@@ -243,18 +256,6 @@ Status WriteCommands(Orn_Hdl::Model& model, const std::string& file, CommandsOut
     const Status status = commands.Write(model);
     model.SetSourceFileName(source);
     return status;
-}
-
-/// Writes the certificate of the netlists of lines and of the command line.
-Status Certify(Orn_Hdl::Model& model, const Outputs& outputs, CommandFile& file,
-               Certificate& certificate) {
-    Status status = certificate.AddCommands(file.name, file.lines.GetSystemName());
-    for (const auto& [language, name] : outputs.files) {
-        if (!name.empty()) {
-            status = Worse(status, certificate.AddNetlist(name, language, *model.GetNetlist()));
-        }
-    }
-    return status == Status::Success ? certificate.Write() : status;
 }
 
 /// Replays the file of the options and writes its netlists.
@@ -285,16 +286,18 @@ Status ReplayAndWrite(Orn_Hdl::Model& model, CommandFile& file, const RunOptions
         }
     }
     const Status written =
-        options.legal
-            ? WriteLegally(model, outputs, options, replayed.lines, file)
-            : WriteOutputs(model, outputs, file.progress, nullptr, TellOf(file, replayed.lines));
+        options.legal ? WriteLegally(model, outputs, options, replayed.lines, file, certificate)
+                      : WriteOutputs(model, outputs, file.progress, nullptr,
+                                     TellOf(file, replayed.lines), certificate);
     status = Worse(status, written);
     if (written == Status::Success) {
         status = Worse(status, commands.Commit());
     }
-    return status == Status::Success && !options.certificate.empty()
-               ? Certify(model, outputs, file, certificate)
-               : status;
+    if (status != Status::Success || !certificate.IsWanted()) {
+        return status;
+    }
+    status = certificate.AddCommands(file.name, file.lines.GetSystemName());
+    return status == Status::Success ? certificate.Write() : status;
 }
 
 } // namespace
@@ -323,6 +326,7 @@ Status Run(const RunOptions& options) {
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";
     model.GetOptions()->verify = options.verify;
+    model.GetOptions()->threads = options.threads;
     const Status status = ReplayAndWrite(model, file, options);
     file.reporter.Finish(GetWarningRules());
     return status;

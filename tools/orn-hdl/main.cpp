@@ -143,6 +143,15 @@ void AddReport(CLI::App& command, Tool::ReportOptions& report) {
     AddColor(command, report);
 }
 
+void AddThreads(CLI::App& command, unsigned& threads) {
+    command
+        .add_option("--threads", threads,
+                    "Use up to N processors; 0, the default, is what the system gives, up to 8")
+        ->type_name("N")
+        ->envname("ORN_HDL_THREADS")
+        ->check(CLI::Range(0, 64));
+}
+
 /// Drops the warnings of a list of names with commas between them. \return what is wrong with it.
 std::string DropWarnings(const std::string& list, Tool::WarningOptions& warnings) {
     std::istringstream rest(list);
@@ -389,6 +398,7 @@ private:
             ->needs(legal);
         AddFile(command, "--name-map", run_.nameMap, "Write a table of old and new names")
             ->needs(legal);
+        AddThreads(command, run_.threads);
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
 
@@ -446,11 +456,15 @@ private:
                          "Import the attributes of cells and nets");
         command.add_flag("--comments", import_.comments, "Import the comments of objects");
         command.add_flag("--legal", import_.legal, "Write netlists that every tool takes");
-        command.add_flag("--verify", import_.verify,
-                         "Read each netlist back and compare it with the design");
+        CLI::Option* verify = command.add_flag(
+            "--verify", import_.verify, "Read each netlist back and compare it with the design");
+        AddFile(command, "--certificate", import_.certificate,
+                "Write what was proven, with the SHA-256 of the files, as JSON")
+            ->needs(verify);
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddFile(command, "--write-cells", import_.cellModels,
                 "Write simulation models in VHDL of the cells of Yosys");
+        AddThreads(command, import_.threads);
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
     }
@@ -468,6 +482,7 @@ private:
                                "What makes the exit status 1");
         AddFormat(command, "--format,--diagnostics", check_.report, "How the findings are printed");
         AddColor(command, check_.report);
+        AddThreads(command, check_.threads);
         command.add_flag("--list", check_.list, "List the rules");
         command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
         command.add_option("--explain", check_.explain, "Explain a rule")->type_name("RULE");
@@ -509,6 +524,7 @@ private:
         command.add_option("--limit", diff_.limit, "Show N differences; 0 shows all")
             ->type_name("N");
         AddReport(command, diff_.report);
+        AddThreads(command, diff_.threads);
         command.add_flag("--quiet", diff_.quiet, "Do not show progress");
         command.footer("The exit status is 0 for equal designs, 1 for different ones, 2 for "
                        "trouble.");
@@ -536,6 +552,7 @@ private:
         AddFile(command, "--certificate", verify_.certificate,
                 "Write what was proven, with the SHA-256 of the files, as JSON");
         AddReport(command, verify_.report);
+        AddThreads(command, verify_.threads);
         command.add_flag("--quiet", verify_.quiet, "Do not show progress");
         command.footer("WRITE commands in the file do nothing.");
     }
@@ -564,6 +581,7 @@ private:
             {{"text", Tool::StatsFormat::Text}, {"json", Tool::StatsFormat::Json}},
             "Print the counts as text or JSON");
         AddReport(command, stats_.report);
+        AddThreads(command, stats_.threads);
         command.add_flag("--quiet", stats_.quiet, "Do not show progress");
         command.footer("WRITE commands in the file do nothing.");
     }

@@ -18,15 +18,25 @@ namespace Orn_Hdl {
 /// These are only hints: nothing goes wrong if the line turns out to name another object or none.
 class Foresight {
 public:
+    static constexpr std::size_t Distance = 16;
+    /// The hashes of what a line can name, which stands in its third and fourth word.
+    using Hashes = std::array<std::uint32_t, 2>;
+
+    static Hashes HashNames(const StringArray& words) noexcept {
+        const std::string_view owner = words.GetView(3);
+        return {HashName(words.GetView(2)), HashName(owner.substr(0, owner.find('.')))};
+    }
+
+    /// Whether hints are worth their time.
+    template <class Index> static bool IsUseful(const Index& index) noexcept {
+        return index.GetSize() >= LeastSize;
+    }
+
     /// Takes note of a line that will be executed `Distance` lines later.
-    template <class Index> void Note(const Index& index, const StringArray& words) noexcept {
-        if (index.GetSize() < LeastSize) {
-            return;
-        }
-        Hashes& hashes = coming_[noted_ % Distance];
-        hashes = HashNames(words);
+    template <class Index> void Note(const Index& index, const Hashes& names) noexcept {
+        coming_[noted_ % Distance] = names;
         ++noted_;
-        for (const std::uint32_t hash : hashes) {
+        for (const std::uint32_t hash : names) {
             index.PrefetchPlace(hash);
         }
         for (const std::uint32_t hash : coming_[(noted_ + Distance / 2) % Distance]) {
@@ -37,19 +47,9 @@ public:
         }
     }
 
-    static constexpr std::size_t Distance = 16;
-
 private:
-    /// What a line can name stands in its third and fourth word.
-    using Hashes = std::array<std::uint32_t, 2>;
-
     static constexpr int LeastSize = 10000;
     static constexpr std::size_t CacheLine = 64;
-
-    static Hashes HashNames(const StringArray& words) noexcept {
-        const std::string_view owner = words.GetView(3);
-        return {HashName(words.GetView(2)), HashName(owner.substr(0, owner.find('.')))};
-    }
 
     std::array<Hashes, Distance> coming_{};
     std::size_t noted_ = 0;

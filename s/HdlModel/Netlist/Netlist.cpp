@@ -337,7 +337,17 @@ bool Netlist::IsNameUsed(std::string_view name) const noexcept {
 }
 
 void ReadAhead::Note(Netlist& netlist, const StringArray& words) noexcept {
-    netlist.implementation_->foresight.Note(netlist.implementation_->byName, words);
+    Netlist::Implementation& own = *netlist.implementation_;
+    if (Foresight::IsUseful(own.byName)) {
+        own.foresight.Note(own.byName, Foresight::HashNames(words));
+    }
+}
+
+void ReadAhead::Note(Netlist& netlist, const Foresight::Hashes& names) noexcept {
+    Netlist::Implementation& own = *netlist.implementation_;
+    if (Foresight::IsUseful(own.byName)) {
+        own.foresight.Note(own.byName, names);
+    }
 }
 
 const DummySignals& RememberedDummies::Of(const Netlist& netlist) noexcept {

@@ -17,6 +17,9 @@ public:
     /// Hints that a line, split into words, will be executed `Distance` lines later, so that what
     /// it names is fetched in the meantime. Changes nothing.
     static void Note(Netlist& netlist, const StringArray& words) noexcept;
+    /// Like the overload with words, for a line whose names have been hashed by
+    /// `Foresight::HashNames`.
+    static void Note(Netlist& netlist, const Foresight::Hashes& names) noexcept;
 };
 
 } // namespace Orn_Hdl

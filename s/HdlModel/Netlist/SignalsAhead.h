@@ -12,24 +12,26 @@ class SignalsAhead {
 public:
     /// \param lead how many instances ahead.
     SignalsAhead(const Netlist& netlist, int lead) noexcept
-        : instances_(netlist.GetInstanceIterator()) {
+        : SignalsAhead(netlist.GetInstanceIterator().begin(), lead) {}
+    /// \param first the instance with which the walk begins.
+    SignalsAhead(Iterator<Instance*>::Cursor first, int lead) noexcept : coming_(first) {
         for (int i = 0; i < lead; ++i) {
-            instances_.Next();
+            ++coming_;
         }
     }
 
     /// To be called for each instance of the walk.
     void Step() noexcept {
-        if (const Instance* const coming = instances_.GetCurrent()) {
+        if (const Instance* const coming = *coming_) {
             for (const Pin* pin : coming->GetPinIterator()) {
                 Port::Prefetch(pin->GetSignal());
             }
-            instances_.Next();
+            ++coming_;
         }
     }
 
 private:
-    Iterator<Instance*> instances_;
+    Iterator<Instance*>::Cursor coming_;
 };
 
 } // namespace Orn_Hdl

@@ -294,18 +294,19 @@ void HeadReader::ReadParameter(bool isLocal) {
     parameter.isLocal = isLocal;
     parser_.TakeName(parameter.name, "name of a parameter");
     if (parser_.Accept('=')) {
-        const Token& token = parser_.Get();
-        if (token.kind == TokenKind::String) {
-            parameter.value = ValueOfString(token.text);
+        const TokenKind kind = parser_.Get().kind;
+        if (kind == TokenKind::String) {
+            parameter.value = ValueOfString(parser_.Get().text);
             parser_.Next();
-        } else if (token.kind == TokenKind::Number || parser_.IsSign('-') || parser_.IsName() ||
+        } else if (kind == TokenKind::Number || parser_.IsSign('-') || parser_.IsName() ||
                    parser_.IsSign('(')) {
             // A literal keeps its form; of an expression the value is known when it is an integer.
+            const bool isNegative = parser_.Accept('-');
             std::optional<Number> number;
             try {
-                if (token.kind == TokenKind::Number) {
-                    number = Number::Read(token.text);
-                    parameter.value = ValueOf(*number, false);
+                if (parser_.Get().kind == TokenKind::Number) {
+                    number = Number::Read(parser_.Get().text);
+                    parameter.value = ValueOf(*number, isNegative);
                 }
             } catch (const LiteralProblem&) {
                 parameter.value.reset();
@@ -314,9 +315,10 @@ void HeadReader::ReadParameter(bool isLocal) {
                 return;
             }
             parameter.number = parser_.ReadInteger(
-                [this](std::string_view name) { return Resolve(name, nullptr); });
+                [this](std::string_view name) { return Resolve(name, nullptr); }, isNegative);
             const bool isWhole = parser_.IsSign(',') || parser_.IsSign(')') || parser_.IsSign(';');
-            const bool isLiteral = number && (number->kind == Number::Real || number->size > 0);
+            const bool isLiteral =
+                number && (number->kind == Number::Real || (number->size > 0 && !isNegative));
             if (!isWhole) {
                 parameter.value.reset();
                 parameter.number.reset();

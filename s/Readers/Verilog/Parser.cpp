@@ -101,18 +101,18 @@ void Parser::SkipAttributes() {
     }
 }
 
-std::optional<std::int64_t> Parser::ReadInteger(const Resolve& resolve) {
+std::optional<std::int64_t> Parser::ReadInteger(const Resolve& resolve, bool isNegated) {
     if (depth_ >= DeepestExpression) {
         Fail("an expression that is nested too deeply");
     }
     ++depth_;
-    const std::optional<std::int64_t> value = ReadSum(resolve);
+    const std::optional<std::int64_t> value = ReadSum(resolve, isNegated);
     --depth_;
     return value;
 }
 
-std::optional<std::int64_t> Parser::ReadSum(const Resolve& resolve) {
-    std::optional<std::int64_t> sum = ReadProduct(resolve);
+std::optional<std::int64_t> Parser::ReadSum(const Resolve& resolve, bool isNegated) {
+    std::optional<std::int64_t> sum = ReadProduct(resolve, isNegated);
     while (sum && (IsSign('+') || IsSign('-'))) {
         const bool isMinus = IsSign('-');
         Next();
@@ -122,8 +122,8 @@ std::optional<std::int64_t> Parser::ReadSum(const Resolve& resolve) {
     return sum;
 }
 
-std::optional<std::int64_t> Parser::ReadProduct(const Resolve& resolve) {
-    std::optional<std::int64_t> product = ReadOperand(resolve);
+std::optional<std::int64_t> Parser::ReadProduct(const Resolve& resolve, bool isNegated) {
+    std::optional<std::int64_t> product = ReadOperand(resolve, isNegated);
     while (product && (IsSign('*') || IsSign('/') || IsSign('%'))) {
         const char sign = Get().sign;
         Next();
@@ -138,8 +138,8 @@ std::optional<std::int64_t> Parser::ReadProduct(const Resolve& resolve) {
     return product;
 }
 
-std::optional<std::int64_t> Parser::ReadOperand(const Resolve& resolve) {
-    bool isNegative = false;
+std::optional<std::int64_t> Parser::ReadOperand(const Resolve& resolve, bool isNegated) {
+    bool isNegative = isNegated;
     while (IsSign('-') || IsSign('+')) {
         isNegative = isNegative != IsSign('-');
         Next();

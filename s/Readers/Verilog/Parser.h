@@ -67,13 +67,14 @@ public:
     /// What a name stands for in a constant expression.
     using Resolve = std::function<std::optional<std::int64_t>(std::string_view name)>;
     /// Reads a constant expression of integers.
+    /// \param isNegated whether a minus sign is in front, which was read.
     /// \return nothing when the expression holds anything else; the token is where that begins.
-    std::optional<std::int64_t> ReadInteger(const Resolve& resolve);
+    std::optional<std::int64_t> ReadInteger(const Resolve& resolve, bool isNegated = false);
 
 private:
-    std::optional<std::int64_t> ReadSum(const Resolve& resolve);
-    std::optional<std::int64_t> ReadProduct(const Resolve& resolve);
-    std::optional<std::int64_t> ReadOperand(const Resolve& resolve);
+    std::optional<std::int64_t> ReadSum(const Resolve& resolve, bool isNegated = false);
+    std::optional<std::int64_t> ReadProduct(const Resolve& resolve, bool isNegated = false);
+    std::optional<std::int64_t> ReadOperand(const Resolve& resolve, bool isNegated = false);
 
     Scanner& scanner_;
     std::size_t depth_ = 0;

@@ -54,12 +54,27 @@ bool IsSameGeneric(const Attribute& attribute, const Value& value, bool isHidden
 
 void InstanceReader::MakeComponents() {
     for (const Architecture::Use& use : architecture_.uses) {
-        ModuleHead* const head = use.isEntity ? design_.FindEntity(use.name)
-                                              : design_.FindComponent(architecture_, use.name);
-        if (head != nullptr) {
+        if (ModuleHead* const head = FindHead(use)) {
             MakeComponent(*head, use.place);
         }
     }
+}
+
+ModuleHead* InstanceReader::FindHead(const Architecture::Use& use) const {
+    return use.isEntity ? design_.FindEntity(use.name)
+                        : design_.FindComponent(architecture_, use.name);
+}
+
+/// What else is instantiated and not declared, so that one message tells of all: the names, each
+/// behind a comma. Empty for nothing.
+std::string InstanceReader::GetOtherMissing(const std::string& name) const {
+    std::string names;
+    for (const Architecture::Use& use : architecture_.uses) {
+        if (!IsSameName(use.name, name, true) && FindHead(use) == nullptr) {
+            names.append(", ").append(Quoted(use.name));
+        }
+    }
+    return names;
 }
 
 /// Makes a component of a head and gives it the generics that have values.
@@ -124,9 +139,13 @@ void InstanceReader::ReadBehind(const std::string& label, const Place& place,
         lastName_ = component;
     }
     if (lastHead_ == nullptr) {
+        const std::string others = GetOtherMissing(component);
         parser_.Fail(componentPlace,
-                     "the component " + Quoted(component) +
-                         " is not declared: declare it, or give a library file that does");
+                     others.empty()
+                         ? "the component " + Quoted(component) +
+                               " is not declared: declare it, or give a library file that does"
+                         : "the cells " + Quoted(component) + others +
+                               " are not declared: declare them, or give a library file that does");
     }
     MakeComponent(*lastHead_, componentPlace);
     ReadInstance(label, place, *lastHead_);
@@ -144,9 +163,14 @@ void InstanceReader::ReadEntity(const std::string& label, const Place& place) {
     }
     ModuleHead* const head = design_.FindEntity(name);
     if (head == nullptr) {
-        parser_.Fail(entityPlace, "the entity " + Quoted(name) +
-                                      " is not declared: a library file has to say which ports it "
-                                      "has");
+        const std::string others = GetOtherMissing(name);
+        parser_.Fail(
+            entityPlace,
+            others.empty()
+                ? "the entity " + Quoted(name) +
+                      " is not declared: a library file has to say which ports it has"
+                : "the cells " + Quoted(name) + others +
+                      " are not declared: a library file has to say which ports they have");
     }
     hasEntities_ = true;
     MakeComponent(*head, entityPlace);

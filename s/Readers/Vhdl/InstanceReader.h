@@ -43,6 +43,8 @@ private:
         bool isHidden = false;
     };
 
+    ModuleHead* FindHead(const Architecture::Use& use) const;
+    std::string GetOtherMissing(const std::string& name) const;
     void MakeComponent(ModuleHead& head, const Place& place);
     void ReadEntity(const std::string& label, const Place& place);
     void ReadConfiguration(const std::string& label, const Place& place);

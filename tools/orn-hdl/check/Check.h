@@ -28,6 +28,8 @@ struct CheckOptions {
     bool markdown = false;
     /// Prints one rule in place of a check.
     std::string explain;
+    /// How many threads may work together; 0 is what the system gives.
+    unsigned threads = 0;
 };
 
 Status CheckFiles(const CheckOptions& options);

@@ -6,6 +6,7 @@
 #include "Port/NameScope.h"
 #include "Progress.h"
 #include "import/NameRules.h"
+#include "proof/Certificate.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -131,8 +132,22 @@ void DesignFileWriter::WriteBodies(Orn_Hdl::TextFileOutStream& out) {
     }
 }
 
+Status WriteFile(const std::vector<DesignModel>& models, Language language, const std::string& file,
+                 bool noHeader, Certificate& certificate) {
+    Status status = DesignFileWriter(models, language, file, noHeader).Write();
+    if (status != Status::Success || !certificate.IsWanted()) {
+        return status;
+    }
+    for (const DesignModel& design : models) {
+        const Orn_Hdl::Proof::Written written = GetWritten(*design.model, design.legal);
+        status = Worse(status, certificate.AddNetlist(file, language, written.netlist));
+    }
+    return status;
+}
+
 Status WriteFolder(const std::vector<DesignModel>& models, Language language,
-                   const Outputs& outputs, const std::string& list, Progress& progress) {
+                   const Outputs& outputs, const std::string& list, Progress& progress,
+                   Certificate& certificate) {
     std::vector<std::string> names;
     for (const DesignModel& design : models) {
         const Orn_Hdl::Netlist& netlist = *design.model->GetNetlist();
@@ -144,7 +159,7 @@ Status WriteFolder(const std::vector<DesignModel>& models, Language language,
     Status status = MakeFolder(outputs.folder);
     for (std::size_t i = 0; i < models.size() && status == Status::Success; ++i) {
         progress.Writing(files[i]);
-        status = DesignFileWriter({models[i]}, language, files[i], outputs.noHeader).Write();
+        status = WriteFile({models[i]}, language, files[i], outputs.noHeader, certificate);
         progress.Erase();
     }
     return status == Status::Success ? WriteFileList(list, files) : status;
@@ -160,10 +175,10 @@ bool IsPlain(std::string_view name) noexcept {
 } // namespace
 
 Status WriteDesign(const std::vector<DesignModel>& models, const Outputs& outputs,
-                   Progress& progress) {
+                   Progress& progress, Certificate& certificate) {
     if (models.size() == 1 && outputs.folder.empty()) {
         return WriteOutputs(*models.front().model, outputs, progress, models.front().legal,
-                            models.front().tell);
+                            models.front().tell, certificate);
     }
     Status status = Status::Success;
     for (const auto& [language, file] : outputs.files) {
@@ -171,11 +186,12 @@ Status WriteDesign(const std::vector<DesignModel>& models, const Outputs& output
             continue;
         }
         if (!outputs.folder.empty()) {
-            status = Worse(status, WriteFolder(models, language, outputs, file, progress));
+            status =
+                Worse(status, WriteFolder(models, language, outputs, file, progress, certificate));
             continue;
         }
         progress.Writing(file == "-" ? "standard output" : file);
-        const Status written = DesignFileWriter(models, language, file, outputs.noHeader).Write();
+        const Status written = WriteFile(models, language, file, outputs.noHeader, certificate);
         progress.Erase();
         status = Worse(status, written);
     }

@@ -20,8 +20,9 @@ struct DesignModel {
 /// Writes the netlists of all models: each language into one file with one header, or each model
 /// into a file of its own if the outputs have a folder.
 /// \param models in the order of compilation.
+/// \param certificate gets what was proven, each model of a file on its own.
 Status WriteDesign(const std::vector<DesignModel>& models, const Outputs& outputs,
-                   Progress& progress);
+                   Progress& progress, Certificate& certificate);
 
 /// The files of models in a folder, with the names of the models as far as files can have them.
 /// \param extension with its period.

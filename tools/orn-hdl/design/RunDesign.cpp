@@ -8,6 +8,7 @@
 #include "design/DesignOutput.h"
 #include "design/LegalDesign.h"
 #include "design/ModelLinks.h"
+#include "proof/Certificate.h"
 #include "warnings/SlipFinder.h"
 
 #include <algorithm>
@@ -130,6 +131,7 @@ Status DesignRun::Replay(FileOfDesign& file) {
     file.model->GetOptions()->legal = options_.legal;
     file.model->GetOptions()->escapeNames = options_.names == "escape";
     file.model->GetOptions()->verify = options_.verify;
+    file.model->GetOptions()->threads = options_.threads;
     Checking::WriteGate gate(*file.model, file.file.lines, reporter_);
     file.replayed = Tool::Replay(*file.model, file.file, options_.keepGoing, options_.writeRules,
                                  options_.check ? &gate : nullptr, &options_.warnings);
@@ -239,7 +241,8 @@ Status DesignRun::Write() {
                              TellOf(file.file, file.replayed.lines)};
     }
     Progress progress(options_.quiet, options_.files.front());
-    status = Worse(status, WriteDesign(models, outputs, progress));
+    Certificate none("");
+    status = Worse(status, WriteDesign(models, outputs, progress, none));
     return status == Status::Success ? nameMap.Commit() : status;
 }
 

@@ -31,6 +31,9 @@ Status Load(Designs& designs, const DiffOptions& options, Reporter& reporter) {
         second->GetFormat() != DesignFormat::Verilog) {
         std::swap(first, second);
     }
+    for (LoadedDesign* design : {first, second}) {
+        design->GetModel().GetOptions()->threads = options.threads;
+    }
     Libraries libraries{options.libraries, nullptr};
     Status status = first->Load(libraries, reporter, options.quiet);
     if (status == Status::Success) {

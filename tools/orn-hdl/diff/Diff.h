@@ -26,6 +26,8 @@ struct DiffOptions {
     bool quiet = false;
     /// How messages about the files are printed.
     ReportOptions report;
+    /// How many threads may work together; 0 is what the system gives.
+    unsigned threads = 0;
 };
 
 /// The words that an option may ignore.

@@ -47,7 +47,7 @@ Status FindDigest(const std::string& name, const std::string& systemName, std::s
 } // namespace
 
 Status Certificate::AddCommands(const std::string& name, const std::string& systemName) {
-    if (fileName_.empty()) {
+    if (!IsWanted()) {
         return Status::Success;
     }
     File file;
@@ -57,9 +57,17 @@ Status Certificate::AddCommands(const std::string& name, const std::string& syst
     return status;
 }
 
+Status Certificate::AddInput(const std::string& name) {
+    File file;
+    file.name = name;
+    const Status status = FindDigest(name, name, file.digest);
+    inputs_.push_back(std::move(file));
+    return status;
+}
+
 Status Certificate::AddNetlist(const std::string& name, Orn_Hdl::Language language,
                                const Orn_Hdl::Netlist& design) {
-    if (fileName_.empty()) {
+    if (!IsWanted()) {
         return Status::Success;
     }
     const Stats::DesignCounts counts = Stats::CountDesign(design);
@@ -90,6 +98,17 @@ Status Certificate::AddNetlist(const std::string& name, Orn_Hdl::Language langua
     return status;
 }
 
+void Certificate::WriteFiles(JsonWriter& json, const char* key, const std::vector<File>& files) {
+    if (files.empty()) {
+        return;
+    }
+    json.Key(key).BeginArray();
+    for (const File& file : files) {
+        json.BeginObject().Key("file").Text(file.name).Key("sha256").Text(file.digest).EndObject();
+    }
+    json.EndArray();
+}
+
 Status Certificate::Write() const {
     OutputFile output(fileName_);
     Port::Stream* const out = output.GetStream();
@@ -98,11 +117,10 @@ Status Certificate::Write() const {
     }
     JsonWriter json;
     json.BeginObject().Key("tool").Text("orn-hdl").Key("version");
-    json.Text(Port::Version::getValue("version").GetView()).Key("commands").BeginArray();
-    for (const File& file : commands_) {
-        json.BeginObject().Key("file").Text(file.name).Key("sha256").Text(file.digest).EndObject();
-    }
-    json.EndArray().Key("netlists").BeginArray();
+    json.Text(Port::Version::getValue("version").GetView());
+    WriteFiles(json, "commands", commands_);
+    WriteFiles(json, "inputs", inputs_);
+    json.Key("netlists").BeginArray();
     for (const File& file : netlists_) {
         json.BeginObject().Key("file").Text(file.name).Key("language").Text(file.language);
         json.Key("module").Text(file.module).Key("sha256").Text(file.digest);

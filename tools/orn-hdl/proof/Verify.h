@@ -25,6 +25,8 @@ struct VerifyOptions {
     std::string certificate;
     bool quiet = false;
     ReportOptions report;
+    /// How many threads may work together; 0 is what the system gives.
+    unsigned threads = 0;
 };
 
 Status Verify(const VerifyOptions& options);

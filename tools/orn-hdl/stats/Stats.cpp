@@ -51,6 +51,7 @@ Status PrintStats(const StatsOptions& options) {
     const std::string name = GetModelName(options.file, options.model);
     engine->CreateAndAddModel(name, options.file);
     Orn_Hdl::Model& model = *engine->GetModel(name);
+    model.GetOptions()->threads = options.threads;
     DropWrites(*model.GetCommandFactory());
 
     Progress progress(options.quiet, options.file);

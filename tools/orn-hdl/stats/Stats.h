@@ -20,6 +20,8 @@ struct StatsOptions {
     bool quiet = false;
     /// How messages about the command file are printed.
     ReportOptions report;
+    /// How many threads may work together; 0 is what the system gives.
+    unsigned threads = 0;
 };
 
 /// Replays the file without its WRITE commands and prints the counts on standard output.

@@ -1,0 +1,102 @@
+// The lines of a command file, split on another processor.
+#pragma once
+
+#include "HdlModel/Netlist/Foresight.h"
+#include "Orn_Hdl/Containers/StringArray.h"
+#include "Port/File.h"
+#include "Port/OrderedWork.h"
+
+#include <cstddef>
+#include <cstdint>
+#include <exception>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+namespace Orn_Hdl {
+
+/// A line of a command file, split into words.
+struct SplitLine {
+    /// Takes the words of a file's last line.
+    void Set(const Port::File& file, std::string_view text) {
+        bytes = file.GetLineSize();
+        words.Empty();
+        words.ParseCommandLine(text.substr(0, text.find('\0')));
+    }
+    /// Frees the memory of the words if the line was longer than `most` bytes; otherwise the next
+    /// line uses it.
+    void Release(std::uint64_t most) noexcept {
+        if (bytes > most) {
+            words = StringArray();
+        }
+    }
+
+    StringArray words;
+    /// How many bytes the line takes in the file.
+    std::uint64_t bytes = 0;
+};
+
+/// Reads a file and splits its lines in a thread of its own, some batches of lines ahead. Nothing
+/// but the file is touched there.
+class LineBatches {
+public:
+    struct Settings {
+        /// How many threads there are besides the owner's; they take turns.
+        unsigned workers = 1;
+        /// How many batches there are.
+        std::size_t batches = 8;
+        /// The most lines of a batch.
+        std::size_t lines = 256;
+        /// A batch ends with the line that reaches this many bytes.
+        std::uint64_t bytes = std::uint64_t(1) << 16;
+    };
+    /// Memory of longer lines is not kept for others, since there are many lines at a time.
+    static constexpr std::uint64_t LongLine = 512;
+
+    /// Begins to read.
+    /// \param file not owned. As long as there are batches of it, nobody else may use it.
+    LineBatches(Port::File& file, const Settings& settings);
+
+    /// Gives the next line.
+    /// \param line receives it and the hashes of its names. Its former words are dropped.
+    /// \return false at the end of the file or on a failure.
+    /// \throws std::bad_alloc if splitting a line throws it. The next call gives the line behind.
+    bool Next(SplitLine& line, Foresight::Hashes& names) {
+        while (batch_ == nullptr || given_ == batch_->count) {
+            if (!NextBatch()) {
+                return false;
+            }
+        }
+        Line& next = batch_->lines[given_];
+        ++given_;
+        std::swap(line, next.split);
+        names = next.names;
+        return true;
+    }
+
+private:
+    struct Line {
+        SplitLine split;
+        Foresight::Hashes names;
+    };
+    struct Batch {
+        std::vector<Line> lines;
+        std::size_t count = 0;
+        /// What reading the line behind the last one has thrown.
+        std::exception_ptr failure;
+    };
+
+    bool Fill(Batch& batch) noexcept;
+    bool NextBatch();
+
+    const Settings settings_;
+    Port::File& file_;
+    std::vector<Batch> batches_;
+    /// The batch whose lines are being given; null before the first.
+    Batch* batch_ = nullptr;
+    std::size_t given_ = 0;
+    /// Last, since its threads use the others.
+    Port::OrderedWork work_;
+};
+
+} // namespace Orn_Hdl
