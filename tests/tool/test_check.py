@@ -103,6 +103,24 @@ note: what helps: 4:B:1010
         self.assertIn("b.cmd:10: error", outcome.out)
         self.assertIn("2 errors", outcome.out)
 
+    def test_components_that_are_designs_of_other_files(self) -> None:
+        leaf = "SET NETLIST NAME leaf\nADD PORT a(1:0) Input\nADD PORT y Output\nCONNECT SIGNAL y a(0)\n"
+        user = ("SUPPRESS CONFIGURATION TRUE\nADD COMPONENT leaf\nADD PIN leaf %s Input\n"
+                "ADD PIN leaf y Output\n" + SOUND)
+        self.write("leaf.cmd", leaf)
+        outcome = self.check(user % "a", "leaf.cmd")
+        self.assertEqual(outcome.status, FAILED)
+        self.assertIn('t.cmd:3: error: the pin "a" of the component "leaf" is 1 bit wide, but the '
+                      "port has 2 bits\n", outcome.err)
+        self.assertIn('leaf.cmd:2: note: the port of "leaf"\n', outcome.err)
+        self.assertIn("1 error", outcome.out)
+        found = json.loads(self.check(user % "a", "leaf.cmd", "--format", "json").out)["findings"]
+        self.assertEqual([(f["file"], f["line"], f["notes"]) for f in found],
+                         [("t.cmd", 3, ['leaf.cmd:2: the port of "leaf"'])])
+        self.assertEqual(self.check(user % "a(1:0)", "leaf.cmd").status, SUCCESS)
+        # By itself the file says nothing of the other one.
+        self.assertEqual(self.check(user % "a").status, SUCCESS)
+
     def test_json(self) -> None:
         found = json.loads(self.check(SOUND + "ADD PORT \xe9\"\xff Input\n", "--format", "json").out)
         self.assertEqual(list(found), ["findings", "counts"])

@@ -40,7 +40,13 @@ std::string CheckFileName(const std::string& name) {
 }
 
 std::string CheckDigit(const std::string& text) {
-    return text == "0" || text == "1" ? "" : "0 or 1 is needed";
+    if (text == "0" || text == "1") {
+        return "";
+    }
+    // The values of VHDL that somebody may want to keep.
+    return text == "-" || text == "x" || text == "X"
+               ? "the constants of a design are 0 and 1 alone; 0 or 1 is needed"
+               : "0 or 1 is needed";
 }
 
 const std::map<std::string, Tool::Import::NameLanguages>& GetNameLanguages() {

@@ -3,6 +3,8 @@
 #include "check/Checker.h"
 #include "check/Located.h"
 #include "check/Report.h"
+#include "design/ComponentCheck.h"
+#include "design/ModelLinks.h"
 
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
@@ -32,19 +34,22 @@ using Orn_Hdl::Check;
 /// The replay of one file, with a check at each line that would write.
 class FileCheck {
 public:
-    FileCheck(const CheckOptions& options, const std::string& file, Check::Targets targets,
-              Reporter& reporter)
-        : options_(options), file_(file), source_(file), lines_(file, source_.GetName()),
-          reporter_(reporter), targets_(targets) {}
+    /// \param engine holds the design, and no other one.
+    FileCheck(Orn_Hdl::Engine& engine, const CheckOptions& options, const std::string& file,
+              Check::Targets targets, Reporter& reporter)
+        : engine_(engine), options_(options), file_(file), source_(file),
+          lines_(file, source_.GetName()), reporter_(reporter), targets_(targets) {}
 
     /// Adds the findings to `all`, unless a line fails.
     Status Run(std::vector<Reported>& all);
+    ModelOfFile GetModel() { return {model_, &lines_}; }
 
 private:
     Status Replay();
     bool Execute(const Orn_Hdl::StringArray& words);
     void Report(const Orn_Hdl::StringArray& words, std::string_view text);
 
+    Orn_Hdl::Engine& engine_;
     const CheckOptions& options_;
     const std::string& file_;
     const RereadableFile source_;
@@ -91,13 +96,9 @@ Status FileCheck::Replay() {
 }
 
 Status FileCheck::Run(std::vector<Reported>& all) {
-    // The design stands until the process ends, as in `run`.
-    static Orn_Hdl::Engine* engine = nullptr;
-    delete std::exchange(engine, nullptr);
-    engine = new Orn_Hdl::Engine;
     const std::string name = GetModelName(file_, options_.model);
-    engine->CreateAndAddModel(name.c_str(), file_.c_str());
-    model_ = engine->GetModel(name.c_str());
+    engine_.CreateAndAddModel(name.c_str(), file_.c_str());
+    model_ = engine_.GetModel(name.c_str());
     model_->GetOptions()->threads = options_.threads;
     checker_ = std::make_unique<Checker>(*model_, targets_);
     const Status status = Replay();
@@ -114,6 +115,34 @@ Status FileCheck::Run(std::vector<Reported>& all) {
         all.push_back(std::move(reported));
     }
     return Status::Success;
+}
+
+/// Checks all files, and the components of each that are models of others.
+Status CheckAll(const CheckOptions& options, Check::Targets targets, Reporter& reporter,
+                std::vector<Reported>& findings) {
+    // The designs stand until the process ends, as in `run`.
+    static std::vector<std::unique_ptr<Orn_Hdl::Engine>>* engines = nullptr;
+    delete std::exchange(engines, nullptr);
+    engines = new std::vector<std::unique_ptr<Orn_Hdl::Engine>>;
+    std::vector<std::unique_ptr<FileCheck>> checks;
+    std::vector<ModelOfFile> checked;
+    std::vector<Orn_Hdl::Model*> models;
+    Status status = Status::Success;
+    for (const std::string& file : options.files) {
+        engines->push_back(std::make_unique<Orn_Hdl::Engine>());
+        checks.push_back(
+            std::make_unique<FileCheck>(*engines->back(), options, file, targets, reporter));
+        const Status one = checks.back()->Run(findings);
+        if (one == Status::Success) {
+            checked.push_back(checks.back()->GetModel());
+            models.push_back(checked.back().model);
+        }
+        status = Worse(status, one);
+    }
+    // A single design is checked as it stands, even if it has a component of its own name.
+    const bool agree =
+        options.files.size() == 1 || CheckComponents(checked, ModelLinks(models), reporter);
+    return agree ? status : Worse(status, Status::Failed);
 }
 
 bool ReadTargets(const std::string& names, Check::Targets& targets) {
@@ -171,10 +200,7 @@ Status CheckFiles(const CheckOptions& options) {
     }
     Reporter reporter(options.report);
     std::vector<Reported> findings;
-    Status status = Status::Success;
-    for (const std::string& file : options.files) {
-        status = Worse(status, FileCheck(options, file, targets, reporter).Run(findings));
-    }
+    Status status = CheckAll(options, targets, reporter, findings);
     // Programs get one document, with the lines that failed before the findings.
     std::vector<Reported> all;
     for (Diagnostic& failure : reporter.TakeCollected()) {
