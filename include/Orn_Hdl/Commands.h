@@ -195,7 +195,7 @@ public:
     int GetError() const noexcept;
 
 private:
-    struct Implementation;
+    struct ORN_HDL_LOCAL Implementation;
     std::unique_ptr<Implementation> implementation_;
 };
 

@@ -50,7 +50,7 @@ void CommandReader::Implementation::Split(std::string_view text) {
 /// Gives up the line in hand.
 void CommandReader::Implementation::Leave() noexcept {
     if (isInHand) {
-        lines[first].Release(batches == nullptr ? LongLine : LineBatches::LongLine);
+        lines[first].Release(LongLine);
         first = (first + 1) % Distance;
         --count;
         isInHand = false;

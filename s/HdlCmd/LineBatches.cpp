@@ -9,23 +9,30 @@ LineBatches::LineBatches(Port::File& file, const Settings& settings)
 
 /// Reads the lines of a batch. \return false if there are none.
 bool LineBatches::Fill(Batch& batch) noexcept {
-    batch.count = 0;
     try {
-        batch.lines.resize(settings_.lines);
-        std::uint64_t bytes = 0;
-        std::string_view text;
-        while (batch.count < batch.lines.size() && bytes < settings_.bytes &&
-               file_.NextLine(text)) {
-            Line& line = batch.lines[batch.count];
-            line.split.Set(file_, text);
-            line.names = Foresight::HashNames(line.split.words);
-            ++batch.count;
-            bytes += line.split.bytes;
-        }
+        Read(batch);
     } catch (...) {
         batch.failure = std::current_exception();
     }
-    return batch.count > 0 || batch.failure != nullptr;
+    return !batch.lines.empty() || batch.failure != nullptr;
+}
+
+void LineBatches::Read(Batch& batch) {
+    // Memory for as many characters is kept for the next batch.
+    constexpr std::size_t LongBatch = std::size_t(1) << 18;
+    batch.lines.clear();
+    batch.words.Empty(LongBatch);
+    batch.lines.reserve(settings_.lines);
+    std::uint64_t bytes = 0;
+    std::string_view text;
+    while (batch.lines.size() < settings_.lines && bytes < settings_.bytes &&
+           file_.NextLine(text)) {
+        line_.Set(file_, text);
+        batch.words.Add(line_.words);
+        batch.lines.push_back({line_.bytes, Foresight::HashNames(line_.words)});
+        bytes += line_.bytes;
+        line_.Release(LongBatch);
+    }
 }
 
 /// Steps to the next batch. \return false if there is none.

@@ -1,6 +1,7 @@
 // The lines of a command file, split on another processor.
 #pragma once
 
+#include "Containers/PackedLists.h"
 #include "HdlModel/Netlist/Foresight.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/File.h"
@@ -50,9 +51,6 @@ public:
         /// A batch ends with the line that reaches this many bytes.
         std::uint64_t bytes = std::uint64_t(1) << 16;
     };
-    /// Memory of longer lines is not kept for others, since there are many lines at a time.
-    static constexpr std::uint64_t LongLine = 512;
-
     /// Begins to read.
     /// \param file not owned. As long as there are batches of it, nobody else may use it.
     LineBatches(Port::File& file, const Settings& settings);
@@ -60,38 +58,44 @@ public:
     /// Gives the next line.
     /// \param line receives it and the hashes of its names. Its former words are dropped.
     /// \return false at the end of the file or on a failure.
-    /// \throws std::bad_alloc if splitting a line throws it. The next call gives the line behind.
+    /// \throws std::bad_alloc if splitting a line throws it; the next call gives the line behind.
+    ///         If there is no memory for `line`, the next call gives this one.
     bool Next(SplitLine& line, Foresight::Hashes& names) {
-        while (batch_ == nullptr || given_ == batch_->count) {
+        while (batch_ == nullptr || given_ == batch_->lines.size()) {
             if (!NextBatch()) {
                 return false;
             }
         }
-        Line& next = batch_->lines[given_];
-        ++given_;
-        std::swap(line, next.split);
+        const Line& next = batch_->lines[given_];
+        batch_->words.Copy(given_, line.words);
+        line.bytes = next.bytes;
         names = next.names;
+        ++given_;
         return true;
     }
 
 private:
     struct Line {
-        SplitLine split;
+        std::uint64_t bytes;
         Foresight::Hashes names;
     };
     struct Batch {
         std::vector<Line> lines;
-        std::size_t count = 0;
+        /// Those of all lines.
+        PackedLists words;
         /// What reading the line behind the last one has thrown.
         std::exception_ptr failure;
     };
 
     bool Fill(Batch& batch) noexcept;
+    void Read(Batch& batch);
     bool NextBatch();
 
     const Settings settings_;
     Port::File& file_;
     std::vector<Batch> batches_;
+    /// The line that is being split.
+    SplitLine line_;
     /// The batch whose lines are being given; null before the first.
     Batch* batch_ = nullptr;
     std::size_t given_ = 0;

@@ -72,7 +72,7 @@ TEST_F(LineBatchesTest, EndBeforeTheirFileDoes) {
             SplitLine& line = lines[static_cast<std::size_t>(i) % lines.size()];
             ASSERT_TRUE(batches.Next(line, names));
             Expect(line, names, i);
-            line.Release(LineBatches::LongLine);
+            line.Release(512);
         }
     }
 }

@@ -13,6 +13,8 @@
 
 namespace Orn_Hdl {
 
+class PackedLists;
+
 /// An ordered list of texts, indexed from 0. Reading out of range, or a slot that was never set,
 /// gives the empty text.
 ///
@@ -162,6 +164,8 @@ public:
     }
 
 private:
+    friend class PackedLists;
+
     struct Slot {
         std::size_t start;
         std::size_t length;
