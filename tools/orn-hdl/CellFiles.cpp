@@ -53,7 +53,7 @@ Status ReadCellFiles(const std::vector<std::string>& files, Import::CellLibrary&
             return read;
         }
         try {
-            library.Add(std::string(WithoutGzip(file)), std::move(text));
+            library.Add(std::string(WithoutGzip(file)), text);
         } catch (const Cells::Error& error) {
             Diagnostic diagnostic = MakeFileDiagnostic(file, Severity::Error, error.what());
             diagnostic.place.line = error.GetLine();

@@ -7,7 +7,6 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <utility>
 
 namespace Tool::Import {
 
@@ -68,9 +67,9 @@ NamedValue MakeDefault(const Cells::CellParameter& declared, ImportedDesign& des
 
 } // namespace
 
-void CellLibrary::Add(const std::string& fileName, std::string text) {
+void CellLibrary::Add(const std::string& fileName, const std::string& text) {
     if (EndsIn(fileName, ".json")) {
-        AddJson(std::move(text));
+        AddJson(text);
         return;
     }
     const bool isLiberty = EndsIn(fileName, ".lib") || EndsIn(fileName, ".liberty");
@@ -91,8 +90,8 @@ void CellLibrary::Add(const std::string& fileName, std::string text) {
     }
 }
 
-void CellLibrary::AddJson(std::string text) {
-    designs_.push_back(ReadDesign(std::move(text), false));
+void CellLibrary::AddJson(std::string_view text) {
+    designs_.push_back(ReadDesign(text, false));
     for (Module& module : designs_.back()->modules) {
         if (module.blackBox || !module.top) {
             Index(module);

@@ -17,7 +17,7 @@ public:
     /// if it ends in ".json", and Verilog otherwise. Of several cells of one name, the first one
     /// holds. \throws Cells::Error if the text is no Liberty or Verilog, Error if it is no JSON
     /// netlist.
-    void Add(const std::string& fileName, std::string text);
+    void Add(const std::string& fileName, const std::string& text);
 
     /// Calls `visit` with every cell, in the order of the files.
     template <class Visit> void ForEach(const Visit& visit) const {
@@ -33,7 +33,7 @@ public:
     const Module* Find(std::string_view name) const;
 
 private:
-    void AddJson(std::string text);
+    void AddJson(std::string_view text);
     void Index(Module& module);
 
     /// The texts and the modules of all files.

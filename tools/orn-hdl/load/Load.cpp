@@ -219,8 +219,7 @@ Status LoadedDesign::ReadJson(const Libraries& libraries, Reporter& reporter) {
         return status;
     }
     try {
-        const std::unique_ptr<Import::ImportedDesign> design =
-            Import::ReadDesign(std::move(text), false);
+        const std::unique_ptr<Import::ImportedDesign> design = Import::ReadDesign(text, false);
         Import::Module& top = Import::FindTop(*design, "");
         Import::Warnings warnings;
         const Import::NameRules names(Import::NameLanguages::Verilog, false);
