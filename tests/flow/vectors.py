@@ -27,6 +27,8 @@ class Stimulus:
     resets: dict[str, int] = field(default_factory=dict)  # name to active level
     # Two-way ports: the input, and its level, at which the design drives them itself.
     driven_when: dict[str, tuple[str, int]] = field(default_factory=dict)
+    # Inputs with one level in the first two cycles and another one from then on.
+    steady: dict[str, tuple[int, int]] = field(default_factory=dict)
 
 
 @dataclass(frozen=True)
@@ -72,10 +74,24 @@ class Bench:
 
     def _value(self, port: Port, cycle: int, source: random.Random) -> int:
         """Random; a reset is active at first and then now and again."""
+        if port.name in self.stimulus.steady:
+            return self.stimulus.steady[port.name][cycle >= 2]
         if port.name not in self.stimulus.resets:
             return source.getrandbits(port.width)
         active = cycle < 2 or source.random() < 1 / 64
         return self.stimulus.resets[port.name] ^ (not active)
+
+    def name_levels(self, shown: list[str]) -> list[dict[str, str]]:
+        """The bits of each port in each cycle, inputs as they were set and outputs as they were shown."""
+        cycles = []
+        for set_, line in zip(self.vectors.read_text().split(), shown, strict=True):
+            levels = {}
+            for bits, ports in ((set_, self.driven),
+                                (line, [port for port in self.ports if port.name in self.nets])):
+                for port in ports:
+                    levels[port.name], bits = bits[:port.width], bits[port.width:]
+            cycles.append(levels)
+        return cycles
 
     def run_verilog(self, sources: list[Path], top: str,
                     name_of: Callable[[str], str] = str) -> list[str]:

@@ -14,6 +14,7 @@ import argparse
 import itertools
 import json
 import tempfile
+from collections.abc import Callable
 from dataclasses import dataclass
 from pathlib import Path
 
@@ -37,6 +38,15 @@ FORMS = {
 
 
 @dataclass(frozen=True)
+class Use:
+    """A design used as it is meant to be used, and what it is to do then."""
+
+    stimulus: Stimulus
+    # Looks at the levels of all ports, cycle by cycle.
+    check: Callable[[list[dict[str, str]]], None]
+
+
+@dataclass(frozen=True)
 class WholeDesign:
     name: str
     stimulus: Stimulus
@@ -45,11 +55,23 @@ class WholeDesign:
     keeps_all: bool = False
     # Whether word-level cells are memories, whose model GHDL cannot synthesise.
     has_memory: bool = False
+    use: Use | None = None
 
     @property
     def source(self) -> Path:
         return RTL / f"{self.name}{self.suffix}"
 
+
+def expect_sent_bytes(cycles: list[dict[str, str]]) -> None:
+    """What the sender takes over comes out of the receiver."""
+    sent = [cycle["send"] for cycle in cycles
+            if cycle["start"] == "1" and cycle["busy"] == "0" and cycle["reset"] == "0"]
+    got = [cycle["got"] for cycle in cycles if cycle["ready"] == "1"]
+    if len(got) < 8 or got != sent[:len(got)] or len(sent) > len(got) + 1:
+        raise Rejected(f"received {got} where {sent} was sent")
+
+
+SERIAL_LINE = Use(Stimulus("clk", steady={"reset": (1, 0), "cut": (0, 0)}), expect_sent_bytes)
 
 CLOCKED = Stimulus("clk")
 RESET = Stimulus("clk", {"reset": 1})
@@ -58,7 +80,7 @@ DESIGNS = [
     WholeDesign("processor", RESET, has_memory=True),
     WholeDesign("queue", RESET, has_memory=True),
     WholeDesign("cipher_round", RESET),
-    WholeDesign("serial_line", RESET),
+    WholeDesign("serial_line", RESET, use=SERIAL_LINE),
     WholeDesign("sorting", CLOCKED),
     WholeDesign("sizes", Stimulus("clk", {"reset": 0})),
     WholeDesign("two_way", Stimulus("clk", {}, {"data": ("write", 1), "strobe": ("write", 1)})),
@@ -149,11 +171,11 @@ class Whole:
 
     # Simulation.
 
-    def bench(self) -> Bench:
+    def bench(self, stimulus: Stimulus) -> Bench:
         ports = load(self.source)["modules"][self.design.name]["ports"]
         return Bench(self.design.name, [Port(name, port["direction"], len(port["bits"]))
                                         for name, port in ports.items()],
-                     self.design.stimulus, self.work)
+                     stimulus, self.work)
 
     def ghdl(self) -> Ghdl:
         folder = self.work / "ghdl"
@@ -165,16 +187,24 @@ class Whole:
         return ghdl
 
     def simulate(self) -> None:
+        rtl, verilog, vhdl = self.traces(self.bench(self.design.stimulus))
+        refuse_difference(rtl, verilog, "Verilog")
+        refuse_difference(verilog, vhdl, "VHDL")
+
+    def use(self, use: Use) -> None:
+        bench = self.bench(use.stimulus)
+        for shown in self.traces(bench):
+            use.check(bench.name_levels(shown))
+
+    def traces(self, bench: Bench) -> tuple[list[str], list[str], list[str]]:
+        """What the RTL shows, and the netlists in Verilog and VHDL."""
         names = read_port_names(self.work / "X.map")
-        bench = self.bench()
-        rtl = bench.run_verilog([self.design.source], self.design.name)
         cells = self.work / "cells.v"
         cells.write_text(self.cells_of_icarus())
         models = [YOSYS / "simlib.v", YOSYS / "simcells.v"]
-        verilog = bench.run_verilog([self.verilog, cells, *models], self.top, names.__getitem__)
-        vhdl = bench.run_vhdl(self.ghdl(), self.vhdl, self.top, names.__getitem__)
-        refuse_difference(rtl, verilog, "Verilog")
-        refuse_difference(verilog, vhdl, "VHDL")
+        return (bench.run_verilog([self.design.source], self.design.name),
+                bench.run_verilog([self.verilog, cells, *models], self.top, names.__getitem__),
+                bench.run_vhdl(self.ghdl(), self.vhdl, self.top, names.__getitem__))
 
     def cells_of_icarus(self) -> str:
         """Modules of the components' names that consist of a cell of Yosys each."""
@@ -244,6 +274,8 @@ def check_design(tally: Tally, tool: Tool, design: WholeDesign, form: str, work:
         return
     tally.check(f"{label}: same wiring", whole.compare_wiring)
     tally.check(f"{label}: same traces", whole.simulate)
+    if design.use is not None:
+        tally.check(f"{label}: works", whole.use, design.use)
     # Yosys has no proof for nets that several cells drive.
     if not design.stimulus.driven_when:
         tally.check(f"{label}: Verilog proved", whole.prove_verilog)
