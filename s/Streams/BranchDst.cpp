@@ -53,8 +53,10 @@ void PlainBranchDst::Write(int number) {
 }
 
 void PlainBranchDst::WriteView(std::string_view text) {
-    Append(text);
-    StartLine();
+    if (!text.empty()) {
+        Append(text);
+        StartLine();
+    }
 }
 
 void PlainBranchDst::WritePieces(const std::string_view* pieces, std::size_t count) {
