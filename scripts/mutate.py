@@ -261,8 +261,8 @@ def limit() -> None:
 def run(program: str, seconds: float, cases: str = SEED) -> str:
     """Why a test program fails; empty when it passes."""
     with tempfile.TemporaryDirectory(dir=WORK / "tmp") as folder:
-        # Some tests become a user who is not root.
-        os.chmod(folder, 0o755)
+        # Some tests become a user who is not root, and make folders of their own.
+        os.chmod(folder, 0o777)
         command = [in_use.folder / "tests" / target(program), "--gtest_brief=1", "--gtest_fail_fast",
                    f"--gtest_filter={FILTER}"]
         try:
