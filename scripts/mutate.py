@@ -48,7 +48,7 @@ REASONS = PROJECT / "scripts" / "mutants.txt"
 
 # All programs, quick ones first; the folder of the changed file comes before them.
 PROGRAMS = ["Writers", "Options", "Header", "Verilog", "Vhdl", "HdlCmd", "Port", "Streams", "HdlModel",
-            "Containers", "HdlEngine", "Check", "Legal", "Readers", "Proof", "Robustness", "Threads"]
+            "Containers", "HdlEngine", "C", "Check", "Legal", "Readers", "Proof", "Robustness", "Threads"]
 # Where no folder below tests/ has the name of the one below s/.
 TESTED_BY = {"Exception": "HdlEngine"}
 # Large designs take minutes and find nothing that small ones do not.
