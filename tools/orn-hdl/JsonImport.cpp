@@ -16,6 +16,7 @@
 #include "import/NameMap.h"
 #include "import/TopModule.h"
 
+#include "LastingEngines.h"
 #include "Orn_Hdl/Engine.h"
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
@@ -94,16 +95,13 @@ Status WriteImported(const Netlists& netlists, const ImportOptions& options, Pro
     if (options.outputs.IsEmpty()) {
         return Status::Success;
     }
-    // The designs are not destroyed before the process ends: freeing them object by object would
-    // take a tenth of the time of the whole import.
-    static Orn_Hdl::Engine* engine = nullptr;
-    delete std::exchange(engine, nullptr); // From an earlier import.
-    engine = new Orn_Hdl::Engine;
-    engine->SetThreads(options.threads);
+    DropLastingEngines();
+    Orn_Hdl::Engine& engine = MakeLastingEngine();
+    engine.SetThreads(options.threads);
     std::vector<Orn_Hdl::Model*> models;
     for (const ImportedNetlist& netlist : netlists) {
-        engine->CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
-        models.push_back(engine->GetModel(netlist.name.c_str()));
+        engine.CreateAndAddModel(netlist.name.c_str(), options.file.c_str());
+        models.push_back(engine.GetModel(netlist.name.c_str()));
         ModelSink sink(*models.back());
         progress.Making(netlist.name);
         EmitNetlist(netlist, sink);

@@ -6,6 +6,7 @@
 #include "design/ComponentCheck.h"
 #include "design/ModelLinks.h"
 
+#include "LastingEngines.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/File.h"
 #include "Run.h"
@@ -120,18 +121,14 @@ Status FileCheck::Run(std::vector<Reported>& all) {
 /// Checks all files, and the components of each that are models of others.
 Status CheckAll(const CheckOptions& options, Check::Targets targets, Reporter& reporter,
                 std::vector<Reported>& findings) {
-    // The designs stand until the process ends, as in `run`.
-    static std::vector<std::unique_ptr<Orn_Hdl::Engine>>* engines = nullptr;
-    delete std::exchange(engines, nullptr);
-    engines = new std::vector<std::unique_ptr<Orn_Hdl::Engine>>;
+    DropLastingEngines();
     std::vector<std::unique_ptr<FileCheck>> checks;
     std::vector<ModelOfFile> checked;
     std::vector<Orn_Hdl::Model*> models;
     Status status = Status::Success;
     for (const std::string& file : options.files) {
-        engines->push_back(std::make_unique<Orn_Hdl::Engine>());
         checks.push_back(
-            std::make_unique<FileCheck>(*engines->back(), options, file, targets, reporter));
+            std::make_unique<FileCheck>(MakeLastingEngine(), options, file, targets, reporter));
         const Status one = checks.back()->Run(findings);
         if (one == Status::Success) {
             checked.push_back(checks.back()->GetModel());

@@ -1,5 +1,6 @@
 #include "design/RunDesign.h"
 
+#include "LastingEngines.h"
 #include "LegalNames.h"
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Progress.h"
@@ -105,6 +106,7 @@ Status DesignRun::Run() {
 }
 
 Status DesignRun::Replay() {
+    DropLastingEngines();
     Status status = Status::Success;
     for (const std::string& name : options_.files) {
         files_.push_back(std::make_unique<FileOfDesign>(name, options_.quiet, reporter_));
@@ -117,14 +119,8 @@ Status DesignRun::Replay() {
 }
 
 Status DesignRun::Replay(FileOfDesign& file) {
-    // The designs are not destroyed before the process ends, as that of a single file. Each has an
-    // engine of its own, since models of one engine need different names before they are replayed.
-    static std::vector<std::unique_ptr<Orn_Hdl::Engine>>& engines =
-        *new std::vector<std::unique_ptr<Orn_Hdl::Engine>>;
-    if (files_.size() == 1) {
-        engines.clear(); // From an earlier run.
-    }
-    Orn_Hdl::Engine& engine = *engines.emplace_back(std::make_unique<Orn_Hdl::Engine>());
+    // Models of one engine need different names before they are replayed.
+    Orn_Hdl::Engine& engine = MakeLastingEngine();
     const std::string name = GetModelName(file.file.name, {});
     engine.CreateAndAddModel(name, file.file.name);
     file.model = engine.GetModel(name);

@@ -1,6 +1,7 @@
 #include "proof/Verify.h"
 
 #include "Gzip.h"
+#include "LastingEngines.h"
 #include "NoWrites.h"
 #include "Progress.h"
 #include "Run.h"
@@ -10,8 +11,6 @@
 
 #include "Orn_Hdl/Orn_Hdl.h"
 #include "Port/String.h"
-
-#include <utility>
 
 namespace Tool {
 
@@ -72,13 +71,11 @@ Status Verify(const VerifyOptions& options) {
         Complain("the language of " + options.netlist + " is not known; say it by --language");
         return Status::Usage;
     }
-    // The design is not destroyed before the process ends, as in `run`.
-    static Orn_Hdl::Engine* engine = nullptr;
-    delete std::exchange(engine, nullptr); // From an earlier run.
-    engine = new Orn_Hdl::Engine;
+    DropLastingEngines();
+    Orn_Hdl::Engine& engine = MakeLastingEngine();
     const std::string name = GetModelName(options.commands, options.model);
-    engine->CreateAndAddModel(name, options.commands);
-    Orn_Hdl::Model& model = *engine->GetModel(name);
+    engine.CreateAndAddModel(name, options.commands);
+    Orn_Hdl::Model& model = *engine.GetModel(name);
     DropWrites(*model.GetCommandFactory());
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";

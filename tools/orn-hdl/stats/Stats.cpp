@@ -1,5 +1,6 @@
 #include "stats/Stats.h"
 
+#include "LastingEngines.h"
 #include "NoWrites.h"
 #include "Progress.h"
 #include "Run.h"
@@ -13,7 +14,6 @@
 #include <fstream>
 #include <sys/resource.h>
 #include <unistd.h>
-#include <utility>
 
 namespace Tool {
 
@@ -44,13 +44,11 @@ std::uint64_t GetGreatestMemory() {
 } // namespace
 
 Status PrintStats(const StatsOptions& options) {
-    // The design is not destroyed before the process ends, as in `run`.
-    static Orn_Hdl::Engine* engine = nullptr;
-    delete std::exchange(engine, nullptr); // From an earlier run.
-    engine = new Orn_Hdl::Engine;
+    DropLastingEngines();
+    Orn_Hdl::Engine& engine = MakeLastingEngine();
     const std::string name = GetModelName(options.file, options.model);
-    engine->CreateAndAddModel(name, options.file);
-    Orn_Hdl::Model& model = *engine->GetModel(name);
+    engine.CreateAndAddModel(name, options.file);
+    Orn_Hdl::Model& model = *engine.GetModel(name);
     model.GetOptions()->threads = options.threads;
     DropWrites(*model.GetCommandFactory());
 
