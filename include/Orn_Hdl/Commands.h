@@ -8,6 +8,7 @@
 #include "Port/Pooled.h"
 
 #include <cstdint>
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -15,6 +16,7 @@ namespace Orn_Hdl {
 
 class Model;
 class PhraseTable;
+struct RegisteredCommand;
 
 /// One command on one model: it is created, parses the words of its line, and is executed. Programs
 /// derive from it to add commands of their own, see `CommandFactory::AddCommandCreator`.
@@ -57,8 +59,8 @@ private:
     bool IsOwned() const noexcept { return (modelAndMark_ & OwnedMark) != 0; }
     void MarkOwned() noexcept { modelAndMark_ |= OwnedMark; }
 
-    /// The model's address, whose lowest bit is free for the mark: a command is kept by the million
-    /// and has no byte to spare.
+    /// The model's address, whose lowest bit is free for the mark: a program may keep commands by
+    /// the million.
     std::uintptr_t modelAndMark_ = 0;
 };
 
@@ -119,12 +121,15 @@ public:
     static const std::vector<CommandInfo>& GetCatalogue();
 
 private:
+    friend class CommandManager;
+
     std::shared_ptr<PhraseTable> phrases_;
 };
 
-/// Runs commands and keeps those that succeeded, which it owns. A command may run further commands
-/// with its manager, and may destroy its manager or its model: the command is then deleted when it
-/// has been executed, and what the manager kept before with the manager.
+/// Runs commands and keeps a journal of those that succeeded. Of a command of the language it keeps
+/// the words, of a command that a program has registered the object too, which it owns. A command
+/// may run further commands with its manager, and may destroy its manager or its model: the command
+/// is then deleted when it has been executed, and what the manager kept before with the manager.
 class ORN_HDL_API CommandManager {
 public:
     CommandManager();
@@ -149,6 +154,11 @@ public:
     void AddDoneCommand(Command* command);
     /// How many done commands are kept.
     int GetDoneCommandCount() const noexcept;
+    /// Calls `use` with the words of each done line, the first one first. Phrases of the command
+    /// language are spelled as registered. A command that was given to `AddDoneCommand` has the
+    /// words of its name.
+    /// \param use may do anything with the manager. What is done meanwhile is left out.
+    void ForEachDoneLine(const std::function<void(const StringArray& words)>& use) const;
     /// Deletes every done command, the first one first.
     void Clear();
 

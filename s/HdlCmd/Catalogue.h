@@ -21,10 +21,12 @@ struct CommandEntry {
     CommandExecution execute;
 };
 
-/// A phrase and the function that makes its commands.
+/// An entry and the function that makes its commands.
 struct RegisteredCommand {
-    CommandInfo info;
+    const CommandEntry& entry;
     CommandCreator create;
+    /// How many words the phrase has.
+    int words;
 };
 
 /// Every phrase of the language, in the order of registration.

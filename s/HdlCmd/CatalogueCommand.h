@@ -3,28 +3,22 @@
 
 #include "HdlCmd/Arguments.h"
 #include "HdlCmd/Catalogue.h"
-#include "Port/Pool.h"
 
+#include <algorithm>
 #include <array>
 #include <cstddef>
 #include <iterator>
-#include <new>
 #include <string_view>
 #include <utility>
 
 namespace Orn_Hdl {
 
-/// The command of one entry of a table. Its class is its entry: an object holds its model and its
-/// arguments and no pointer to the entry, since millions of done commands are kept.
+/// The command of one entry of a table, for callers who want it as an object. A manager carries out
+/// the entry itself.
 template <const auto& Table, std::size_t Index> class CatalogueCommand final : public Command {
 public:
-    static Command* Create(Model* model, const StringArray& tokens) {
-        constexpr std::size_t PhraseLength = std::string_view(Entry.info.phrase).size();
-        const std::size_t room = Arguments::RoomFor(tokens, PhraseLength);
-        // The arguments are the last member, with nothing between them and the base.
-        void* const memory = Port::Pool::AllocatePacked(sizeof(Command) + sizeof(Arguments) + room,
-                                                        Port::Pool::Commands);
-        return ::new (memory) CatalogueCommand(model, room);
+    static Command* Create(Model* model, const StringArray& /*tokens*/) {
+        return new CatalogueCommand(model);
     }
 
     bool Parse(const StringArray& tokens) override { return Entry.parse(tokens, arguments_); }
@@ -34,17 +28,22 @@ public:
 private:
     static constexpr const CommandEntry& Entry = Table[Index];
 
-    CatalogueCommand(Model* model, std::size_t room) noexcept : Command(model), arguments_(room) {}
+    explicit CatalogueCommand(Model* model) noexcept : Command(model) {}
 
     Arguments arguments_;
 };
 
 namespace CommandDetail {
 
+constexpr int CountWords(std::string_view phrase) {
+    return 1 + static_cast<int>(std::count(phrase.begin(), phrase.end(), ' '));
+}
+
 template <const auto& Table, std::size_t... Indices>
 constexpr auto RegisterAll(std::index_sequence<Indices...> /*indices*/) {
     return std::array<RegisteredCommand, sizeof...(Indices)>{
-        {{Table[Indices].info, &CatalogueCommand<Table, Indices>::Create}...}};
+        {{Table[Indices], &CatalogueCommand<Table, Indices>::Create,
+          CountWords(Table[Indices].info.phrase)}...}};
 }
 
 } // namespace CommandDetail

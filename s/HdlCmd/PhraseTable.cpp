@@ -13,7 +13,8 @@ std::size_t PhraseTable::GetChild(std::size_t node, std::string_view word) const
     return None;
 }
 
-void PhraseTable::Add(std::string_view phrase, CommandCreator creator) {
+void PhraseTable::Add(std::string_view phrase, CommandCreator creator,
+                      const RegisteredCommand* own) {
     std::size_t node = 0;
     for (bool more = true; more;) {
         const std::size_t end = phrase.find(' ');
@@ -29,6 +30,7 @@ void PhraseTable::Add(std::string_view phrase, CommandCreator creator) {
         node = child;
     }
     nodes_[node].creator = creator;
+    nodes_[node].own = own;
 }
 
 std::size_t PhraseTable::GetDescendant(std::size_t node, std::string_view words) const noexcept {
@@ -40,8 +42,8 @@ std::size_t PhraseTable::GetDescendant(std::size_t node, std::string_view words)
     return node == None ? None : GetChild(node, words);
 }
 
-CommandCreator PhraseTable::Find(const StringArray& words) const noexcept {
-    CommandCreator found = nullptr;
+PhraseTable::Match PhraseTable::Find(const StringArray& words) const noexcept {
+    Match found;
     std::size_t node = 0;
     for (int i = 0; i < words.GetSize() && !nodes_[node].children.empty(); ++i) {
         const std::string_view word = words.GetView(i);
@@ -51,7 +53,7 @@ CommandCreator PhraseTable::Find(const StringArray& words) const noexcept {
             break;
         }
         if (nodes_[node].creator != nullptr) {
-            found = nodes_[node].creator;
+            found = {nodes_[node].creator, nodes_[node].own, i + 1};
         }
     }
     return found;

@@ -1,7 +1,7 @@
 // Finds the command of a line by its leading words.
 #pragma once
 
-#include "Orn_Hdl/Commands.h"
+#include "HdlCmd/Catalogue.h"
 
 #include <cstddef>
 #include <string>
@@ -15,11 +15,22 @@ namespace Orn_Hdl {
 /// nothing.
 class PhraseTable {
 public:
-    /// Enters a phrase, or gives a present one another creator.
-    void Add(std::string_view phrase, CommandCreator creator);
-    /// The creator of the longest phrase that the words, joined by one blank, begin with; null if
-    /// there is none. A phrase ends where a word ends.
-    CommandCreator Find(const StringArray& words) const noexcept;
+    /// The command of a phrase.
+    struct Match {
+        /// Null if there is none.
+        CommandCreator creator = nullptr;
+        /// The command of the language that has the creator; null if a program registered it.
+        const RegisteredCommand* own = nullptr;
+        /// How many words of the line the phrase takes. A quoted word can hold several of its own.
+        int words = 0;
+    };
+
+    /// Enters a phrase, or gives a present one another command.
+    /// \param own the command of the language that has the creator; null for other creators.
+    void Add(std::string_view phrase, CommandCreator creator, const RegisteredCommand* own);
+    /// The command of the longest phrase that the words, joined by one blank, begin with. A phrase
+    /// ends where a word ends.
+    Match Find(const StringArray& words) const noexcept;
 
 private:
     struct Child {
@@ -28,6 +39,7 @@ private:
     };
     struct Node {
         CommandCreator creator = nullptr;
+        const RegisteredCommand* own = nullptr;
         std::vector<Child> children;
     };
 

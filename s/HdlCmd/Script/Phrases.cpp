@@ -26,7 +26,7 @@ HolderPhrases MakeHolderPhrases() {
 
 Phrase::Phrase(CommandExecution execute) : text(GetPhrase(execute)) {
     for (const RegisteredCommand& command : GetRegisteredCommands()) {
-        const std::string_view other = command.info.phrase;
+        const std::string_view other = command.entry.info.phrase;
         if (IsContinuedBy(text, other)) {
             continuations.push_back(other.substr(text.size() + 1));
         }
