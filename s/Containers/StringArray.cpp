@@ -214,26 +214,44 @@ int StringArray::Parse(Port::TextView text, Port::TextView separators, bool skip
     return Split(text, separators, skipEmpty, quotes);
 }
 
+namespace {
+
+/// The characters of a line from a position on, fewer than eight, and a blank behind them.
+std::uint64_t LoadLast(string_view line, std::size_t position) noexcept {
+    const std::size_t bits = 8 * (line.size() - position);
+    std::uint64_t text = 0;
+    if (line.size() >= sizeof text) {
+        // In two steps, since none may shift all bits out.
+        text = EightBytes::Load(line.data() + line.size() - sizeof text) >> 8U >> (56 - bits);
+    } else {
+        line.copy(reinterpret_cast<char*>(&text), line.size());
+    }
+    return text | std::uint64_t(' ') << bits;
+}
+
+} // namespace
+
 int StringArray::ParseCommandLine(Port::TextView commandLine) {
     if (IsOwn(commandLine)) {
         return ParseCommandLine(std::string(commandLine.GetView()));
     }
     const string_view line = commandLine;
     // Without quotes, the words are parts of the line: it is copied as a whole and scanned eight
-    // characters at a time. A blank behind the line ends its last word, and padding fills the last
-    // eight characters.
+    // characters at a time. The line itself is scanned, because a processor waits long before it
+    // can read what it has just copied. A blank behind the line ends its last word.
     constexpr std::size_t Step = sizeof(std::uint64_t);
-    constexpr string_view Filling(" \0\0\0\0\0\0\0", Step);
     const int before = GetSize();
     const std::size_t offset = text_.size();
-    text_.append(line).append(Filling);
-    std::size_t start = offset;
-    for (std::size_t i = offset; i <= offset + line.size(); i += Step) {
+    text_.append(line);
+    std::size_t start = 0;
+    for (std::size_t i = 0; i <= line.size(); i += Step) {
+        const std::uint64_t text =
+            i + Step <= line.size() ? EightBytes::Load(line.data() + i) : LoadLast(line, i);
         // Blanks and quotes, and some characters between them that need no attention.
-        std::uint64_t marks = EightBytes::MarkRange(EightBytes::Load(text_.data() + i), ' ', '\'');
+        std::uint64_t marks = EightBytes::MarkRange(text, ' ', '\'');
         for (; marks != 0; marks &= marks - 1) {
             const std::size_t end = i + EightBytes::FirstMarked(marks);
-            const char c = text_[end];
+            const char c = end == line.size() ? ' ' : line[end];
             if (c == '"' || c == '\'') {
                 text_.resize(offset);
                 slots_.resize(static_cast<std::size_t>(before));
@@ -241,7 +259,7 @@ int StringArray::ParseCommandLine(Port::TextView commandLine) {
             }
             if (c == ' ') {
                 if (end > start) {
-                    slots_.push_back({start, end - start});
+                    slots_.push_back({offset + start, end - start});
                 }
                 start = end + 1;
             }

@@ -41,10 +41,12 @@ struct CommandReader::Implementation {
 };
 
 void CommandReader::Implementation::Split(std::string_view text) {
-    SplitLine& line = GetFree();
-    line.Set(file, text);
+    GetFree().Set(file, text);
     ++count;
-    ReadAhead::Note(*model.GetNetlist(), line.words);
+    // The line before: a processor waits long before it can read what it has just written.
+    if (count > 1) {
+        ReadAhead::Note(*model.GetNetlist(), lines[(first + count - 2) % Distance].words);
+    }
 }
 
 /// Gives up the line in hand.
