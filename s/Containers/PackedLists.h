@@ -2,6 +2,7 @@
 #pragma once
 
 #include "Orn_Hdl/Containers/StringArray.h"
+#include "Port/Prefetch.h"
 
 #include <cstddef>
 #include <string>
@@ -36,6 +37,14 @@ public:
         }
     }
     std::size_t GetSize() const noexcept { return ends_.size(); }
+    /// Fetches a list, if there is one, which is to be copied soon.
+    void Prefetch(std::size_t index) const noexcept {
+        if (index < ends_.size()) {
+            const End begin = GetEnd(index);
+            Port::Prefetch(text_.data() + begin.text);
+            Port::Prefetch(slots_.data() + begin.slots);
+        }
+    }
     /// Makes `list` a copy of a list that is here.
     void Copy(std::size_t index, StringArray& list) const {
         const End begin = GetEnd(index);

@@ -4,8 +4,10 @@ namespace Orn_Hdl {
 
 LineBatches::LineBatches(Port::File& file, const Settings& settings)
     : settings_(settings), file_(file), batches_(settings.batches),
-      work_({settings.workers, settings.batches, true},
-            [this](std::size_t number) { return Fill(batches_[number % batches_.size()]); }) {}
+      work_(
+          {settings.workers, settings.batches, true},
+          [this](std::size_t number) { return Fill(batches_[number % batches_.size()]); },
+          [this] { memory_.Replenish(); }) {}
 
 /// Reads the lines of a batch. \return false if there are none.
 bool LineBatches::Fill(Batch& batch) noexcept {

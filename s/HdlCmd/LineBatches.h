@@ -6,6 +6,7 @@
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/File.h"
 #include "Port/OrderedWork.h"
+#include "Port/Pool.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -68,6 +69,8 @@ public:
         }
         const Line& next = batch_->lines[given_];
         batch_->words.Copy(given_, line.words);
+        // The processor that split it has it in its cache.
+        batch_->words.Prefetch(given_ + Lead);
         line.bytes = next.bytes;
         names = next.names;
         ++given_;
@@ -87,6 +90,9 @@ private:
         std::exception_ptr failure;
     };
 
+    /// How many lines ahead words are fetched.
+    static constexpr std::size_t Lead = 4;
+
     bool Fill(Batch& batch) noexcept;
     void Read(Batch& batch);
     bool NextBatch();
@@ -99,6 +105,8 @@ private:
     /// The batch whose lines are being given; null before the first.
     Batch* batch_ = nullptr;
     std::size_t given_ = 0;
+    /// For the objects that the lines make.
+    Port::Pool::Reserve memory_;
     /// Last, since its threads use the others.
     Port::OrderedWork work_;
 };

@@ -36,8 +36,8 @@ unsigned OrderedWork::GetWorkersFor(unsigned threads) noexcept {
     return std::min(threads, Most) - 1;
 }
 
-OrderedWork::OrderedWork(const Settings& settings, Job job)
-    : settings_(settings), job_(std::move(job)),
+OrderedWork::OrderedWork(const Settings& settings, Job job, Pastime pastime)
+    : settings_(settings), job_(std::move(job)), pastime_(std::move(pastime)),
       results_(std::max<std::size_t>(settings.ahead, 1)) {
     workers_.reserve(settings_.workers);
     StartWorkers();
@@ -72,8 +72,20 @@ void OrderedWork::Work() {
         if (CanBegin()) {
             RunNext(lock);
         } else {
-            change_.wait(lock);
+            Wait(lock);
         }
+    }
+}
+
+/// Waits in a worker for a change.
+void OrderedWork::Wait(Lock& lock) {
+    if (pastime_) {
+        lock.unlock();
+        pastime_();
+        lock.lock();
+    }
+    if (begun_ < end_ && !CanBegin()) {
+        change_.wait(lock);
     }
 }
 

@@ -37,6 +37,9 @@ public:
     /// Carries out the job of a number, 0 for the first. \return false if there is no such job and
     /// none of a higher number. What it throws is thrown by the `Next` that would give its result.
     using Job = std::function<bool(std::size_t number)>;
+    /// What a worker does, once, before it waits for a job that can begin; may be empty. Throws
+    /// nothing.
+    using Pastime = std::function<void()>;
 
     /// How many workers make up that many threads together with the owner; 0 threads are as many as
     /// the system gives, at most 8.
@@ -44,7 +47,7 @@ public:
 
     /// Begins. If the system gives fewer threads than asked for, the work is done by those there
     /// are.
-    OrderedWork(const Settings& settings, Job job);
+    OrderedWork(const Settings& settings, Job job, Pastime pastime = {});
     OrderedWork(const OrderedWork&) = delete;
     OrderedWork& operator=(const OrderedWork&) = delete;
     /// Begins no more jobs and waits for those that run.
@@ -66,12 +69,14 @@ private:
     std::size_t PlaceOf(std::size_t number) const noexcept { return number % results_.size(); }
     void StartWorkers();
     void Work();
+    void Wait(Lock& lock);
     bool CanBegin() const noexcept;
     void RunNext(Lock& lock);
     void Release() noexcept;
 
     const Settings settings_;
     const Job job_;
+    const Pastime pastime_;
     std::mutex mutex_;
     /// A job has ended, a result was released, or no more jobs begin.
     std::condition_variable change_;

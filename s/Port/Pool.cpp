@@ -30,6 +30,14 @@ void Free(void* memory) noexcept {
     ::operator delete(memory);
 }
 
+Reserve::~Reserve() = default;
+
+void Reserve::Replenish() noexcept {}
+
+bool Reserve::IsFull() noexcept {
+    return false;
+}
+
 #else
 
 namespace {
@@ -86,6 +94,15 @@ void Leave(Page* page, std::size_t users) noexcept {
     }
 }
 
+/// The page that is held ready; null if there is none.
+std::atomic<Page*> readyPage{nullptr};
+
+Page* TakeReadyPage() noexcept {
+    return readyPage.load(std::memory_order_relaxed) == nullptr
+               ? nullptr
+               : readyPage.exchange(nullptr, std::memory_order_acquire);
+}
+
 /// The page that a thread is filling with objects of one kind.
 class Filler {
 public:
@@ -95,7 +112,10 @@ public:
     void* AllocatePacked(std::size_t size) {
         if (size > left_) {
             // The first page does not use huge pages: most processes need only a part of it.
-            Page* const fresh = NewPage(PageSize, page_ != nullptr, Filling);
+            Page* fresh = page_ == nullptr ? nullptr : TakeReadyPage();
+            if (fresh == nullptr) {
+                fresh = NewPage(PageSize, page_ != nullptr, Filling);
+            }
             Close();
             page_ = fresh;
             left_ = PageSize - HeaderSize;
@@ -151,6 +171,33 @@ void* AllocatePage(std::size_t size) {
 }
 
 } // namespace
+
+Reserve::~Reserve() {
+    if (Page* const page = TakeReadyPage()) {
+        munmap(page, page->size);
+    }
+}
+
+bool Reserve::IsFull() noexcept {
+    return readyPage.load(std::memory_order_relaxed) != nullptr;
+}
+
+void Reserve::Replenish() noexcept {
+    if (IsFull()) {
+        return;
+    }
+    try {
+        // Its header is written, so the system clears a huge page as a whole.
+        Page* const page = NewPage(PageSize, true, Filling);
+        Page* none = nullptr;
+        if (!readyPage.compare_exchange_strong(none, page, std::memory_order_release,
+                                               std::memory_order_relaxed)) {
+            munmap(page, page->size);
+        }
+    } catch (const std::bad_alloc&) {
+        // Whoever needs the page will see.
+    }
+}
 
 void* Allocate(std::size_t size, Kind kind) {
     const std::size_t rounded = RoundUp(size);

@@ -14,6 +14,22 @@ namespace Port::Pool {
 /// Memory for an object whose alignment is at most eight bytes.
 void* AllocatePacked(std::size_t size, Kind kind);
 
+/// Has the system clear memory for the next thread that fills pages, which takes longer than
+/// filling them: one page at a time, held ready for any thread. A thread that has nothing else to
+/// do calls it for one that is busy.
+class Reserve {
+public:
+    Reserve() = default;
+    Reserve(const Reserve&) = delete;
+    Reserve& operator=(const Reserve&) = delete;
+    /// Returns the page that is held ready to the system.
+    ~Reserve();
+    /// Makes a page ready if there is none. If allocation fails, there is none.
+    void Replenish() noexcept;
+    /// Whether a page is ready. Sanitizers have no pages.
+    static bool IsFull() noexcept;
+};
+
 /// An allocator for standard containers that become large: it uses huge pages for memory of at
 /// least that size.
 template <class T> struct Allocator {

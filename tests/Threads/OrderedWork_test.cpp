@@ -132,6 +132,34 @@ TEST(OrderedWork, MayEndBeforeItsResultsAreTaken) {
     EXPECT_EQ(running, 0);
 }
 
+TEST(OrderedWork, WorkersHaveAPastimeBeforeTheyWait) {
+    for (const unsigned workers : {1U, 3U}) {
+        std::atomic<int> pastimes = 0;
+        {
+            OrderedWork work(
+                {workers, 2}, [](std::size_t number) { return number < Jobs; },
+                [&pastimes] { ++pastimes; });
+            // No job can begin once both places are taken.
+            while (pastimes == 0) {
+                std::this_thread::yield();
+            }
+            std::size_t given = 0;
+            while (work.Next()) {
+                ++given;
+            }
+            EXPECT_EQ(given, Jobs);
+        }
+        EXPECT_GT(pastimes, 0);
+    }
+    bool hadPastime = false;
+    OrderedWork alone(
+        {0, 2}, [](std::size_t number) { return number < Jobs; },
+        [&hadPastime] { hadPastime = true; });
+    while (alone.Next()) {
+    }
+    EXPECT_FALSE(hadPastime) << "the owner has none";
+}
+
 TEST(OrderedWork, WithoutWorkersTheOwnerDoesAll) {
     const std::thread::id owner = std::this_thread::get_id();
     OrderedWork work({0, 2, false}, [&](std::size_t number) {
