@@ -1,5 +1,10 @@
 #include "Writers/NetlistPass.h"
 
+#include "HdlModel/Netlist/NetlistSorting.h"
+#include "Port/OrderedWork.h"
+
+#include <algorithm>
+
 namespace Orn_Hdl::Writers {
 
 InstanceStarts::InstanceStarts(const Netlist& netlist) : distance_(GetRangeSizes().items) {
@@ -21,9 +26,24 @@ InstanceStarts::Cursor InstanceStarts::Find(std::size_t instance) const noexcept
 }
 
 void NetlistPass::Prepare() {
-    netlist_.SortNetlist();
+    Sort();
     netlist_.CreateVhdlDummySignals();
     passesInit_ = PassesInit(language_, netlist_);
+}
+
+void NetlistPass::Sort() {
+    constexpr std::size_t Parts = NetlistSorting::Parts;
+    const unsigned workers = options_.threads == 1 || !NetlistSorting::IsLong(netlist_)
+                                 ? 0
+                                 : Port::OrderedWork::GetWorkersFor(options_.threads);
+    Port::OrderedWork work({std::min(workers, 1U), Parts}, [this](std::size_t part) {
+        if (part < Parts) {
+            NetlistSorting::SortPart(netlist_, part);
+        }
+        return part < Parts;
+    });
+    while (work.Next()) {
+    }
 }
 
 void NetlistPass::WriteOpening() {

@@ -120,6 +120,8 @@ protected:
     const HdlOptions& options_;
 
 private:
+    void Sort();
+
     const Language language_;
     bool passesInit_ = false;
 };

@@ -161,6 +161,7 @@ public:
 private:
     friend class Model;
     friend class NetlistOwner;
+    friend class NetlistSorting;
     friend class Renaming;
     friend class ModelRegistry;
     friend class ReadAhead;

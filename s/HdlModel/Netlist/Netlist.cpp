@@ -7,6 +7,7 @@
 #include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/Foresight.h"
 #include "HdlModel/Netlist/NetlistOwner.h"
+#include "HdlModel/Netlist/NetlistSorting.h"
 #include "HdlModel/Netlist/ObjectList.h"
 #include "HdlModel/Netlist/PinBlock.h"
 #include "HdlModel/Netlist/Primitives.h"
@@ -388,18 +389,34 @@ void Netlist::GetInstances(const char* componentName, PtrArray<Instance*>& insta
     GetInstances(GetComponent(componentName), instances);
 }
 
-void Netlist::SortNetlist() {
-    implementation_->signals.SortBy([](PtrArray<Signal*>& signals) {
-        SortNaturally(signals, [](const Signal* s) { return s->GetPortPolarity().GetValue(); });
-    });
-    implementation_->components.SortBy([](PtrArray<Component*>& components) {
+bool NetlistSorting::IsLong(const Netlist& netlist) noexcept {
+    constexpr int LeastLength = 8000;
+    const Netlist::Implementation& own = *netlist.implementation_;
+    return std::min(own.signals.GetLength(), own.instances.GetLength()) >= LeastLength;
+}
+
+void NetlistSorting::SortPart(Netlist& netlist, std::size_t part) {
+    Netlist::Implementation& own = *netlist.implementation_;
+    if (part == 0) {
+        own.signals.SortBy([](PtrArray<Signal*>& signals) {
+            SortNaturally(signals, [](const Signal* s) { return s->GetPortPolarity().GetValue(); });
+        });
+        return;
+    }
+    own.components.SortBy([](PtrArray<Component*>& components) {
         SortNaturally(components, [](const Component*) { return 0; });
     });
-    implementation_->instances.SortBy([](PtrArray<Instance*>& instances) {
+    own.instances.SortBy([](PtrArray<Instance*>& instances) {
         SortNaturally(instances, [](const Instance*) { return 0; });
     });
-    for (Instance* instance : GetInstanceIterator()) {
+    for (Instance* instance : netlist.GetInstanceIterator()) {
         instance->SortPinName();
+    }
+}
+
+void Netlist::SortNetlist() {
+    for (std::size_t part = 0; part < NetlistSorting::Parts; ++part) {
+        NetlistSorting::SortPart(*this, part);
     }
 }
 

@@ -88,6 +88,8 @@ public:
         sort(objects_);
     }
 
+    /// How many objects there are, holes included.
+    int GetLength() const noexcept { return objects_.GetSize(); }
     /// The objects without nulls between them.
     const PtrArray<T*>& GetArray() noexcept {
         CloseHoles();
