@@ -50,8 +50,8 @@ ImportFormat GetFormat(const ImportOptions& options) {
 
 /// The first option that applies to JSON netlists alone; empty for none.
 std::string_view FindJsonOption(const ImportOptions& options) {
-    if (!options.unknownAs.empty()) {
-        return "--x-as";
+    if (options.unknownAs == "0" || options.unknownAs == "1") {
+        return options.unknownAs == "0" ? "--x-as 0" : "--x-as 1";
     }
     if (!options.modules.empty()) {
         return "--module";

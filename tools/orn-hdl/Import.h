@@ -35,7 +35,7 @@ struct ImportOptions {
     /// The command file to write; empty for none. A folder gets one file a module.
     std::string commandFile;
     Outputs outputs;
-    /// The replacement of x and z, "0" or "1"; empty to reject them.
+    /// The replacement of x and z: "0", "1", or "-" for don't cares; empty to reject them.
     std::string unknownAs;
     /// The cell libraries.
     std::vector<std::string> libraries;

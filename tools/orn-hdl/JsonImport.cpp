@@ -38,7 +38,9 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     if (options.unknownAs.empty()) {
         return UnknownValues(std::nullopt);
     }
-    return UnknownValues(options.unknownAs == "1" ? One : Zero);
+    return UnknownValues(options.unknownAs == "-"   ? Unknown
+                         : options.unknownAs == "1" ? One
+                                                    : Zero);
 }
 
 /// The modules that are written, in the order of compilation.

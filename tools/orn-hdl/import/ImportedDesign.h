@@ -23,6 +23,11 @@ constexpr bool IsNet(Bit bit) noexcept {
     return bit < Zero;
 }
 
+/// The digit of a constant bit: x and z are don't cares.
+constexpr char GetDigit(Bit bit) noexcept {
+    return bit == Zero ? '0' : bit == One ? '1' : '-';
+}
+
 /// A run of consecutive entries in one of a module's tables.
 struct Span {
     std::uint32_t start = 0;

@@ -104,12 +104,13 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     const std::vector<std::string> portNames = ClaimPortNames(top, names);
     ImportedComponents components = FindComponents(design, top, rules, names, warnings);
     OpenConstantOutputs(top, components, warnings);
-    TellReplacedValues(top, components, unknown, warnings);
+    const bool hasReplaced = TellReplacedValues(top, components, unknown, warnings);
     const BitUses uses = BitUses::Count(top, components, unknown, portNames);
     BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
     WarnOfModule(top, warnings);
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
+    netlist.hasDontCares = hasReplaced && unknown.AreDontCares();
     netlist.hasVhdl = rules.names.HasVhdl();
     netlist.vhdl = rules.vhdl;
     CheckConfiguration(netlist);

@@ -96,7 +96,8 @@ void SlipFinder::ReadConstant(const StringArray& words) {
     if (value == "0" || value == "1") {
         return;
     }
-    if (const std::optional<WrongDigit> wrong = FindWrongDigit(value)) {
+    const bool dontCares = model_.GetOptions()->dontCares;
+    if (const std::optional<WrongDigit> wrong = FindWrongDigit(value, dontCares)) {
         if (options_.Has(Slip::ConstantDigit)) {
             report_({Slip::ConstantDigit, wrong->message, "",
                      Mark::Part(Value, wrong->offset, wrong->length)});
