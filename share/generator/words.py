@@ -19,6 +19,8 @@ class Port:
     name: str
     direction: str = "in"
     width: str = ""
+    # What an output has at first.
+    start: str = ""
 
 
 @dataclass(frozen=True)
@@ -29,8 +31,8 @@ class Cell:
     ports: list[Port]
     body: list[str]
     declarations: list[str] = field(default_factory=list)
-    # Parameters whose digits can be others than 0 and 1.
-    texts: list[str] = field(default_factory=list)
+    # Parameters whose digits can be others than 0 and 1, with their defaults.
+    texts: dict[str, str] = field(default_factory=dict)
     # How wide ports are, where parameters do not tell it.
     numbers: list[str] = field(default_factory=list)
 
@@ -258,8 +260,9 @@ def _register(name: str, parts: list[str]) -> Cell:
     comment = f"{kind} with {', '.join(_ABOUT[part] for part in parts)}"
     comment += ("; the reset needs the enable." if name == "sdffce" else ".")
     comment = comment.replace("Latches with a set", "Latches without data, with a set")
-    return Cell(name, comment, sorted(parameters), [*ports, Port("Q", "out", _WIDTH)],
-                _register_body(name, parts))
+    return Cell(name, comment, sorted(parameters),
+                [*ports, Port("Q", "out", _WIDTH, "first_value(INIT, highest(number(WIDTH)) + 1)")],
+                _register_body(name, parts), texts={"INIT": "U"})
 
 
 def _register_body(name: str, parts: list[str]) -> list[str]:
@@ -366,7 +369,7 @@ _STATE_MACHINE = Cell(
      "constant outputs : natural := number(CTRL_OUT_WIDTH);",
      "-- The number of the state, and of the row that fits; -1 for none.",
      "signal state, row : integer := -1;"],
-    ["TRANS_TABLE"])
+    {"TRANS_TABLE": "0"})
 
 
 def cells() -> list[Cell]:
@@ -380,7 +383,7 @@ def _port(port: Port) -> str:
         default = " := '0'" if port.direction == "in" else ""
         return f"{port.name} : {port.direction} std_logic{default}"
     kind = f"std_logic_vector(highest({port.width}) downto 0)"
-    default = " := (others => '0')" if port.direction == "in" else ""
+    default = " := (others => '0')" if port.direction == "in" else f" := {port.start}" if port.start else ""
     return f"{port.name} : {port.direction} {kind}{default}"
 
 
@@ -390,7 +393,7 @@ def model(cell: Cell) -> str:
     lines = [f"-- ${cell.name}: {cell.comment}", "library ieee;", "use ieee.std_logic_1164.all;",
              "use work.orn_hdl_cells.all;", "", f"entity {entity} is", f"{_INDENT}generic ("]
     generics = [f"{name} : bit_vector := b\"0\"" for name in cell.parameters]
-    generics += [f"{name} : string := \"0\"" for name in cell.texts]
+    generics += [f"{name} : string := \"{default}\"" for name, default in cell.texts.items()]
     generics += [f"{name} : natural := 0" for name in cell.numbers]
     ports = [_port(port) for port in cell.ports]
     lines += [f"{2 * _INDENT}{text};" for text in generics[:-1]] + [2 * _INDENT + generics[-1]]

@@ -11,6 +11,8 @@ package orn_hdl_cells is
    function is_set (value : bit_vector) return boolean;
    -- The lowest bits of a parameter, which has zeros above its own.
    function value_of (value : bit_vector; width : natural) return std_logic_vector;
+   -- What a register has at first, from digits 0, 1 and U; bits without a digit have U.
+   function first_value (digits : string; width : natural) return std_logic_vector;
    -- The highest index of a port, which has one bit at least.
    function highest (width : integer) return natural;
    function largest (a, b : integer) return integer;
@@ -141,6 +143,22 @@ package body orn_hdl_cells is
       end loop;
       return result;
    end value_of;
+
+   function first_value (digits : string; width : natural) return std_logic_vector is
+      alias texts : string(digits'length downto 1) is digits;
+      variable result : std_logic_vector(width - 1 downto 0) := (others => 'U');
+   begin
+      for i in result'reverse_range loop
+         if i < texts'length then
+            case texts(i + 1) is
+               when '0' => result(i) := '0';
+               when '1' => result(i) := '1';
+               when others => null;
+            end case;
+         end if;
+      end loop;
+      return result;
+   end first_value;
 
    function highest (width : integer) return natural is
    begin
@@ -583,19 +601,19 @@ package body orn_hdl_cells is
       alias levels : std_logic_vector(control'length - 1 downto 0) is control;
       constant length : natural := 2 * states + inputs + outputs;
       variable start : integer;
-      variable fits : boolean;
+      variable is_fitting : boolean;
       variable digit : character;
    begin
       for row in rows - 1 downto 0 loop
          start := start_of(digits, row, length);
-         fits := state >= 0 and number_at(digits, start, states) = state;
+         is_fitting := state >= 0 and number_at(digits, start, states) = state;
          for i in 0 to inputs - 1 loop
             digit := digits(start + states + inputs - 1 - i);
             if digit /= '-' then
-               fits := fits and digit_of(digit) = to_x01(levels(i));
+               is_fitting := is_fitting and digit_of(digit) = to_x01(levels(i));
             end if;
          end loop;
-         if fits then
+         if is_fitting then
             return row;
          end if;
       end loop;

@@ -57,6 +57,8 @@ struct ImportOptions {
     std::string nameMap;
     /// The file for the simulation models of cells; empty for none.
     std::string cellModels;
+    /// Give registers the first values of their nets, for the models of cells in VHDL.
+    bool initialValues = false;
     /// Write legal netlists, or nothing.
     bool legal = false;
     /// Read each netlist back and compare it with the design before it replaces its file.

@@ -10,6 +10,7 @@
 #include "import/DesignReader.h"
 #include "import/DesignUnits.h"
 #include "import/EmitNetlist.h"
+#include "import/FirstValues.h"
 #include "import/Hierarchy.h"
 #include "import/ImportedNetlist.h"
 #include "import/ModelSink.h"
@@ -230,6 +231,9 @@ Status ImportFile(JsonFile& file, const ImportOptions& options, const CellLibrar
         const std::unique_ptr<ImportedDesign> design = ReadFile(file, options);
         if (design == nullptr) {
             return Status::File;
+        }
+        if (options.initialValues) {
+            SetFirstValues(*design);
         }
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());

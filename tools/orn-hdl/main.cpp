@@ -465,6 +465,8 @@ private:
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddFile(command, "--write-cells", import_.cellModels,
                 "Write simulation models in VHDL of the cells of Yosys");
+        command.add_flag("--initial-values", import_.initialValues,
+                         "Give the registers of these models the first values of their nets");
         AddThreads(command, import_.threads);
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");

@@ -14,6 +14,8 @@ package orn_hdl_cells is
    function is_set (value : bit_vector) return boolean;
    -- The lowest bits of a parameter, which has zeros above its own.
    function value_of (value : bit_vector; width : natural) return std_logic_vector;
+   -- What a register has at first, from digits 0, 1 and U; bits without a digit have U.
+   function first_value (digits : string; width : natural) return std_logic_vector;
    -- The highest index of a port, which has one bit at least.
    function highest (width : integer) return natural;
    function largest (a, b : integer) return integer;
@@ -144,6 +146,22 @@ package body orn_hdl_cells is
       end loop;
       return result;
    end value_of;
+
+   function first_value (digits : string; width : natural) return std_logic_vector is
+      alias texts : string(digits'length downto 1) is digits;
+      variable result : std_logic_vector(width - 1 downto 0) := (others => 'U');
+   begin
+      for i in result'reverse_range loop
+         if i < texts'length then
+            case texts(i + 1) is
+               when '0' => result(i) := '0';
+               when '1' => result(i) := '1';
+               when others => null;
+            end case;
+         end if;
+      end loop;
+      return result;
+   end first_value;
 
    function highest (width : integer) return natural is
    begin
@@ -586,19 +604,19 @@ package body orn_hdl_cells is
       alias levels : std_logic_vector(control'length - 1 downto 0) is control;
       constant length : natural := 2 * states + inputs + outputs;
       variable start : integer;
-      variable fits : boolean;
+      variable is_fitting : boolean;
       variable digit : character;
    begin
       for row in rows - 1 downto 0 loop
          start := start_of(digits, row, length);
-         fits := state >= 0 and number_at(digits, start, states) = state;
+         is_fitting := state >= 0 and number_at(digits, start, states) = state;
          for i in 0 to inputs - 1 loop
             digit := digits(start + states + inputs - 1 - i);
             if digit /= '-' then
-               fits := fits and digit_of(digit) = to_x01(levels(i));
+               is_fitting := is_fitting and digit_of(digit) = to_x01(levels(i));
             end if;
          end loop;
-         if fits then
+         if is_fitting then
             return row;
          end if;
       end loop;
@@ -1921,12 +1939,13 @@ entity orn_hdl_sr is
    generic (
       CLR_POLARITY : bit_vector := b"0";
       SET_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       SET : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       CLR : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_sr;
 
@@ -1952,12 +1971,13 @@ use work.orn_hdl_cells.all;
 entity orn_hdl_dff is
    generic (
       CLK_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_dff;
 
@@ -1990,13 +2010,14 @@ entity orn_hdl_dffe is
    generic (
       CLK_POLARITY : bit_vector := b"0";
       EN_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       EN : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_dffe;
 
@@ -2034,14 +2055,15 @@ entity orn_hdl_dffsr is
       CLK_POLARITY : bit_vector := b"0";
       CLR_POLARITY : bit_vector := b"0";
       SET_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       SET : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       CLR : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_dffsr;
 
@@ -2086,7 +2108,8 @@ entity orn_hdl_dffsre is
       CLR_POLARITY : bit_vector := b"0";
       EN_POLARITY : bit_vector := b"0";
       SET_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
@@ -2094,7 +2117,7 @@ entity orn_hdl_dffsre is
       CLR : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       EN : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_dffsre;
 
@@ -2142,13 +2165,14 @@ entity orn_hdl_adff is
       ARST_POLARITY : bit_vector := b"0";
       ARST_VALUE : bit_vector := b"0";
       CLK_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       ARST : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_adff;
 
@@ -2187,14 +2211,15 @@ entity orn_hdl_adffe is
       ARST_VALUE : bit_vector := b"0";
       CLK_POLARITY : bit_vector := b"0";
       EN_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       ARST : in std_logic := '0';
       EN : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_adffe;
 
@@ -2235,14 +2260,15 @@ entity orn_hdl_aldff is
    generic (
       ALOAD_POLARITY : bit_vector := b"0";
       CLK_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       ALOAD : in std_logic := '0';
       AD : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_aldff;
 
@@ -2280,7 +2306,8 @@ entity orn_hdl_aldffe is
       ALOAD_POLARITY : bit_vector := b"0";
       CLK_POLARITY : bit_vector := b"0";
       EN_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
@@ -2288,7 +2315,7 @@ entity orn_hdl_aldffe is
       EN : in std_logic := '0';
       AD : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_aldffe;
 
@@ -2330,13 +2357,14 @@ entity orn_hdl_sdff is
       CLK_POLARITY : bit_vector := b"0";
       SRST_POLARITY : bit_vector := b"0";
       SRST_VALUE : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       SRST : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_sdff;
 
@@ -2379,14 +2407,15 @@ entity orn_hdl_sdffe is
       EN_POLARITY : bit_vector := b"0";
       SRST_POLARITY : bit_vector := b"0";
       SRST_VALUE : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       SRST : in std_logic := '0';
       EN : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_sdffe;
 
@@ -2429,14 +2458,15 @@ entity orn_hdl_sdffce is
       EN_POLARITY : bit_vector := b"0";
       SRST_POLARITY : bit_vector := b"0";
       SRST_VALUE : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       CLK : in std_logic := '0';
       SRST : in std_logic := '0';
       EN : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_sdffce;
 
@@ -2480,12 +2510,13 @@ use work.orn_hdl_cells.all;
 entity orn_hdl_dlatch is
    generic (
       EN_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       EN : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_dlatch;
 
@@ -2509,13 +2540,14 @@ entity orn_hdl_adlatch is
       ARST_POLARITY : bit_vector := b"0";
       ARST_VALUE : bit_vector := b"0";
       EN_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       EN : in std_logic := '0';
       ARST : in std_logic := '0';
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_adlatch;
 
@@ -2541,14 +2573,15 @@ entity orn_hdl_dlatchsr is
       CLR_POLARITY : bit_vector := b"0";
       EN_POLARITY : bit_vector := b"0";
       SET_POLARITY : bit_vector := b"0";
-      WIDTH : bit_vector := b"0"
+      WIDTH : bit_vector := b"0";
+      INIT : string := "U"
    );
    port (
       EN : in std_logic := '0';
       SET : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       CLR : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
       D : in std_logic_vector(highest(number(WIDTH)) downto 0) := (others => '0');
-      Q : out std_logic_vector(highest(number(WIDTH)) downto 0)
+      Q : out std_logic_vector(highest(number(WIDTH)) downto 0) := first_value(INIT, highest(number(WIDTH)) + 1)
    );
 end orn_hdl_dlatchsr;
 

@@ -271,6 +271,19 @@ void ModelWriter::WriteOnce(std::string_view key) {
 
 } // namespace
 
+bool HasModelWithFirstValue(std::string_view type) {
+    static const CellModelMap gates = SplitModels(GetGateModels());
+    static const CellModelMap words = SplitModels(GetWordModels());
+    for (const CellModelMap* models : {&gates, &words}) {
+        const auto model = models->find(type);
+        // A memory has a first value for each word, which is a parameter of its own.
+        if (model != models->end() && model->second.GetTypeOf("INIT") == "string") {
+            return true;
+        }
+    }
+    return false;
+}
+
 void WriteCellModels(const std::vector<ImportedNetlist>& netlists, Port::Stream& out,
                      Warnings& warnings) {
     out << "-- Simulation models of cells, by Orn_Hdl.\n";

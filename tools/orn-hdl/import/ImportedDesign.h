@@ -82,8 +82,14 @@ struct Net {
     BitRange range;
     Span bits;
     Span attributes;
-    /// Whether registers that drive the net start with a known value, by its attribute "init".
-    bool hasFirstValue = false;
+};
+
+/// The digits with which registers that drive a net start, the leftmost first; at least one is 0
+/// or 1. The net says so by its attribute "init".
+struct FirstValue {
+    /// Index into the nets of the module.
+    std::uint32_t net = 0;
+    std::string_view digits;
 };
 
 struct Connection {
@@ -115,6 +121,7 @@ struct Module {
     /// The default values of parameters.
     std::vector<NamedValue> defaults;
     std::vector<Net> nets;
+    std::vector<FirstValue> firstValues;
     std::vector<Cell> cells;
 
     std::vector<Bit> bits;

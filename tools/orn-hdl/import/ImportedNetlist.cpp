@@ -56,12 +56,11 @@ void WarnOfModule(const Module& top, Warnings& warnings) {
         warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("memories"),
                      "memories are not imported; map them to cells first");
     }
-    for (const Net& net : top.nets) {
-        if (net.hasFirstValue) {
-            warnings.Add(top.GetPath("netnames", net.name).AddKey("attributes").AddKey("init"),
-                         "the first values of registers are not imported: a register is unknown "
-                         "until it is reset or loaded");
-        }
+    for (const FirstValue& value : top.firstValues) {
+        const std::string_view net = top.nets[value.net].name;
+        warnings.Add(top.GetPath("netnames", net).AddKey("attributes").AddKey("init"),
+                     "the first values of registers are not imported: a register is unknown until "
+                     "it is reset or loaded");
     }
     if (top.ports.empty()) {
         warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("ports"),
