@@ -138,7 +138,9 @@ class DontCares(ImportTest):
 
     def test_without_the_option_a_run_warns(self) -> None:
         self.import_design(DESIGN, "--x-as", "-")
-        self.assertIn("constant-digit", self.run_tool("run", "x.cmd").err)
+        said = self.run_tool("run", "x.cmd").err
+        self.assertIn("constant-digit", said)
+        self.assertIn("note: what helps: --dont-cares, if a digit - is a don't care", said)
         self.expect(self.run_tool("run", "x.cmd", "--dont-cares"), SUCCESS)
 
     def test_other_values_are_refused(self) -> None:
