@@ -14,6 +14,7 @@
 #include "import/DesignReader.h"
 #include "import/DesignUnits.h"
 #include "import/EmitNetlist.h"
+#include "import/FirstValues.h"
 #include "import/Hierarchy.h"
 #include "import/ImportedNetlist.h"
 #include "import/ModelSink.h"
@@ -34,6 +35,8 @@ Import::UnknownValues PickUnknownValues(int choice) {
         return Import::UnknownValues(Import::Zero);
     case 1:
         return Import::UnknownValues(Import::One);
+    case 2:
+        return Import::UnknownValues(Import::Unknown);
     default:
         return Import::UnknownValues(std::nullopt);
     }
@@ -85,6 +88,7 @@ void CheckCommands(const Import::ImportedNetlist& netlist, Model& direct) {
     CommandFactory factory;
     Model replayed(&factory);
     Replay(replayed, WriteCommands(netlist));
+    replayed.GetOptions()->dontCares = direct.GetOptions()->dontCares;
     Check(Fuzz::WriteWithChecks(*direct.GetNetlist(), *direct.GetOptions()) ==
               Fuzz::WriteThreeTimes(*replayed.GetNetlist(), *replayed.GetOptions()),
           "the command file makes the same netlist");
@@ -173,6 +177,9 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     try {
         const std::unique_ptr<Import::ImportedDesign> design =
             Import::ReadDesign(std::string(bytes.Rest()), choice % 2 == 0);
+        if (rules.keepPorts) {
+            Import::SetFirstValues(*design);
+        }
         CheckImport(*design, rules, choice >= 2);
     } catch (const Import::Error&) {
         // The input is no netlist, or cannot be imported.

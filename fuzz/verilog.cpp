@@ -46,13 +46,16 @@ void CheckReadBack(Model& model) {
     VerilogReader reader;
     reader.AddLibrary(*model.GetNetlist());
     reader.SetNames(VerilogReader::Names::Literal);
+    reader.KeepDontCares(true);
     reader.Read("back.v", back);
     Fuzz::CheckNetlist(*back.GetNetlist());
 }
 
 void Run(Fuzz::Bytes bytes) {
     VerilogReader reader;
-    reader.KeepComments(bytes.Choose(2) == 0);
+    const bool keepsAll = bytes.Choose(2) == 0;
+    reader.KeepComments(keepsAll);
+    reader.KeepDontCares(keepsAll);
     const bool isLiteral = bytes.Choose(2) == 1;
     reader.SetNames(isLiteral ? VerilogReader::Names::Literal : VerilogReader::Names::Simple);
     reader.SetIncludes(bytes.Choose(2) == 0 ? VerilogReader::Includes::Follow

@@ -69,6 +69,7 @@ void CheckReadBack(Model& model) {
     VhdlReader reader;
     reader.AddLibrary(*model.GetNetlist());
     reader.SetNames(VhdlReader::Names::Literal);
+    reader.KeepDontCares(true);
     reader.Read("back.vhd", back);
     Fuzz::CheckNetlist(*back.GetNetlist());
     const std::string second = WriteVhdl(back);
@@ -82,7 +83,9 @@ void CheckReadBack(Model& model) {
 
 void Run(Fuzz::Bytes bytes) {
     VhdlReader reader;
-    reader.KeepComments(bytes.Choose(2) == 0);
+    const bool keepsAll = bytes.Choose(2) == 0;
+    reader.KeepComments(keepsAll);
+    reader.KeepDontCares(keepsAll);
     const bool isLiteral = bytes.Choose(2) == 1;
     reader.SetNames(isLiteral ? VhdlReader::Names::Literal : VhdlReader::Names::Simple);
     reader.AddLibrary("cells.vhd");

@@ -342,9 +342,9 @@ static int CheckDesign(Tcl_Interp* interp, orn_hdl_model_t model) {
 
 /* MODEL option NAME ?VALUE?: the switches that belong to a write, which no command sets. */
 static int Option(Tcl_Interp* interp, orn_hdl_model_t model, int count, Tcl_Obj* const words[]) {
-    static const char* const names[] = {"escape", "header", "legal", "verify", NULL};
-    static const orn_hdl_option_t options[] = {ORN_HDL_ESCAPE_NAMES, ORN_HDL_WRITE_HEADER,
-                                               ORN_HDL_LEGAL, ORN_HDL_VERIFY};
+    static const char* const names[] = {"dontcares", "escape", "header", "legal", "verify", NULL};
+    static const orn_hdl_option_t options[] = {ORN_HDL_DONT_CARES, ORN_HDL_ESCAPE_NAMES,
+                                               ORN_HDL_WRITE_HEADER, ORN_HDL_LEGAL, ORN_HDL_VERIFY};
     int index = 0;
     int value = 0;
     orn_hdl_status_t status;

@@ -96,6 +96,9 @@ struct ORN_HDL_API HdlOptions {
     /// Whether the write commands read each netlist back and compare it with the design (`Proof`)
     /// before it replaces its file. A netlist that differs is an error, and the file stays.
     bool verify = false;
+    /// Whether the digit "-" of a constant is a don't care: VHDL gets '-', and Verilog x. Otherwise
+    /// the digits are written as they stand, and a constant of one bit is 0 or 1.
+    bool dontCares = false;
     /// How many threads may write a netlist or read a command file together: 1 for the caller's
     /// alone, 0 for as many as the system gives, at most 8. What is written is the same, and small
     /// designs and files have one thread in any case. With more than one, the virtual functions of

@@ -125,6 +125,9 @@ public:
     /// Whether attributes become attributes of the objects: (* *) attributes, and those that are
     /// comments in the dialect of a synthesis tool.
     void KeepAttributes(bool keep) noexcept;
+    /// Whether bits x of constants become don't cares, digits "-" in the model. The model's option
+    /// `HdlOptions::dontCares` is set when there are any. Otherwise they are errors.
+    void KeepDontCares(bool keep) noexcept;
 
     /// Reads a file. What the model's netlist held before is destroyed. The model's name becomes
     /// the module's and its source file the file.
@@ -195,6 +198,9 @@ public:
     void KeepComments(bool keep) noexcept;
     /// Whether attribute specifications become attributes of the objects.
     void KeepAttributes(bool keep) noexcept;
+    /// Whether bits 'X' and '-' of constants become don't cares, digits "-" in the model. The
+    /// model's option `HdlOptions::dontCares` is set when there are any. Otherwise they are errors.
+    void KeepDontCares(bool keep) noexcept;
 
     /// Adds the components that a file declares to a netlist, as a library for a reader: its
     /// entities, and the component declarations in its packages. What no netlist can have, and what

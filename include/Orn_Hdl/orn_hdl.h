@@ -695,7 +695,9 @@ enum {
     ORN_HDL_VERIFY = 23,
     /** Number: how many threads may write a netlist or read a command file together. 1 is the
      * caller's alone, 0 as many as the system gives, at most 8. */
-    ORN_HDL_THREADS = 24
+    ORN_HDL_THREADS = 24,
+    /** Number: the digit "-" of a constant is a don't care, '-' in VHDL and x in Verilog. */
+    ORN_HDL_DONT_CARES = 25
 };
 
 enum {
@@ -894,7 +896,10 @@ enum {
     ORN_HDL_KEEP_INCLUDES = 3,
     /** Verilog: modules that no file declares get the ports that instances connect; off at first.
      */
-    ORN_HDL_INFER_UNDECLARED = 4
+    ORN_HDL_INFER_UNDECLARED = 4,
+    /** Bits x become don't cares, digits "-" of constants, and the model gets the option
+     * `ORN_HDL_DONT_CARES` if there are any, instead of being errors; off at first. */
+    ORN_HDL_KEEP_DONT_CARES = 5
 };
 
 /** Turns a switch on with 1 and off with 0.

@@ -262,7 +262,7 @@ template <class Reader> Ref ReadNetlist(Reader& reader, ModelState& state, const
 }
 
 /// File, top, libraries, folders, names of macros, their texts, whether to keep names, whether to
-/// infer undeclared modules.
+/// infer undeclared modules, whether to keep don't cares.
 Ref ReadVerilog(ModelState& state, Arguments& arguments) {
     Orn_Hdl::VerilogReader reader;
     reader.SetTop(arguments.GetText(1));
@@ -280,11 +280,12 @@ Ref ReadVerilog(ModelState& state, Arguments& arguments) {
     reader.SetNames(GetReaderNames(arguments.GetBool(6)));
     reader.SetUndeclared(arguments.GetBool(7) ? Orn_Hdl::ReaderUndeclared::Infer
                                               : Orn_Hdl::ReaderUndeclared::Refuse);
+    reader.KeepDontCares(arguments.GetBool(8));
     reader.KeepComments(true);
     return ReadNetlist(reader, state, arguments.GetText(0));
 }
 
-/// File, top, libraries, whether to keep names.
+/// File, top, libraries, whether to keep names, whether to keep don't cares.
 Ref ReadVhdl(ModelState& state, Arguments& arguments) {
     Orn_Hdl::VhdlReader reader;
     reader.SetTop(arguments.GetText(1));
@@ -292,6 +293,7 @@ Ref ReadVhdl(ModelState& state, Arguments& arguments) {
         reader.AddLibrary(library.c_str());
     }
     reader.SetNames(GetReaderNames(arguments.GetBool(3)));
+    reader.KeepDontCares(arguments.GetBool(4));
     reader.KeepComments(true);
     return ReadNetlist(reader, state, arguments.GetText(0));
 }
@@ -306,8 +308,8 @@ const std::vector<PyMethodDef> FileMethods = {
     Row<RunCheck, 1>("check"),
     Row<FindIllegal, 0>("find_illegal"),
     Row<VerifyNetlist, 2>("verify"),
-    Row<ReadVerilog, 8>("read_verilog"),
-    Row<ReadVhdl, 4>("read_vhdl"),
+    Row<ReadVerilog, 9>("read_verilog"),
+    Row<ReadVhdl, 5>("read_vhdl"),
 };
 
 } // namespace Python

@@ -20,6 +20,7 @@ std::map<std::string_view, Place> GetPlaces(HdlOptions& options) {
     return {{"legal", &options.legal},
             {"escape_names", &options.escapeNames},
             {"verify", &options.verify},
+            {"dont_cares", &options.dontCares},
             {"threads", &options.threads},
             {"application", &options.application},
             {"command", &options.command},

@@ -421,39 +421,43 @@ class Design(Holder):
 
     def read_verilog(self, path: StrPath, *, top: str = "", libraries: Iterable[StrPath] = (),
                      include_folders: Iterable[StrPath] = (), macros: Optional[Mapping[str, str]] = None,
-                     literal_names: bool = False, infer: bool = False) -> Dict[str, str]:
+                     literal_names: bool = False, infer: bool = False,
+                     dont_cares: bool = False) -> Dict[str, str]:
         """Reads a structural Verilog netlist, which takes the place of the design.
 
         `top` is the module; by default the only one that no other instantiates. `libraries` declare the cells.
-        With `infer`, cells that no file declares get their pins from the netlist. Returns the names that had to
-        be replaced. Raises NetlistError, and the design stays as it is.
+        With `infer`, cells that no file declares get their pins from the netlist. With `dont_cares`, bits x become
+        don't cares, and the option of that name is set. Returns the names that had to be replaced. Raises
+        NetlistError, and the design stays as it is.
         """
         defined = dict(macros or {})
         renamed = self._native.read_verilog(
             os.fspath(path), top, [os.fspath(file) for file in libraries],
             [os.fspath(folder) for folder in include_folders], list(defined), list(defined.values()),
-            literal_names, infer)
+            literal_names, infer, dont_cares)
         self._note_replacement()
         return dict(renamed)
 
     def read_vhdl(self, path: StrPath, *, top: str = "", libraries: Iterable[StrPath] = (),
-                  literal_names: bool = False) -> Dict[str, str]:
+                  literal_names: bool = False, dont_cares: bool = False) -> Dict[str, str]:
         """Reads a structural VHDL netlist, which takes the place of the design.
 
-        `top` is the entity, or "ENTITY(ARCHITECTURE)". `libraries` declare the components. Returns the names that
-        had to be replaced. Raises NetlistError, and the design stays as it is.
+        `top` is the entity, or "ENTITY(ARCHITECTURE)". `libraries` declare the components. With `dont_cares`, bits
+        'X' and '-' become don't cares, and the option of that name is set. Returns the names that had to be replaced.
+        Raises NetlistError, and the design stays as it is.
         """
         renamed = self._native.read_vhdl(os.fspath(path), top, [os.fspath(file) for file in libraries],
-                                         literal_names)
+                                         literal_names, dont_cares)
         self._note_replacement()
         return dict(renamed)
 
     def import_json(self, path: StrPath, *, top: str = "", cells: Iterable[StrPath] = (),
-                    attributes: bool = False, comments: bool = False) -> None:
+                    attributes: bool = False, comments: bool = False, x_as: str = "") -> None:
         """Imports a JSON netlist as Yosys writes it, by the tool; it takes the place of the design.
 
-        `top` is the module, `cells` are files that declare cell types. Raises NetlistError with the tool's message,
-        and the design stays as it is; FileNotFoundError if the tool is not installed.
+        `top` is the module, `cells` are files that declare cell types. `x_as` is what x and z become: "0", "1", or
+        "-" for don't cares, which sets the option `dont_cares`. Raises NetlistError with the tool's message, and the
+        design stays as it is; FileNotFoundError if the tool is not installed.
         """
         with tempfile.TemporaryDirectory() as folder:
             commands = os.path.join(folder, "design.cmd")
@@ -463,12 +467,15 @@ class Design(Holder):
                 arguments += ["--cells", os.fspath(file)]
             arguments += ["--attributes"] if attributes else []
             arguments += ["--comments"] if comments else []
+            arguments += ["--x-as", x_as] if x_as else []
             done = run_tool(*arguments)
             if done.returncode != 0:
                 raise NetlistError(done.stderr.rstrip("\n"), file=os.fspath(path))
             self._native.clear()
             self._note_replacement()
             self._native.read_commands(commands)
+            if x_as == "-":
+                self.options.dont_cares = True
 
     def check(self, *targets: str) -> List[Finding]:
         """What standards and tools make of the netlists that would be written; nothing is changed.

@@ -67,6 +67,7 @@ class Options:
     legal = _Option[bool]("Write a netlist that every tool takes, or nothing.")
     escape_names = _Option[bool]("A legal netlist escapes names where that is enough.")
     verify = _Option[bool]("Read each netlist back and compare it with the design before it replaces its file.")
+    dont_cares = _Option[bool]('The digit "-" of a constant is a don\'t care, x in Verilog.')
     threads = _Option[int]("How many threads may write a netlist or read a command file; 0 is what the system gives.")
     application = _Option[str]("The application that the header names.")
     command = _Option[str]("The command that the header shows.")

@@ -37,6 +37,8 @@ bool* FindSwitch(HdlOptions& options, orn_hdl_option_t option) noexcept {
         return &options.escapeNames;
     case ORN_HDL_VERIFY:
         return &options.verify;
+    case ORN_HDL_DONT_CARES:
+        return &options.dontCares;
     default:
         return nullptr;
     }

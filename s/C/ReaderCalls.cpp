@@ -83,6 +83,9 @@ template <class Reader> void SetCommonSwitch(Reader& reader, orn_hdl_switch_t wh
     case ORN_HDL_KEEP_COMMENTS:
         reader.KeepComments(isOn);
         break;
+    case ORN_HDL_KEEP_DONT_CARES:
+        reader.KeepDontCares(isOn);
+        break;
     case ORN_HDL_LITERAL_NAMES:
         reader.SetNames(isOn ? ReaderNames::Literal : ReaderNames::Simple);
         break;

@@ -53,6 +53,10 @@ bool IsTiedByBits(const Signal& signal) {
 /// Whether VHDL gets the constant of what is written bit by bit.
 bool IsWrittenByBits(const Signal& signal, const Digits& digits) {
     const auto width = static_cast<std::size_t>(std::max(signal.GetWidth(), 0));
+    if (digits.hasDontCare) {
+        const BitText bits = digits.ReadVhdl();
+        return bits && bits->size() == width && bits->find_first_not_of("01-") == std::string::npos;
+    }
     return digits.base == 2 && digits.digits.size() == width &&
            digits.digits.find_first_not_of("01") == std::string::npos;
 }
@@ -118,7 +122,7 @@ void Assignments::CheckSignal(const Signal& signal) {
         CheckOpen(signal);
     }
     if (hasConstant) {
-        const Digits digits(signal.GetConstantValue());
+        const Digits digits(signal.GetConstantValue(), context_.options.dontCares);
         CheckTarget(signal, ConstantCause(signal), "a constant",
                     !IsTiedByBits(signal) || IsWrittenByBits(signal, digits));
         CheckConstant(signal);
@@ -236,7 +240,7 @@ void Assignments::CheckConstant(const Signal& signal) {
     if (IsSingleBit(signal)) {
         return;
     }
-    const Digits digits(signal.GetConstantValue());
+    const Digits digits(signal.GetConstantValue(), context_.options.dontCares);
     CheckDigits(signal, digits);
     CheckLength(signal, digits);
     CheckVhdlConstant(signal, digits);

@@ -1,6 +1,7 @@
 #include "Check/Digits.h"
 
 #include "Port/Ascii.h"
+#include "Writers/DontCares.h"
 
 #include <algorithm>
 #include <iterator>
@@ -68,7 +69,7 @@ std::string Resize(const std::string& bits, std::size_t width) {
         return bits.substr(bits.size() - width);
     }
     const char first = bits.empty() ? '0' : bits.front();
-    return std::string(width - bits.size(), first == 'x' || first == 'z' ? first : '0') + bits;
+    return std::string(width - bits.size(), first == '1' ? '0' : first) + bits;
 }
 
 void Negate(std::string& bits) {
@@ -85,9 +86,14 @@ constexpr std::size_t MostDecimalDigits = 4096;
 
 } // namespace
 
-Digits::Digits(const BitVectorValue& value)
+Digits::Digits(const BitVectorValue& value, bool dontCares)
     : digits(string_view(value.GetValue())), base(value.GetBase()), length(value.GetLength()),
-      hasLength(value.HasBaseAndLength()) {}
+      hasLength(value.HasBaseAndLength()), hasDontCare(dontCares && Writers::HasDontCare(value)) {
+    if (hasDontCare && !hasLength) {
+        hasLength = true;
+        length = static_cast<int>(digits.size());
+    }
+}
 
 bool Digits::IsVerilogNumber() const {
     if (!hasLength) {
@@ -98,11 +104,15 @@ bool Digits::IsVerilogNumber() const {
     return !text.empty() && text.front() != '_' &&
            std::all_of(text.begin(), text.end(), [this](char c) {
                const char small = Port::ToLower(c);
-               return IsDigitOf(base, c) || small == 'x' || small == 'z' || c == '?' || c == '_';
+               return IsDigitOf(base, c) || small == 'x' || small == 'z' || c == '?' || c == '_' ||
+                      (hasDontCare && c == Writers::DontCare);
            });
 }
 
 bool Digits::IsVhdlString(bool is2008) const {
+    if (hasDontCare) {
+        return true;
+    }
     if (!hasLength) {
         return std::all_of(digits.begin(), digits.end(),
                            [](char c) { return StdLogic.find(c) != string_view::npos; });
@@ -139,7 +149,7 @@ std::string Digits::ExpandDigits() const {
             continue;
         }
         for (int bit = BitsPerDigit() - 1; bit >= 0; --bit) {
-            const char unknown = Port::ToLower(c) == 'x' ? 'x' : 'z';
+            const char unknown = c == Writers::DontCare ? c : Port::ToLower(c) == 'x' ? 'x' : 'z';
             bits.push_back(!isDigit ? unknown : ((value >> bit) & 1) != 0 ? '1' : '0');
         }
     }

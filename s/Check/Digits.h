@@ -13,18 +13,23 @@ namespace Orn_Hdl::Checking {
 /// The values of std_logic.
 constexpr std::string_view StdLogic = "UX01ZWLH-";
 
-/// A value's bits, leftmost first, each of "01xz"; nothing when the text is no number.
+/// A value's bits, leftmost first, each of "01xz", and "-" for a don't care; nothing when the text
+/// is no number.
 using BitText = std::optional<std::string>;
 
 /// The text that the writers write for a value, seen by each language.
 struct Digits {
-    explicit Digits(const BitVectorValue& value);
+    /// \param dontCares whether a digit "-" is a don't care.
+    explicit Digits(const BitVectorValue& value, bool dontCares = false);
 
     /// The digits as they stand.
     std::string digits;
     int base = 2;
     int length = 1;
     bool hasLength = false;
+    /// Whether there are don't cares. The writers then give Verilog a length and a base, and VHDL a
+    /// string with an element for each bit.
+    bool hasDontCare = false;
 
     /// How many bits one digit stands for.
     int BitsPerDigit() const noexcept { return base == 16 ? 4 : base == 8 ? 3 : 1; }

@@ -213,7 +213,9 @@ void Copier::CopyConstants() {
         }
         if (plan_.HasFaultyConstant(*signal)) {
             const auto width = static_cast<std::size_t>(signal->GetWidth());
-            copy->AssignConstantValue(MakeConstant(FindBits(value, width).value_or(""), language_));
+            const std::string bits =
+                FindBits(value, width, plan_.GetOptions().dontCares).value_or("");
+            copy->AssignConstantValue(MakeConstant(bits, language_));
         } else {
             copy->AssignConstantValue(value);
         }

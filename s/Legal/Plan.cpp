@@ -255,9 +255,10 @@ void Plan::Note(Check::Finding& finding) {
 void Plan::NoteConstant(Check::Finding& finding) {
     const auto& signal = *static_cast<const Signal*>(finding.objects.front());
     const auto width = static_cast<std::size_t>(std::max(signal.GetWidth(), 0));
-    const std::optional<std::string> bits = FindBits(signal.GetConstantValue(), width);
+    const std::optional<std::string> bits =
+        FindBits(signal.GetConstantValue(), width, options_.dontCares);
     const bool isLeftOut = Is(finding, RuleId::ConstantLeftOut);
-    if (!bits || (isLeftOut && bits->find_first_not_of("01") != std::string::npos)) {
+    if (!bits || (isLeftOut && bits->find_first_not_of("01-") != std::string::npos)) {
         Refuse(finding);
     } else {
         constants_.insert(&signal);

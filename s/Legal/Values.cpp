@@ -142,19 +142,21 @@ std::unique_ptr<Attribute> Clone(const Attribute& attribute) {
 
 } // namespace
 
-std::optional<std::string> FindBits(const BitVectorValue& value, std::size_t width) {
+std::optional<std::string> FindBits(const BitVectorValue& value, std::size_t width,
+                                    bool dontCares) {
     if (width == 0 || width > static_cast<std::size_t>(Names::MostExpandedBits)) {
         return std::nullopt;
     }
-    const Digits digits(value);
+    const Digits digits(value, dontCares);
     return digits.hasLength ? FindSizedBits(digits, width) : FindPlainBits(digits, width);
 }
 
 std::optional<std::string> FindBits(const BitVectorValue& value) {
     const Digits digits(value);
     const std::optional<std::string> bits =
-        digits.hasLength ? FindBits(value, static_cast<std::size_t>(std::max(digits.length, 0)))
-                         : digits.digits;
+        digits.hasLength
+            ? FindBits(value, static_cast<std::size_t>(std::max(digits.length, 0)), false)
+            : digits.digits;
     return bits && !bits->empty() && AreAllOf("01", *bits) ? bits : std::nullopt;
 }
 

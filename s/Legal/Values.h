@@ -14,7 +14,8 @@ namespace Orn_Hdl::Legal {
 
 /// The bits that a constant means, leftmost first, each of "01xz"; nothing when it has no meaning,
 /// or one that the languages do not share.
-std::optional<std::string> FindBits(const BitVectorValue& value, std::size_t width);
+/// \param dontCares whether a digit "-" is a don't care, which is a bit "-".
+std::optional<std::string> FindBits(const BitVectorValue& value, std::size_t width, bool dontCares);
 
 /// The bits of the value of an attribute: as many as its length says, or one a digit when it has
 /// none. Nothing when the digits do not fit the length, or there are others than 0 and 1.

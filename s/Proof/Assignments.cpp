@@ -18,8 +18,9 @@ void SetRuns(const Readers::Members& members, Runs& runs) {
 
 } // namespace
 
-Assignments::Assignments(const Netlist& design, Language language, Findings& findings)
-    : design_(design), language_(language), findings_(findings),
+Assignments::Assignments(const Netlist& design, Language language, bool dontCares,
+                         Findings& findings)
+    : design_(design), language_(language), dontCares_(dontCares), findings_(findings),
       signals_(design.GetSignalIterator()), aliases_(nullptr) {
     Advance();
 }
@@ -71,7 +72,7 @@ bool Assignments::FindConstant() {
             target_ = &signal;
             source_ = nullptr;
             targetBits_.Set(signal);
-            constant_ = BitsOfConstant(signal).value_or("");
+            constant_ = BitsOfConstant(signal, dontCares_, language_).value_or("");
             tied_ = 0;
             SkipNothing();
             if (targetBits_.IsEmpty()) {

@@ -15,7 +15,8 @@ namespace Orn_Hdl::Proving {
 /// constant or alias may be several assignments, of some bits each.
 class Assignments {
 public:
-    Assignments(const Netlist& design, Language language, Findings& findings);
+    /// \param dontCares whether a digit "-" of a constant stands for don't cares.
+    Assignments(const Netlist& design, Language language, bool dontCares, Findings& findings);
 
     /// \{
     /// Takes an assignment of the netlist.
@@ -41,6 +42,7 @@ private:
 
     const Netlist& design_;
     const Language language_;
+    const bool dontCares_;
     Findings& findings_;
     Phase phase_ = Phase::Constants;
     Iterator<Signal*> signals_;

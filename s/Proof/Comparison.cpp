@@ -84,7 +84,7 @@ bool IsOpen(const Pin& pin) {
 Comparison::Comparison(const Netlist& design, const HdlOptions& options, Language language,
                        Findings& findings)
     : design_(design), options_(options), language_(language), findings_(findings),
-      shared_(design, language), assignments_(design, language, findings),
+      shared_(design, language), assignments_(design, language, options.dontCares, findings),
       parameters_(design, options, language, findings), signals_(design.GetSignalIterator()),
       instances_(design.GetInstanceIterator()), ahead_(design, Lead) {}
 

@@ -13,6 +13,7 @@ namespace {
 
 constexpr std::size_t MostBits = 1'048'576;
 constexpr std::size_t MostDecimalDigits = 4096;
+constexpr char DontCare = '-';
 
 bool AreAllOf(string_view characters, string_view text) {
     return text.find_first_not_of(characters) == string_view::npos;
@@ -45,10 +46,15 @@ void Resize(std::string& bits, std::size_t width) {
     bits.insert(0, width - bits.size(), first == '1' ? '0' : first);
 }
 
-std::optional<std::string> BitsOfSized(const BitVectorValue& value, std::size_t width) {
+/// \param dontCares whether a digit "-" stands for don't cares, which are bits "-".
+std::optional<std::string> BitsOfSized(const BitVectorValue& value, std::size_t width,
+                                       bool dontCares) {
     std::string bits;
     for (const char digit : string_view(value.GetValue())) {
-        const std::string more = digit == '_' ? std::string() : BitsOfDigit(digit, value.GetBase());
+        std::string more = digit == '_' ? std::string() : BitsOfDigit(digit, value.GetBase());
+        if (dontCares && digit == DontCare) {
+            more.assign(BitsOfDigit('0', value.GetBase()).size(), DontCare);
+        }
         if (digit != '_' && more.empty()) {
             return std::nullopt;
         }
@@ -83,8 +89,9 @@ std::string BitsOfDecimal(string_view digits) {
 
 /// Plain digits are one bit each. When there are not as many as bits, they can be a decimal number,
 /// but only one that nobody takes for bits.
-std::optional<std::string> BitsOfPlain(string_view digits, std::size_t width) {
-    if (digits.size() == width && AreAllOf("01xXzZ", digits)) {
+/// \param dontCares whether a digit "-" is a don't care; such digits are never a decimal number.
+std::optional<std::string> BitsOfPlain(string_view digits, std::size_t width, bool dontCares) {
+    if (digits.size() == width && AreAllOf(dontCares ? "01xXzZ-" : "01xXzZ", digits)) {
         std::string bits(digits);
         std::transform(bits.begin(), bits.end(), bits.begin(), Port::ToLower);
         return bits;
@@ -219,21 +226,29 @@ bool IsNothing(string_view name, Language language) noexcept {
     return name.empty() || (language == Language::Vhdl && Port::EqualIgnoringCase(name, "open"));
 }
 
-std::optional<std::string> BitsOf(const BitVectorValue& value, std::size_t width) {
+std::optional<std::string> BitsOf(const BitVectorValue& value, std::size_t width, bool dontCares) {
     if (width == 0 || width > MostBits) {
         return std::nullopt;
     }
-    return value.HasBaseAndLength() ? BitsOfSized(value, width)
-                                    : BitsOfPlain(value.GetValue(), width);
+    return value.HasBaseAndLength() ? BitsOfSized(value, width, dontCares)
+                                    : BitsOfPlain(value.GetValue(), width, dontCares);
 }
 
-std::optional<std::string> BitsOfConstant(const Signal& signal) {
+std::optional<std::string> BitsOfConstant(const Signal& signal, bool dontCares, Language language) {
     const BitVectorValue& value = signal.GetConstantValue();
+    std::optional<std::string> bits;
     if (IsSingle(signal)) {
         const string_view digits = value.GetValue();
-        return std::string(1, !digits.empty() && digits.back() == '0' ? '0' : '1');
+        const char last = digits.empty() ? '1' : digits.back();
+        bits = last == '0' ? "0" : dontCares && last == DontCare ? "-" : "1";
+    } else {
+        bits = BitsOf(value, static_cast<std::size_t>(signal.GetWidth()), dontCares);
     }
-    return BitsOf(value, static_cast<std::size_t>(signal.GetWidth()));
+    if (bits && language == Language::Verilog) {
+        // Verilog has no value that only says that it does not matter.
+        std::replace(bits->begin(), bits->end(), DontCare, 'x');
+    }
+    return bits;
 }
 
 std::string TextOf(const Attribute& attribute) {

@@ -21,9 +21,13 @@ bool IsNothing(std::string_view name, Language language) noexcept;
 
 /// The bits of a constant on a signal of so many bits, leftmost first, each one of "01xz"; nothing
 /// when the digits do not say which.
-std::optional<std::string> BitsOf(const BitVectorValue& value, std::size_t width);
-/// The bits of the constant that a signal is tied to.
-std::optional<std::string> BitsOfConstant(const Signal& signal);
+/// \param dontCares whether a digit "-" stands for don't cares, which are bits "-".
+std::optional<std::string> BitsOf(const BitVectorValue& value, std::size_t width,
+                                  bool dontCares = false);
+/// The bits of the constant that a signal is tied to, as a language has them: VHDL has "-" for a
+/// don't care, Verilog has x.
+/// \param dontCares whether a digit "-" stands for don't cares.
+std::optional<std::string> BitsOfConstant(const Signal& signal, bool dontCares, Language language);
 
 /// The text of an attribute in one line, without quotes around it.
 std::string TextOf(const Attribute& attribute);

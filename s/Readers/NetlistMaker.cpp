@@ -407,21 +407,26 @@ const Members& NetlistMaker::GetMembers(const std::vector<Piece>& pieces) {
             members_.push_back(piece.signal);
         }
         for (const char bit : piece.bits) {
-            members_.push_back(GetConstantNet(bit == '1'));
+            members_.push_back(GetConstantNet(bit));
         }
     }
     return members_;
 }
 
-Signal* NetlistMaker::GetConstantNet(bool value) {
-    Signal*& net = constantNets_[value ? 1 : 0];
+Signal* NetlistMaker::GetConstantNet(char bit) {
+    static constexpr struct {
+        const char* name;
+        const char* value;
+    } Nets[] = {{"const_0", "0"}, {"const_1", "1"}, {"const_x", "-"}};
+    const std::size_t kind = bit == '1' ? 1 : bit == '-' ? 2 : 0;
+    Signal*& net = constantNets_[kind];
     if (net == nullptr) {
-        std::string name = value ? "const_1" : "const_0";
+        std::string name = Nets[kind].name;
         if (IsTaken(name)) {
             name = MakeUnique(name);
         }
         auto signal = MakePacked<ScalarSignal>(name.c_str());
-        signal->AssignConstantValue(value ? "1" : "0");
+        signal->AssignConstantValue(Nets[kind].value);
         made_.insert(signal.get());
         net = signal.get();
         netlist_.Add(signal.release());

@@ -58,6 +58,14 @@ public:
     Netlist& GetNetlist() noexcept { return netlist_; }
     /// Who gets what is read; null when the netlist does.
     NetlistSink* GetSink() const noexcept { return sink_; }
+    /// Sets whether x becomes a don't care when there is no sink; otherwise it is an error.
+    void KeepDontCares(bool keep) noexcept { keepsDontCares_ = keep; }
+    /// What becomes of x and z. A sink judges them by itself.
+    Unknowns GetUnknowns() const noexcept {
+        return sink_ != nullptr  ? Unknowns::Keep
+               : keepsDontCares_ ? Unknowns::DontCare
+                                 : Unknowns::Refuse;
+    }
     /// Sets the place of what is made next, for the sink.
     void SetPlace(const Place& place) noexcept { place_ = place; }
     const Place& GetPlace() const noexcept { return place_; }
@@ -94,8 +102,9 @@ public:
     Signal* GetSignal(const std::vector<Piece>& pieces);
     /// The members of that signal, for a sink; valid until the next call.
     const Members& GetMembers(const std::vector<Piece>& pieces);
-    /// A net of one bit that carries a constant.
-    Signal* GetConstantNet(bool value);
+    /// A net of one bit that carries a constant: 0, 1, or "-" for a don't care. With a sink, any
+    /// other bit is 0.
+    Signal* GetConstantNet(char bit);
     /// Connects a pin to a signal of its own that carries a constant.
     void ConnectConstant(const Instance& instance, Pin& pin, const std::string& constant);
 
@@ -157,8 +166,10 @@ private:
     std::unordered_map<std::string, unsigned> lastSuffixes_;
     /// The signals that the file does not have.
     std::unordered_set<const Signal*> made_;
-    Signal* constantNets_[2] = {nullptr, nullptr};
+    /// Of 0, 1 and don't cares.
+    Signal* constantNets_[3] = {nullptr, nullptr, nullptr};
     NetlistSink* const sink_;
+    bool keepsDontCares_ = false;
     Place place_;
     /// \{
     /// The present instance, when there is a sink, and its name in the file.

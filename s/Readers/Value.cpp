@@ -79,6 +79,14 @@ std::string MakeConstant(const std::string& bits, bool isBare) {
     return isBare ? bits : std::to_string(bits.size()) + ":B:" + bits;
 }
 
+bool HasDontCares(const Netlist& netlist) {
+    const Iterator<Signal*> signals = netlist.GetSignalIterator();
+    return std::any_of(signals.begin(), signals.end(), [](const Signal* signal) {
+        const std::string_view digits = signal->GetConstantValue().GetValue();
+        return digits.find('-') != std::string_view::npos;
+    });
+}
+
 Value Value::OfBits(const std::string& bits) {
     return {Attribute::BitVector, MakeConstant(bits, false), {}};
 }

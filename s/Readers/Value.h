@@ -2,6 +2,7 @@
 #pragma once
 
 #include "Orn_Hdl/Attributes.h"
+#include "Orn_Hdl/Model/Netlist.h"
 
 #include <memory>
 #include <string>
@@ -14,8 +15,15 @@ struct LiteralProblem {
     std::string text;
 };
 
-/// What becomes of a digit of the value x or z, which a model has only as the writers write it.
-enum class Unknowns { Refuse, Keep };
+/// What becomes of a digit of the value x or z, or "-" in VHDL.
+enum class Unknowns {
+    /// It is an error.
+    Refuse,
+    /// It stays, for a sink that judges it by itself.
+    Keep,
+    /// X and "-" become don't cares, which are digits "-" of a model's constant; z is an error.
+    DontCare
+};
 
 /// The value of a parameter, a generic or an attribute.
 struct Value {
@@ -35,6 +43,9 @@ struct Value {
 
 /// The constant of a model with these bits: "4:B:1010", or "1" for one bit when `isBare`.
 std::string MakeConstant(const std::string& bits, bool isBare);
+
+/// Whether a constant of a netlist that was read has a don't care.
+bool HasDontCares(const Netlist& netlist);
 
 /// The bits of a decimal number, leftmost first, without zeros in front.
 /// \throws LiteralProblem for a character that is no digit, and for too many.

@@ -108,6 +108,7 @@ std::vector<VerilogReader::Renaming> Reading::FillNetlist(Netlist& netlist,
     }
     Readers::NetlistMaker maker(netlist, setup_.names,
                                 {false, true, Readers::IsVerilogKeyword, setup_.keepsName}, sink);
+    maker.KeepDontCares(setup_.keepsDontCares);
     Readers::Scanner scanner(files_, setup_);
     scanner.Open(files_.GetName(top.source));
     Readers::ModuleReader(scanner, heads_, top, maker, setup_).Read();
@@ -173,6 +174,10 @@ void VerilogReader::KeepAttributes(bool keep) noexcept {
     implementation_->setup.keepsAttributes = keep;
 }
 
+void VerilogReader::KeepDontCares(bool keep) noexcept {
+    implementation_->setup.keepsDontCares = keep;
+}
+
 void VerilogReader::Read(const char* fileName, Model& model) {
     Reading reading(fileName, implementation_->setup, implementation_->components);
     Netlist netlist;
@@ -182,7 +187,10 @@ void VerilogReader::Read(const char* fileName, Model& model) {
     for (const std::string& include : reading.GetKeptIncludes()) {
         includes.Add(include.c_str());
     }
+    const bool hasDontCares =
+        implementation_->setup.keepsDontCares && Readers::HasDontCares(netlist);
     *model.GetNetlist() = std::move(netlist);
+    model.GetOptions()->dontCares |= hasDontCares;
     model.GetOptions()->verilog.includePaths = std::move(includes);
     implementation_->renamings = std::move(renamings);
     model.SetModifiedFlag(true);

@@ -120,6 +120,7 @@ std::vector<ReaderRenaming> Reading::FillNetlist(Netlist& netlist,
     const Vhdl::Architecture& architecture = FindArchitecture(entity, architectureName);
     Readers::NetlistMaker maker(netlist, setup_.names,
                                 {true, false, Vhdl::IsReserved, setup_.keepsName}, sink_);
+    maker.KeepDontCares(setup_.keepsDontCares);
     Vhdl::Scanner scanner(files_);
     scanner.Open(fileName_);
     Vhdl::ArchitectureReader reader(scanner, design_, entity, architecture, maker, setup_);
@@ -274,6 +275,10 @@ void VhdlReader::KeepAttributes(bool keep) noexcept {
     implementation_->setup.keepsAttributes = keep;
 }
 
+void VhdlReader::KeepDontCares(bool keep) noexcept {
+    implementation_->setup.keepsDontCares = keep;
+}
+
 void VhdlReader::ReadComponents(const char* fileName, Netlist& netlist) {
     const std::string name(ViewOf(fileName));
     Readers::Files files;
@@ -293,7 +298,10 @@ void VhdlReader::Read(const char* fileName, Model& model) {
     netlist.SetSourceFileName(reading.GetFileName().c_str());
     HdlOptions::VhdlOption options = model.GetOptions()->vhdl;
     std::vector<Renaming> renamings = reading.FillNetlist(netlist, options);
+    const bool hasDontCares =
+        implementation_->setup.keepsDontCares && Readers::HasDontCares(netlist);
     *model.GetNetlist() = std::move(netlist);
+    model.GetOptions()->dontCares |= hasDontCares;
     model.GetOptions()->vhdl = std::move(options);
     implementation_->renamings = std::move(renamings);
     model.SetModifiedFlag(true);

@@ -5,6 +5,7 @@
 #include "Orn_Hdl/LegalNetlist.h"
 #include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
+#include "Writers/DontCares.h"
 #include "Writers/NetlistPass.h"
 
 namespace Orn_Hdl {
@@ -58,6 +59,7 @@ private:
     void WriteSignalDeclaration(const Signal& signal);
     void WriteSignalAssignments(const Writers::SignalLists& signals);
     void WriteConstantAssignment(Signal& signal);
+    void WriteConstantAssignment(Signal& signal, bool singleBit, const BitVectorValue& value);
     void WriteAlias(Signal& signal, Signal& alias);
     void WriteReference(Signal& signal);
     void WriteInstances();
@@ -229,14 +231,25 @@ void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists
 
 void VerilogNetlister::Writer::WriteConstantAssignment(Signal& signal) {
     const BitVectorValue& value = signal.GetConstantValue();
+    const bool isSingle = SignalBits::IsSingle(signal);
+    if (options_.dontCares && isSingle && Writers::IsDontCare(value)) {
+        WriteConstantAssignment(signal, false, BitVectorValue("1:B:x"));
+    } else if (options_.dontCares && !isSingle && Writers::HasDontCare(value)) {
+        WriteConstantAssignment(signal, false, Writers::InVerilog(value));
+    } else {
+        WriteConstantAssignment(signal, isSingle, value);
+    }
+}
+
+void VerilogNetlister::Writer::WriteConstantAssignment(Signal& signal, bool singleBit,
+                                                       const BitVectorValue& value) {
     if (IsNamedPlainly(signal)) {
-        statements_.WriteConstantSignalAssignment(signal.GetNameView(),
-                                                  SignalBits::IsSingle(signal), value);
+        statements_.WriteConstantSignalAssignment(signal.GetNameView(), singleBit, value);
     } else {
         Put(out_, "assign", " ");
         WriteReference(signal);
         Put(out_, " = ");
-        statements_.WriteConstant(SignalBits::IsSingle(signal), value);
+        statements_.WriteConstant(singleBit, value);
     }
     WriteSemicolon();
 }

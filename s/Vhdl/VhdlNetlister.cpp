@@ -6,6 +6,7 @@
 #include "Orn_Hdl/LegalNetlist.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
+#include "Writers/DontCares.h"
 #include "Writers/NetlistPass.h"
 
 #include <algorithm>
@@ -67,8 +68,8 @@ StringArray GetBitNames(const Signal& signal, std::int64_t count) {
     return names;
 }
 
-bool IsBinary(string_view digits) {
-    return digits.find_first_not_of("01") == string_view::npos;
+bool IsBinary(string_view digits, bool dontCares) {
+    return digits.find_first_not_of(dontCares ? "01-" : "01") == string_view::npos;
 }
 
 } // namespace
@@ -102,7 +103,9 @@ private:
                                       const std::vector<const Instance*>& instances);
     void WriteInstanceAttrAssignment(const Instance& instance);
     void WriteConstant(const Signal& signal);
-    void WriteConstantBits(const Signal& signal);
+    void WriteConstantBit(string_view name, const BitVectorValue& value);
+    void WriteConstantVector(const Signal& signal, const BitVectorValue& value);
+    void WriteConstantBits(const Signal& signal, const BitVectorValue& value);
     void WriteAlias(const Signal& signal, const Signal& alias);
     void WriteAliasBits(const StringArray& bits, const StringArray& aliasBits);
     void WriteInstances();
@@ -415,20 +418,37 @@ void VhdlNetlister::Writer::WriteInstanceAttrAssignment(const Instance& instance
 }
 
 void VhdlNetlister::Writer::WriteConstant(const Signal& signal) {
-    if (IsCompoundOrAgainst(signal) || IsOneBitOfAscendingBus(signal)) {
-        WriteConstantBits(signal);
+    const BitVectorValue& value = signal.GetConstantValue();
+    if (SignalBits::IsSingle(signal)) {
+        WriteConstantBit(signal.GetNameView(), value);
+    } else if (options_.dontCares && Writers::HasDontCare(value)) {
+        WriteConstantVector(signal, Writers::InVhdl(value));
     } else {
-        statements_.WriteConstantSignalAssignment(
-            signal.GetNameView(), SignalBits::IsSingle(signal), signal.GetConstantValue());
+        WriteConstantVector(signal, value);
+    }
+}
+
+void VhdlNetlister::Writer::WriteConstantVector(const Signal& signal, const BitVectorValue& value) {
+    if (IsCompoundOrAgainst(signal) || IsOneBitOfAscendingBus(signal)) {
+        WriteConstantBits(signal, value);
+    } else {
+        statements_.WriteConstantSignalAssignment(signal.GetNameView(), false, value);
+    }
+}
+
+void VhdlNetlister::Writer::WriteConstantBit(string_view name, const BitVectorValue& value) {
+    if (options_.dontCares && Writers::IsDontCare(value)) {
+        statements_.WriteSignalAssignment(name, "'-'");
+    } else {
+        statements_.WriteConstantSignalAssignment(name, true, value);
     }
 }
 
 /// Writes nothing if the digits of the constant are not the bits of the signal.
-void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
-    const BitVectorValue& value = signal.GetConstantValue();
+void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal, const BitVectorValue& value) {
     const string_view digits = value.GetValue();
     const std::optional<std::int64_t> count = SignalBits::Count(signal);
-    if (value.GetBase() != 2 || !IsBinary(digits) || !count ||
+    if (value.GetBase() != 2 || !IsBinary(digits, options_.dontCares) || !count ||
         digits.size() != static_cast<std::size_t>(*count)) {
         return;
     }
@@ -436,7 +456,7 @@ void VhdlNetlister::Writer::WriteConstantBits(const Signal& signal) {
     SignalBits::ForEach(signal, *count, [this, digits, &position](string_view bit) {
         const Port::String digit(digits.substr(position++, 1));
         if (IsWritable(bit)) {
-            statements_.WriteConstantSignalAssignment(bit, true, BitVectorValue(digit.CStr()));
+            WriteConstantBit(bit, BitVectorValue(digit.CStr()));
         }
     });
 }

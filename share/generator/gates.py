@@ -74,9 +74,13 @@ def cells() -> list[Cell]:
 
 
 def _text(cell: Cell, inputs: list[str], output: str, comment: str, body: list[str]) -> str:
-    ports = [f"{pin} : in std_logic;" for pin in inputs] + [f"{output} : out std_logic"]
+    generics, start = [], ""
+    if output == "Q":
+        generics = [f"{_INDENT}generic (", 2 * _INDENT + 'INIT : string := "U"', f"{_INDENT});"]
+        start = """ := std_logic'value("'" & INIT & "'")"""
+    ports = [f"{pin} : in std_logic;" for pin in inputs] + [f"{output} : out std_logic{start}"]
     lines = [f"-- {cell.yosys}: {comment}", "library ieee;", "use ieee.std_logic_1164.all;", "",
-             f"entity {cell.entity} is", f"{_INDENT}port ("]
+             f"entity {cell.entity} is", *generics, f"{_INDENT}port ("]
     lines += [2 * _INDENT + port for port in ports]
     lines += [f"{_INDENT});", f"end {cell.entity};", "",
               f"architecture model of {cell.entity} is", "begin"]

@@ -19,6 +19,8 @@ class Port:
     name: str
     direction: str = "in"
     width: str = ""
+    # What an output has at first.
+    start: str = ""
 
 
 @dataclass(frozen=True)
@@ -29,6 +31,10 @@ class Cell:
     ports: list[Port]
     body: list[str]
     declarations: list[str] = field(default_factory=list)
+    # Parameters whose digits can be others than 0 and 1, with their defaults.
+    texts: dict[str, str] = field(default_factory=dict)
+    # How wide ports are, where parameters do not tell it.
+    numbers: list[str] = field(default_factory=list)
 
 
 _ENTITY = "orn_hdl_{}"
@@ -186,6 +192,12 @@ def _other_functions() -> list[Cell]:
         Cell("lcu", "CO has the carries of an adder that generates G and propagates P.", ["WIDTH"],
              [Port("P", width=_WIDTH), Port("G", width=_WIDTH), Port("CI"),
               Port("CO", "out", _WIDTH)], ["CO <= carries(P, G, CI);"]),
+        Cell("macc", "Y is the sum of products and numbers that A has, as CONFIG says, and of the bits of B.",
+             ["A_WIDTH", "B_WIDTH", "CONFIG", "CONFIG_WIDTH", "Y_WIDTH"],
+             [Port("A", width="largest(number(A_WIDTH), A_PINS)"),
+              Port("B", width="largest(number(B_WIDTH), B_PINS)"), _Y],
+             ["Y <= accumulated(A, CONFIG, B, number(B_WIDTH), Y'length);"],
+             numbers=["A_PINS", "B_PINS"]),
         Cell("alu", "Y is A + B + CI, with B inverted while BI is 1; X is A xor B, CO has the carries.",
              _BINARY, [_A, _B, Port("CI"), Port("BI"), Port("X", "out", "number(Y_WIDTH)"), _Y,
                        Port("CO", "out", "number(Y_WIDTH)")],
@@ -248,8 +260,9 @@ def _register(name: str, parts: list[str]) -> Cell:
     comment = f"{kind} with {', '.join(_ABOUT[part] for part in parts)}"
     comment += ("; the reset needs the enable." if name == "sdffce" else ".")
     comment = comment.replace("Latches with a set", "Latches without data, with a set")
-    return Cell(name, comment, sorted(parameters), [*ports, Port("Q", "out", _WIDTH)],
-                _register_body(name, parts))
+    return Cell(name, comment, sorted(parameters),
+                [*ports, Port("Q", "out", _WIDTH, "first_value(INIT, highest(number(WIDTH)) + 1)")],
+                _register_body(name, parts), texts={"INIT": "U"})
 
 
 def _register_body(name: str, parts: list[str]) -> list[str]:
@@ -335,10 +348,34 @@ _MEMORY = Cell(
     (Path(__file__).parent / "memory.vhd").read_text(encoding="utf-8").splitlines())
 
 
+_STATE_MACHINE = Cell(
+    "fsm", "A state machine. CTRL_OUT is x, and the next state that of a reset, where no row fits.",
+    ["ARST_POLARITY", "CLK_POLARITY", "CTRL_IN_WIDTH", "CTRL_OUT_WIDTH", "STATE_NUM_LOG2",
+     "STATE_RST", "TRANS_NUM"],
+    [Port("CLK"), Port("ARST"), Port("CTRL_IN", width="number(CTRL_IN_WIDTH)"),
+     Port("CTRL_OUT", "out", "number(CTRL_OUT_WIDTH)")],
+    ["row <= row_of(TRANS_TABLE, number(TRANS_NUM), states, inputs, outputs, state, CTRL_IN);",
+     "CTRL_OUT <= outputs_of(TRANS_TABLE, row, states, inputs, outputs, CTRL_OUT'length);",
+     "process (CLK, ARST)",
+     "begin",
+     "   if is_active(ARST, ARST_POLARITY) then",
+     "      state <= number(STATE_RST);",
+     "   elsif CLK'event and ticks(true, is_set(CLK_POLARITY), CLK'last_value, CLK) then",
+     "      state <= next_state(TRANS_TABLE, row, states, inputs, outputs, number(STATE_RST));",
+     "   end if;",
+     "end process;"],
+    ["constant states : natural := number(STATE_NUM_LOG2);",
+     "constant inputs : natural := number(CTRL_IN_WIDTH);",
+     "constant outputs : natural := number(CTRL_OUT_WIDTH);",
+     "-- The number of the state, and of the row that fits; -1 for none.",
+     "signal state, row : integer := -1;"],
+    {"TRANS_TABLE": "0"})
+
+
 def cells() -> list[Cell]:
     """All word-level cells that have a model."""
     registers = [_register(name, parts) for name, parts in _REGISTERS.items()]
-    return [*_operators(), *_other_functions(), *registers, _MEMORY]
+    return [*_operators(), *_other_functions(), *registers, _MEMORY, _STATE_MACHINE]
 
 
 def _port(port: Port) -> str:
@@ -346,7 +383,7 @@ def _port(port: Port) -> str:
         default = " := '0'" if port.direction == "in" else ""
         return f"{port.name} : {port.direction} std_logic{default}"
     kind = f"std_logic_vector(highest({port.width}) downto 0)"
-    default = " := (others => '0')" if port.direction == "in" else ""
+    default = " := (others => '0')" if port.direction == "in" else f" := {port.start}" if port.start else ""
     return f"{port.name} : {port.direction} {kind}{default}"
 
 
@@ -356,6 +393,8 @@ def model(cell: Cell) -> str:
     lines = [f"-- ${cell.name}: {cell.comment}", "library ieee;", "use ieee.std_logic_1164.all;",
              "use work.orn_hdl_cells.all;", "", f"entity {entity} is", f"{_INDENT}generic ("]
     generics = [f"{name} : bit_vector := b\"0\"" for name in cell.parameters]
+    generics += [f"{name} : string := \"{default}\"" for name, default in cell.texts.items()]
+    generics += [f"{name} : natural := 0" for name in cell.numbers]
     ports = [_port(port) for port in cell.ports]
     lines += [f"{2 * _INDENT}{text};" for text in generics[:-1]] + [2 * _INDENT + generics[-1]]
     lines += [f"{_INDENT});", f"{_INDENT}port ("]

@@ -11,6 +11,8 @@ package orn_hdl_cells is
    function is_set (value : bit_vector) return boolean;
    -- The lowest bits of a parameter, which has zeros above its own.
    function value_of (value : bit_vector; width : natural) return std_logic_vector;
+   -- What a register has at first, from digits 0, 1 and U; bits without a digit have U.
+   function first_value (digits : string; width : natural) return std_logic_vector;
    -- The highest index of a port, which has one bit at least.
    function highest (width : integer) return natural;
    function largest (a, b : integer) return integer;
@@ -64,6 +66,23 @@ package orn_hdl_cells is
       return std_logic;
    function fits (a : std_logic_vector; rows : bit_vector; depth : natural) return std_logic;
    function carries (p, g : std_logic_vector; carry : std_logic) return std_logic_vector;
+
+   -- For $macc: a sum of terms, each one or two numbers of a, and of single bits. CONFIG has the
+   -- width of the fields of a term, then for each term whether it is signed and subtracted, and how
+   -- wide its numbers are.
+   function accumulated (a : std_logic_vector; config : bit_vector; single : std_logic_vector;
+                         count : natural; width : natural) return std_logic_vector;
+   function field (value : bit_vector; low, count : natural) return natural;
+
+   -- For $fsm: rows of a table. A row has, from the left, a state, a pattern of inputs, the next
+   -- state and the outputs; its "-" fit any value.
+   -- The last row of a state whose pattern fits the inputs; -1 for none.
+   function row_of (table : string; rows, states, inputs, outputs : natural; state : integer;
+                    control : std_logic_vector) return integer;
+   function next_state (table : string; row, states, inputs, outputs : integer;
+                        otherwise : integer) return integer;
+   function outputs_of (table : string; row, states, inputs, outputs : integer; width : natural)
+      return std_logic_vector;
 
    -- For memories: bit number i of a parameter, a clock's edge, and an address.
    function flag (value : bit_vector; i : natural) return boolean;
@@ -124,6 +143,22 @@ package body orn_hdl_cells is
       end loop;
       return result;
    end value_of;
+
+   function first_value (digits : string; width : natural) return std_logic_vector is
+      alias texts : string(digits'length downto 1) is digits;
+      variable result : std_logic_vector(width - 1 downto 0) := (others => 'U');
+   begin
+      for i in result'reverse_range loop
+         if i < texts'length then
+            case texts(i + 1) is
+               when '0' => result(i) := '0';
+               when '1' => result(i) := '1';
+               when others => null;
+            end case;
+         end if;
+      end loop;
+      return result;
+   end first_value;
 
    function highest (width : integer) return natural is
    begin
@@ -478,6 +513,139 @@ package body orn_hdl_cells is
       end loop;
       return result;
    end carries;
+
+   function field (value : bit_vector; low, count : natural) return natural is
+      variable result : natural := 0;
+   begin
+      for i in low + count - 1 downto low loop
+         result := 2 * result;
+         if flag(value, i) then
+            result := result + 1;
+         end if;
+      end loop;
+      return result;
+   end field;
+
+   function accumulated (a : std_logic_vector; config : bit_vector; single : std_logic_vector;
+                         count : natural; width : natural) return std_logic_vector is
+      alias bits : std_logic_vector(a'length - 1 downto 0) is a;
+      alias ones : std_logic_vector(single'length - 1 downto 0) is single;
+      constant size : positive := largest(field(config, 0, 4), 1);
+      constant terms : integer := (config'length - 4) / (2 + 2 * size);
+      variable low, from, first, second : natural := 0;
+      variable term, result : std_logic_vector(width - 1 downto 0) := zeros(width);
+
+      -- The next number of a, which may have no bits.
+      procedure take (length : in natural; value : out std_logic_vector) is
+      begin
+         value := extend(bits(from + length - 1 downto from), length, flag(config, low), width);
+         from := from + length;
+      end take;
+
+      variable factor : std_logic_vector(width - 1 downto 0);
+   begin
+      for i in 0 to terms - 1 loop
+         low := 4 + i * (2 + 2 * size);
+         first := field(config, low + 2, size);
+         second := field(config, low + 2 + size, size);
+         take(first, term);
+         if second > 0 then
+            take(second, factor);
+            term := product(term, factor);
+         end if;
+         if flag(config, low + 1) then
+            result := difference(result, term);
+         else
+            result := sum(result, term, '0');
+         end if;
+      end loop;
+      for i in 0 to count - 1 loop
+         result := sum(result, zeros(width), ones(i));
+      end loop;
+      return result;
+   end accumulated;
+
+   function digit_of (value : character) return std_logic is
+   begin
+      case value is
+         when '0' => return '0';
+         when '1' => return '1';
+         when others => return 'X';
+      end case;
+   end digit_of;
+
+   -- A number in a table; -1 for one that has other digits than 0 and 1.
+   function number_at (table : string; first, count : natural) return integer is
+      variable result : natural := 0;
+   begin
+      for i in first to first + count - 1 loop
+         result := 2 * result;
+         if table(i) = '1' then
+            result := result + 1;
+         elsif table(i) /= '0' then
+            return -1;
+         end if;
+      end loop;
+      return result;
+   end number_at;
+
+   -- Where a row begins; the first row stands at the right end.
+   function start_of (table : string; row, length : natural) return integer is
+   begin
+      return table'length - (row + 1) * length + 1;
+   end start_of;
+
+   function row_of (table : string; rows, states, inputs, outputs : natural; state : integer;
+                    control : std_logic_vector) return integer is
+      alias digits : string(1 to table'length) is table;
+      alias levels : std_logic_vector(control'length - 1 downto 0) is control;
+      constant length : natural := 2 * states + inputs + outputs;
+      variable start : integer;
+      variable is_fitting : boolean;
+      variable digit : character;
+   begin
+      for row in rows - 1 downto 0 loop
+         start := start_of(digits, row, length);
+         is_fitting := state >= 0 and number_at(digits, start, states) = state;
+         for i in 0 to inputs - 1 loop
+            digit := digits(start + states + inputs - 1 - i);
+            if digit /= '-' then
+               is_fitting := is_fitting and digit_of(digit) = to_x01(levels(i));
+            end if;
+         end loop;
+         if is_fitting then
+            return row;
+         end if;
+      end loop;
+      return -1;
+   end row_of;
+
+   function next_state (table : string; row, states, inputs, outputs : integer;
+                        otherwise : integer) return integer is
+      alias digits : string(1 to table'length) is table;
+      constant length : natural := 2 * states + inputs + outputs;
+   begin
+      if row < 0 then
+         return otherwise;
+      end if;
+      return number_at(digits, start_of(digits, row, length) + states + inputs, states);
+   end next_state;
+
+   function outputs_of (table : string; row, states, inputs, outputs : integer; width : natural)
+      return std_logic_vector is
+      alias digits : string(1 to table'length) is table;
+      variable result : std_logic_vector(width - 1 downto 0) := copies('X', width);
+      constant length : natural := 2 * states + inputs + outputs;
+      variable last : integer;
+   begin
+      if row >= 0 then
+         last := start_of(digits, row, length) + length - 1;
+         for i in 0 to outputs - 1 loop
+            result(i) := digit_of(digits(last - i));
+         end loop;
+      end if;
+      return result;
+   end outputs_of;
 
    function flag (value : bit_vector; i : natural) return boolean is
       alias bits : bit_vector(value'length - 1 downto 0) is value;

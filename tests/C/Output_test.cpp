@@ -315,4 +315,24 @@ TEST_F(CReader, InfersUndeclaredCells) {
     EXPECT_EQ(Read("a.v", text), ORN_HDL_OK) << GetError();
 }
 
+TEST_F(CReader, KeepsDontCares) {
+    for (const orn_hdl_language_t language : {ORN_HDL_VERILOG, ORN_HDL_VHDL}) {
+        SCOPED_TRACE(language);
+        Create(language);
+        const bool isVhdl = language == ORN_HDL_VHDL;
+        const char* const file = isVhdl ? "x.vhd" : "x.v";
+        const std::string text = isVhdl ? "library ieee; use ieee.std_logic_1164.all;\n"
+                                          "entity top is port (y : out std_logic); end;\n"
+                                          "architecture a of top is begin y <= '-'; end;\n"
+                                        : "module top(y); output y; assign y = 1'bx; endmodule\n";
+        EXPECT_EQ(Read(file, text), ORN_HDL_FAILED);
+        ASSERT_EQ(orn_hdl_reader_set(reader, ORN_HDL_KEEP_DONT_CARES, 1), ORN_HDL_OK);
+        EXPECT_EQ(Read(file, text), ORN_HDL_OK) << GetError();
+        int keeps = 0;
+        EXPECT_EQ(orn_hdl_model_get_number(session.model, ORN_HDL_DONT_CARES, &keeps), ORN_HDL_OK);
+        EXPECT_EQ(keeps, 1);
+        ASSERT_EQ(orn_hdl_model_set_number(session.model, ORN_HDL_DONT_CARES, 0), ORN_HDL_OK);
+    }
+}
+
 } // namespace

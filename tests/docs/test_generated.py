@@ -158,7 +158,7 @@ class Bash(unittest.TestCase):
         self.assertEqual(self.complete("co"), ["commands"])
         self.assertEqual(self.complete("run", "--v"), ["--verify", "--verilog", "--vhdl"])
         self.assertEqual(self.complete("run", "--model", ""), [])
-        self.assertEqual(self.complete("import", "--x-as", ""), ["0", "1"])
+        self.assertEqual(self.complete("import", "--x-as", ""), ["-", "0", "1"])
         self.assertEqual(self.complete("unknown", ""), [])
         self.assertEqual(self.complete("help", "dr"), ["draw"])
 

@@ -61,7 +61,7 @@ class Pin:
 
 @dataclass
 class Cell:
-    """One cell with its parameters; their values are strings of bits."""
+    """One cell with its parameters; their values are strings of bits, "-" for any value."""
     type: str
     pins: list[Pin]
     parameters: dict[str, str] = field(default_factory=dict)
@@ -75,7 +75,8 @@ class Cell:
         return sum(pin.width for pin in self.pins if pin.is_output)
 
     def __str__(self) -> str:
-        values = ", ".join(f"{name}={int(bits, 2)}" for name, bits in self.parameters.items())
+        values = ", ".join(f"{name}={bits if '-' in bits else int(bits, 2)}"
+                           for name, bits in self.parameters.items())
         return f"{self.type}({values})"
 
 
@@ -149,13 +150,14 @@ def as_verilog(batch: Batch) -> str:
     lines = [f"module batch(input [{batch.width - 1}:0] v, output [{total - 1}:0] o);"]
     made = 0
     for number, cell in enumerate(batch.cells):
-        values = ", ".join(f".{name}({len(bits)}'b{bits})" for name, bits in cell.parameters.items())
+        values = ", ".join(f".{name}({len(bits)}'b{bits.replace('-', '?')})"
+                           for name, bits in cell.parameters.items())
         pins, taken = [], 0
         for pin in cell.pins:
             bus, low = ("o", made) if pin.is_output else ("v", taken)
             wires = ["1'b0" if bit in pin.tied else f"{bus}[{low + bit}]"
                      for bit in range(pin.width)]
-            pins.append(f".{pin.name}({{{', '.join(reversed(wires))}}})")
+            pins.append(f".{pin.name}({{{', '.join(reversed(wires))}}})" if wires else f".{pin.name}()")
             if pin.is_output:
                 made += pin.width
             else:
@@ -411,6 +413,49 @@ def other_functions() -> Iterator[Cell]:
                    size)
 
 
+def sums() -> Iterator[Cell]:
+    """Sums of products: of each term its sign, whether it is subtracted, and the widths of its factors."""
+    for terms, single, width in (
+            (((0, 0, 4, 4), (0, 0, 4, 0), (0, 1, 4, 0)), 0, 8), (((1, 0, 3, 3), (1, 1, 2, 3)), 0, 7),
+            (((1, 1, 3, 0), (0, 0, 2, 2), (0, 1, 2, 0)), 3, 4), (((0, 0, 1, 0),), 2, 3),
+            (((1, 0, 3, 2), (0, 0, 0, 0), (1, 0, 1, 0)), 1, 2), ((), 3, 4)):
+        size = max([1, *(count.bit_length() for term in terms for count in term[2:])])
+        config = bits_of(size, 4)
+        for is_signed, is_subtracted, first, second in terms:
+            config = bits_of(second, size) + bits_of(first, size) + f"{is_subtracted}{is_signed}" + config
+        operand = sum(first + second for _, _, first, second in terms)
+        yield Cell("$macc", [Pin("A", operand), Pin("B", single), Pin("Y", width, True)],
+                   {"A_WIDTH": bits_of(operand), "B_WIDTH": bits_of(single), "CONFIG": config,
+                    "CONFIG_WIDTH": bits_of(len(config)), "Y_WIDTH": bits_of(width)})
+
+
+def state_machines(count: int) -> Iterator[Cell]:
+    """Random tables. Some have a row for every input, others patterns of which the last one holds."""
+    draw = random.Random(10)
+    for number in range(count):
+        states, inputs, outputs = draw.randint(2, 4), draw.randint(1, 3), draw.randint(1, 3)
+        log2 = draw.choice((2, 3))
+        rows = []
+        for state in range(states):
+            for _ in range(draw.randint(1, 4)):
+                pattern = "".join(draw.choice("01" if number % 4 == 0 else "01--")
+                                  for _ in range(inputs))
+                rows.append(bits_of(state, log2) + pattern + bits_of(draw.randrange(states), log2) +
+                            bits_of(draw.getrandbits(outputs), outputs))
+        is_one_hot = draw.random() < 0.5
+        codes = ["-" * (states - 1 - state) + "1" + "-" * state if is_one_hot else bits_of(state, 2)
+                 for state in range(states)]
+        yield Cell("$fsm", [Pin("CLK", 1), Pin("ARST", 1), Pin("CTRL_IN", inputs),
+                            Pin("CTRL_OUT", outputs, True)],
+                   {"CLK_POLARITY": bits_of(draw.getrandbits(1), 1),
+                    "ARST_POLARITY": bits_of(draw.getrandbits(1), 1),
+                    "CTRL_IN_WIDTH": bits_of(inputs), "CTRL_OUT_WIDTH": bits_of(outputs),
+                    "STATE_BITS": bits_of(len(codes[0])), "STATE_NUM": bits_of(states),
+                    "STATE_NUM_LOG2": bits_of(log2), "STATE_RST": bits_of(draw.randrange(states)),
+                    "STATE_TABLE": "".join(reversed(codes)), "TRANS_NUM": bits_of(len(rows)),
+                    "TRANS_TABLE": "".join(rows)})
+
+
 REGISTERS = {
     "sr": "SET CLR", "dff": "CLK", "dffe": "CLK EN", "dffsr": "CLK SET CLR",
     "dffsre": "CLK SET CLR EN", "adff": "CLK ARST", "adffe": "CLK ARST EN", "aldff": "CLK ALOAD",
@@ -487,6 +532,10 @@ def word_batches(is_full: bool) -> Iterator[Batch]:
     yield from in_pieces("operators", small, 400)
     yield from in_pieces("operators of more inputs", [c for c in cells if c not in small], 400)
     yield from in_pieces("other functions", other_functions(), 400)
+    adding = list(sums())
+    yield Batch("sums of products", adding, walk(adding, 60000 if is_full else 3000, 11))
+    machines = list(state_machines(200 if is_full else 30))
+    yield Batch("state machines", machines, walk(machines, 30000 if is_full else 3000, 12), WARM_UP)
     stored = list(registers())
     small = [cell for cell in stored if cell.inputs <= SMALL]
     large = [cell for cell in stored if cell.inputs > SMALL]

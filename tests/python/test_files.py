@@ -89,6 +89,25 @@ def test_importing_json(tmp_path: Path) -> None:
     assert u1.component.name == "INV", "the design stays as it was"
 
 
+def test_dont_cares(tmp_path: Path) -> None:
+    path = tmp_path / "x.json"
+    path.write_text('{"modules": {"top": {"ports": {"y": {"direction": "output", "bits": ["x", "1"]}}, "cells": {}}}}')
+    d = orn_hdl.Design("top")
+    with pytest.raises(orn_hdl.NetlistError, match="the value x"):
+        d.import_json(path)
+    d.import_json(path, x_as="-")
+    assert d.options.dont_cares
+    assert "assign y = 2'b1x;" in d.to_verilog() and '<= "1-";' in d.to_vhdl()
+    for read, text, name in (("read_verilog", d.to_verilog(), "x.v"), ("read_vhdl", d.to_vhdl(), "x.vhd")):
+        (tmp_path / name).write_text(text)
+        other = orn_hdl.Design("other")
+        with pytest.raises(orn_hdl.NetlistError):
+            getattr(other, read)(tmp_path / name)
+        assert not other.options.dont_cares
+        getattr(other, read)(tmp_path / name, dont_cares=True)
+        assert other.options.dont_cares and other.to_verilog() == d.to_verilog()
+
+
 def test_without_the_tool(tmp_path: Path, monkeypatch: pytest.MonkeyPatch) -> None:
     monkeypatch.delenv("ORN_HDL_TOOL", raising=False)
     monkeypatch.setenv("PATH", str(tmp_path))

@@ -128,6 +128,14 @@ test texts {a design as text gives the design again} -setup {set m [small]} -bod
         [expr {[$copy text vhdl] eq [$m text vhdl]}] [expr {[$copy text commands] eq $commands}]
 } -cleanup {$m destroy; $copy destroy} -result {1 1 1}
 
+test dontcares {a digit - is a don't care when the option says so} -setup {set m [small]} -body {
+    $m execute {ASSIGN CONSTANT k(1:0) 2:B:1-}
+    set before [string match "*= 2'b1-;*" [$m text verilog]]
+    $m option dontcares on
+    list $before [$m option dontcares] [string match "*= 2'b1x;*" [$m text verilog]] \
+        [string match "*<= \"1-\";*" [$m text vhdl]]
+} -cleanup {$m destroy} -result {1 1 1 1}
+
 test read {a netlist is read} -setup {
     set file [makeFile "module top(a, y);\ninput a;\noutput y;\nCELL u(.I(a), .O(y));\nendmodule" a.v]
     set cells [makeFile "module CELL(I, O);\ninput I;\noutput O;\nendmodule" cells.v]

@@ -5,6 +5,8 @@ from __future__ import annotations
 import itertools
 import json
 import re
+import shutil
+import subprocess
 import unittest
 from pathlib import Path
 
@@ -53,6 +55,36 @@ class CellModels(ImportTest):
                                            **{pin: [next(nets)] for pin, _ in pins})
         text, _ = self.models(design({}, cells), "--names", "both")
         self.assertEqual(text.partition("\n\n")[2], installed.partition("\n\n")[2])
+
+    def test_every_cell_has_a_model_or_a_reason(self) -> None:
+        """The page names all cells of Yosys that have no model, and no others."""
+        if shutil.which("yosys") is None:
+            self.skipTest("yosys is not installed")
+        told = subprocess.run(["yosys", "-p", "help -cells"], check=True, capture_output=True, text=True).stdout
+        if "Yosys 0.23 " not in told:
+            self.skipTest("the page is about Yosys 0.23")
+        known = set(re.findall(r"^    (\$\w+)", told, re.MULTILINE))
+        models = {name for file in SHARE.glob("*.vhd")
+                  for name in re.findall(r"^-- (\$\w+):", file.read_text(), re.MULTILINE)}
+        page = (SHARE.parents[2] / "docs" / "import.md").read_text()
+        table = page.partition("| cells without a model |")[2].partition("\n\n")[0]
+        named = {name for row in table.splitlines()[2:]
+                 for name in re.findall(r"`(\$\w+)`", row.split("|")[1])}
+        self.assertGreater(len(models), 200)
+        self.assertEqual(models - known, set())
+        self.assertEqual(named, known - models)
+
+    def test_tables_of_state_machines_are_texts(self) -> None:
+        """Two machines of one component, one of which has no "-" in its table."""
+        size = {name: bits for name, bits in (("CTRL_IN_WIDTH", 1), ("CTRL_OUT_WIDTH", 1), ("TRANS_NUM", 1))}
+        cells = {f"u{i}": cell("$fsm", "iiio", CLK=[2], ARST=[3], CTRL_IN=[2], CTRL_OUT=[5 + i],
+                               parameters={**size, "TRANS_TABLE": table})
+                 for i, table in enumerate(("00-01", "00x01"))}
+        text, messages = self.models(design({"a": port("input", 2), "b": port("input", 3)}, cells))
+        self.assertIn("TRANS_TABLE : string", text)
+        self.assertIn("TRANS_TABLE => TRANS_TABLE", text)
+        self.assertEqual(self.read("top.vhd").count('TRANS_TABLE => "00'), 2)
+        self.assertNotIn("x means any value", messages)
 
     def test_word_has_package_and_entity_once(self) -> None:
         wide = {**WIDTH, "A_WIDTH": format(2, "032b")}

@@ -217,7 +217,7 @@ class Trouble(ToolTest):
     def test_options_of_the_other_kind(self) -> None:
         self.write("d.v", DESIGN)
         self.expect(self.run_tool("import", "d.v", "--x-as", "0"), USAGE,
-                    "orn-hdl: --x-as applies to JSON netlists alone; see --help\n")
+                    "orn-hdl: --x-as 0 applies to JSON netlists alone; see --help\n")
         self.write("d.json", "{}")
         for option in (["--comments"], ["-I", "."], ["-D", "A"]):
             self.expect(self.run_tool("import", "d.json", *option), USAGE,

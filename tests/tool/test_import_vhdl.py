@@ -71,7 +71,7 @@ class Vhdl(ToolTest):
                     "orn-hdl: cannot read none.vhd: No such file or directory\n")
         self.write("d.vhd", DESIGN)
         self.expect(self.run_tool("import", "d.vhd", "--x-as", "1"), USAGE,
-                    "orn-hdl: --x-as applies to JSON netlists alone; see --help\n")
+                    "orn-hdl: --x-as 1 applies to JSON netlists alone; see --help\n")
 
 
 class Libraries(ToolTest):

@@ -1,5 +1,7 @@
 #include "CommandsOutput.h"
 
+#include "import/Sink.h"
+
 #include "Orn_Hdl/Exception.h"
 #include "Orn_Hdl/Model.h"
 #include "Orn_Hdl/Streams.h"
@@ -48,13 +50,16 @@ private:
 CommandsOutput::CommandsOutput(const std::string& name)
     : isStandardOutput_(name == "-"), file_(isStandardOutput_ ? std::string() : name) {}
 
-Status CommandsOutput::Write(const Orn_Hdl::Model& model) {
+Status CommandsOutput::Write(Orn_Hdl::Model& model) {
     if (!isStandardOutput_ && file_.GetStream() == nullptr) {
         return file_.Flush();
     }
     Status status = Status::Success;
     Orn_Hdl::OutStream out(new LineDestination(file_.GetStream(), status));
     try {
+        if (model.GetOptions()->dontCares) {
+            out << Import::DontCareNote;
+        }
         model.WriteCommands(out);
     } catch (const Orn_Hdl::Exception& exception) {
         std::string_view text = exception.getLocalized().GetView();

@@ -21,7 +21,7 @@ public:
     explicit CommandsOutput(const std::string& name);
 
     /// Writes the commands of the model as it is now, and prints a message if that fails.
-    Status Write(const Orn_Hdl::Model& model);
+    Status Write(Orn_Hdl::Model& model);
     /// Replaces the named file, and prints a message if that fails.
     Status Commit() { return file_.Commit(); }
 

@@ -50,8 +50,8 @@ ImportFormat GetFormat(const ImportOptions& options) {
 
 /// The first option that applies to JSON netlists alone; empty for none.
 std::string_view FindJsonOption(const ImportOptions& options) {
-    if (!options.unknownAs.empty()) {
-        return "--x-as";
+    if (options.unknownAs == "0" || options.unknownAs == "1") {
+        return options.unknownAs == "0" ? "--x-as 0" : "--x-as 1";
     }
     if (!options.modules.empty()) {
         return "--module";
@@ -59,9 +59,10 @@ std::string_view FindJsonOption(const ImportOptions& options) {
     if (!options.cellModels.empty()) {
         return "--write-cells";
     }
-    return options.vhdl.configuration ? "--configuration"
-           : options.vhdl.ieeeAlone   ? "--no-kestra"
-                                      : "";
+    return options.initialValues        ? "--initial-values"
+           : options.vhdl.configuration ? "--configuration"
+           : options.vhdl.ieeeAlone     ? "--no-kestra"
+                                        : "";
 }
 
 /// The first option that does not apply to the format; empty if all do.
@@ -101,6 +102,11 @@ Status WriteCertified(const std::vector<DesignModel>& models, const ImportOption
         status = WriteDesign(models, options.outputs, progress, certificate);
     }
     return status == Status::Success ? certificate.Write() : status;
+}
+
+bool IsWritten(const ImportOptions& options, Orn_Hdl::Language language) {
+    const auto file = options.outputs.files.find(language);
+    return file != options.outputs.files.end() && !file->second.empty();
 }
 
 /// Whether a certificate can name what is read and written.
@@ -161,12 +167,8 @@ bool HasExtension(std::string_view file, std::string_view extension) noexcept {
 }
 
 NameLanguages GetNameLanguages(const ImportOptions& options) {
-    const auto isWritten = [&](Orn_Hdl::Language language) {
-        const auto file = options.outputs.files.find(language);
-        return file != options.outputs.files.end() && !file->second.empty();
-    };
-    const bool verilog = isWritten(Orn_Hdl::Language::Verilog);
-    const bool vhdl = isWritten(Orn_Hdl::Language::Vhdl);
+    const bool verilog = IsWritten(options, Orn_Hdl::Language::Verilog);
+    const bool vhdl = IsWritten(options, Orn_Hdl::Language::Vhdl);
     if (options.names) {
         return *options.names;
     }
@@ -238,6 +240,10 @@ Status ImportDesign(const ImportOptions& options) {
     }
     if (!options.cellModels.empty() && GetNameLanguages(options) == NameLanguages::Verilog) {
         Complain("--write-cells needs names that are legal in VHDL, too; see --names");
+        return Status::Usage;
+    }
+    if (options.initialValues && IsWritten(options, Orn_Hdl::Language::Verilog)) {
+        Complain("--initial-values is for VHDL: the registers of Yosys have no such parameter");
         return Status::Usage;
     }
     Reporter reporter(options.report);

@@ -35,7 +35,7 @@ struct ImportOptions {
     /// The command file to write; empty for none. A folder gets one file a module.
     std::string commandFile;
     Outputs outputs;
-    /// The replacement of x and z, "0" or "1"; empty to reject them.
+    /// The replacement of x and z: "0", "1", or "-" for don't cares; empty to reject them.
     std::string unknownAs;
     /// The cell libraries.
     std::vector<std::string> libraries;
@@ -57,6 +57,8 @@ struct ImportOptions {
     std::string nameMap;
     /// The file for the simulation models of cells; empty for none.
     std::string cellModels;
+    /// Give registers the first values of their nets, for the models of cells in VHDL.
+    bool initialValues = false;
     /// Write legal netlists, or nothing.
     bool legal = false;
     /// Read each netlist back and compare it with the design before it replaces its file.

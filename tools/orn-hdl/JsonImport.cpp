@@ -10,6 +10,7 @@
 #include "import/DesignReader.h"
 #include "import/DesignUnits.h"
 #include "import/EmitNetlist.h"
+#include "import/FirstValues.h"
 #include "import/Hierarchy.h"
 #include "import/ImportedNetlist.h"
 #include "import/ModelSink.h"
@@ -39,7 +40,9 @@ UnknownValues GetUnknownValues(const ImportOptions& options) {
     if (options.unknownAs.empty()) {
         return UnknownValues(std::nullopt);
     }
-    return UnknownValues(options.unknownAs == "1" ? One : Zero);
+    return UnknownValues(options.unknownAs == "-"   ? Unknown
+                         : options.unknownAs == "1" ? One
+                                                    : Zero);
 }
 
 /// The modules that are written, in the order of compilation.
@@ -226,6 +229,9 @@ Status ImportFile(JsonFile& file, const ImportOptions& options, const CellLibrar
         const std::unique_ptr<ImportedDesign> design = ReadFile(file, options);
         if (design == nullptr) {
             return Status::File;
+        }
+        if (options.initialValues) {
+            SetFirstValues(*design);
         }
         Warnings warnings;
         const NameRules names(GetNameLanguages(options), !options.commandFile.empty());

@@ -202,6 +202,7 @@ template <class Reader> void Importer::SetUp(Reader& reader) {
     reader.SetTop(options_.top.c_str());
     reader.KeepAttributes(options_.attributes);
     reader.KeepComments(options_.comments);
+    reader.KeepDontCares(options_.unknownAs == "-");
     reader.SetKeptNames([this](string_view name) { return KeepsName(name); });
     for (const std::string& library : options_.libraries) {
         if (GetFormat(library) == format_) {

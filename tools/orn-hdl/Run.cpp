@@ -324,6 +324,7 @@ Status Run(const RunOptions& options) {
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";
     model.GetOptions()->verify = options.verify;
+    model.GetOptions()->dontCares = options.dontCares;
     model.GetOptions()->threads = options.threads;
     const Status status = ReplayAndWrite(model, file, options);
     file.reporter.Finish(GetWarningRules());

@@ -53,6 +53,8 @@ struct RunOptions {
     std::string names = "rename";
     /// The file for the table of old and new names; empty for none.
     std::string nameMap;
+    /// Whether the digit "-" of a constant is a don't care.
+    bool dontCares = false;
     /// How many threads may work together; 0 is what the system gives.
     unsigned threads = 0;
     ReportOptions report;

@@ -40,13 +40,7 @@ std::string CheckFileName(const std::string& name) {
 }
 
 std::string CheckDigit(const std::string& text) {
-    if (text == "0" || text == "1") {
-        return "";
-    }
-    // The values of VHDL that somebody may want to keep.
-    return text == "-" || text == "x" || text == "X"
-               ? "the constants of a design are 0 and 1 alone; 0 or 1 is needed"
-               : "0 or 1 is needed";
+    return text == "0" || text == "1" || text == "-" ? "" : "0, 1 or - is needed";
 }
 
 const std::map<std::string, Tool::Import::NameLanguages>& GetNameLanguages() {
@@ -164,6 +158,10 @@ std::string DropWarnings(const std::string& list, Tool::WarningOptions& warnings
         }
     }
     return "";
+}
+
+void AddDontCares(CLI::App& command, bool& dontCares) {
+    command.add_flag("--dont-cares", dontCares, "The digit - of a constant is a don't care");
 }
 
 void AddWarnings(CLI::App& command, Tool::WarningOptions& warnings) {
@@ -398,6 +396,7 @@ private:
             ->needs(legal);
         AddFile(command, "--name-map", run_.nameMap, "Write a table of old and new names")
             ->needs(legal);
+        AddDontCares(command, run_.dontCares);
         AddThreads(command, run_.threads);
         command.add_flag("--quiet", run_.quiet, "Do not show progress");
     }
@@ -449,8 +448,10 @@ private:
         command.add_flag("--no-kestra", import_.vhdl.ieeeAlone,
                          "Leave the library KESTRA out of VHDL");
         command.add_flag("--keep-ports", import_.keepPorts, "Fail if a port has to be renamed");
-        command.add_option("--x-as", import_.unknownAs, "Replace the values x and z by 0 or 1")
-            ->type_name("0|1")
+        command
+            .add_option("--x-as", import_.unknownAs,
+                        "Replace the values x and z by 0, 1 or a don't care")
+            ->type_name("0|1|-")
             ->check(CheckDigit);
         command.add_flag("--attributes", import_.attributes,
                          "Import the attributes of cells and nets");
@@ -464,6 +465,8 @@ private:
         AddFile(command, "--name-map", import_.nameMap, "Write a table of old and new names");
         AddFile(command, "--write-cells", import_.cellModels,
                 "Write simulation models in VHDL of the cells of Yosys");
+        command.add_flag("--initial-values", import_.initialValues,
+                         "Give the registers of these models the first values of their nets");
         AddThreads(command, import_.threads);
         AddReport(command, import_.report);
         command.footer("If no output is given, the file is only checked.");
@@ -482,6 +485,7 @@ private:
                                "What makes the exit status 1");
         AddFormat(command, "--format,--diagnostics", check_.report, "How the findings are printed");
         AddColor(command, check_.report);
+        AddDontCares(command, check_.dontCares);
         AddThreads(command, check_.threads);
         command.add_flag("--list", check_.list, "List the rules");
         command.add_flag("--markdown", check_.markdown, "Print the table of the documentation");
@@ -552,6 +556,7 @@ private:
         AddFile(command, "--certificate", verify_.certificate,
                 "Write what was proven, with the SHA-256 of the files, as JSON");
         AddReport(command, verify_.report);
+        AddDontCares(command, verify_.dontCares);
         AddThreads(command, verify_.threads);
         command.add_flag("--quiet", verify_.quiet, "Do not show progress");
         command.footer("WRITE commands in the file do nothing.");

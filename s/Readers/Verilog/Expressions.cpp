@@ -141,7 +141,7 @@ void ExpressionReader::ReadConstantName(const ParameterHead& parameter, const Pl
 void ExpressionReader::ReadNumber(bool isWhole) {
     const Place place = parser_.Get().place;
     try {
-        Number number = Number::Read(parser_.Get().text, GetUnknowns());
+        Number number = Number::Read(parser_.Get().text, maker_.GetUnknowns());
         if (!isWhole) {
             if (number.size == 0 || number.kind != Number::Integer) {
                 parser_.Fail("a constant in a concatenation needs a size");
@@ -168,7 +168,7 @@ void ExpressionReader::ReadConcatenation() {
     if (parser_.Get().kind == TokenKind::Number) {
         Number number;
         try {
-            number = Number::Read(parser_.Get().text, GetUnknowns());
+            number = Number::Read(parser_.Get().text, maker_.GetUnknowns());
             const std::optional<std::int64_t> value = number.GetValue();
             count = value.value_or(0);
             parser_.Next();

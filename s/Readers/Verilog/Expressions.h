@@ -75,11 +75,6 @@ private:
 
     Parser& parser_;
     Scanner& scanner_;
-    /// A sink judges the values x and z by itself.
-    Unknowns GetUnknowns() const noexcept {
-        return maker_.GetSink() == nullptr ? Unknowns::Refuse : Unknowns::Keep;
-    }
-
     NetlistMaker& maker_;
     const ModuleHead& head_;
     Expression* expression_ = nullptr;

@@ -51,14 +51,14 @@ int ValueOf(char digit) noexcept {
     return (digit | 0x20) - 'a' + 10;
 }
 
-/// Whether a digit or a bit stands for x or z.
+/// Whether a digit or a bit stands for x, z or a don't care.
 bool IsUnknown(char c) noexcept {
-    return c == '?' || (c | 0x20) == 'x' || (c | 0x20) == 'z';
+    return c == '?' || c == '-' || (c | 0x20) == 'x' || (c | 0x20) == 'z';
 }
 
 void RefuseUnknown(std::string_view digits) {
     for (const char c : digits) {
-        if (IsUnknown(c)) {
+        if (c != '-' && IsUnknown(c)) {
             throw LiteralProblem{std::string("the digit ") + c +
                                  ": a model has the values 0 and 1 alone"};
         }
@@ -100,7 +100,8 @@ std::string DigitBits(const std::string& digits, int base) {
     std::string bits;
     for (const char digit : digits) {
         if (IsUnknown(digit)) {
-            bits.append(std::max(count, 1U), (digit | 0x20) == 'x' ? 'x' : 'z');
+            const char bit = digit == '-' ? digit : (digit | 0x20) == 'x' ? 'x' : 'z';
+            bits.append(std::max(count, 1U), bit);
             continue;
         }
         for (std::uint32_t bit = count; bit-- > 0;) {
@@ -129,7 +130,12 @@ Number ReadBased(std::string_view text, std::size_t apostrophe, Unknowns unknown
         text.remove_prefix(1);
     }
     number.digits = text;
-    if (unknowns == Unknowns::Refuse) {
+    if (unknowns == Unknowns::DontCare) {
+        std::replace_if(
+            number.digits.begin(), number.digits.end(), [](char c) { return (c | 0x20) == 'x'; },
+            '-');
+    }
+    if (unknowns != Unknowns::Keep) {
         RefuseUnknown(number.digits);
     }
     RefuseDigitsOfOtherBases(number.digits, number.base);

@@ -32,7 +32,7 @@ struct Number {
     /// The width that the number has by itself: its size, else 32, or more when its digits need it.
     std::uint32_t GetWidth() const;
     /// So many bits of the number, leftmost first, as an assignment would extend or cut it. A bit
-    /// is one of "01xz". \throws LiteralProblem.
+    /// is one of "01xz-". \throws LiteralProblem.
     std::string GetBits(std::uint32_t width) const;
     /// The value as a number without a sign; nothing when it is none below 2 to the power of 62.
     std::optional<std::int64_t> GetValue() const;

@@ -22,6 +22,7 @@ struct VerilogSetup {
     ReaderUndeclared undeclared = ReaderUndeclared::Refuse;
     bool keepsComments = false;
     bool keepsAttributes = true;
+    bool keepsDontCares = false;
 };
 
 } // namespace Orn_Hdl::Readers

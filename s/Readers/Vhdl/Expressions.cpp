@@ -111,11 +111,11 @@ bool ExpressionReader::ReadOperand(const Shape* shape) {
             RefuseOperator();
             return ReadName(shape);
         case TokenKind::Character:
-            AddBits(std::string(1, ReadBit(token.text.front(), GetUnknowns())), place);
+            AddBits(std::string(1, ReadBit(token.text.front(), maker_.GetUnknowns())), place);
             isVector = false;
             break;
         case TokenKind::String:
-            AddBits(ReadBits(token.text, GetUnknowns()), place);
+            AddBits(ReadBits(token.text, maker_.GetUnknowns()), place);
             break;
         case TokenKind::BitString: {
             BitString literal = BitString::Read(token.text);

@@ -150,11 +150,6 @@ private:
     void Spend(std::uint64_t cost, const Place& place);
 
     Parser& parser_;
-    /// A sink judges the values x and z by itself.
-    Unknowns GetUnknowns() const noexcept {
-        return maker_.GetSink() == nullptr ? Unknowns::Refuse : Unknowns::Keep;
-    }
-
     NetlistMaker& maker_;
     const ModuleHead& entity_;
     std::map<std::string, Named> named_;

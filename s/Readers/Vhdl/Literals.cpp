@@ -127,8 +127,11 @@ std::string ReadString(std::string_view text) {
 }
 
 char ReadBit(char character, Unknowns unknowns) {
-    if (unknowns == Unknowns::Keep && (character == 'X' || character == 'Z')) {
+    if (unknowns == Unknowns::Keep && (character == 'X' || character == 'Z' || character == '-')) {
         return Port::ToLower(character);
+    }
+    if (unknowns == Unknowns::DontCare && (character == 'X' || character == '-')) {
+        return '-';
     }
     if (character != '0' && character != '1') {
         RefuseValue(character);

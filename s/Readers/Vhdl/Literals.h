@@ -18,7 +18,8 @@ bool IsReal(std::string_view text) noexcept;
 
 /// The characters of a string, in which two quotes stand for one.
 std::string ReadString(std::string_view text);
-/// The bit of a character literal: 0 or 1, or x or z where these are kept.
+/// The bit of a character literal: 0 or 1, x, z or "-" where these are kept, and "-" for a don't
+/// care.
 /// \throws LiteralProblem for another value.
 char ReadBit(char character, Unknowns unknowns = Unknowns::Refuse);
 /// The bits of a string.

@@ -17,6 +17,7 @@ struct VhdlSetup {
     std::function<bool(std::string_view name)> keepsName;
     bool keepsComments = false;
     bool keepsAttributes = true;
+    bool keepsDontCares = false;
 };
 
 } // namespace Orn_Hdl::Readers

@@ -565,10 +565,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SR_NN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       S : in std_logic;
       R : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SR_NN;
 
@@ -589,10 +592,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SR_NP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       S : in std_logic;
       R : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SR_NP;
 
@@ -613,10 +619,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SR_PN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       S : in std_logic;
       R : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SR_PN;
 
@@ -637,10 +646,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SR_PP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       S : in std_logic;
       R : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SR_PP;
 
@@ -661,10 +673,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_N;
 
@@ -683,10 +698,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_P;
 
@@ -705,11 +723,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NN;
 
@@ -730,11 +751,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NP;
 
@@ -755,11 +779,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PN;
 
@@ -780,11 +807,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PP;
 
@@ -805,11 +835,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_NN0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_NN0;
 
@@ -830,11 +863,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_NN1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_NN1;
 
@@ -855,11 +891,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_NP0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_NP0;
 
@@ -880,11 +919,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_NP1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_NP1;
 
@@ -905,11 +947,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_PN0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_PN0;
 
@@ -930,11 +975,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_PN1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_PN1;
 
@@ -955,11 +1003,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_PP0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_PP0;
 
@@ -980,11 +1031,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFF_PP1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFF_PP1;
 
@@ -1005,12 +1059,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NN0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NN0N;
 
@@ -1033,12 +1090,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NN0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NN0P;
 
@@ -1061,12 +1121,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NN1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NN1N;
 
@@ -1089,12 +1152,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NN1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NN1P;
 
@@ -1117,12 +1183,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NP0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NP0N;
 
@@ -1145,12 +1214,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NP0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NP0P;
 
@@ -1173,12 +1245,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NP1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NP1N;
 
@@ -1201,12 +1276,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_NP1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_NP1P;
 
@@ -1229,12 +1307,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PN0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PN0N;
 
@@ -1257,12 +1338,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PN0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PN0P;
 
@@ -1285,12 +1369,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PN1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PN1N;
 
@@ -1313,12 +1400,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PN1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PN1P;
 
@@ -1341,12 +1431,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PP0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PP0N;
 
@@ -1369,12 +1462,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PP0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PP0P;
 
@@ -1397,12 +1493,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PP1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PP1N;
 
@@ -1425,12 +1524,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFE_PP1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFE_PP1P;
 
@@ -1453,12 +1555,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFF_NN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFF_NN;
 
@@ -1479,12 +1584,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFF_NP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFF_NP;
 
@@ -1505,12 +1613,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFF_PN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFF_PN;
 
@@ -1531,12 +1642,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFF_PP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFF_PP;
 
@@ -1557,13 +1671,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_NNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_NNN;
 
@@ -1586,13 +1703,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_NNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_NNP;
 
@@ -1615,13 +1735,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_NPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_NPN;
 
@@ -1644,13 +1767,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_NPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_NPP;
 
@@ -1673,13 +1799,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_PNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_PNN;
 
@@ -1702,13 +1831,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_PNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_PNP;
 
@@ -1731,13 +1863,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_PPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_PPN;
 
@@ -1760,13 +1895,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity ALDFFE_PPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       L : in std_logic;
       E : in std_logic;
       AD : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end ALDFFE_PPP;
 
@@ -1789,12 +1927,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_NNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_NNN;
 
@@ -1817,12 +1958,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_NNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_NNP;
 
@@ -1845,12 +1989,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_NPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_NPN;
 
@@ -1873,12 +2020,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_NPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_NPP;
 
@@ -1901,12 +2051,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_PNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_PNN;
 
@@ -1929,12 +2082,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_PNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_PNP;
 
@@ -1957,12 +2113,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_PPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_PPN;
 
@@ -1985,12 +2144,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSR_PPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSR_PPP;
 
@@ -2013,13 +2175,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NNNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NNNN;
 
@@ -2044,13 +2209,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NNNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NNNP;
 
@@ -2075,13 +2243,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NNPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NNPN;
 
@@ -2106,13 +2277,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NNPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NNPP;
 
@@ -2137,13 +2311,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NPNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NPNN;
 
@@ -2168,13 +2345,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NPNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NPNP;
 
@@ -2199,13 +2379,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NPPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NPPN;
 
@@ -2230,13 +2413,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_NPPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_NPPP;
 
@@ -2261,13 +2447,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PNNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PNNN;
 
@@ -2292,13 +2481,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PNNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PNNP;
 
@@ -2323,13 +2515,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PNPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PNPN;
 
@@ -2354,13 +2549,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PNPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PNPP;
 
@@ -2385,13 +2583,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PPNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PPNN;
 
@@ -2416,13 +2617,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PPNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PPNP;
 
@@ -2447,13 +2651,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PPPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PPPN;
 
@@ -2478,13 +2685,16 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DFFSRE_PPPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       S : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DFFSRE_PPPP;
 
@@ -2509,11 +2719,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_NN0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_NN0;
 
@@ -2536,11 +2749,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_NN1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_NN1;
 
@@ -2563,11 +2779,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_NP0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_NP0;
 
@@ -2590,11 +2809,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_NP1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_NP1;
 
@@ -2617,11 +2839,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_PN0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_PN0;
 
@@ -2644,11 +2869,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_PN1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_PN1;
 
@@ -2671,11 +2899,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_PP0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_PP0;
 
@@ -2698,11 +2929,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFF_PP1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFF_PP1;
 
@@ -2725,12 +2959,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NN0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NN0N;
 
@@ -2753,12 +2990,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NN0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NN0P;
 
@@ -2781,12 +3021,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NN1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NN1N;
 
@@ -2809,12 +3052,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NN1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NN1P;
 
@@ -2837,12 +3083,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NP0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NP0N;
 
@@ -2865,12 +3114,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NP0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NP0P;
 
@@ -2893,12 +3145,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NP1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NP1N;
 
@@ -2921,12 +3176,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_NP1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_NP1P;
 
@@ -2949,12 +3207,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PN0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PN0N;
 
@@ -2977,12 +3238,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PN0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PN0P;
 
@@ -3005,12 +3269,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PN1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PN1N;
 
@@ -3033,12 +3300,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PN1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PN1P;
 
@@ -3061,12 +3331,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PP0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PP0N;
 
@@ -3089,12 +3362,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PP0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PP0P;
 
@@ -3117,12 +3393,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PP1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PP1N;
 
@@ -3145,12 +3424,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFE_PP1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFE_PP1P;
 
@@ -3173,12 +3455,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NN0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NN0N;
 
@@ -3203,12 +3488,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NN0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NN0P;
 
@@ -3233,12 +3521,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NN1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NN1N;
 
@@ -3263,12 +3554,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NN1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NN1P;
 
@@ -3293,12 +3587,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NP0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NP0N;
 
@@ -3323,12 +3620,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NP0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NP0P;
 
@@ -3353,12 +3653,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NP1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NP1N;
 
@@ -3383,12 +3686,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_NP1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_NP1P;
 
@@ -3413,12 +3719,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PN0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PN0N;
 
@@ -3443,12 +3752,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PN0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PN0P;
 
@@ -3473,12 +3785,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PN1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PN1N;
 
@@ -3503,12 +3818,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PN1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PN1P;
 
@@ -3533,12 +3851,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PP0N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PP0N;
 
@@ -3563,12 +3884,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PP0P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PP0P;
 
@@ -3593,12 +3917,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PP1N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PP1N;
 
@@ -3623,12 +3950,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity SDFFCE_PP1P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       C : in std_logic;
       R : in std_logic;
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end SDFFCE_PP1P;
 
@@ -3653,10 +3983,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_N is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_N;
 
@@ -3675,10 +4008,13 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_P is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_P;
 
@@ -3697,11 +4033,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_NN0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_NN0;
 
@@ -3722,11 +4061,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_NN1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_NN1;
 
@@ -3747,11 +4089,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_NP0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_NP0;
 
@@ -3772,11 +4117,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_NP1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_NP1;
 
@@ -3797,11 +4145,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_PN0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_PN0;
 
@@ -3822,11 +4173,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_PN1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_PN1;
 
@@ -3847,11 +4201,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_PP0 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_PP0;
 
@@ -3872,11 +4229,14 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCH_PP1 is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCH_PP1;
 
@@ -3897,12 +4257,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_NNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_NNN;
 
@@ -3925,12 +4288,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_NNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_NNP;
 
@@ -3953,12 +4319,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_NPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_NPN;
 
@@ -3981,12 +4350,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_NPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_NPP;
 
@@ -4009,12 +4381,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_PNN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_PNN;
 
@@ -4037,12 +4412,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_PNP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_PNP;
 
@@ -4065,12 +4443,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_PPN is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_PPN;
 
@@ -4093,12 +4474,15 @@ library ieee;
 use ieee.std_logic_1164.all;
 
 entity DLATCHSR_PPP is
+   generic (
+      INIT : string := "U"
+   );
    port (
       E : in std_logic;
       S : in std_logic;
       R : in std_logic;
       D : in std_logic;
-      Q : out std_logic
+      Q : out std_logic := std_logic'value("'" & INIT & "'")
    );
 end DLATCHSR_PPP;
 

@@ -100,6 +100,7 @@ Status FileCheck::Run(std::vector<Reported>& all) {
     const std::string name = GetModelName(file_, options_.model);
     engine_.CreateAndAddModel(name.c_str(), file_.c_str());
     model_ = engine_.GetModel(name.c_str());
+    model_->GetOptions()->dontCares = options_.dontCares;
     model_->GetOptions()->threads = options_.threads;
     checker_ = std::make_unique<Checker>(*model_, targets_);
     const Status status = Replay();

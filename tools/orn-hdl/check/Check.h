@@ -28,6 +28,8 @@ struct CheckOptions {
     bool markdown = false;
     /// Prints one rule in place of a check.
     std::string explain;
+    /// Whether the digit "-" of a constant is a don't care.
+    bool dontCares = false;
     /// How many threads may work together; 0 is what the system gives.
     unsigned threads = 0;
 };

@@ -127,6 +127,7 @@ Status DesignRun::Replay(FileOfDesign& file) {
     file.model->GetOptions()->legal = options_.legal;
     file.model->GetOptions()->escapeNames = options_.names == "escape";
     file.model->GetOptions()->verify = options_.verify;
+    file.model->GetOptions()->dontCares = options_.dontCares;
     file.model->GetOptions()->threads = options_.threads;
     Checking::WriteGate gate(*file.model, file.file.lines, reporter_);
     file.replayed = Tool::Replay(*file.model, file.file, options_.keepGoing, options_.writeRules,

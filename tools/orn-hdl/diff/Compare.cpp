@@ -549,10 +549,11 @@ void Comparison::CompareTies(const SignalRow& a, const SignalRow& b, bool isRena
         for (std::uint32_t i = 0; i < row.count; ++i) {
             const std::uint32_t tie = tieOf(design, row, i);
             isTied = isTied || tie != Graph::Untied;
-            text += tie == Graph::Untied       ? '-'
-                    : tie == Graph::TiedToZero ? '0'
-                    : tie == Graph::TiedToOne  ? '1'
-                                               : '?';
+            text += tie == Graph::Untied           ? '-'
+                    : tie == Graph::TiedToZero     ? '0'
+                    : tie == Graph::TiedToOne      ? '1'
+                    : tie == Graph::TiedToDontCare ? 'x'
+                                                   : '?';
         }
         const std::string own(row.signal->GetConstantValue().GetValue().GetView());
         return !isTied                                               ? std::string("nothing")
@@ -682,7 +683,7 @@ void Comparison::CompareConnections(std::uint32_t rowA, std::uint32_t rowB) {
         for (std::uint32_t i = pin.first; i < pin.first + pin.width; ++i) {
             // Most nets are equal and no constants.
             if (netsA[i] == Open || netsB[i] == Open || matching_.nets[A][netsA[i]] != netsB[i] ||
-                graphs_[A].GetTie(netsA[i]) > Graph::TiedToOne) {
+                graphs_[A].GetTie(netsA[i]) > Graph::TiedToDontCare) {
                 bool isTie = false;
                 if (!AreEqualNets(netsA[i], netsB[i], isTie)) {
                     areEqual = false;

@@ -69,7 +69,7 @@ bool HasEnd(std::string_view name, std::string_view end) {
 bool IsReadConstant(std::string_view base) {
     const std::string_view name = base.substr(0, 7);
     const std::string_view rest = base.substr(name.size());
-    return (name == "const_0" || name == "const_1") &&
+    return (name == "const_0" || name == "const_1" || name == "const_x") &&
            (rest.empty() ||
             (rest.front() == '_' &&
              std::all_of(rest.begin() + 1, rest.end(), [](char c) { return Port::IsDigit(c); })));
@@ -89,12 +89,19 @@ unsigned GetDigit(char c) noexcept {
                                           : 99U;
 }
 
+/// A digit of a constant, and each of its bits.
+constexpr char DontCare = '-';
+
 /// The bits of a literal; empty if a character is no digit of its base.
 std::string ReadDigits(std::string_view digits, unsigned base) {
     const unsigned perDigit = base == 16 ? 4 : base == 8 ? 3 : 1;
     std::string bits;
     for (const char c : digits) {
         const unsigned digit = GetDigit(c);
+        if (c == DontCare) {
+            bits.append(perDigit, c);
+            continue;
+        }
         if (c == '_' && !bits.empty()) {
             continue;
         }
@@ -130,7 +137,9 @@ std::vector<std::uint32_t> GetTies(const Orn_Hdl::BitVectorValue& value, std::si
             bits = Resize(bits, static_cast<std::size_t>(value.GetLength()));
         }
         for (const char bit : Resize(bits, width)) {
-            ties.push_back(bit == '1' ? Graph::TiedToOne : Graph::TiedToZero);
+            ties.push_back(bit == '1'        ? Graph::TiedToOne
+                           : bit == DontCare ? Graph::TiedToDontCare
+                                             : Graph::TiedToZero);
         }
         return ties;
     }
@@ -343,15 +352,15 @@ void Graph::JoinAliases(const Signal& target) {
 
 /// Whether a tied net is no net but the constant itself.
 bool Graph::IsConstantNet(const SignalRow& row, std::uint32_t tie) const {
-    return (row.isGenerated || rules_.mergesNets) && (tie == TiedToZero || tie == TiedToOne);
+    return (row.isGenerated || rules_.mergesNets) && tie >= TiedToZero && tie <= TiedToDontCare;
 }
 
 void Graph::MakeNets() {
-    std::vector<std::uint32_t> ties = {TiedToZero, TiedToOne};
+    std::vector<std::uint32_t> ties = {TiedToZero, TiedToOne, TiedToDontCare};
     std::vector<std::uint32_t> netOfRoot(nets_.size(), None);
     std::vector<std::uint8_t> hasPort(nets_.size(), 0);
-    bitOfNet_ = {None, None};
-    isPort_ = {0, 0};
+    bitOfNet_ = {None, None, None};
+    isPort_ = {0, 0, 0};
     for (const SignalRow& row : signals_) {
         for (std::uint32_t i = 0; row.isPort && i < row.count; ++i) {
             hasPort[FindRoot(row.first + i)] = 1;
@@ -369,7 +378,9 @@ void Graph::MakeNets() {
             }
             if (net == None && (hasPort[root] == 0 || rules_.mergesNets) &&
                 IsConstantNet(row, ties_[root])) {
-                net = ties_[root] == TiedToOne ? OneNet : ZeroNet;
+                net = ties_[root] == TiedToOne    ? OneNet
+                      : ties_[root] == TiedToZero ? ZeroNet
+                                                  : DontCareNet;
             } else if (net == None) {
                 net = static_cast<std::uint32_t>(ties.size());
                 ties.push_back(ties_[root]);

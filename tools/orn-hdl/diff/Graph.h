@@ -62,17 +62,20 @@ struct AliasRow {
 class Graph {
 public:
     /// \{
-    /// The nets of pins that are tied to 0 or 1 without a net that somebody named.
+    /// The nets of pins that are tied to 0, to 1 or to a don't care without a net that somebody
+    /// named.
     static constexpr std::uint32_t ZeroNet = 0;
     static constexpr std::uint32_t OneNet = 1;
-    static constexpr std::uint32_t FirstNet = 2;
+    static constexpr std::uint32_t DontCareNet = 2;
+    static constexpr std::uint32_t FirstNet = 3;
     /// \}
 
     /// \{
-    /// What a net is tied to. Other values stand for what is no 0 and no 1.
+    /// What a net is tied to. Other values stand for what is none of these.
     static constexpr std::uint32_t Untied = 0;
     static constexpr std::uint32_t TiedToZero = 1;
     static constexpr std::uint32_t TiedToOne = 2;
+    static constexpr std::uint32_t TiedToDontCare = 3;
     /// \}
 
     /// \param components notes which pins are wired.

@@ -12,7 +12,7 @@ namespace Tool::Import {
 namespace {
 
 /// Names of the signals that carry constants.
-constexpr std::string_view ConstantNames[] = {"const_0", "const_1"};
+constexpr std::string_view ConstantNames[] = {"const_0", "const_1", "const_x"};
 
 bool OwnsBit(const ModulePort& port, const BitUse& use) noexcept {
     switch (port.direction) {

@@ -57,8 +57,8 @@ public:
     const std::vector<ImportedSignal>& GetSignals() const noexcept { return signals_; }
     /// The owner of a net bit.
     const BitOwner& Get(Bit bit) const { return owners_[bit]; }
-    /// The signal that carries the constant `Zero` or `One` inside compounds; null if none is
-    /// needed.
+    /// The signal that carries the constant `Zero`, `One` or `Unknown` inside compounds; null if
+    /// none is needed.
     const ImportedSignal* GetConstant(Bit bit) const noexcept {
         const std::uint32_t index = constants_[bit - Zero];
         return index == BitOwner::NoSignal ? nullptr : &signals_[index];
@@ -99,7 +99,7 @@ private:
     std::unordered_map<std::string_view, const Net*> portNets_;
     std::vector<Candidate> publicNets_;
     std::vector<Candidate> hiddenNets_;
-    std::uint32_t constants_[2] = {BitOwner::NoSignal, BitOwner::NoSignal};
+    std::uint32_t constants_[3] = {BitOwner::NoSignal, BitOwner::NoSignal, BitOwner::NoSignal};
 };
 
 } // namespace Tool::Import

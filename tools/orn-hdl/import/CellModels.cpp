@@ -133,13 +133,17 @@ Adapter::Adapter(const ImportedComponent& component, const CellModel& model)
 void Adapter::AddGeneric(const ImportedGeneric& generic, const CellModel& model) {
     const std::string_view type = GetVhdlType(generic);
     generics_.push_back(std::string(generic.value.name).append(" : ").append(type));
-    // A text is a name for people alone.
-    if (!model.GetTypeOf(generic.oldName).empty() && type != "string") {
-        const std::string formal(generic.oldName);
-        genericMap_.push_back(formal + " => " +
-                              (type == "integer" ? "work.orn_hdl_cells.bits_of(" : "") +
-                              generic.value.name + (type == "integer" ? ")" : ""));
+    const std::string_view wanted = model.GetTypeOf(generic.oldName);
+    // Any other text is a name for people alone.
+    if (wanted.empty() || (type == "string") != (wanted == "string")) {
+        return;
     }
+    const std::string_view conversion = type == "integer" ? "work.orn_hdl_cells.bits_of(" : "";
+    genericMap_.push_back(std::string(generic.oldName)
+                              .append(" => ")
+                              .append(conversion)
+                              .append(generic.value.name)
+                              .append(conversion.empty() ? "" : ")"));
 }
 
 void Adapter::AddPin(const ImportedPin& pin, const CellModel& model) {
@@ -149,6 +153,11 @@ void Adapter::AddPin(const ImportedPin& pin, const CellModel& model) {
         pin.scalar ? "std_logic"
                    : "std_logic_vector(" + std::to_string(pin.width - 1) + " downto 0)";
     ports_.push_back(pin.baseName + direction + type);
+    // Cells that leave the pin open share a component with cells that have more bits there.
+    const std::string count = std::string(pin.oldName).append("_PINS");
+    if (!model.GetTypeOf(count).empty()) {
+        genericMap_.push_back(count + " => " + std::to_string(pin.width));
+    }
     // No signal stands between the two, so that a clock arrives without a delay.
     portMap_.push_back(std::string(pin.oldName) + (isBitOfBus ? "(0) => " : " => ") + pin.baseName);
 }
@@ -261,6 +270,19 @@ void ModelWriter::WriteOnce(std::string_view key) {
 }
 
 } // namespace
+
+bool HasModelWithFirstValue(std::string_view type) {
+    static const CellModelMap gates = SplitModels(GetGateModels());
+    static const CellModelMap words = SplitModels(GetWordModels());
+    for (const CellModelMap* models : {&gates, &words}) {
+        const auto model = models->find(type);
+        // A memory has a first value for each word, which is a parameter of its own.
+        if (model != models->end() && model->second.GetTypeOf("INIT") == "string") {
+            return true;
+        }
+    }
+    return false;
+}
 
 void WriteCellModels(const std::vector<ImportedNetlist>& netlists, Port::Stream& out,
                      Warnings& warnings) {

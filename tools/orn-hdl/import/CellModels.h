@@ -18,4 +18,7 @@ namespace Tool::Import {
 void WriteCellModels(const std::vector<ImportedNetlist>& netlists, Port::Stream& out,
                      Warnings& warnings);
 
+/// Whether the type is one of registers, whose model has a first value.
+bool HasModelWithFirstValue(std::string_view type);
+
 } // namespace Tool::Import

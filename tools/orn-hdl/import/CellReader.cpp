@@ -1,11 +1,30 @@
 #include "import/CellReader.h"
 
+#include <algorithm>
+#include <iterator>
+
 namespace Tool::Import {
 
 namespace {
 
 /// The type of cells without pins that only record the origin of flattened cells.
 constexpr std::string_view ScopeInfo("$scopeinfo");
+
+/// The type of cells that are state machines, and the parameters that are their tables.
+constexpr std::string_view StateMachine("$fsm");
+constexpr std::string_view Tables[] = {"STATE_TABLE", "TRANS_TABLE"};
+
+/// Makes texts of the tables of a state machine. Most have digits "-", and are texts anyway; in the
+/// others, too, an x says something.
+void KeepTables(Module& module, const Cell& cell) {
+    for (std::uint32_t i = 0; i < cell.parameters.count; ++i) {
+        NamedValue& parameter = module.values[cell.parameters.start + i];
+        if (parameter.value.kind == Value::Bits &&
+            std::find(std::begin(Tables), std::end(Tables), parameter.name) != std::end(Tables)) {
+            parameter.value.kind = Value::Text;
+        }
+    }
+}
 
 } // namespace
 
@@ -21,6 +40,9 @@ void CellReader::Read(Module& module, std::string_view name) {
     }
     if (type_ == ScopeInfo) {
         return;
+    }
+    if (type_ == StateMachine) {
+        KeepTables(module, cell);
     }
     cell.type = GetOrAddType(type_);
     AddPins(module, cell);

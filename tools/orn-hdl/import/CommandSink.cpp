@@ -58,6 +58,10 @@ void CommandSink::SetName(const std::string& name) {
     WriteLine("SET NETLIST NAME", name);
 }
 
+void CommandSink::KeepDontCares() {
+    out_ << DontCareNote;
+}
+
 void CommandSink::SuppressConfiguration() {
     WriteLine("SUPPRESS CONFIGURATION", "TRUE");
 }

@@ -3,7 +3,9 @@
 #include "import/CellReader.h"
 #include "import/JsonWalker.h"
 #include "import/PartReader.h"
+#include "import/Values.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <string_view>
 #include <utility>
@@ -13,7 +15,7 @@ namespace Tool::Import {
 namespace {
 
 /// The attribute of a net with the value that registers have before they are loaded.
-constexpr std::string_view FirstValue("init");
+constexpr std::string_view FirstValueName("init");
 
 class DesignReader {
 public:
@@ -150,10 +152,20 @@ void DesignReader::ReadNet(Module& module, std::string_view name) {
 }
 
 void DesignReader::ReadNetAttributes(Module& module, Net& net) {
-    const auto note = [&net](std::string_view name, const Value& value) {
-        net.hasFirstValue |=
-            name == FirstValue && (value.kind == Value::Integer ||
-                                   value.text.find_first_of("01") != std::string_view::npos);
+    const auto note = [&](std::string_view name, const Value& value) {
+        constexpr std::size_t IntegerWidth = 32;
+        if (name != FirstValueName) {
+            return;
+        }
+        // The net itself is not in its table yet.
+        const auto index = static_cast<std::uint32_t>(module.nets.size());
+        const std::string_view digits =
+            value.kind == Value::Integer
+                ? design_.Keep(MakeIntegerBits(value.integer, IntegerWidth))
+                : value.text;
+        if (digits.find_first_of("01") != std::string_view::npos) {
+            module.firstValues.push_back(FirstValue{index, digits});
+        }
     };
     if (keepAttributes_) {
         net.attributes = parts_.ReadValues(module);
@@ -164,7 +176,7 @@ void DesignReader::ReadNetAttributes(Module& module, Net& net) {
         return;
     }
     walker_.ForEachField([&](std::string_view name) {
-        if (name == FirstValue) {
+        if (name == FirstValueName) {
             note(name, parts_.ReadValue());
         } else {
             walker_.Skip();

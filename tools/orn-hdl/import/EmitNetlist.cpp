@@ -24,7 +24,8 @@ public:
 private:
     void EmitComponents();
     void EmitSignals();
-    void EmitConstantSignal(Bit bit, const char* value);
+    void EmitConstantSignal(Bit bit);
+    bool IsTied(const ModulePort& port, std::uint32_t i) const;
     void EmitPortBits(const ImportedSignal& signal, std::uint32_t index);
     void EmitPortConstant(const ImportedSignal& signal, std::uint32_t& left);
     void EmitAlias(const ImportedSignal& signal, std::uint32_t& left);
@@ -47,6 +48,9 @@ private:
 };
 
 void NetlistEmitter::Emit() {
+    if (netlist_.hasDontCares) {
+        sink_.KeepDontCares();
+    }
     sink_.SetName(netlist_.name);
     if (!netlist_.vhdl.configuration) {
         // The leaf cells need not have configurations.
@@ -102,24 +106,31 @@ void NetlistEmitter::EmitSignals() {
         }
         isScalar_[i] = signals[i].IsScalar();
     }
-    EmitConstantSignal(Zero, "0");
-    EmitConstantSignal(One, "1");
+    for (const Bit bit : {Zero, One, Unknown}) {
+        EmitConstantSignal(bit);
+    }
     for (std::uint32_t index = 0; index < top_.ports.size(); ++index) {
         EmitPortBits(owners_.GetSignals()[index], index);
     }
 }
 
-void NetlistEmitter::EmitConstantSignal(Bit bit, const char* value) {
+void NetlistEmitter::EmitConstantSignal(Bit bit) {
     if (const ImportedSignal* signal = owners_.GetConstant(bit)) {
-        sink_.AssignSignal(signal->name, value);
+        sink_.AssignSignal(signal->name, std::string(1, GetDigit(bit)));
     }
+}
+
+/// Whether a bit of a port is a constant. A bit of an inout port that is z stays open.
+bool NetlistEmitter::IsTied(const ModulePort& port, std::uint32_t i) const {
+    const Bit bit = top_.GetBit(port.bits, i);
+    return !IsNet(bit) && (bit != HighImpedance || port.direction != Direction::InOut);
 }
 
 /// Connects the bits of a port that the port does not own.
 void NetlistEmitter::EmitPortBits(const ImportedSignal& signal, std::uint32_t index) {
     for (std::uint32_t left = signal.width; left-- > 0;) {
         const Bit bit = references_.GetBit(signal.port->bits, left);
-        if (bit == Zero || bit == One) {
+        if (IsTied(*signal.port, left)) {
             EmitPortConstant(signal, left);
         } else if (IsNet(bit) && owners_.Get(bit).signal != BitOwner::NoSignal &&
                    (owners_.Get(bit).signal != index || owners_.Get(bit).position != left)) {
@@ -131,12 +142,8 @@ void NetlistEmitter::EmitPortBits(const ImportedSignal& signal, std::uint32_t in
 /// \param left the leftmost bit of a run of constants; becomes the rightmost one.
 void NetlistEmitter::EmitPortConstant(const ImportedSignal& signal, std::uint32_t& left) {
     const Span& bits = signal.port->bits;
-    const auto isConstant = [&](std::uint32_t i) {
-        const Bit bit = references_.GetBit(bits, i);
-        return bit == Zero || bit == One;
-    };
     const std::uint32_t start = left;
-    while (left > 0 && isConstant(left - 1)) {
+    while (left > 0 && IsTied(*signal.port, left - 1)) {
         --left;
     }
     const Span run{bits.start + left, start - left + 1};

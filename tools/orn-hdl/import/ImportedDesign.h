@@ -23,6 +23,11 @@ constexpr bool IsNet(Bit bit) noexcept {
     return bit < Zero;
 }
 
+/// The digit of a constant bit: x and z are don't cares.
+constexpr char GetDigit(Bit bit) noexcept {
+    return bit == Zero ? '0' : bit == One ? '1' : '-';
+}
+
 /// A run of consecutive entries in one of a module's tables.
 struct Span {
     std::uint32_t start = 0;
@@ -77,8 +82,14 @@ struct Net {
     BitRange range;
     Span bits;
     Span attributes;
-    /// Whether registers that drive the net start with a known value, by its attribute "init".
-    bool hasFirstValue = false;
+};
+
+/// The digits with which registers that drive a net start, the leftmost first; at least one is 0
+/// or 1. The net says so by its attribute "init".
+struct FirstValue {
+    /// Index into the nets of the module.
+    std::uint32_t net = 0;
+    std::string_view digits;
 };
 
 struct Connection {
@@ -110,6 +121,7 @@ struct Module {
     /// The default values of parameters.
     std::vector<NamedValue> defaults;
     std::vector<Net> nets;
+    std::vector<FirstValue> firstValues;
     std::vector<Cell> cells;
 
     std::vector<Bit> bits;

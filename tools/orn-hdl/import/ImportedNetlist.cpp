@@ -56,12 +56,11 @@ void WarnOfModule(const Module& top, Warnings& warnings) {
         warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("memories"),
                      "memories are not imported; map them to cells first");
     }
-    for (const Net& net : top.nets) {
-        if (net.hasFirstValue) {
-            warnings.Add(top.GetPath("netnames", net.name).AddKey("attributes").AddKey("init"),
-                         "the first values of registers are not imported: a register is unknown "
-                         "until it is reset or loaded");
-        }
+    for (const FirstValue& value : top.firstValues) {
+        const std::string_view net = top.nets[value.net].name;
+        warnings.Add(top.GetPath("netnames", net).AddKey("attributes").AddKey("init"),
+                     "the first values of registers are not imported: a register is unknown until "
+                     "it is reset or loaded");
     }
     if (top.ports.empty()) {
         warnings.Add(JsonPath("modules").AddKey(top.name).AddKey("ports"),
@@ -104,12 +103,13 @@ ImportedNetlist MakeNetlist(ImportedDesign& design, Module& top, const ImportRul
     const std::vector<std::string> portNames = ClaimPortNames(top, names);
     ImportedComponents components = FindComponents(design, top, rules, names, warnings);
     OpenConstantOutputs(top, components, warnings);
-    TellReplacedValues(top, components, unknown, warnings);
+    const bool hasReplaced = TellReplacedValues(top, components, unknown, warnings);
     const BitUses uses = BitUses::Count(top, components, unknown, portNames);
     BitOwners owners = BitOwners::Choose(top, uses, portNames, rules.names, warnings);
     WarnOfModule(top, warnings);
     CheckParameters(top, unknown, warnings);
     ImportedNetlist netlist{top, unknown, std::move(components), std::move(owners), {}, {}, {}, {}};
+    netlist.hasDontCares = hasReplaced && unknown.AreDontCares();
     netlist.hasVhdl = rules.names.HasVhdl();
     netlist.vhdl = rules.vhdl;
     CheckConfiguration(netlist);

@@ -34,6 +34,8 @@ struct ImportedNetlist {
     std::vector<ConnectionKind> connections;
     /// Whether an input pin of some cell is open.
     bool hasOpenInputs = false;
+    /// Whether a constant of a port or pin has a don't care.
+    bool hasDontCares = false;
     /// Whether the netlist may be written in VHDL.
     bool hasVhdl = true;
     VhdlClauses vhdl = {};

@@ -17,6 +17,10 @@ void ModelSink::SetName(const std::string& name) {
     model_.SetName(name.c_str());
 }
 
+void ModelSink::KeepDontCares() {
+    model_.GetOptions()->dontCares = true;
+}
+
 void ModelSink::SuppressConfiguration() {
     model_.GetOptions()->vhdl.suppressConfiguration = true;
 }

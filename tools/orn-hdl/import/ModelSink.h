@@ -23,6 +23,7 @@ public:
 
     void BeginGroup() override {}
     void SetName(const std::string& name) override;
+    void KeepDontCares() override;
     void SuppressConfiguration() override;
     void NameIeeeAlone() override;
     void WireOpenPins() override;

@@ -11,15 +11,16 @@ namespace {
 class ReplacedValues {
 public:
     ReplacedValues(const Module& top, const UnknownValues& unknown, Warnings& warnings)
-        : top_(top), replacement_(unknown.Replace(Unknown) == One ? '1' : '0'),
-          warnings_(warnings) {}
+        : top_(top), replacement_(GetDigit(unknown.Replace(Unknown))), warnings_(warnings) {}
 
     void CountPort(const ModulePort& port);
     void CountConnection(const Cell& cell, const Span& bits, const ImportedPin& pin);
     void CountParameters(const Cell& cell);
+    bool HasBits() const noexcept { return hasBits_; }
 
 private:
     void Add(const JsonPath& path, Bit bit) {
+        hasBits_ = true;
         warnings_.Add(path, std::string("the value ") + (bit == Unknown ? "x" : "z") + " becomes " +
                                 replacement_);
     }
@@ -27,6 +28,8 @@ private:
     const Module& top_;
     const char replacement_;
     Warnings& warnings_;
+    /// Whether a bit was replaced.
+    bool hasBits_ = false;
 };
 
 /// An inout port that is z stays open.
@@ -61,10 +64,10 @@ void ReplacedValues::CountParameters(const Cell& cell) {
 
 } // namespace
 
-void TellReplacedValues(const Module& top, const ImportedComponents& components,
+bool TellReplacedValues(const Module& top, const ImportedComponents& components,
                         const UnknownValues& unknown, Warnings& warnings) {
     if (!unknown.HasReplacement()) {
-        return;
+        return false;
     }
     ReplacedValues values(top, unknown, warnings);
     for (const ModulePort& port : top.ports) {
@@ -77,8 +80,11 @@ void TellReplacedValues(const Module& top, const ImportedComponents& components,
             values.CountConnection(cell, connection.bits,
                                    components.GetOf(c).GetPin(connection.pin));
         }
-        values.CountParameters(cell);
+        if (unknown.HasDigit()) {
+            values.CountParameters(cell);
+        }
     }
+    return values.HasBits();
 }
 
 } // namespace Tool::Import

@@ -27,7 +27,7 @@ bool SignalReferences::IsConstant(const Span& bits) const {
 std::string SignalReferences::GetDigits(const Span& bits) const {
     std::string digits;
     for (std::uint32_t i = bits.count; i-- > 0;) {
-        digits += GetBit(bits, i) == One ? '1' : '0';
+        digits += GetDigit(GetBit(bits, i));
     }
     return digits;
 }
@@ -37,9 +37,9 @@ std::string SignalReferences::GetReference(const Span& bits) const {
     for (std::uint32_t i = bits.count; i-- > 0;) {
         text.append(text.empty() ? "" : ",");
         const Bit bit = GetBit(bits, i);
-        if (bit == Zero || bit == One) {
+        if (!IsNet(bit) && bit != HighImpedance) {
             const ImportedSignal* constant = owners_.GetConstant(bit);
-            text += constant == nullptr ? std::string(bit == One ? "1" : "0") : constant->name;
+            text += constant == nullptr ? std::string(1, GetDigit(bit)) : constant->name;
             continue;
         }
         if (!IsNet(bit) || owners_.Get(bit).signal == BitOwner::NoSignal) {

@@ -17,6 +17,9 @@ struct TypedValue {
 /// The library and use clauses for IEEE alone.
 inline constexpr const char* IeeeLibrary = "ieee";
 inline constexpr const char* IeeePackage = "ieee.std_logic_1164.ALL";
+/// The line of a command file whose netlists need an option.
+inline constexpr const char* DontCareNote =
+    "NOOP Write netlists with --dont-cares: the digit - of constants says so.\n";
 /// The attribute of a component without a configuration.
 inline constexpr const char* LevelName = "LEVEL";
 inline constexpr const char* LevelValue = "HALVEX";
@@ -31,6 +34,8 @@ public:
     /// Begins a new group of operations.
     virtual void BeginGroup() = 0;
     virtual void SetName(const std::string& name) = 0;
+    /// The digit "-" of constants is a don't care.
+    virtual void KeepDontCares() = 0;
     virtual void SuppressConfiguration() = 0;
     /// VHDL names the library IEEE alone.
     virtual void NameIeeeAlone() = 0;

@@ -1,4 +1,4 @@
-// The values x and z, which a netlist cannot contain.
+// The values x and z, which a netlist contains as don't cares alone.
 #pragma once
 
 #include "import/ImportedDesign.h"
@@ -10,10 +10,14 @@ namespace Tool::Import {
 /// The user's choice for x and z.
 class UnknownValues {
 public:
-    /// \param replacement `Zero` or `One`; without one, x and z are rejected.
+    /// \param replacement `Zero`, `One`, or `Unknown` for don't cares; without one, x and z are
+    ///        rejected.
     explicit UnknownValues(std::optional<Bit> replacement) noexcept : replacement_(replacement) {}
 
     bool HasReplacement() const noexcept { return replacement_.has_value(); }
+    bool AreDontCares() const noexcept { return replacement_ == Unknown; }
+    /// Whether 0 or 1 was chosen, which parameters can have too.
+    bool HasDigit() const noexcept { return HasReplacement() && !AreDontCares(); }
     /// The bit itself, or the replacement of x or z.
     Bit Replace(Bit bit) const noexcept {
         return bit >= Unknown && replacement_ ? *replacement_ : bit;

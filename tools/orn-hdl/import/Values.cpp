@@ -41,8 +41,8 @@ std::int32_t ToInteger(std::string_view digits) noexcept {
 } // namespace
 
 bool MeansAny(const Value& value, const UnknownValues& unknown) noexcept {
-    return value.kind == Value::Bits && !unknown.HasReplacement() &&
-           value.text.find('x') != std::string_view::npos;
+    return value.kind == Value::Bits && !unknown.HasDigit() &&
+           value.text.find_first_of(unknown.AreDontCares() ? "xz" : "x") != std::string_view::npos;
 }
 
 void CheckParameter(const Value& value, const Place& place, const UnknownValues& unknown,

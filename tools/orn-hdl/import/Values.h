@@ -12,7 +12,8 @@
 
 namespace Tool::Import {
 
-/// Whether a parameter's value contains an x without a replacement: any value will do there.
+/// Whether a parameter's value contains an x, or z where this is a don't care, that is not replaced
+/// by 0 or 1: any value will do there.
 bool MeansAny(const Value& value, const UnknownValues& unknown) noexcept;
 /// Rejects a parameter's value that contains a z without a replacement, and warns about a text that
 /// cannot be written as a text.
@@ -20,7 +21,7 @@ void CheckParameter(const Value& value, const Place& place, const UnknownValues&
                     Warnings& warnings);
 /// Warns about a parameter for which `MeansAny` is true.
 void WarnOfAny(const Place& place, Warnings& warnings);
-/// A parameter's value as a generic. An x without a replacement becomes 0.
+/// A parameter's value as a generic. An x that is not replaced by 1 becomes 0.
 TypedValue MakeGeneric(const std::string& name, const Value& value, const UnknownValues& unknown);
 /// The bits of an integer, the leftmost first.
 std::string MakeIntegerBits(std::int32_t integer, std::size_t width);

@@ -189,6 +189,7 @@ Status LoadedDesign::ReadNetlist(const Libraries& libraries, Reporter& reporter)
             reader.AddLibrary(*libraries.components);
         }
         reader.KeepComments(true);
+        reader.KeepDontCares(true);
         reader.SetNames(Orn_Hdl::ReaderNames::Literal);
         if constexpr (std::is_same_v<Reader, Orn_Hdl::VerilogReader>) {
             reader.SetUndeclared(Orn_Hdl::ReaderUndeclared::Infer);
@@ -223,7 +224,8 @@ Status LoadedDesign::ReadJson(const Libraries& libraries, Reporter& reporter) {
         Import::Module& top = Import::FindTop(*design, "");
         Import::Warnings warnings;
         const Import::NameRules names(Import::NameLanguages::Verilog, false);
-        const Import::ImportRules rules{Import::UnknownValues(std::nullopt), names, false, library};
+        const Import::ImportRules rules{Import::UnknownValues(Import::Unknown), names, false,
+                                        library};
         const Import::ImportedNetlist netlist = Import::MakeNetlist(*design, top, rules, warnings);
         Import::ModelSink sink(*model_);
         Import::EmitNetlist(netlist, sink);

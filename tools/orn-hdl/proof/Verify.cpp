@@ -79,6 +79,7 @@ Status Verify(const VerifyOptions& options) {
     DropWrites(*model.GetCommandFactory());
     model.GetOptions()->legal = options.legal;
     model.GetOptions()->escapeNames = options.names == "escape";
+    model.GetOptions()->dontCares = options.dontCares;
     model.GetOptions()->threads = options.threads;
     model.GetOptions()->verify = true;
 

@@ -25,6 +25,8 @@ struct VerifyOptions {
     std::string certificate;
     bool quiet = false;
     ReportOptions report;
+    /// Whether the digit "-" of a constant is a don't care.
+    bool dontCares = false;
     /// How many threads may work together; 0 is what the system gives.
     unsigned threads = 0;
 };

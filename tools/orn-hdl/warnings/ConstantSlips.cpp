@@ -85,7 +85,7 @@ bool IsVerilogNumber(string_view digits) {
 
 } // namespace
 
-std::optional<WrongDigit> FindWrongDigit(string_view value) {
+std::optional<WrongDigit> FindWrongDigit(string_view value, bool dontCares) {
     const Parts parts(value);
     const Base* base = &Decimal;
     if (parts.hasBase) {
@@ -98,8 +98,10 @@ std::optional<WrongDigit> FindWrongDigit(string_view value) {
     } else if (IsVerilogNumber(parts.digits)) {
         return std::nullopt;
     }
-    const auto wrong = std::find_if(parts.digits.begin(), parts.digits.end(),
-                                    [base](char c) { return !IsDigitOf(*base, c); });
+    const auto wrong =
+        std::find_if(parts.digits.begin(), parts.digits.end(), [base, dontCares](char c) {
+            return !IsDigitOf(*base, c) && !(dontCares && c == '-');
+        });
     if (wrong == parts.digits.end()) {
         return std::nullopt;
     }

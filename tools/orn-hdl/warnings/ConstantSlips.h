@@ -18,7 +18,8 @@ struct WrongDigit {
 
 /// The first digit that the base of a constant does not have, or a base that is unknown. Digits
 /// that one of the languages knows besides, such as x, z and -, are none.
-std::optional<WrongDigit> FindWrongDigit(std::string_view value);
+/// \param dontCares whether "-" is a digit of every base.
+std::optional<WrongDigit> FindWrongDigit(std::string_view value, bool dontCares);
 
 /// Whether the digits of a constant need more than one bit.
 bool NeedsSeveralBits(std::string_view value);

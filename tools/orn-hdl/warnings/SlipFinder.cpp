@@ -96,9 +96,12 @@ void SlipFinder::ReadConstant(const StringArray& words) {
     if (value == "0" || value == "1") {
         return;
     }
-    if (const std::optional<WrongDigit> wrong = FindWrongDigit(value)) {
+    const bool dontCares = model_.GetOptions()->dontCares;
+    if (const std::optional<WrongDigit> wrong = FindWrongDigit(value, dontCares)) {
         if (options_.Has(Slip::ConstantDigit)) {
-            report_({Slip::ConstantDigit, wrong->message, "",
+            const bool isDash = value.substr(wrong->offset, wrong->length) == "-";
+            report_({Slip::ConstantDigit, wrong->message,
+                     isDash ? "what helps: --dont-cares, if a digit - is a don't care" : "",
                      Mark::Part(Value, wrong->offset, wrong->length)});
         }
         return;
