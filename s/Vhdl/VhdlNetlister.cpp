@@ -4,6 +4,7 @@
 #include "HdlModel/Netlist/Primitives.h"
 #include "HdlModel/Signals/SignalBits.h"
 #include "Orn_Hdl/LegalNetlist.h"
+#include "Port/Prefetch.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/DontCares.h"
@@ -208,12 +209,13 @@ void VhdlNetlister::Writer::Write() {
 }
 
 void VhdlNetlister::Writer::Prepare() {
-    NetlistPass::Prepare();
     netlist_.SetBoxTypeAttribute();
+    // Before the netlist is sorted, its objects follow one another in memory.
+    attrWidth_ = Netlist::GetLongestAttrName(&netlist_);
+    NetlistPass::Prepare();
     if (!options_.vhdl.openPin) {
         netlist_.ConnectOpenPinToDummy();
     }
-    attrWidth_ = Netlist::GetLongestAttrName(&netlist_);
 }
 
 void VhdlNetlister::Writer::WriteHead() {
@@ -551,10 +553,10 @@ void VhdlNetlister::Writer::WriteConfiguration(const InstanceLists& instances) {
 void VhdlNetlister::Writer::WriteConfigurationItem(const Component& component,
                                                    const std::vector<const Instance*>& instances) {
     Put(out_, "for", " ");
-    bool isFirst = true;
-    for (const Instance* instance : instances) {
-        Put(out_, (isFirst ? "" : ", "), instance->GetNameView());
-        isFirst = false;
+    constexpr std::size_t Lead = 8;
+    for (std::size_t i = 0; i < instances.size(); ++i) {
+        Port::Prefetch(instances[std::min(i + Lead, instances.size() - 1)]);
+        Put(out_, (i == 0 ? "" : ", "), instances[i]->GetNameView());
     }
     PutLine(out_, " : ", component.GetNameView());
     out_.Indent();
