@@ -29,6 +29,7 @@ namespace Port {
 /// The owner uses it from one thread. While it waits for a result, it runs jobs itself.
 class ORN_HDL_API OrderedWork {
 public:
+    /// How the work is shared out.
     struct Settings {
         /// How many threads run jobs besides the owner. 0 creates no thread: `Next` runs each job.
         unsigned workers = 0;
