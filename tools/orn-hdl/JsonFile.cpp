@@ -4,6 +4,8 @@
 
 #include <algorithm>
 #include <array>
+#include <filesystem>
+#include <system_error>
 
 namespace Tool {
 
@@ -25,6 +27,13 @@ std::size_t JsonFile::Read(char* to, std::size_t count) {
     bytes_ += read;
     progress_.Reading(bytes_, compressed_.has_value());
     return read;
+}
+
+bool JsonFile::IsLarge() const noexcept {
+    constexpr std::uintmax_t LeastSize = std::uintmax_t(1) << 18;
+    std::error_code error;
+    const std::uintmax_t size = std::filesystem::file_size(name_, error);
+    return !error && size >= LeastSize;
 }
 
 void JsonFile::CheckRest() {

@@ -25,6 +25,9 @@ public:
     /// \throws GzipError if a compressed file cannot be read.
     std::size_t Read(char* to, std::size_t count) override;
 
+    /// Whether reading ahead is worth a thread: the file is regular, so that nobody waits for more
+    /// of it, and not small.
+    bool IsLarge() const noexcept;
     /// Reads what is left of a compressed file, to see whether it is damaged.
     /// \throws GzipError if it is.
     void CheckRest();

@@ -22,6 +22,7 @@
 #include "Orn_Hdl/Model.h"
 #include "Port/File.h"
 #include "Port/NameScope.h"
+#include "Port/OrderedWork.h"
 
 #include <algorithm>
 #include <cstddef>
@@ -210,7 +211,9 @@ Diagnostic MakeError(const ImportOptions& options, const Import::Error& error,
 std::unique_ptr<ImportedDesign> ReadFile(JsonFile& file, const ImportOptions& options) {
     std::unique_ptr<ImportedDesign> design;
     try {
-        design = ReadDesign(file, options.attributes);
+        design = file.IsLarge() && Port::OrderedWork::GetWorkersFor(options.threads) > 0
+                     ? ReadDesign(file, options.attributes, TokenBatches::Settings())
+                     : ReadDesign(file, options.attributes);
     } catch (const Import::Error&) {
         // A file that cannot be read to its end seems to end too early, and a damaged one is no
         // JSON.

@@ -19,8 +19,10 @@ constexpr std::string_view FirstValueName("init");
 
 class DesignReader {
 public:
-    DesignReader(TextSource& source, ImportedDesign& design, bool keepAttributes)
-        : design_(design), keepAttributes_(keepAttributes), walker_(source),
+    /// \param walk the arguments of the walker.
+    template <class... Walk>
+    DesignReader(ImportedDesign& design, bool keepAttributes, Walk&... walk)
+        : design_(design), keepAttributes_(keepAttributes), walker_(walk...),
           parts_(design, walker_), cells_(design, walker_, parts_, keepAttributes) {}
 
     void Read();
@@ -188,7 +190,14 @@ void DesignReader::ReadNetAttributes(Module& module, Net& net) {
 
 std::unique_ptr<ImportedDesign> ReadDesign(TextSource& source, bool keepAttributes) {
     auto design = std::make_unique<ImportedDesign>();
-    DesignReader(source, *design, keepAttributes).Read();
+    DesignReader(*design, keepAttributes, source).Read();
+    return design;
+}
+
+std::unique_ptr<ImportedDesign> ReadDesign(TextSource& source, bool keepAttributes,
+                                           const TokenBatches::Settings& settings) {
+    auto design = std::make_unique<ImportedDesign>();
+    DesignReader(*design, keepAttributes, source, settings).Read();
     return design;
 }
 

@@ -4,9 +4,12 @@
 
 namespace Tool::Import {
 
-using Kind = JsonScanner::Kind;
+using Kind = JsonTokens::Kind;
 
-JsonWalker::JsonWalker(TextSource& source) : scanner_(source), keys_(DeepestNesting + 1) {}
+JsonWalker::JsonWalker(TextSource& source) : tokens_(source), keys_(DeepestNesting + 1) {}
+
+JsonWalker::JsonWalker(TextSource& source, const TokenBatches::Settings& settings)
+    : tokens_(source, settings), keys_(DeepestNesting + 1) {}
 
 std::string JsonWalker::GetMessage(const std::string& text) const {
     JsonPath path;
@@ -23,7 +26,7 @@ void JsonWalker::Fail(const std::string& text) const {
 void JsonWalker::FailToScan(const JsonSyntaxError& error) {
     const std::string text = std::string("invalid JSON: ") + error.reason;
     const std::string message = error.hasPath ? GetMessage(text) : text;
-    throw error.hasPlace ? Error(message, scanner_.FindPlace()) : Error(message);
+    throw error.hasPlace ? Error(message, tokens_.FindPlace()) : Error(message);
 }
 
 void JsonWalker::FailAt(std::string_view field, std::string_view member, const std::string& text) {
@@ -47,7 +50,7 @@ void JsonWalker::Enter(std::size_t index) {
 }
 
 void JsonWalker::Skip() {
-    switch (scanner_.GetKind()) {
+    switch (tokens_.GetKind()) {
     case Kind::Object:
         ForEachField([this](std::string_view) { Skip(); });
         break;
@@ -55,25 +58,25 @@ void JsonWalker::Skip() {
         ForEachElement([this] { Skip(); });
         break;
     case Kind::Text:
-        scanner_.TakeText();
+        tokens_.TakeText();
         break;
     case Kind::Number:
-        scanner_.TakeNumber();
+        tokens_.TakeNumber();
         break;
     case Kind::Word:
-        scanner_.TakeWord();
+        tokens_.TakeWord();
         break;
     }
 }
 
 std::string_view JsonWalker::ReadText() {
     Expect(Kind::Text, "a text is expected");
-    return scanner_.TakeText();
+    return tokens_.TakeText();
 }
 
 std::int64_t JsonWalker::ReadInteger() {
     Expect(Kind::Number, "an integer is expected");
-    const JsonScanner::Number number = scanner_.TakeNumber();
+    const JsonTokens::Number number = tokens_.TakeNumber();
     if (!number.isInteger) {
         Fail("an integer is expected");
     }

@@ -1,5 +1,8 @@
-// Work for several threads whose results are needed in order.
+/// \file
+/// Work for several threads whose results are needed in order.
 #pragma once
+
+#include "Port/Export.h"
 
 #include <condition_variable>
 #include <cstddef>
@@ -17,15 +20,16 @@ namespace Port {
 /// with it.
 ///
 /// \code
-/// OrderedWork work({.workers = 1, .ahead = 4}, [&](std::size_t n) { return Make(n, results[n %
-/// 4]); }); while (work.Next()) {
+/// OrderedWork work({1, 4}, [&](std::size_t n) { return Make(n, results[n % 4]); });
+/// while (work.Next()) {
 ///     Use(results[work.GetPlace()]);
 /// }
 /// \endcode
 ///
 /// The owner uses it from one thread. While it waits for a result, it runs jobs itself.
-class OrderedWork {
+class ORN_HDL_API OrderedWork {
 public:
+    /// How the work is shared out.
     struct Settings {
         /// How many threads run jobs besides the owner. 0 creates no thread: `Next` runs each job.
         unsigned workers = 0;
