@@ -430,6 +430,16 @@ TEST_F(Widening, MovesPortPolarityAttributesAndComment) {
     EXPECT_EQ(Signals(), (Names{"X", "Y", "A", "A,q(7:0)", "Z", "q(15:0)", "q(7:0)", "W"}));
 }
 
+TEST_F(Widening, MakesTheOldBusTheSliceAlsoWhereABusOrACompoundHasItAsAlias) {
+    model_.ConnectSignals("b(7:0)", "q(7:0)");
+    model_.ConnectSignals("c(6:0),d", "q(7:0)");
+    model_.ConnectSignals("q(15:0)", "X");
+    for (const char* name : {"b(7:0)", "c(6:0),d"}) {
+        EXPECT_EQ(NamesOf(Get(name)->GetSignalIterator()), Names{"q(7:0)"}) << name;
+        EXPECT_EQ(Get(name)->GetSignalIterator().GetCurrent(), &GetSlice("q(7:0)")) << name;
+    }
+}
+
 TEST_F(Widening, MovesSlicesAndBits) {
     model_.AddSignal("Q(7:0)");
     model_.ConnectSignals("Q(3:0)", "X");
