@@ -72,6 +72,9 @@ TEST(Model, StartsEmptyAndUnmodified) {
     EXPECT_EQ(model.GetCommandFactory(), &factory);
     EXPECT_TRUE(model.GetNetlist()->GetSignalIterator().IsAtEnd());
     EXPECT_TRUE(model.GetOptions()->writeHeader);
+    EXPECT_EQ(model.GetWrittenFileName(), "");
+    EXPECT_EQ(model.GetWriteError(), 0);
+    EXPECT_EQ(model.GetWriteLeftover(), 0U);
     model.SetModifiedFlag(true);
     EXPECT_TRUE(model.IsModified());
 }
