@@ -6,6 +6,7 @@
     scripts/mutate.py --file s/Port/File.cpp --count 20
     scripts/mutate.py --sources --count 300       # none in headers, of which each rebuilds much
     scripts/mutate.py --settle                    # the other test programs, for what is still open
+    scripts/mutate.py --settle --again            # what survived too, when tests have been added
     scripts/mutate.py --settle --sanitize         # all programs with sanitizers, for what is not found
     scripts/mutate.py --list --count 20           # only shows them
     scripts/mutate.py --report                    # what the results say, with every survivor
@@ -18,7 +19,8 @@ when it does not compile. The same seed gives the same mistakes in the same orde
 turn, and one that has a result is not tried again.
 
 A mistake that changes nothing that anybody can see is no gap in the tests. scripts/mutants.txt lists those
-that were looked at, each with the reason, and the report counts them apart.
+that were looked at, each with the reason, and the report counts them apart. One whose line has changed since
+it was tried is "gone", whatever became of it, and counts for nothing.
 """
 
 from __future__ import annotations
@@ -28,11 +30,13 @@ import dataclasses
 import functools
 import hashlib
 import json
+import math
 import os
 import random
 import re
 import resource
 import shutil
+import signal
 import subprocess
 import sys
 import tempfile
@@ -59,6 +63,8 @@ FEW_CASES = SEED + " max_success=25"
 JOBS = 1
 MOST_MEMORY = 8 << 30
 MOST_WRITTEN = 4 << 30
+# How much longer than its time on the processor a program may take in all.
+WAITING = 6
 
 
 @dataclasses.dataclass(frozen=True)
@@ -252,14 +258,19 @@ def usual_time(program: str) -> float:
     return time.monotonic() - start
 
 
-def limit() -> None:
+def limit(seconds: int) -> None:
     """What a program gone wild may take."""
     resource.setrlimit(resource.RLIMIT_AS, (in_use.most_memory, in_use.most_memory))
     resource.setrlimit(resource.RLIMIT_FSIZE, (MOST_WRITTEN, MOST_WRITTEN))
+    resource.setrlimit(resource.RLIMIT_CPU, (seconds, seconds + 5))
 
 
 def run(program: str, seconds: float, cases: str = SEED) -> str:
-    """Why a test program fails; empty when it passes."""
+    """Why a test program fails; empty when it passes.
+
+    The seconds are time on the processor, as the machine may have other work to do. A program that
+    only waits is ended after WAITING times as long.
+    """
     with tempfile.TemporaryDirectory(dir=WORK / "tmp") as folder:
         # Some tests become a user who is not root, and make folders of their own.
         os.chmod(folder, 0o777)
@@ -267,13 +278,15 @@ def run(program: str, seconds: float, cases: str = SEED) -> str:
                    f"--gtest_filter={FILTER}"]
         try:
             ended = subprocess.run(command, env=environment() | {"TMPDIR": folder, "RC_PARAMS": cases}, cwd=folder,
-                                   preexec_fn=limit, timeout=seconds, check=False, text=True,
-                                   errors="replace", stdin=subprocess.DEVNULL, stdout=subprocess.PIPE,
-                                   stderr=subprocess.DEVNULL)
+                                   preexec_fn=lambda: limit(math.ceil(seconds)), timeout=WAITING * seconds,
+                                   check=False, text=True, errors="replace", stdin=subprocess.DEVNULL,
+                                   stdout=subprocess.PIPE, stderr=subprocess.DEVNULL)
         except subprocess.TimeoutExpired:
             return "time"
     if ended.returncode == 0:
         return ""
+    if ended.returncode == -signal.SIGXCPU:
+        return "time"
     failed = re.search(r"^\[  FAILED  \] ([\w./]+)", ended.stdout, re.M)
     return failed[1] if failed else f"status {ended.returncode}"
 
@@ -330,9 +343,21 @@ def reasons() -> dict[str, str]:
     return dict(line.split(maxsplit=1) for line in lines if line and not line.startswith("#"))
 
 
+def is_unsettled(result: dict, sanitized: bool, again: bool) -> bool:
+    """Whether all programs are to run on a mistake that has that result."""
+    unsettled = ["open", "survived"] if sanitized or again else ["open"]
+    return result.get("status") in unsettled or (again and result.get("test") == "time")
+
+
 def show(result: dict) -> None:
     print(f"\n{result['name']} {result['file']}:{result['line']} ({result['operator']})\n"
           f"- {result['before'].strip()}\n+ {result['after'].strip()}")
+
+
+def is_there(result: dict) -> bool:
+    """Whether the file still has the line that was changed."""
+    path = PROJECT / result["file"]
+    return path.exists() and result["before"] in path.read_text().split("\n")
 
 
 def report(path: Path) -> None:
@@ -340,12 +365,14 @@ def report(path: Path) -> None:
     known = reasons()
     found = latest(path)
     for name, result in found.items():
-        if result["status"] in ("open", "survived") and name in known:
+        if not is_there(result):
+            result["status"] = "gone"
+        elif result["status"] in ("open", "survived") and name in known:
             result["status"] = "equivalent"
     counts = Counter(result["status"] for result in found.values())
     print(f"{len(found)} mistakes: " + ", ".join(
         f"{counts[status]} {status}"
-        for status in ("killed", "survived", "open", "equivalent", "invalid")))
+        for status in ("killed", "survived", "open", "equivalent", "invalid", "gone")))
     if tried := counts["killed"] + counts["survived"] + counts["open"]:
         print(f"{100 * counts['killed'] / tried:.1f} % of those that change something are found")
     for status in ("survived", "open", "equivalent"):
@@ -366,6 +393,8 @@ def main() -> None:
     parser.add_argument("--sources", action="store_true", help="none in headers")
     parser.add_argument("--settle", action="store_true",
                         help="run all programs on those that are still open")
+    parser.add_argument("--again", action="store_true",
+                        help="with --settle: try what survived, and what only took too long, once more")
     parser.add_argument("--sanitize", action="store_true",
                         help="with --settle: use AddressSanitizer and UndefinedBehaviorSanitizer, on "
                              "what survived, too")
@@ -373,8 +402,8 @@ def main() -> None:
     parser.add_argument("--list", action="store_true", help="show the mistakes and stop")
     parser.add_argument("--report", action="store_true", help="show what is known and stop")
     options = parser.parse_args()
-    if options.sanitize and not options.settle:
-        parser.error("--sanitize goes with --settle")
+    if (options.sanitize or options.again) and not options.settle:
+        parser.error("--sanitize and --again go with --settle")
     if options.report:
         report(options.results)
         return
@@ -389,9 +418,8 @@ def main() -> None:
     known = latest(options.results)
     if options.settle:
         excused = reasons()
-        unsettled = ["open", "survived"] if options.sanitize else ["open"]
         mutants = [mutant for mutant in mutants if mutant.name not in excused and
-                   known.get(mutant.name, {}).get("status") in unsettled]
+                   is_unsettled(known.get(mutant.name, {}), options.sanitize, options.again)]
     else:
         mutants = mutants[:options.count]
     if options.list:

@@ -71,9 +71,9 @@ const NameTable::Node* NameTable::Find(std::string_view name) const noexcept {
     return nullptr;
 }
 
-bool NameTable::Insert(std::string_view name) {
+void NameTable::Insert(std::string_view name) {
     if (Contains(name)) {
-        return false;
+        return;
     }
     auto node = std::make_unique<Node>(Node{nullptr, Hash(name), std::string(name)});
     if (buckets_.empty()) {
@@ -83,7 +83,6 @@ bool NameTable::Insert(std::string_view name) {
     }
     Link(node.release());
     ++count_;
-    return true;
 }
 
 NameTable::Node** NameTable::LinkInto(std::size_t bucket) noexcept {

@@ -28,8 +28,8 @@ public:
     NameTable& operator=(const NameTable&) = delete;
     ~NameTable();
 
-    /// \return false if the name is present already.
-    bool Insert(std::string_view name);
+    /// Does nothing if the name is present already.
+    void Insert(std::string_view name);
     bool Contains(std::string_view name) const noexcept { return Find(name) != nullptr; }
     void Remove(std::string_view name) noexcept;
     /// Removes all names; the number of buckets does not change.

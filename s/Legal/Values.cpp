@@ -40,8 +40,7 @@ std::optional<std::string> FindPlainBits(const Digits& digits, std::size_t width
     if (text.size() == width && AreAllOf("01XZxz", text)) {
         return ReadBinary(text);
     }
-    if (text.empty() || !std::all_of(text.begin(), text.end(), Port::IsDigit) ||
-        digits.GetNeededBits() > width) {
+    if (!std::all_of(text.begin(), text.end(), Port::IsDigit) || digits.GetNeededBits() > width) {
         return std::nullopt;
     }
     std::optional<std::string> bits = digits.ReadVerilog(width);

@@ -124,6 +124,14 @@ TEST_F(CheckTest, DigitsThatMeanOneThingAreNot) {
     }
 }
 
+TEST_F(CheckTest, UnderscoresAndBlanksAmongDigitsAreNoBits) {
+    Do({"ASSIGN CONSTANT D(7:0) 8:H:A_5", "ADD SIGNAL E(7:0)"});
+    model_.GetSignal("E(7:0)")->AssignConstantValue("8:H: A5");
+    for (const Finding& finding : Run()) {
+        EXPECT_NE(finding.rule->name, "constant-length") << finding.message;
+    }
+}
+
 TEST_F(CheckTest, AVectorOfVhdlIsAsLongAsItsDigits) {
     Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=BitVector W 4:H:A", "USE ATTRTYPE true",
         "SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=SYN"});
@@ -174,6 +182,34 @@ TEST_F(CheckTest, AnIndexOfMoreThan32BitsIsWrittenAsAnotherOne) {
               "misread: the bus \"P(0:4294967296)\" has an index of more than 32 bits");
 }
 
+TEST_F(CheckTest, VhdlRejectsAnAliasThatLiesOutsideItsBus) {
+    Do({"ADD PORT B(3:0) input", "ADD SIGNAL N", "CONNECT SIGNAL N B(7)"});
+    const Finding finding = Find("slice-outside");
+    EXPECT_EQ(finding.message, "\"B(7)\" lies outside the bus \"B(3:0)\"");
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Vhdl93), Verdict::Rejects);
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Ghdl), Verdict::Rejects);
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Icarus), Verdict::Warns);
+}
+
+TEST_F(CheckTest, ABusHidesALibraryOfItsName) {
+    Do({"ADD PORT work(1:0) input"});
+    const Finding finding = Find("hidden-library");
+    EXPECT_EQ(finding.message, "the port \"work(1:0)\" hides the library of that name");
+    EXPECT_EQ(finding.cause.first, "work");
+}
+
+TEST_F(CheckTest, ASignalOfAnOpenPinMayMeetABusOfItsName) {
+    Do({"ADD COMPONENT REG", "ADD PIN REG D(3:0) input", "ADD INSTANCE REG U2",
+        "ADD SIGNAL U2_D_openSignal(7:4)", "SET OPEN PIN false"});
+    Write(false);
+    const Signal* const made = model_.GetSignal("U2_D_openSignal(3:0)");
+    ASSERT_NE(made, nullptr);
+    const Finding finding = Find("name-clash");
+    EXPECT_EQ(finding.objects,
+              (std::vector<const Object*>{model_.GetSignal("U2_D_openSignal(7:4)"), made}));
+    EXPECT_EQ(finding.verdicts.Get(Check::Target::Vhdl93), Verdict::Rejects);
+}
+
 TEST_F(CheckTest, AValueOfAUserTypeIsALiteralOfIt) {
     Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=User W x",
         "SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=SYN"});
@@ -193,6 +229,20 @@ TEST_F(CheckTest, AValueOfAUserTypeIsALiteralOfIt) {
     EXPECT_TRUE(isWrong("std_logic", "'x'"));
     EXPECT_FALSE(isWrong("std_logic", "'X'"));
     EXPECT_FALSE(isWrong("character", "'x'"));
+}
+
+TEST_F(CheckTest, OnlyAUseClauseMayDeclareATypeThatHasAName) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=User W x",
+        "SET COMPONENT ATTRIBUTE OPTION INV W -GENERIC=SYN"});
+    const auto judge = [this](const char* type) {
+        model_.SetComponentUserType("INV", "W", type);
+        return Find("user-type").verdicts.Get(Check::Target::Vhdl93);
+    };
+    EXPECT_EQ(judge("colour"), Verdict::Rejects);
+    EXPECT_EQ(judge(""), Verdict::Rejects);
+    Do({"ADD USE LIBRARY work.colours.all"});
+    EXPECT_EQ(judge("colour"), Verdict::Warns);
+    EXPECT_EQ(judge(""), Verdict::Rejects);
 }
 
 TEST_F(CheckTest, CommentsHideWhatFollowsFromSynthesis) {

@@ -72,6 +72,9 @@ TEST(Model, StartsEmptyAndUnmodified) {
     EXPECT_EQ(model.GetCommandFactory(), &factory);
     EXPECT_TRUE(model.GetNetlist()->GetSignalIterator().IsAtEnd());
     EXPECT_TRUE(model.GetOptions()->writeHeader);
+    EXPECT_EQ(model.GetWrittenFileName(), "");
+    EXPECT_EQ(model.GetWriteError(), 0);
+    EXPECT_EQ(model.GetWriteLeftover(), 0U);
     model.SetModifiedFlag(true);
     EXPECT_TRUE(model.IsModified());
 }
@@ -428,6 +431,16 @@ TEST_F(Widening, MovesPortPolarityAttributesAndComment) {
     EXPECT_EQ(Get("Y")->GetSignalIterator().GetCurrent(), &slice);
     EXPECT_EQ(dynamic_cast<CompoundBus&>(*Get("A,q(7:0)")).GetAt(1), &slice);
     EXPECT_EQ(Signals(), (Names{"X", "Y", "A", "A,q(7:0)", "Z", "q(15:0)", "q(7:0)", "W"}));
+}
+
+TEST_F(Widening, MakesTheOldBusTheSliceAlsoWhereABusOrACompoundHasItAsAlias) {
+    model_.ConnectSignals("b(7:0)", "q(7:0)");
+    model_.ConnectSignals("c(6:0),d", "q(7:0)");
+    model_.ConnectSignals("q(15:0)", "X");
+    for (const char* name : {"b(7:0)", "c(6:0),d"}) {
+        EXPECT_EQ(NamesOf(Get(name)->GetSignalIterator()), Names{"q(7:0)"}) << name;
+        EXPECT_EQ(Get(name)->GetSignalIterator().GetCurrent(), &GetSlice("q(7:0)")) << name;
+    }
 }
 
 TEST_F(Widening, MovesSlicesAndBits) {

@@ -191,6 +191,15 @@ TEST_F(LegalNetlistTest, ConstantWithTwoMeaningsIsRefused) {
     EXPECT_NE(std::find(errors.begin(), errors.end(), "constant-width"), errors.end());
 }
 
+TEST_F(LegalNetlistTest, ConstantThatIsNoPlainNumberIsRefused) {
+    Do({"ADD PORT D(7:0) output"});
+    for (const char* value : {"-5", "1_9", "+7"}) {
+        model_.AssignConstantToSignal("D(7:0)", value);
+        const std::vector<std::string> errors = FindErrors();
+        EXPECT_NE(std::find(errors.begin(), errors.end(), "constant-width"), errors.end()) << value;
+    }
+}
+
 TEST_F(LegalNetlistTest, NothingIsWrittenOfWhatCannotBeMended) {
     Do({"ADD INSTANCE INV U2", "CONNECT SIGNAL A U2.I", "CONNECT SIGNAL Y U2.O"});
     EXPECT_EQ(FindErrors(), std::vector<std::string>{"two-drivers"});
@@ -280,6 +289,13 @@ TEST_F(LegalNetlistTest, ClausesAreMended) {
         << text;
 }
 
+TEST_F(LegalNetlistTest, LegalLibrariesStayWhenAnotherIsLeftOut) {
+    Do({"ADD LIBRARY cells,2x", "ADD LIBRARY unisim"});
+    const std::string text = WriteLegally(Language::Vhdl);
+    EXPECT_NE(text.find("library cells;\nlibrary unisim;\n"), std::string::npos) << text;
+    EXPECT_EQ(text.find("2x"), std::string::npos) << text;
+}
+
 TEST_F(LegalNetlistTest, LegalClausesStay) {
     // The default library comes with clauses of its own, and a clause may stand twice.
     Do({"ADD LIBRARY ieee,ieee", "ADD USE LIBRARY ieee.numeric_std.all", "ADD SIGNAL begin"});
@@ -309,6 +325,16 @@ TEST_F(LegalNetlistTest, AQuotedTextOfAUsersTypeLosesItsQuotes) {
         "SET INSTANCE ATTRIBUTE OPTION U1 DELAY -SYNATTR=ASSIGN", "ADD SIGNAL begin"});
     const std::string text = WriteLegally(Language::Vhdl);
     EXPECT_NE(text.find("attribute DELAY of U1 : label is \"1 ns\";"), std::string::npos) << text;
+}
+
+TEST_F(LegalNetlistTest, AQuotedGenericOfAUsersTypeIsQuotedOnceInEachLanguage) {
+    Do({"ADD COMPONENT ATTRIBUTE INV -TYPE=User MODE \"\\\"slow\\\"\"",
+        "SET COMPONENT ATTRIBUTE USERTYPE INV MODE string",
+        "SET COMPONENT ATTRIBUTE OPTION INV MODE -GENERIC=SYN",
+        "ADD INSTANCE ATTRIBUTE U1 -TYPE=User MODE \"\\\"fast\\\"\"",
+        "SET INSTANCE ATTRIBUTE USERTYPE U1 MODE string",
+        "SET INSTANCE ATTRIBUTE OPTION U1 MODE -GENERIC=SYN"});
+    ExpectInBoth("defparam U1.MODE = \"fast\";", "generic map( MODE => \"fast\")");
 }
 
 TEST_F(LegalNetlistTest, WriteCommandLeavesTheFileAlone) {

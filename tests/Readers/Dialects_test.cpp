@@ -64,6 +64,13 @@ TEST(VerilogAttributes, OfAModuleAreNotThoseOfTheModuleInFront) {
     EXPECT_EQ(AttributesOf(text.model.GetNetlist()), "second Integer 1 NONE ASSIGN\n");
 }
 
+TEST(VerilogAttributes, InFrontOfALoneSemicolonBelongToNothing) {
+    TextReader text;
+    text.Read("(* NONE = 1 *) ;\n(* LEVEL = 2 *) module m; endmodule");
+    EXPECT_EQ(text.model.GetNetlist()->GetAttr("NONE"), nullptr);
+    EXPECT_NE(text.model.GetNetlist()->GetAttr("LEVEL"), nullptr);
+}
+
 TEST(VerilogAttributes, MayBeOfAnEscapedName) {
     TextReader text;
     text.Read("module m(input a);\n"

@@ -121,6 +121,36 @@ TEST(VerilogLimits, RepetitionsAndMacrosMakeNoMoreThanTheyMay) {
     EXPECT_EQ(ErrorOf(doubling + "module m; `M59 endmodule"), "macros use each other too often");
 }
 
+/// A macro that uses another one, and so on.
+std::string NestedMacros(int count) {
+    std::string text = "`define M1 wire w;\n";
+    for (int i = 2; i <= count; ++i) {
+        text += "`define M" + std::to_string(i) + " `M" + std::to_string(i - 1) + "\n";
+    }
+    return text + "module m; `M" + std::to_string(count) + "\nendmodule";
+}
+
+/// A text that includes a file that includes another one, and so on.
+std::string NestedFiles(TextReader& reader, int count) {
+    std::string text = "// the innermost one\n";
+    for (int i = 1; i <= count; ++i) {
+        const std::string name = "f" + std::to_string(i) + ".v";
+        reader.Put(name.c_str(), text);
+        text = "`include \"" + name + "\"\n";
+    }
+    return text + "module m; endmodule";
+}
+
+TEST(VerilogLimits, MacrosAndFilesNestSixtyThreeTimes) {
+    constexpr int Most = 63;
+    TextReader reader;
+    EXPECT_EQ(ErrorOf(reader, NestedMacros(Most)), "");
+    EXPECT_NE(reader.model.GetSignal("w"), nullptr);
+    EXPECT_EQ(ErrorOf(reader, NestedMacros(Most + 1)), "macros use each other too often");
+    EXPECT_EQ(ErrorOf(reader, NestedFiles(reader, Most)), "");
+    EXPECT_EQ(ErrorOf(reader, NestedFiles(reader, Most + 1)), "too many files include each other");
+}
+
 TEST(VerilogLimits, MillionsOfSmallThingsAreRead) {
     std::string text = "module m; wire a;\n";
     for (int i = 0; i < 20'000; ++i) {

@@ -7,6 +7,9 @@
 #include <rapidcheck/gtest.h>
 
 #include <algorithm>
+#include <cstddef>
+#include <limits>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -170,6 +173,25 @@ TEST(NaturalOrder, AgreesWithASlowOrderOnGroupsOfLongNames) {
     const Names expected = SortedSlowly(names);
     EXPECT_TRUE(SortedAsInstances(names) == expected);
     EXPECT_TRUE(SortedAsSignals(names) == expected);
+}
+
+TEST(NaturalOrder, ComesBehindTheOrderOfPolaritiesWhateverTheirValues) {
+    constexpr int Least = std::numeric_limits<int>::min();
+    constexpr int Most = std::numeric_limits<int>::max();
+    const std::vector<int> values = {Least, -300, -3,  -2,  -1,  0,   1,
+                                     2,     251,  252, 253, 254, 300, Most};
+    Netlist netlist("top");
+    Names expected;
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        expected.push_back("P" + std::to_string(values.size() - i));
+    }
+    for (std::size_t i = values.size(); i-- > 0;) {
+        auto port = std::make_unique<ScalarSignal>(expected[i].c_str());
+        port->SetPortPolarity(Polarity(values[i]));
+        netlist.Add(port.release());
+    }
+    netlist.SortNetlist();
+    EXPECT_EQ(NamesOf(netlist.GetSignalIterator()), expected);
 }
 
 RC_GTEST_PROP(NaturalOrder, AgreesWithASlowOrderOnAnyNames, ()) {

@@ -82,6 +82,24 @@ TEST(Object, CopiesHaveNameCommentAndType) {
     EXPECT_EQ(copy.GetObjectType(), 105);
 }
 
+TEST(Object, MayGetLongAndShortNamesInAnyOrder) {
+    const std::string names[] = {std::string(30, 'a'), std::string(40, 'b'), "c",
+                                 std::string(300, 'd')};
+    Thing thing;
+    Thing commented;
+    commented.AddComment("comment");
+    for (const std::string& former : names) {
+        for (const std::string& name : names) {
+            for (Thing* each : {&thing, &commented}) {
+                each->SetName(former.c_str());
+                each->SetName(name.c_str());
+                EXPECT_EQ(each->GetNameView(), name);
+            }
+        }
+    }
+    EXPECT_EQ(commented.GetComment(), "comment\n");
+}
+
 TEST(Object, AssignmentToItselfChangesNothing) {
     Thing thing("a name that is too long for its object");
     thing.AddComment("comment");
