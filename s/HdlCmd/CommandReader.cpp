@@ -5,6 +5,7 @@
 #include "Port/File.h"
 #include "Port/LinesAtHand.h"
 #include "Port/OrderedWork.h"
+#include "Port/Prefetch.h"
 
 #include <array>
 #include <memory>
@@ -29,9 +30,10 @@ struct CommandReader::Implementation {
     void LookAheadInBatches();
 
     Model& model;
-    Port::File file;
+    /// While there are batches, another thread uses it.
+    alignas(Port::CacheLine) Port::File file;
     /// A ring of the line in hand, if `Next` has given one, and those behind it.
-    std::array<SplitLine, Distance> lines;
+    alignas(Port::CacheLine) std::array<SplitLine, Distance> lines;
     std::size_t first = 0;
     std::size_t count = 0;
     bool isInHand = false;

@@ -7,6 +7,7 @@
 #include "Port/File.h"
 #include "Port/OrderedWork.h"
 #include "Port/Pool.h"
+#include "Port/Prefetch.h"
 
 #include <cstddef>
 #include <cstdint>
@@ -82,7 +83,7 @@ private:
         std::uint64_t bytes;
         Foresight::Hashes names;
     };
-    struct Batch {
+    struct alignas(Port::CacheLine) Batch {
         std::vector<Line> lines;
         /// Those of all lines.
         PackedLists words;
@@ -101,14 +102,14 @@ private:
     Port::File& file_;
     std::vector<Batch> batches_;
     /// The line that is being split.
-    SplitLine line_;
+    alignas(Port::CacheLine) SplitLine line_;
     /// The batch whose lines are being given; null before the first.
-    Batch* batch_ = nullptr;
+    alignas(Port::CacheLine) Batch* batch_ = nullptr;
     std::size_t given_ = 0;
     /// For the objects that the lines make.
     Port::Pool::Reserve memory_;
     /// Last, since its threads use the others.
-    Port::OrderedWork work_;
+    alignas(Port::CacheLine) Port::OrderedWork work_;
 };
 
 } // namespace Orn_Hdl

@@ -42,14 +42,13 @@ public:
         for (const std::uint32_t hash : coming_[(noted_ + Distance / 2) % Distance]) {
             if (const auto* const object = index.GuessObject(hash)) {
                 Port::Prefetch(object);
-                Port::Prefetch(reinterpret_cast<const char*>(object) + CacheLine);
+                Port::Prefetch(reinterpret_cast<const char*>(object) + Port::CacheLine);
             }
         }
     }
 
 private:
     static constexpr int LeastSize = 10000;
-    static constexpr std::size_t CacheLine = 64;
 
     std::array<Hashes, Distance> coming_{};
     std::size_t noted_ = 0;

@@ -32,7 +32,7 @@ public:
         if (const Instance* const far = *far_) {
             // The pins were usually made right after it, and stand behind it.
             for (std::size_t line = 0; line < Lines; ++line) {
-                Port::Prefetch(reinterpret_cast<const char*>(far) + line * CacheLine);
+                Port::Prefetch(reinterpret_cast<const char*>(far) + line * Port::CacheLine);
             }
             ++far_;
         }
@@ -47,7 +47,6 @@ public:
 private:
     /// How many leads ahead instances are prefetched.
     static constexpr int FarLeads = 3;
-    static constexpr std::size_t CacheLine = 64;
     static constexpr std::size_t Lines = 4;
 
     Iterator<Instance*>::Cursor coming_;
