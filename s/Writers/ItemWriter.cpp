@@ -1,6 +1,7 @@
 #include "Writers/ItemWriter.h"
 
 #include "Port/OrderedWork.h"
+#include "Port/Prefetch.h"
 #include "Streams/StreamBranch.h"
 
 #include <algorithm>
@@ -30,7 +31,7 @@ void Write(ItemWriter& writer, std::size_t begin, std::size_t end) {
 }
 
 /// Formats one range at a time.
-class RangeFormatter {
+class alignas(Port::CacheLine) RangeFormatter {
 public:
     RangeFormatter(std::unique_ptr<StreamBranch> branch, const MakeItemWriter& make)
         : branch_(std::move(branch)), writer_(make(branch_->GetStream())) {}

@@ -6,6 +6,7 @@
 #include "Orn_Hdl/Model/Netlist.h"
 #include "Orn_Hdl/Options.h"
 #include "Orn_Hdl/Streams.h"
+#include "Port/Prefetch.h"
 #include "Writers/Generics.h"
 #include "Writers/ItemWriter.h"
 #include "Writers/SignalLists.h"
@@ -38,7 +39,8 @@ private:
 };
 
 /// Writes instances by a writer that `MakeWriter` makes for a stream.
-template <class MakeWriter> class InstanceWriter final : public ItemWriter {
+template <class MakeWriter>
+class alignas(Port::CacheLine) InstanceWriter final : public ItemWriter {
 public:
     InstanceWriter(const InstanceStarts& starts, const MakeWriter& makeWriter, OutStream& out)
         : starts_(starts), write_(makeWriter(out)) {}
@@ -62,7 +64,7 @@ private:
 };
 
 /// Writes signals by a writer that `MakeWriter` makes for a stream.
-template <class MakeWriter> class SignalWriter final : public ItemWriter {
+template <class MakeWriter> class alignas(Port::CacheLine) SignalWriter final : public ItemWriter {
 public:
     SignalWriter(const std::vector<Signal*>& signals, const MakeWriter& makeWriter, OutStream& out)
         : signals_(signals), write_(makeWriter(out)) {}
