@@ -14,9 +14,10 @@ void Arguments::Set(std::initializer_list<std::string_view> texts) {
     count_ = 0;
     flags_ = 0;
     for (const std::string_view text : texts) {
-        texts_[count_++] = place;
-        place += text.copy(place, text.find('\0'));
-        *place++ = '\0';
+        const std::size_t length = text.copy(place, text.find('\0'));
+        place[length] = '\0';
+        texts_[count_++] = std::string_view(place, length);
+        place += length + 1;
     }
 }
 

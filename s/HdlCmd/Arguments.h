@@ -20,7 +20,7 @@ public:
     /// The text at `index`, closed by a NUL; empty if there is none.
     const char* Get(int index) const noexcept {
         const auto place = static_cast<std::size_t>(index);
-        return place < count_ ? texts_[place] : "";
+        return place < count_ ? texts_[place].data() : "";
     }
 
     /// Raises a flag, an enumerator of the command's own flags.
@@ -41,7 +41,7 @@ private:
 
     /// The texts, behind them what former ones have left.
     std::vector<char> room_;
-    std::array<const char*, MostTexts> texts_{};
+    std::array<std::string_view, MostTexts> texts_;
     std::uint8_t count_ = 0;
     std::uint8_t flags_ = 0;
 };

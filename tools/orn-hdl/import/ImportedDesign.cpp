@@ -1,7 +1,5 @@
 #include "import/ImportedDesign.h"
 
-#include <cstring>
-
 namespace Tool::Import {
 
 JsonPath Module::GetPath(std::string_view table, std::string_view object) const {
@@ -25,7 +23,7 @@ std::string_view ImportedDesign::Keep(std::string_view text) {
         return "";
     }
     char* copy = static_cast<char*>(texts_.allocate(text.size(), 1));
-    std::memcpy(copy, text.data(), text.size());
+    text.copy(copy, text.size());
     return std::string_view(copy, text.size());
 }
 
