@@ -16,7 +16,6 @@ namespace Orn_Hdl {
 
 class Model;
 class PhraseTable;
-struct RegisteredCommand;
 
 /// One command on one model: it is created, parses the words of its line, and is executed. Programs
 /// derive from it to add commands of their own, see `CommandFactory::AddCommandCreator`.
