@@ -8,6 +8,9 @@
 
 namespace Orn_Hdl::EightBytes {
 
+/// How many characters there are.
+constexpr std::size_t Count = sizeof(std::uint64_t);
+
 constexpr std::uint64_t Each(unsigned byte) noexcept {
     return byte * 0x0101010101010101U;
 }
@@ -53,6 +56,28 @@ inline std::uint64_t LoadShort(const char* text, std::size_t size) noexcept {
         return static_cast<std::uint64_t>(static_cast<unsigned char>(text[i]));
     };
     return size == 0 ? 0 : at(0) | at(size / 2) << 8U | at(size - 1) << 16U;
+}
+
+/// Copies a text of any length, most quickly one of a few characters, for which a call of `memcpy`
+/// takes longer than copying. The places do not overlap. \return the place behind the copy.
+inline char* Copy(const char* from, std::size_t size, char* to) noexcept {
+    if (size > 2 * Count) {
+        std::memcpy(to, from, size);
+    } else if (size >= Count) {
+        const std::uint64_t last = Load(from + size - Count);
+        std::memcpy(to, from, Count);
+        std::memcpy(to + size - Count, &last, Count);
+    } else if (size >= Count / 2) {
+        std::uint32_t last = 0;
+        std::memcpy(&last, from + size - sizeof last, sizeof last);
+        std::memcpy(to, from, sizeof last);
+        std::memcpy(to + size - sizeof last, &last, sizeof last);
+    } else if (size > 0) {
+        to[0] = from[0];
+        to[size / 2] = from[size / 2];
+        to[size - 1] = from[size - 1];
+    }
+    return to + size;
 }
 
 } // namespace Orn_Hdl::EightBytes

@@ -1,23 +1,21 @@
 #include "HdlCmd/Arguments.h"
 
+#include "Containers/EightBytes.h"
+
 namespace Orn_Hdl {
 
 void Arguments::Set(std::initializer_list<std::string_view> texts) {
-    std::size_t size = 0;
-    for (const std::string_view text : texts) {
-        size += text.size() + 1;
-    }
-    if (room_.size() < size) {
-        room_.resize(size);
-    }
-    char* place = room_.data();
+    std::size_t end = 0;
     count_ = 0;
     flags_ = 0;
     for (const std::string_view text : texts) {
-        const std::size_t length = text.copy(place, text.find('\0'));
-        place[length] = '\0';
-        texts_[count_++] = std::string_view(place, length);
-        place += length + 1;
+        if (room_.size() - end <= text.size()) {
+            room_.resize(end + text.size() + 1);
+        }
+        EightBytes::Copy(text.data(), text.size(), room_.data() + end);
+        starts_[count_++] = end;
+        end += text.size() + 1;
+        room_[end - 1] = '\0';
     }
 }
 

@@ -14,13 +14,13 @@ namespace Orn_Hdl {
 /// The texts and up to eight flags of a command.
 class Arguments {
 public:
-    /// Sets the texts, each up to its first NUL, and lowers every flag.
+    /// Sets the texts, which are read up to their first NUL, and lowers every flag.
     /// \param texts at most `MostTexts`.
     void Set(std::initializer_list<std::string_view> texts);
     /// The text at `index`, closed by a NUL; empty if there is none.
     const char* Get(int index) const noexcept {
         const auto place = static_cast<std::size_t>(index);
-        return place < count_ ? texts_[place].data() : "";
+        return place < count_ ? room_.data() + starts_[place] : "";
     }
 
     /// Raises a flag, an enumerator of the command's own flags.
@@ -39,9 +39,9 @@ private:
         return 1U << static_cast<unsigned>(flag);
     }
 
-    /// The texts, behind them what former ones have left.
+    /// The texts, each closed by a NUL; behind them what former ones have left.
     std::vector<char> room_;
-    std::array<std::string_view, MostTexts> texts_;
+    std::array<std::size_t, MostTexts> starts_;
     std::uint8_t count_ = 0;
     std::uint8_t flags_ = 0;
 };

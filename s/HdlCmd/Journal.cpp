@@ -1,5 +1,6 @@
 #include "HdlCmd/Journal.h"
 
+#include "Containers/EightBytes.h"
 #include "HdlCmd/Catalogue.h"
 #include "Port/Pool.h"
 
@@ -41,25 +42,23 @@ std::size_t TakeNumber(const char*& place) noexcept {
 
 std::string_view Journal::Pack(const StringArray& words, const PhraseTable::Match& phrase,
                                std::string& room) {
+    const bool isOwn = phrase.own != nullptr && phrase.words == phrase.own->words;
+    const int first = isOwn ? phrase.words : 0;
     std::size_t most = 1 + MostNumberSize;
-    for (int i = 0; i < words.GetSize(); ++i) {
+    for (int i = first; i < words.GetSize(); ++i) {
         most += MostNumberSize + words.GetView(i).size();
     }
     if (room.size() < most) {
         room.resize(most);
     }
     char* place = room.data();
-    int next = 0;
-    *place = static_cast<char>(NoPhrase);
-    if (phrase.own != nullptr && phrase.words == phrase.own->words) {
-        *place = static_cast<char>(phrase.own - GetRegisteredCommands().data());
-        next = phrase.words;
-    }
-    place = PutNumber(place + 1, static_cast<std::size_t>(words.GetSize() - next));
-    for (; next < words.GetSize(); ++next) {
-        const std::string_view word = words.GetView(next);
+    *place = isOwn ? static_cast<char>(phrase.own - GetRegisteredCommands().data())
+                   : static_cast<char>(NoPhrase);
+    place = PutNumber(place + 1, static_cast<std::size_t>(words.GetSize() - first));
+    for (int i = first; i < words.GetSize(); ++i) {
+        const std::string_view word = words.GetView(i);
         place = PutNumber(place, word.size());
-        place += word.copy(place, word.size());
+        place = EightBytes::Copy(word.data(), word.size(), place);
     }
     return std::string_view(room.data(), static_cast<std::size_t>(place - room.data()));
 }

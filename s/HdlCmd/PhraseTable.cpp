@@ -1,12 +1,21 @@
 #include "HdlCmd/PhraseTable.h"
 
+#include "Containers/EightBytes.h"
 #include "Port/Ascii.h"
 
 namespace Orn_Hdl {
 
-std::size_t PhraseTable::GetChild(std::size_t node, std::string_view word) const noexcept {
+inline PhraseTable::Key::Key(std::string_view text) noexcept
+    : word(text), start(EightBytes::ToUpper(text.size() < EightBytes::Count
+                                                ? EightBytes::LoadShort(text.data(), text.size())
+                                                : EightBytes::Load(text.data()))) {}
+
+inline std::size_t PhraseTable::GetChild(std::size_t node, const Key& key) const noexcept {
+    const std::size_t size = key.word.size();
     for (const Child& child : nodes_[node].children) {
-        if (Port::EqualIgnoringCase(child.word, word)) {
+        // Words of up to eight characters that have one length and one start are the same.
+        if (child.start == key.start && child.word.size() == size &&
+            (size <= EightBytes::Count || Port::EqualIgnoringCase(child.word, key.word))) {
             return child.node;
         }
     }
@@ -21,11 +30,12 @@ void PhraseTable::Add(std::string_view phrase, CommandCreator creator,
         const std::string_view text = phrase.substr(0, end);
         more = end != std::string_view::npos;
         phrase.remove_prefix(more ? end + 1 : phrase.size());
-        std::size_t child = GetChild(node, text);
+        const Key key(text);
+        std::size_t child = GetChild(node, key);
         if (child == None) {
             child = nodes_.size();
             nodes_.emplace_back();
-            nodes_[node].children.push_back({std::string(text), child});
+            nodes_[node].children.push_back({std::string(text), key.start, child});
         }
         node = child;
     }
@@ -35,28 +45,32 @@ void PhraseTable::Add(std::string_view phrase, CommandCreator creator,
 
 std::size_t PhraseTable::GetDescendant(std::size_t node, std::string_view words) const noexcept {
     std::size_t end = words.find(' ');
-    while (end != std::string_view::npos && (node = GetChild(node, words.substr(0, end))) != None) {
+    while (end != std::string_view::npos &&
+           (node = GetChild(node, Key(words.substr(0, end)))) != None) {
         words.remove_prefix(end + 1);
         end = words.find(' ');
     }
-    return node == None ? None : GetChild(node, words);
+    return node == None ? None : GetChild(node, Key(words));
 }
 
 PhraseTable::Match PhraseTable::Find(const StringArray& words) const noexcept {
-    Match found;
+    std::size_t found = None;
+    int length = 0;
+    const int count = words.GetSize();
     std::size_t node = 0;
-    for (int i = 0; i < words.GetSize() && !nodes_[node].children.empty(); ++i) {
+    for (int i = 0; i < count && !nodes_[node].children.empty(); ++i) {
         const std::string_view word = words.GetView(i);
-        const std::size_t child = GetChild(node, word);
+        const std::size_t child = GetChild(node, Key(word));
         node = child != None ? child : GetDescendant(node, word);
         if (node == None) {
             break;
         }
         if (nodes_[node].creator != nullptr) {
-            found = {nodes_[node].creator, nodes_[node].own, i + 1};
+            found = node;
+            length = i + 1;
         }
     }
-    return found;
+    return {nodes_[found].creator, nodes_[found].own, length};
 }
 
 } // namespace Orn_Hdl

@@ -4,6 +4,7 @@
 #include "HdlCmd/Catalogue.h"
 
 #include <cstddef>
+#include <cstdint>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -33,8 +34,17 @@ public:
     Match Find(const StringArray& words) const noexcept;
 
 private:
+    /// A word with what tells most words apart, made once to be compared with many.
+    struct Key {
+        explicit Key(std::string_view word) noexcept;
+
+        std::string_view word;
+        /// Up to eight characters that the word begins with, in upper case.
+        std::uint64_t start;
+    };
     struct Child {
         std::string word;
+        std::uint64_t start;
         std::size_t node;
     };
     struct Node {
@@ -47,7 +57,7 @@ private:
     static constexpr std::size_t None = 0;
 
     /// The child of a node for one word; `None` if there is none.
-    std::size_t GetChild(std::size_t node, std::string_view word) const noexcept;
+    std::size_t GetChild(std::size_t node, const Key& key) const noexcept;
     /// The descendant of a node for a quoted word, which may contain blanks and so several words of
     /// a phrase; `None` if there is none.
     std::size_t GetDescendant(std::size_t node, std::string_view words) const noexcept;
