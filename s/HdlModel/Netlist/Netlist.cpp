@@ -74,6 +74,9 @@ struct Netlist::Implementation {
     NameIndex<Bus, KeyBaseName> busesByBaseName;
     Foresight foresight;
     DummySignals dummies;
+    /// The instance that was added last, unless something has been removed since: the lines that
+    /// connect an instance often follow the one that adds it.
+    Instance* latest = nullptr;
     std::string sourceFileName;
     NameListener* nameListener = nullptr;
     std::uint64_t removals = 0;
@@ -141,6 +144,7 @@ struct Netlist::Implementation {
     /// Removes the object at a position. Classes derived from `T` may already be destroyed.
     template <class T> void LetGo(T& object, ObjectList<T>& objects, int place) noexcept {
         ++removals;
+        latest = nullptr;
         Forget(&object);
         byName.Remove(&object, GroupOf(&object));
         objects.TakeOut(place);
@@ -158,6 +162,7 @@ struct Netlist::Implementation {
     }
 
     void Enter(Object* /*object*/) {}
+    void Enter(Instance* instance) { latest = instance; }
     void Enter(Signal* signal) {
         if (Bus* const bus = As<Bus>(signal)) {
             busesByBaseName.Add(bus);
@@ -326,6 +331,10 @@ Signal* Netlist::GetSignal(std::string_view name) const noexcept {
 }
 
 Instance* Netlist::GetInstance(std::string_view name) const noexcept {
+    Instance* const latest = implementation_->latest;
+    if (latest != nullptr && ObjectKey::Get(*latest) == name) {
+        return latest;
+    }
     return static_cast<Instance*>(implementation_->byName.Find(NameKey(name, InstanceGroup)));
 }
 

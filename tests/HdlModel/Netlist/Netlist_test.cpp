@@ -281,6 +281,20 @@ TEST(NetlistRemove, OfAComponentLeavesItsInstancesWithTheirPins) {
     EXPECT_TRUE(instances.IsEmpty());
 }
 
+TEST(NetlistRemove, OfTheInstanceAddedLastLeavesTheOthers) {
+    Netlist netlist;
+    Instance* first = Added(netlist, new Instance("U1", nullptr));
+    Instance* last = Added(netlist, new Instance("U2", nullptr));
+    EXPECT_EQ(netlist.GetInstance("U2"), last);
+    netlist.Remove(last);
+    EXPECT_EQ(netlist.GetInstance("U2"), nullptr);
+    EXPECT_EQ(netlist.GetInstance("U1"), first);
+    last = Added(netlist, new Instance("U2", nullptr));
+    delete last;
+    EXPECT_EQ(netlist.GetInstance("U2"), nullptr);
+    EXPECT_EQ(netlist.GetInstance("u1"), first);
+}
+
 TEST(NetlistRemove, MakesRoomForANewObjectOfTheName) {
     Netlist netlist;
     for (int round = 0; round < 3; ++round) {
