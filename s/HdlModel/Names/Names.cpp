@@ -9,6 +9,13 @@ namespace Orn_Hdl::Names {
 using std::string_view;
 
 bool IsNormalized(string_view name) noexcept {
+    using namespace EightBytes;
+    while (name.size() >= Count && !MayDiffer(Load(name.data()))) {
+        name.remove_prefix(Count);
+    }
+    if (name.size() < Count && !MayDiffer(LoadShort(name.data(), name.size()))) {
+        return true;
+    }
     return std::all_of(name.begin(), name.end(), [](char c) { return Normalized(c) == c; });
 }
 

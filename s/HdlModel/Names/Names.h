@@ -2,6 +2,7 @@
 // any length are safe.
 #pragma once
 
+#include "Containers/EightBytes.h"
 #include "HdlModel/Names/GeneratedNames.h"
 #include "HdlModel/Names/Range.h"
 #include "Port/Ascii.h"
@@ -30,6 +31,16 @@ constexpr char Normalized(char c) noexcept {
     default:
         return c;
     }
+}
+
+/// Whether one of eight characters may differ from its normalised form: few names contain one that
+/// does. A few other characters are taken for such ones.
+constexpr bool MayDiffer(std::uint64_t eight) noexcept {
+    using namespace EightBytes;
+    // Brackets differ from braces in one bit.
+    const std::uint64_t alike = eight | Each(0x20);
+    return (MarkRange(alike, '{', '}') | MarkRange(alike, '<', '>') | MarkRange(alike, '-', '-')) !=
+           0;
 }
 
 bool IsNormalized(std::string_view name) noexcept;

@@ -92,7 +92,9 @@ void Object::SetNameVerbatim(std::string_view name) {
 }
 
 void Object::CopyNameFrom(const Object& other) {
-    KeepKeyName(other.GetNameView());
+    if (HasFlag(OwnedFlagBit)) {
+        KeepKeyName(other.GetNameView());
+    }
     Name() = other.Name();
 }
 

@@ -1,5 +1,6 @@
 #include "HdlModel/Objects/ObjectName.h"
 
+#include "Containers/EightBytes.h"
 #include "HdlModel/Objects/ObjectDetails.h"
 
 #include <atomic>
@@ -64,13 +65,8 @@ void ObjectName::Release() noexcept {
     length_ = 0;
 }
 
-ObjectName::ObjectName(const ObjectName& other) noexcept : ObjectName() {
-    *this = other;
-}
-
-// Self-assignment shows in the places of the names, which may be in the details.
-// NOLINTNEXTLINE(bugprone-unhandled-self-assignment)
-ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
+/// Copies a name where one of both is not stored in its object.
+void ObjectName::CopyLong(const ObjectName& other) noexcept {
     ObjectName& to = GetPlain();
     const ObjectName& from = other.GetPlain();
     if (&to != &from) {
@@ -81,7 +77,6 @@ ObjectName& ObjectName::operator=(const ObjectName& other) noexcept {
         std::memcpy(to.bytes_, from.bytes_, sizeof bytes_);
         to.length_ = from.length_;
     }
-    return *this;
 }
 
 void ObjectName::Swap(ObjectName& other) noexcept {
@@ -93,10 +88,10 @@ void ObjectName::Assign(std::string_view text) {
     ObjectName& name = GetPlain();
     if (text.size() <= InlineCapacity) {
         // The text may be part of the name that it replaces.
-        char copy[InlineCapacity];
-        text.copy(copy, text.size());
+        char copy[InlineCapacity] = {};
+        EightBytes::Copy(text.data(), text.size(), copy);
         name.Release();
-        std::memcpy(name.bytes_, copy, text.size());
+        std::memcpy(name.bytes_, copy, sizeof copy);
         name.length_ = static_cast<std::uint8_t>(text.size());
         return;
     }

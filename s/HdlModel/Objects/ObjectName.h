@@ -20,9 +20,17 @@ class ObjectName {
 public:
     ObjectName() noexcept : bytes_(), length_(0) {}
     /// Copies the name; the details stay with their owner.
-    ObjectName(const ObjectName& other) noexcept;
+    ObjectName(const ObjectName& other) noexcept : ObjectName() { *this = other; }
     /// Copies the name; the details stay with their owner.
-    ObjectName& operator=(const ObjectName& other) noexcept;
+    ObjectName& operator=(const ObjectName& other) noexcept {
+        if (length_ <= InlineCapacity && other.length_ <= InlineCapacity) {
+            std::memcpy(bytes_, other.bytes_, sizeof bytes_);
+            length_ = other.length_;
+        } else {
+            CopyLong(other);
+        }
+        return *this;
+    }
     ~ObjectName() {
         if (length_ > InlineCapacity) {
             Release();
@@ -56,6 +64,7 @@ private:
     /// The value of `length_` if `bytes_` hold a pointer to the details.
     static constexpr std::uint8_t DetailedLength = 254;
 
+    void CopyLong(const ObjectName& other) noexcept;
     std::string_view LongView() const noexcept;
     void* GetPointer() const noexcept {
         void* pointer = nullptr;
