@@ -45,6 +45,9 @@ void PhraseTable::Add(std::string_view phrase, CommandCreator creator,
 
 std::size_t PhraseTable::GetDescendant(std::size_t node, std::string_view words) const noexcept {
     std::size_t end = words.find(' ');
+    if (end == std::string_view::npos) {
+        return None;
+    }
     while (end != std::string_view::npos &&
            (node = GetChild(node, Key(words.substr(0, end)))) != None) {
         words.remove_prefix(end + 1);

@@ -58,8 +58,8 @@ private:
 
     /// The child of a node for one word; `None` if there is none.
     std::size_t GetChild(std::size_t node, const Key& key) const noexcept;
-    /// The descendant of a node for a quoted word, which may contain blanks and so several words of
-    /// a phrase; `None` if there is none.
+    /// The descendant of a node for a quoted word that contains blanks, and so several words of a
+    /// phrase; `None` if there is none, or no blank.
     std::size_t GetDescendant(std::size_t node, std::string_view words) const noexcept;
 
     std::vector<Node> nodes_{1};
