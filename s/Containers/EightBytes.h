@@ -55,4 +55,19 @@ inline std::uint64_t LoadShort(const char* text, std::size_t size) noexcept {
     return size == 0 ? 0 : at(0) | at(size / 2) << 8U | at(size - 1) << 16U;
 }
 
+/// Whether two texts of one size are equal. For a few characters this is faster than a call.
+inline bool Equal(const char* a, const char* b, std::size_t size) noexcept {
+    constexpr std::size_t Step = sizeof(std::uint64_t);
+    if (size < Step) {
+        return LoadShort(a, size) == LoadShort(b, size);
+    }
+    for (std::size_t i = 0; i < size - Step; i += Step) {
+        if (Load(a + i) != Load(b + i)) {
+            return false;
+        }
+    }
+    // The last step overlaps with the one before it.
+    return Load(a + size - Step) == Load(b + size - Step);
+}
+
 } // namespace Orn_Hdl::EightBytes
