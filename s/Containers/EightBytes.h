@@ -25,11 +25,17 @@ constexpr std::uint64_t MarkRange(std::uint64_t text, char first, char last) noe
     return from & ~behind & ~text & High;
 }
 
+/// The high bit of each byte that is an ASCII character up to `last`.
+constexpr std::uint64_t MarkUpTo(std::uint64_t text, char last) noexcept {
+    const std::uint64_t behind = (text & ~High) + Each(0x7FU - static_cast<unsigned>(last));
+    return ~(behind | text) & High;
+}
+
 /// The index in memory, counted from 0, of the first marked byte. At least one must be marked.
 constexpr std::size_t FirstMarked(std::uint64_t marks) noexcept {
     static_assert(std::endian::native == std::endian::little,
                   "the first byte in memory is the lowest of a number");
-    return static_cast<std::size_t>(std::countr_zero(marks)) / 8;
+    return static_cast<unsigned>(std::countr_zero(marks)) / 8;
 }
 
 /// The characters with letters in upper case.
@@ -78,6 +84,20 @@ inline char* Copy(const char* from, std::size_t size, char* to) noexcept {
         to[size - 1] = from[size - 1];
     }
     return to + size;
+}
+
+/// Whether two texts of one size are equal. For a few characters this is faster than a call.
+inline bool Equal(const char* a, const char* b, std::size_t size) noexcept {
+    if (size < Count) {
+        return LoadShort(a, size) == LoadShort(b, size);
+    }
+    for (std::size_t i = 0; i < size - Count; i += Count) {
+        if (Load(a + i) != Load(b + i)) {
+            return false;
+        }
+    }
+    // The last step overlaps with the one before it.
+    return Load(a + size - Count) == Load(b + size - Count);
 }
 
 } // namespace Orn_Hdl::EightBytes

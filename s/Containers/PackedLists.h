@@ -6,6 +6,7 @@
 
 #include <cstddef>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace Orn_Hdl {
@@ -53,6 +54,13 @@ public:
         list.text_.assign(text_, begin.text, end.text - begin.text);
         list.slots_.assign(slots_.data() + begin.slots, slots_.data() + end.slots);
     }
+
+    /// Makes `list` the words of the first line of a text, as `StringArray::ParseCommandLine`
+    /// would, if it is a usual line: one that ends with a line feed some characters before the text
+    /// does, contains no quotes and no NUL, and fits the memory that the list has. \return how many
+    /// bytes the line takes with its end, "\n" or "\r\n"; 0, with any words in
+    ///         the list, if the line is not a usual one.
+    static std::size_t SplitUsualLine(std::string_view text, StringArray& list) noexcept;
 
 private:
     struct End {

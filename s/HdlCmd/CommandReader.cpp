@@ -23,7 +23,7 @@ struct CommandReader::Implementation {
     bool HasThreads() const {
         return Port::OrderedWork::GetWorkersFor(model.GetOptions()->threads) > 0;
     }
-    void Split(std::string_view text);
+    void Add() noexcept;
     void Leave() noexcept;
     void LookAhead();
     void LookAheadInBuffer();
@@ -42,8 +42,8 @@ struct CommandReader::Implementation {
     std::unique_ptr<LineBatches> batches;
 };
 
-void CommandReader::Implementation::Split(std::string_view text) {
-    GetFree().Set(file, text);
+/// Takes the line that the free place of the ring has got.
+void CommandReader::Implementation::Add() noexcept {
     ++count;
     // The line before: a processor waits long before it can read what it has just written.
     if (count > 1) {
@@ -72,18 +72,17 @@ void CommandReader::Implementation::LookAhead() {
 }
 
 void CommandReader::Implementation::LookAheadInBuffer() {
-    std::string_view text;
-    while (count < Distance && Port::LinesAtHand::Next(file, text)) {
-        Split(text);
+    while (count < Distance && GetFree().TakeAtHand(file)) {
+        Add();
     }
     if (count == Distance) {
         return;
     }
     if (Port::LinesAtHand::GoesOn(file) && HasThreads()) {
         batches = std::make_unique<LineBatches>(file, LineBatches::Settings());
-    } else if (count == 0 && file.NextLine(text)) {
+    } else if (count == 0 && GetFree().Take(file)) {
         // Only for the line that is asked for is it worth waiting.
-        Split(text);
+        Add();
         LookAheadInBuffer();
     }
 }

@@ -26,10 +26,7 @@ void LineBatches::Read(Batch& batch) {
     batch.words.Empty(LongBatch);
     batch.lines.reserve(settings_.lines);
     std::uint64_t bytes = 0;
-    std::string_view text;
-    while (batch.lines.size() < settings_.lines && bytes < settings_.bytes &&
-           file_.NextLine(text)) {
-        line_.Set(file_, text);
+    while (batch.lines.size() < settings_.lines && bytes < settings_.bytes && line_.Take(file_)) {
         batch.words.Add(line_.words);
         batch.lines.push_back({line_.bytes, Foresight::HashNames(line_.words)});
         bytes += line_.bytes;

@@ -5,6 +5,7 @@
 #include "HdlModel/Netlist/Foresight.h"
 #include "Orn_Hdl/Containers/StringArray.h"
 #include "Port/File.h"
+#include "Port/LinesAtHand.h"
 #include "Port/OrderedWork.h"
 #include "Port/Pool.h"
 #include "Port/Prefetch.h"
@@ -20,11 +21,17 @@ namespace Orn_Hdl {
 
 /// A line of a command file, split into words.
 struct SplitLine {
-    /// Takes the words of a file's last line.
-    void Set(const Port::File& file, std::string_view text) {
-        bytes = file.GetLineSize();
-        words.Empty();
-        words.ParseCommandLine(text.substr(0, text.find('\0')));
+    /// Takes the words of a file's next line, which may have to be read first.
+    /// \return false at the end of the file or on a failure.
+    bool Take(Port::File& file) {
+        std::string_view text;
+        return TakeUsual(file) || (file.NextLine(text) && Set(file, text));
+    }
+    /// Like `Take`, but only from the file's buffer.
+    /// \return false if the buffer does not contain the whole line.
+    bool TakeAtHand(Port::File& file) {
+        std::string_view text;
+        return TakeUsual(file) || (Port::LinesAtHand::Next(file, text) && Set(file, text));
     }
     /// Frees the memory of the words if the line was longer than `most` bytes; otherwise the next
     /// line uses it.
@@ -37,6 +44,21 @@ struct SplitLine {
     StringArray words;
     /// How many bytes the line takes in the file.
     std::uint64_t bytes = 0;
+
+private:
+    /// Takes the next line if it is a usual one and in the file's buffer, as nearly all are.
+    bool TakeUsual(Port::File& file) noexcept {
+        bytes = PackedLists::SplitUsualLine(Port::LinesAtHand::GetUnread(file), words);
+        Port::LinesAtHand::Skip(file, bytes);
+        return bytes != 0;
+    }
+    /// Takes the words of a file's last line. \return true.
+    bool Set(const Port::File& file, std::string_view text) {
+        bytes = file.GetLineSize();
+        words.Empty();
+        words.ParseCommandLine(text.substr(0, text.find('\0')));
+        return true;
+    }
 };
 
 /// Reads a file and splits its lines in a thread of its own, some batches of lines ahead. Nothing

@@ -20,6 +20,13 @@ public:
         line = file.TakeLine(length);
         return true;
     }
+    /// The text of the coming lines, as far as it is in the buffer.
+    static std::string_view GetUnread(const File& file) noexcept { return file.GetUnread(); }
+    /// Skips the first line of that text. \param bytes its size, line end included; 0 for none.
+    static void Skip(File& file, std::size_t bytes) noexcept {
+        file.lineStart_ += bytes;
+        file.lineSize_ = bytes;
+    }
     /// Whether the file is a regular one that goes on behind its buffer, as far as is known.
     static bool GoesOn(const File& file) noexcept {
         return file.isRegular_ && !file.atEnd_ && file.lineCapacity_ > 0 &&

@@ -68,3 +68,15 @@ TEST(EightBytes, LoadsEveryCharacterOfAShortText) {
         }
     }
 }
+
+TEST(EightBytes, ComparesEveryCharacter) {
+    for (std::size_t size = 0; size < 40; ++size) {
+        const std::string text(size, 'a');
+        EXPECT_TRUE(EightBytes::Equal(text.data(), std::string(text).data(), size)) << size;
+        for (std::size_t i = 0; i < size; ++i) {
+            std::string other = text;
+            other[i] = 'A';
+            EXPECT_FALSE(EightBytes::Equal(text.data(), other.data(), size)) << size << " " << i;
+        }
+    }
+}
