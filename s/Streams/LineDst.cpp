@@ -1,9 +1,11 @@
 #include "Streams/LineDst.h"
 
+#include "Containers/EightBytes.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
 #include <charconv>
+#include <cstdint>
 #include <string>
 #include <utility>
 
@@ -29,6 +31,55 @@ std::size_t FindLineFeed(std::string_view text) noexcept {
         }
     }
     return std::string_view::npos;
+}
+
+/// Whether a character is a line feed, or another control character, of which there are few.
+constexpr bool IsControl(char c) noexcept {
+    return static_cast<unsigned char>(c) < ' ';
+}
+
+/// Copies eight characters. \return false if there is a control character among them.
+inline bool CopyWord(const char* from, char* to) noexcept {
+    const std::uint64_t word = EightBytes::Load(from);
+    std::memcpy(to, &word, sizeof word);
+    return !EightBytes::HasBelow(word, ' ');
+}
+
+/// Copies a text. Most texts are so short that this is faster than a search and a call of `memcpy`.
+/// \return false, the text copied in part, if there is a control character in it.
+inline bool CopyPlain(std::string_view text, char* to) noexcept {
+    constexpr std::size_t Half = sizeof(std::uint32_t);
+    constexpr std::size_t Word = sizeof(std::uint64_t);
+    const char* const from = text.data();
+    const std::size_t size = text.size();
+    if (size <= 1) {
+        if (size == 0) {
+            return true;
+        }
+        *to = *from;
+        return !IsControl(*from);
+    }
+    // What follows may copy some characters twice.
+    if (size < Half) {
+        const char first = from[0];
+        const char second = from[1];
+        const char last = from[size - 1];
+        to[0] = first;
+        to[1] = second;
+        to[size - 1] = last;
+        return !IsControl(first) && !IsControl(second) && !IsControl(last);
+    }
+    if (size < Word) {
+        std::memcpy(to, from, Half);
+        std::memcpy(to + size - Half, from + size - Half, Half);
+        return !EightBytes::HasBelow(EightBytes::LoadShort(from, size), ' ');
+    }
+    for (std::size_t i = 0; i < size - Word; i += Word) {
+        if (!CopyWord(from + i, to + i)) {
+            return false;
+        }
+    }
+    return CopyWord(from + size - Word, to + size - Word);
 }
 
 } // namespace
@@ -74,19 +125,67 @@ void LineDst::Write(int number) {
     }
 }
 
-void LineDst::WriteView(std::string_view text) {
+void LineDst::WriteNewLine() {
     if (isTaking_) {
-        WritePiece(text);
+        BeginLine();
+        Append("\n");
+        StartLine();
     }
+}
+
+void LineDst::WriteView(std::string_view text) {
+    LineDst::WritePieces(&text, 1);
 }
 
 void LineDst::WritePieces(const std::string_view* pieces, std::size_t count) {
     if (isTaking_) {
-        std::for_each(pieces, pieces + count, [this](std::string_view text) { WritePiece(text); });
+        const std::string_view* const end = pieces + count;
+        const std::string_view* const rest = AppendPlain(pieces, end);
+        if (rest != end) {
+            WriteRest(rest, end);
+        }
     }
 }
 
-inline void LineDst::WritePiece(std::string_view text) {
+/// Appends texts while they have no control characters and the line stays within its width and the
+/// buffer. \return the first text that is left.
+inline const std::string_view* LineDst::AppendPlain(const std::string_view* piece,
+                                                    const std::string_view* end) noexcept {
+    constexpr std::size_t MostLevels = Width / IndentStep.size();
+    const auto levels = static_cast<std::size_t>(GetIndentLevel());
+    if (GetLine().size() > Width || capacity_ - lineStart_ < Width || levels > MostLevels ||
+        piece == end) {
+        return piece;
+    }
+    char* to = buffer_.get() + used_;
+    const char* const limit = buffer_.get() + lineStart_ + Width;
+    if (GetLine().empty()) {
+        if (piece->empty()) {
+            return piece;
+        }
+        for (std::size_t i = 0; i < levels; ++i) {
+            std::memcpy(to, IndentStep.data(), IndentStep.size());
+            to += IndentStep.size();
+        }
+    }
+    while (piece != end && piece->size() <= static_cast<std::size_t>(limit - to) &&
+           CopyPlain(*piece, to)) {
+        to += piece->size();
+        ++piece;
+    }
+    used_ = static_cast<std::size_t>(to - buffer_.get());
+    return piece;
+}
+
+/// Writes texts, of which the first one cannot be appended as it is.
+void LineDst::WriteRest(const std::string_view* piece, const std::string_view* end) {
+    while (piece != end) {
+        WritePiece(*piece);
+        piece = AppendPlain(piece + 1, end);
+    }
+}
+
+void LineDst::WritePiece(std::string_view text) {
     for (std::size_t end = FindLineFeed(text); end != std::string_view::npos;
          end = FindLineFeed(text)) {
         WriteToLineEnd(text.substr(0, end + 1));
