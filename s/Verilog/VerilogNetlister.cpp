@@ -8,6 +8,8 @@
 #include "Writers/DontCares.h"
 #include "Writers/NetlistPass.h"
 
+#include <optional>
+
 namespace Orn_Hdl {
 
 using std::string_view;
@@ -66,6 +68,7 @@ private:
     void WriteInstance(const Instance& instance);
     void WriteInstantiation(const Instance& instance);
     void WriteConnections(const Instance& instance, std::size_t column);
+    void WriteConnection(const Pin& pin, string_view before, string_view after);
     void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
 
     void WriteNextItem(std::size_t column);
@@ -292,22 +295,36 @@ void VerilogNetlister::Writer::WriteInstantiation(const Instance& instance) {
     const string_view name = instance.GetNameView();
     Put(out_, componentName, " ", name, " ", "(");
     WriteConnections(instance, componentName.size() + name.size() + InstanceHeadLength);
-    Put(out_, ")");
 }
 
+/// Writes the pins of an instance and the ")" behind them.
 void VerilogNetlister::Writer::WriteConnections(const Instance& instance, std::size_t column) {
-    bool isFirst = true;
-    for (const Pin* pin : instance.GetPinIterator()) {
-        if (!isFirst) {
-            WriteNextItem(column);
-        }
-        isFirst = false;
-        Put(out_, ".", Writers::GetBaseName(*pin), "(");
-        if (Signal* const signal = pin->GetSignal()) {
-            signal->AcceptSignal(connection_);
-        }
+    const Writers::Blanks indentation(options_.onePortPerLine ? column : 0);
+    const Iterator<Pin*> pins = instance.GetPinIterator();
+    if (pins.IsAtEnd()) {
         Put(out_, ")");
     }
+    string_view before;
+    for (auto place = pins.begin(); place != pins.end(); before = indentation.GetView()) {
+        const Pin& pin = **place;
+        const bool isLast = ++place == pins.end();
+        WriteConnection(pin, before, isLast ? ")" : ", ");
+        if (!isLast && options_.onePortPerLine) {
+            out_ << OutStream::NewLine;
+        }
+    }
+}
+
+void VerilogNetlister::Writer::WriteConnection(const Pin& pin, string_view before,
+                                               string_view after) {
+    const string_view name = Writers::GetBaseName(pin);
+    if (const std::optional<string_view> signal = connection_.GetPiece(pin.GetSignal())) {
+        Put(out_, before, ".", name, "(", *signal, ")", after);
+        return;
+    }
+    Put(out_, before, ".", name, "(");
+    pin.GetSignal()->AcceptSignal(connection_);
+    Put(out_, ")", after);
 }
 
 void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
@@ -333,7 +350,7 @@ void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
 void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
     Put(out_, ", ");
     if (options_.onePortPerLine) {
-        PutLine(out_);
+        out_ << OutStream::NewLine;
         Writers::WriteBlanks(out_, column);
     }
 }

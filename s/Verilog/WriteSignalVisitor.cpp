@@ -15,11 +15,24 @@ bool WriteSignalVisitor::IsWritten(const Signal& signal) const noexcept {
     return place_ == Assignment || !Writers::IsOpen(signal.GetNameView());
 }
 
-void WriteSignalVisitor::WriteInBrackets(string_view name) {
+std::optional<string_view> WriteSignalVisitor::GetPiece(const Signal* signal) {
+    const int type = signal == nullptr ? 0 : signal->GetSignalType();
+    if (type == SignalTypeScalar || type == SignalTypeBusIndex) {
+        const string_view name = IsWritten(*signal) ? signal->GetNameView() : string_view();
+        return type == SignalTypeScalar ? name : InBrackets(name);
+    }
+    return signal == nullptr ? std::optional(string_view()) : std::nullopt;
+}
+
+string_view WriteSignalVisitor::InBrackets(string_view name) {
     text_ = name;
     std::replace(text_.begin(), text_.end(), '(', '[');
     std::replace(text_.begin(), text_.end(), ')', ']');
-    Put(out_, string_view(text_));
+    return text_;
+}
+
+void WriteSignalVisitor::WriteInBrackets(string_view name) {
+    Put(out_, InBrackets(name));
 }
 
 void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
