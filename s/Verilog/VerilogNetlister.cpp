@@ -15,6 +15,7 @@ namespace Orn_Hdl {
 using std::string_view;
 using Writers::Put;
 using Writers::PutLine;
+using namespace std::literals::string_view_literals;
 
 namespace {
 
@@ -73,6 +74,7 @@ private:
 
     void WriteNextItem(std::size_t column);
     void WriteSemicolon() { PutLine(out_, ";"); }
+    void EndDeclaration(const Signal& signal);
     void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
     template <class WriteStatement>
     void WriteGenericAttrs(const Writers::GenericAttrs& attributes,
@@ -210,7 +212,7 @@ void VerilogNetlister::Writer::WritePortDeclarations(const std::vector<Signal*>&
     for (const Signal* port : ports) {
         statements_.WriteComment(port);
         statements_.WritePortDeclaration(port->GetNameView(), port->GetPortPolarity());
-        EndStatement(port->GetAttrIterator(), Names::BaseName(port->GetNameView()));
+        EndDeclaration(*port);
     }
     out_.WriteEmptyLine();
 }
@@ -223,7 +225,7 @@ void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*
 void VerilogNetlister::Writer::WriteSignalDeclaration(const Signal& signal) {
     statements_.WriteComment(&signal);
     statements_.WriteSignalDeclaration(signal.GetNameView());
-    EndStatement(signal.GetAttrIterator(), Names::BaseName(signal.GetNameView()));
+    EndDeclaration(signal);
 }
 
 void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists& signals) {
@@ -280,6 +282,10 @@ void VerilogNetlister::Writer::WriteInstances() {
 void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {
     WriteInstantiation(instance);
     Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+    if (effectiveAttrs_.IsEmpty()) {
+        WriteSemicolon();
+        return;
+    }
     EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
     WriteDefParam(instance, effectiveAttrs_);
 }
@@ -305,10 +311,11 @@ void VerilogNetlister::Writer::WriteConnections(const Instance& instance, std::s
         Put(out_, ")");
     }
     string_view before;
-    for (auto place = pins.begin(); place != pins.end(); before = indentation.GetView()) {
+    auto place = pins.begin();
+    for (bool isLast = pins.IsAtEnd(); !isLast; before = indentation.GetView()) {
         const Pin& pin = **place;
-        const bool isLast = ++place == pins.end();
-        WriteConnection(pin, before, isLast ? ")" : ", ");
+        isLast = ++place == pins.end();
+        WriteConnection(pin, before, isLast ? ")"sv : ", "sv);
         if (!isLast && options_.onePortPerLine) {
             out_ << OutStream::NewLine;
         }
@@ -355,13 +362,17 @@ void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
     }
 }
 
-/// Ends a statement whose object may have synthesis attributes.
+void VerilogNetlister::Writer::EndDeclaration(const Signal& signal) {
+    if (signal.HasAttrs()) {
+        EndStatement(signal.GetAttrIterator(), Names::BaseName(signal.GetNameView()));
+    } else {
+        WriteSemicolon();
+    }
+}
+
+/// Ends a statement whose object has attributes, which may be for synthesis.
 void VerilogNetlister::Writer::EndStatement(const Iterator<Attribute*>& attributes,
                                             string_view objectName) {
-    if (attributes.IsAtEnd()) {
-        WriteSemicolon();
-        return;
-    }
     if (dialect_.isSemicolonFirst) {
         WriteSemicolon();
     }

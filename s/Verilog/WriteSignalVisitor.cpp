@@ -11,17 +11,23 @@ namespace Orn_Hdl {
 using std::string_view;
 using Writers::Put;
 
-bool WriteSignalVisitor::IsWritten(const Signal& signal) const noexcept {
-    return place_ == Assignment || !Writers::IsOpen(signal.GetNameView());
+inline bool WriteSignalVisitor::IsWritten(string_view name) const noexcept {
+    return place_ == Assignment || !Writers::IsOpen(name);
 }
 
 std::optional<string_view> WriteSignalVisitor::GetPiece(const Signal* signal) {
-    const int type = signal == nullptr ? 0 : signal->GetSignalType();
-    if (type == SignalTypeScalar || type == SignalTypeBusIndex) {
-        const string_view name = IsWritten(*signal) ? signal->GetNameView() : string_view();
-        return type == SignalTypeScalar ? name : InBrackets(name);
+    if (signal == nullptr) {
+        return string_view();
     }
-    return signal == nullptr ? std::optional(string_view()) : std::nullopt;
+    const int type = signal->GetSignalType();
+    if (type != SignalTypeScalar && type != SignalTypeBusIndex) {
+        return std::nullopt;
+    }
+    const string_view name = signal->GetNameView();
+    if (!IsWritten(name)) {
+        return string_view();
+    }
+    return type == SignalTypeScalar ? name : InBrackets(name);
 }
 
 string_view WriteSignalVisitor::InBrackets(string_view name) {
@@ -46,13 +52,13 @@ void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
 }
 
 void WriteSignalVisitor::VisitScalarSignal(ScalarSignal* signal) {
-    if (IsWritten(*signal)) {
+    if (IsWritten(signal->GetNameView())) {
         Put(out_, signal->GetNameView());
     }
 }
 
 void WriteSignalVisitor::VisitBus(Bus* bus) {
-    if (!IsWritten(*bus)) {
+    if (!IsWritten(bus->GetNameView())) {
         return;
     }
     const string_view name = bus->GetNameView();
@@ -65,7 +71,7 @@ void WriteSignalVisitor::VisitBus(Bus* bus) {
 }
 
 void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
-    if (!IsWritten(*slice)) {
+    if (!IsWritten(slice->GetNameView())) {
         return;
     }
     const string_view name = slice->GetNameView();
@@ -79,13 +85,13 @@ void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
 }
 
 void WriteSignalVisitor::VisitBusIndex(BusIndex* bit) {
-    if (IsWritten(*bit)) {
+    if (IsWritten(bit->GetNameView())) {
         WriteInBrackets(bit->GetNameView());
     }
 }
 
 void WriteSignalVisitor::VisitCompoundBus(CompoundBus* compound) {
-    if (!IsWritten(*compound)) {
+    if (!IsWritten(compound->GetNameView())) {
         return;
     }
     Put(out_, "{");

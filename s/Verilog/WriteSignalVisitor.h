@@ -36,7 +36,7 @@ public:
     void VisitCompoundBus(CompoundBus* compound) override;
 
 private:
-    bool IsWritten(const Signal& signal) const noexcept;
+    bool IsWritten(std::string_view name) const noexcept;
     std::string_view InBrackets(std::string_view name);
     void WriteInBrackets(std::string_view name);
     void WriteBits(const Names::BusName& slice);
