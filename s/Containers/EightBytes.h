@@ -38,6 +38,11 @@ constexpr std::size_t FirstMarked(std::uint64_t marks) noexcept {
     return static_cast<unsigned>(std::countr_zero(marks)) / 8;
 }
 
+/// Whether one of the bytes is an ASCII character below `limit`, which is one itself.
+constexpr bool HasBelow(std::uint64_t text, char limit) noexcept {
+    return ((text - Each(static_cast<unsigned char>(limit))) & ~text & High) != 0;
+}
+
 /// The characters with letters in upper case.
 constexpr std::uint64_t ToUpper(std::uint64_t text) noexcept {
     return text - (MarkRange(text, 'a', 'z') >> 2U);

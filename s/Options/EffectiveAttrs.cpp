@@ -8,6 +8,9 @@ int GetEffectiveAttrs(const Instance& instance, PtrArray<Attribute*>& attributes
     attributes.Empty();
     const Component* const component = instance.GetComponent();
     const bool canHide = component != nullptr && component->HasAttrs();
+    if (!canHide && !instance.HasAttrs()) {
+        return 0;
+    }
     // Compares present names: a look-up in the instance finds a renamed attribute by its former
     // name.
     IStringPtrMap<const Attribute*> hiding;

@@ -44,6 +44,10 @@ void BranchDst::WriteLongLine(std::string_view text) {
     StartLine();
 }
 
+void PlainBranchDst::WriteNewLine() {
+    WriteView("\n");
+}
+
 void PlainBranchDst::Write(const char* text) {
     WriteView(Port::ViewOf(text));
 }

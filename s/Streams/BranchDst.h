@@ -38,6 +38,7 @@ class PlainBranchDst final : public BranchDst {
 public:
     using BranchDst::BranchDst;
 
+    void WriteNewLine() override;
     void Write(const char* text) override;
     void Write(int number) override;
     void WriteView(std::string_view text) override;

@@ -1,9 +1,11 @@
 #include "Streams/LineDst.h"
 
+#include "Containers/EightBytes.h"
 #include "Port/Ascii.h"
 
 #include <algorithm>
 #include <charconv>
+#include <cstdint>
 #include <string>
 #include <utility>
 
@@ -29,6 +31,63 @@ std::size_t FindLineFeed(std::string_view text) noexcept {
         }
     }
     return std::string_view::npos;
+}
+
+/// Whether a character, such as a letter or a digit, says nothing about where a line may be broken.
+constexpr bool IsOrdinary(char c) noexcept {
+    return c > '/' && c != '\\';
+}
+
+/// The first place from `place` on whose character is not ordinary, or the end of the text.
+std::size_t FindOther(std::string_view text, std::size_t place) noexcept {
+    while (place < text.size() && IsOrdinary(text[place])) {
+        ++place;
+    }
+    return place;
+}
+
+/// Whether a character is a line feed, or another control character, of which there are few.
+constexpr bool IsControl(char c) noexcept {
+    return static_cast<unsigned char>(c) < ' ';
+}
+
+/// Copies eight characters. \return false if there is a control character among them.
+inline bool CopyWord(const char* from, char* to) noexcept {
+    const std::uint64_t word = EightBytes::Load(from);
+    std::memcpy(to, &word, sizeof word);
+    return !EightBytes::HasBelow(word, ' ');
+}
+
+/// Copies a text of two or more characters, some of them twice. Most texts are so short that this
+/// is faster than a search and a call of `memcpy`. \return false, the text copied in part, if there
+/// is a control character in it.
+inline bool CopyPlain(std::string_view text, char* to) noexcept {
+    constexpr std::size_t Half = sizeof(std::uint32_t);
+    constexpr std::size_t Word = sizeof(std::uint64_t);
+    const char* const from = text.data();
+    const std::size_t size = text.size();
+    if (size < Half) {
+        const char first = from[0];
+        const char second = from[1];
+        const char last = from[size - 1];
+        to[0] = first;
+        to[1] = second;
+        to[size - 1] = last;
+        return !IsControl(first) && !IsControl(second) && !IsControl(last);
+    }
+    if (size < Word) {
+        const std::uint64_t both = EightBytes::LoadShort(from, size);
+        const std::uint64_t last = both >> 32U;
+        std::memcpy(to, &both, Half);
+        std::memcpy(to + size - Half, &last, Half);
+        return !EightBytes::HasBelow(both, ' ');
+    }
+    for (std::size_t i = 0; i < size - Word; i += Word) {
+        if (!CopyWord(from + i, to + i)) {
+            return false;
+        }
+    }
+    return CopyWord(from + size - Word, to + size - Word);
 }
 
 } // namespace
@@ -74,19 +133,81 @@ void LineDst::Write(int number) {
     }
 }
 
-void LineDst::WriteView(std::string_view text) {
+void LineDst::WriteNewLine() {
     if (isTaking_) {
-        WritePiece(text);
+        BeginLine();
+        Append("\n");
+        StartLine();
     }
+}
+
+void LineDst::WriteView(std::string_view text) {
+    LineDst::WritePieces(&text, 1);
 }
 
 void LineDst::WritePieces(const std::string_view* pieces, std::size_t count) {
     if (isTaking_) {
-        std::for_each(pieces, pieces + count, [this](std::string_view text) { WritePiece(text); });
+        const std::string_view* const end = pieces + count;
+        const std::string_view* const rest = AppendPlain(pieces, end);
+        if (rest != end) {
+            WriteRest(rest, end);
+        }
     }
 }
 
-inline void LineDst::WritePiece(std::string_view text) {
+/// Appends texts while they have no control characters and the line stays within its width and the
+/// buffer. \return the first text that is left.
+inline const std::string_view* LineDst::AppendPlain(const std::string_view* piece,
+                                                    const std::string_view* end) noexcept {
+    constexpr std::size_t MostLevels = Width / IndentStep.size();
+    const auto levels = static_cast<std::size_t>(GetIndentLevel());
+    if (GetLine().size() > Width || capacity_ - lineStart_ < Width || levels > MostLevels ||
+        piece == end) {
+        return piece;
+    }
+    char* to = buffer_.get() + used_;
+    const char* const limit = buffer_.get() + lineStart_ + Width;
+    if (GetLine().empty()) {
+        if (piece->empty()) {
+            return piece;
+        }
+        for (std::size_t i = 0; i < levels; ++i) {
+            std::memcpy(to, IndentStep.data(), IndentStep.size());
+            to += IndentStep.size();
+        }
+    }
+    for (; piece != end; ++piece) {
+        const std::size_t size = piece->size();
+        if (size > static_cast<std::size_t>(limit - to)) {
+            break;
+        }
+        if (size > 1) {
+            if (!CopyPlain(*piece, to)) {
+                break;
+            }
+        } else if (size == 1) {
+            if (IsControl(piece->front())) {
+                break;
+            }
+            *to = piece->front();
+        }
+        to += size;
+    }
+    used_ = static_cast<std::size_t>(to - buffer_.get());
+    return piece;
+}
+
+/// Writes texts, of which the first one cannot be appended as it is. This is no part of
+/// `WritePieces`, which is faster as long as it calls nothing.
+[[gnu::noinline]] void LineDst::WriteRest(const std::string_view* piece,
+                                          const std::string_view* end) {
+    while (piece != end) {
+        WritePiece(*piece);
+        piece = AppendPlain(piece + 1, end);
+    }
+}
+
+void LineDst::WritePiece(std::string_view text) {
     for (std::size_t end = FindLineFeed(text); end != std::string_view::npos;
          end = FindLineFeed(text)) {
         WriteToLineEnd(text.substr(0, end + 1));
@@ -143,9 +264,17 @@ void LineDst::Wrap() {
 }
 
 void LineDst::SearchBreak() {
-    BreakSearch& found = search_;
+    // A copy, which the compiler can keep in registers.
+    BreakSearch found = search_;
     const std::string_view line = GetLine();
     for (std::size_t& i = found.searched; i < line.size() && !found.isComment; ++i) {
+        if (IsOrdinary(line[i])) {
+            found.isEscaped = false;
+            i = FindOther(line, i + 1);
+            if (i == line.size()) {
+                break;
+            }
+        }
         const char c = line[i];
         const char before = i > 0 ? line[i - 1] : '\0';
         const bool isOutside = !found.inLiteral && !found.inEscapingLiteral;
@@ -161,6 +290,7 @@ void LineDst::SearchBreak() {
         found.isComment = (c == '/' && before == '/') || (c == '-' && before == '-') ||
                           (c == '*' && before == '/');
     }
+    search_ = found;
 }
 
 void LineDst::BreakAt(std::size_t position) {

@@ -20,6 +20,7 @@ public:
     LineDst& operator=(const LineDst&) = delete;
     ~LineDst() override;
 
+    void WriteNewLine() override;
     void Write(const char* text) override;
     void Write(int number) override;
     void WriteView(std::string_view text) override;
@@ -83,6 +84,9 @@ private:
         bool isComment = false;
     };
 
+    const std::string_view* AppendPlain(const std::string_view* piece,
+                                        const std::string_view* end) noexcept;
+    void WriteRest(const std::string_view* piece, const std::string_view* end);
     void WritePiece(std::string_view text);
     void WriteToLineEnd(std::string_view text);
     void BeginLine();

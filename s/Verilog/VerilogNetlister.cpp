@@ -8,11 +8,14 @@
 #include "Writers/DontCares.h"
 #include "Writers/NetlistPass.h"
 
+#include <optional>
+
 namespace Orn_Hdl {
 
 using std::string_view;
 using Writers::Put;
 using Writers::PutLine;
+using namespace std::literals::string_view_literals;
 
 namespace {
 
@@ -66,10 +69,12 @@ private:
     void WriteInstance(const Instance& instance);
     void WriteInstantiation(const Instance& instance);
     void WriteConnections(const Instance& instance, std::size_t column);
+    void WriteConnection(const Pin& pin, string_view before, string_view after);
     void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
 
     void WriteNextItem(std::size_t column);
     void WriteSemicolon() { PutLine(out_, ";"); }
+    void EndDeclaration(const Signal& signal);
     void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
     template <class WriteStatement>
     void WriteGenericAttrs(const Writers::GenericAttrs& attributes,
@@ -207,7 +212,7 @@ void VerilogNetlister::Writer::WritePortDeclarations(const std::vector<Signal*>&
     for (const Signal* port : ports) {
         statements_.WriteComment(port);
         statements_.WritePortDeclaration(port->GetNameView(), port->GetPortPolarity());
-        EndStatement(port->GetAttrIterator(), Names::BaseName(port->GetNameView()));
+        EndDeclaration(*port);
     }
     out_.WriteEmptyLine();
 }
@@ -220,7 +225,7 @@ void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*
 void VerilogNetlister::Writer::WriteSignalDeclaration(const Signal& signal) {
     statements_.WriteComment(&signal);
     statements_.WriteSignalDeclaration(signal.GetNameView());
-    EndStatement(signal.GetAttrIterator(), Names::BaseName(signal.GetNameView()));
+    EndDeclaration(signal);
 }
 
 void VerilogNetlister::Writer::WriteSignalAssignments(const Writers::SignalLists& signals) {
@@ -277,6 +282,10 @@ void VerilogNetlister::Writer::WriteInstances() {
 void VerilogNetlister::Writer::WriteInstance(const Instance& instance) {
     WriteInstantiation(instance);
     Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+    if (effectiveAttrs_.IsEmpty()) {
+        WriteSemicolon();
+        return;
+    }
     EndStatement(Iterator<Attribute*>(&effectiveAttrs_), instance.GetNameView());
     WriteDefParam(instance, effectiveAttrs_);
 }
@@ -292,22 +301,37 @@ void VerilogNetlister::Writer::WriteInstantiation(const Instance& instance) {
     const string_view name = instance.GetNameView();
     Put(out_, componentName, " ", name, " ", "(");
     WriteConnections(instance, componentName.size() + name.size() + InstanceHeadLength);
-    Put(out_, ")");
 }
 
+/// Writes the pins of an instance and the ")" behind them.
 void VerilogNetlister::Writer::WriteConnections(const Instance& instance, std::size_t column) {
-    bool isFirst = true;
-    for (const Pin* pin : instance.GetPinIterator()) {
-        if (!isFirst) {
-            WriteNextItem(column);
-        }
-        isFirst = false;
-        Put(out_, ".", Writers::GetBaseName(*pin), "(");
-        if (Signal* const signal = pin->GetSignal()) {
-            signal->AcceptSignal(connection_);
-        }
+    const Writers::Blanks indentation(options_.onePortPerLine ? column : 0);
+    const Iterator<Pin*> pins = instance.GetPinIterator();
+    if (pins.IsAtEnd()) {
         Put(out_, ")");
     }
+    string_view before;
+    auto place = pins.begin();
+    for (bool isLast = pins.IsAtEnd(); !isLast; before = indentation.GetView()) {
+        const Pin& pin = **place;
+        isLast = ++place == pins.end();
+        WriteConnection(pin, before, isLast ? ")"sv : ", "sv);
+        if (!isLast && options_.onePortPerLine) {
+            out_ << OutStream::NewLine;
+        }
+    }
+}
+
+void VerilogNetlister::Writer::WriteConnection(const Pin& pin, string_view before,
+                                               string_view after) {
+    const string_view name = Writers::GetBaseName(pin);
+    if (const std::optional<string_view> signal = connection_.GetPiece(pin.GetSignal())) {
+        Put(out_, before, ".", name, "(", *signal, ")", after);
+        return;
+    }
+    Put(out_, before, ".", name, "(");
+    pin.GetSignal()->AcceptSignal(connection_);
+    Put(out_, ")", after);
 }
 
 void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
@@ -333,18 +357,22 @@ void VerilogNetlister::Writer::WriteDefParam(const Instance& instance,
 void VerilogNetlister::Writer::WriteNextItem(std::size_t column) {
     Put(out_, ", ");
     if (options_.onePortPerLine) {
-        PutLine(out_);
+        out_ << OutStream::NewLine;
         Writers::WriteBlanks(out_, column);
     }
 }
 
-/// Ends a statement whose object may have synthesis attributes.
+void VerilogNetlister::Writer::EndDeclaration(const Signal& signal) {
+    if (signal.HasAttrs()) {
+        EndStatement(signal.GetAttrIterator(), Names::BaseName(signal.GetNameView()));
+    } else {
+        WriteSemicolon();
+    }
+}
+
+/// Ends a statement whose object has attributes, which may be for synthesis.
 void VerilogNetlister::Writer::EndStatement(const Iterator<Attribute*>& attributes,
                                             string_view objectName) {
-    if (attributes.IsAtEnd()) {
-        WriteSemicolon();
-        return;
-    }
     if (dialect_.isSemicolonFirst) {
         WriteSemicolon();
     }

@@ -11,15 +11,34 @@ namespace Orn_Hdl {
 using std::string_view;
 using Writers::Put;
 
-bool WriteSignalVisitor::IsWritten(const Signal& signal) const noexcept {
-    return place_ == Assignment || !Writers::IsOpen(signal.GetNameView());
+inline bool WriteSignalVisitor::IsWritten(string_view name) const noexcept {
+    return place_ == Assignment || !Writers::IsOpen(name);
 }
 
-void WriteSignalVisitor::WriteInBrackets(string_view name) {
+std::optional<string_view> WriteSignalVisitor::GetPiece(const Signal* signal) {
+    if (signal == nullptr) {
+        return string_view();
+    }
+    const int type = signal->GetSignalType();
+    if (type != SignalTypeScalar && type != SignalTypeBusIndex) {
+        return std::nullopt;
+    }
+    const string_view name = signal->GetNameView();
+    if (!IsWritten(name)) {
+        return string_view();
+    }
+    return type == SignalTypeScalar ? name : InBrackets(name);
+}
+
+string_view WriteSignalVisitor::InBrackets(string_view name) {
     text_ = name;
     std::replace(text_.begin(), text_.end(), '(', '[');
     std::replace(text_.begin(), text_.end(), ')', ']');
-    Put(out_, string_view(text_));
+    return text_;
+}
+
+void WriteSignalVisitor::WriteInBrackets(string_view name) {
+    Put(out_, InBrackets(name));
 }
 
 void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
@@ -33,13 +52,13 @@ void WriteSignalVisitor::WriteBits(const Names::BusName& slice) {
 }
 
 void WriteSignalVisitor::VisitScalarSignal(ScalarSignal* signal) {
-    if (IsWritten(*signal)) {
+    if (IsWritten(signal->GetNameView())) {
         Put(out_, signal->GetNameView());
     }
 }
 
 void WriteSignalVisitor::VisitBus(Bus* bus) {
-    if (!IsWritten(*bus)) {
+    if (!IsWritten(bus->GetNameView())) {
         return;
     }
     const string_view name = bus->GetNameView();
@@ -52,7 +71,7 @@ void WriteSignalVisitor::VisitBus(Bus* bus) {
 }
 
 void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
-    if (!IsWritten(*slice)) {
+    if (!IsWritten(slice->GetNameView())) {
         return;
     }
     const string_view name = slice->GetNameView();
@@ -66,13 +85,13 @@ void WriteSignalVisitor::VisitBusSlice(BusSlice* slice) {
 }
 
 void WriteSignalVisitor::VisitBusIndex(BusIndex* bit) {
-    if (IsWritten(*bit)) {
+    if (IsWritten(bit->GetNameView())) {
         WriteInBrackets(bit->GetNameView());
     }
 }
 
 void WriteSignalVisitor::VisitCompoundBus(CompoundBus* compound) {
-    if (!IsWritten(*compound)) {
+    if (!IsWritten(compound->GetNameView())) {
         return;
     }
     Put(out_, "{");

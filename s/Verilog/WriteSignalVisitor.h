@@ -5,6 +5,7 @@
 #include "Orn_Hdl/Model/Signals.h"
 #include "Orn_Hdl/Streams.h"
 
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -23,6 +24,11 @@ public:
 
     WriteSignalVisitor(OutStream& out, Place place) noexcept : out_(out), place_(place) {}
 
+    /// What is written for a signal if that is one piece of text, as for most signals; nothing for
+    /// another one. Null is no signal, for which the text is empty. The text is valid until the
+    /// next call.
+    std::optional<std::string_view> GetPiece(const Signal* signal);
+
     void VisitScalarSignal(ScalarSignal* signal) override;
     void VisitBus(Bus* bus) override;
     void VisitBusSlice(BusSlice* slice) override;
@@ -30,7 +36,8 @@ public:
     void VisitCompoundBus(CompoundBus* compound) override;
 
 private:
-    bool IsWritten(const Signal& signal) const noexcept;
+    bool IsWritten(std::string_view name) const noexcept;
+    std::string_view InBrackets(std::string_view name);
     void WriteInBrackets(std::string_view name);
     void WriteBits(const Names::BusName& slice);
 

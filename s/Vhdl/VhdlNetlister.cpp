@@ -26,7 +26,8 @@ namespace {
 
 constexpr string_view PortIndentation = "       ";      // 7 blanks
 constexpr string_view GenericIndentation = "         "; // 9 blanks
-constexpr string_view AssociationPerLine = ",\n          ";
+constexpr WritePortAssignmentVisitor::Separator AssociationPerLine = {",\n", "          "};
+constexpr WritePortAssignmentVisitor::Separator AssociationsInLine = {", ", ""};
 
 /// The keywords of a generic clause or a generic map.
 struct GenericForm {
@@ -157,7 +158,8 @@ class VhdlNetlister::Writer::Instances {
 public:
     Instances(OutStream& out, const Writer& whole)
         : statements_(out), writer_(out, statements_, whole),
-          portMap_(whole.options_.onePortPerLine ? AssociationPerLine : ", "sv, statements_, out) {}
+          portMap_(whole.options_.onePortPerLine ? AssociationPerLine : AssociationsInLine,
+                   statements_, out) {}
     Instances(const Instances&) = delete;
     Instances& operator=(const Instances&) = delete;
 
@@ -512,7 +514,9 @@ void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
 }
 
 void VhdlNetlister::Writer::WriteInstanceGenericMap(const Instance& instance) {
-    Writers::GetEffectiveAttrs(instance, effectiveAttrs_);
+    if (Writers::GetEffectiveAttrs(instance, effectiveAttrs_); effectiveAttrs_.IsEmpty()) {
+        return;
+    }
     genericAttrs_.Split(Iterator<Attribute*>(&effectiveAttrs_));
     Attribute* const init = FindPassedInit(genericAttrs_);
     if (init != nullptr) {

@@ -35,6 +35,12 @@ void WriteLines(OutStream& out, string_view keyword, const StringArray& items) {
     }
 }
 
+/// What pads a name and a blank to the width of the column.
+Writers::Blanks Padding(string_view name, int width) {
+    const std::size_t least = width > 0 ? static_cast<std::size_t>(width) : 0;
+    return Writers::Blanks(least > name.size() ? least - name.size() : 0);
+}
+
 /// Writes a bit string literal, without a base specifier if the value has no base and length.
 void WriteBitString(const BitVectorValue& value, OutStream& out) {
     if (value.HasBaseAndLength()) {
@@ -111,10 +117,7 @@ void VhdlStatements::WriteComment(const Object* object) {
 
 /// Writes a name and at least one blank, padded to the width of the column.
 void VhdlStatements::WritePadded(string_view name, int width) {
-    Put(out_, name, " ");
-    if (width > 0 && static_cast<std::size_t>(width) > name.size()) {
-        Writers::WriteBlanks(out_, static_cast<std::size_t>(width) - name.size());
-    }
+    Put(out_, name, " ", Padding(name, width).GetView());
 }
 
 void VhdlStatements::WriteSignalStatement(const char* name, int width) {
@@ -122,11 +125,8 @@ void VhdlStatements::WriteSignalStatement(const char* name, int width) {
 }
 
 void VhdlStatements::WriteSignalStatement(string_view name, int width) {
-    Put(out_, "signal", " ");
-    WritePadded(name, width);
-    Put(out_, ":", " ");
-    WriteStdLogic();
-    PutLine(out_, ";");
+    PutLine(out_, "signal", " ", name, " ", Padding(name, width).GetView(), ":", " ", "std_logic",
+            ";");
 }
 
 void VhdlStatements::WriteSignalVectorStatement(const char* name, int width) {

@@ -24,50 +24,51 @@ void WritePortAssignmentVisitor::WritePin(const Pin& pin) {
 }
 
 /// A formal of one bit is written as a bit, not as a range.
+/// \param name must outlive the association.
 void WritePortAssignmentVisitor::SetFormal(string_view name) {
     Names::BusName bus;
     const bool isBus = Names::ParseBus(name, bus);
     isScalarFormal_ = !isBus || bus.IsOneBit();
+    formal_ = name;
     if (isBus && bus.IsOneBit()) {
-        formal_ = Names::WithIndex(bus.base, bus.leftIndex);
-    } else {
-        formal_ = name;
+        formalText_ = Names::WithIndex(bus.base, bus.leftIndex);
+        formal_ = formalText_;
     }
 }
 
 /// Replaces the formal by a slice of it; only a formal with a range can be sliced.
 void WritePortAssignmentVisitor::SetFormalPiece(const std::string& formal, int start, int count) {
     if (Bus::IsBusName(formal.c_str())) {
-        SetFormal(Bus::GetBusSliceName(formal.c_str(), start, count));
+        formalText_ = Bus::GetBusSliceName(formal.c_str(), start, count).GetView();
+        SetFormal(formalText_);
     } else {
         SetFormal(formal);
     }
 }
 
-void WritePortAssignmentVisitor::WriteSeparator() {
-    Put(out_, pending_);
-    pending_ = separator_;
+void WritePortAssignmentVisitor::WriteFormal() {
+    const Separator separator = TakeSeparator();
+    if (isScalarFormal_) {
+        Put(out_, separator.after, separator.before, formal_, "=>");
+    } else {
+        Put(out_, separator.after, separator.before);
+        statements_.WriteBus(formal_);
+        Put(out_, "=>");
+    }
 }
 
-void WritePortAssignmentVisitor::WriteFormal() {
-    WriteSeparator();
-    if (isScalarFormal_) {
-        Put(out_, string_view(formal_));
-    } else {
-        statements_.WriteBus(string_view(formal_));
-    }
-    Put(out_, "=>");
+void WritePortAssignmentVisitor::WriteAssociation(string_view formal, string_view actual) {
+    const Separator separator = TakeSeparator();
+    Put(out_, separator.after, separator.before, formal, "=>", actual);
 }
 
 void WritePortAssignmentVisitor::WriteScalar(string_view actual) {
-    WriteSeparator();
-    Put(out_, string_view(formal_), "=>", (actual.empty() ? "open" : actual));
+    WriteAssociation(formal_, actual.empty() ? "open"sv : actual);
 }
 
 void WritePortAssignmentVisitor::WriteBus(string_view actual) {
     if (actual.empty()) {
-        WriteSeparator();
-        Put(out_, Names::BaseName(formal_), "=>", "open");
+        WriteAssociation(Names::BaseName(formal_), "open");
         return;
     }
     WriteFormal();
@@ -101,7 +102,7 @@ void WritePortAssignmentVisitor::VisitBusIndex(BusIndex* bit) {
 }
 
 void WritePortAssignmentVisitor::VisitCompoundBus(CompoundBus* compound) {
-    const std::string formal = formal_;
+    const std::string formal(formal_);
     int offset = 0;
     for (Signal* member : compound->GetBusMemberIterator()) {
         const int width = member->GetWidth();
@@ -119,7 +120,7 @@ bool WritePortAssignmentVisitor::WriteBitByBit(string_view slice) {
     if (!Names::ParseBus(slice, range) || !range.IsExpandable()) {
         return false;
     }
-    const std::string formal = formal_;
+    const std::string formal(formal_);
     int position = 0;
     SignalBits::ForEach(range, range.GetBits(), [this, &formal, &position](string_view bit) {
         SetFormalPiece(formal, position++, 1);

@@ -8,6 +8,7 @@
 
 #include <string>
 #include <string_view>
+#include <utility>
 
 namespace Orn_Hdl {
 
@@ -16,13 +17,21 @@ namespace Orn_Hdl {
 /// formal, the pin's name.
 class WritePortAssignmentVisitor : public SignalVisitor {
 public:
-    /// \param separator written between two associations; not owned.
-    WritePortAssignmentVisitor(std::string_view separator, VhdlStatements& statements,
+    /// What is written between two associations.
+    struct Separator {
+        /// Behind the former one.
+        std::string_view after;
+        /// In front of the next one.
+        std::string_view before;
+    };
+
+    /// \param separator its texts are not owned.
+    WritePortAssignmentVisitor(const Separator& separator, VhdlStatements& statements,
                                OutStream& out) noexcept
         : separator_(separator), statements_(statements), out_(out) {}
 
     /// Begins another port map, whose first association has no separator before it.
-    void BeginPortMap() noexcept { pending_ = std::string_view(); }
+    void BeginPortMap() noexcept { pending_ = Separator(); }
     /// Writes the associations of a pin, which may be open.
     void WritePin(const Pin& pin);
 
@@ -35,15 +44,19 @@ public:
 private:
     void SetFormal(std::string_view name);
     void SetFormalPiece(const std::string& formal, int start, int count);
-    void WriteSeparator();
+    Separator TakeSeparator() noexcept { return std::exchange(pending_, separator_); }
     void WriteScalar(std::string_view actual);
     void WriteBus(std::string_view actual);
     void WriteFormal();
+    void WriteAssociation(std::string_view formal, std::string_view actual);
     bool WriteBitByBit(std::string_view slice);
 
-    std::string_view separator_;
-    std::string_view pending_;
-    std::string formal_;
+    Separator separator_;
+    /// What is written in front of the next association.
+    Separator pending_;
+    /// The formal of the present association: a view of the pin's name, or of `formalText_`.
+    std::string_view formal_;
+    std::string formalText_;
     bool isScalarFormal_ = true;
     VhdlStatements& statements_;
     OutStream& out_;

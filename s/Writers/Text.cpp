@@ -5,6 +5,7 @@
 #include "Writers/OneLine.h"
 
 #include <algorithm>
+#include <array>
 #include <string>
 
 namespace Orn_Hdl::Writers {
@@ -28,13 +29,22 @@ std::string_view GetSingleBit(const BitVectorValue& value) {
     return !digits.empty() && digits.back() == '0' ? "0" : "1";
 }
 
-void WriteBlanks(OutStream& out, std::size_t count) {
-    static const std::string some(256, ' ');
-    if (count <= some.size()) {
-        out << std::string_view(some).substr(0, count);
+Blanks::Blanks(std::size_t count) {
+    static constexpr auto Some = [] {
+        std::array<char, 256> blanks{};
+        blanks.fill(' ');
+        return blanks;
+    }();
+    if (count > Some.size()) {
+        long_.assign(count, ' ');
+        view_ = long_;
     } else {
-        out << std::string_view(std::string(count, ' '));
+        view_ = std::string_view(Some.data(), count);
     }
+}
+
+void WriteBlanks(OutStream& out, std::size_t count) {
+    out << Blanks(count).GetView();
 }
 
 std::string InComment(Language language, std::string_view text) {

@@ -50,6 +50,21 @@ template <class... Pieces> void PutLine(OutStream& out, const Pieces&... pieces)
     out << OutStream::NewLine;
 }
 
+/// A text of blanks.
+class Blanks {
+public:
+    explicit Blanks(std::size_t count);
+    Blanks(const Blanks&) = delete;
+    Blanks& operator=(const Blanks&) = delete;
+
+    std::string_view GetView() const noexcept { return view_; }
+
+private:
+    std::string_view view_;
+    /// Holds the text if it is unusually long.
+    std::string long_;
+};
+
 /// Writes blanks as one piece of text, which is never broken.
 void WriteBlanks(OutStream& out, std::size_t count);
 

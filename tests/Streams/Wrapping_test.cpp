@@ -6,7 +6,9 @@
 #include <rapidcheck/gtest.h>
 
 #include <algorithm>
+#include <array>
 #include <string>
+#include <string_view>
 #include <vector>
 
 namespace {
@@ -122,11 +124,26 @@ private:
     int level_ = 0;
 };
 
-/// What a caller does to a stream: write a text or a number, indent, unindent, flush.
+/// What a caller does to a stream: write a text, several pieces or a number, indent, unindent,
+/// flush.
 struct Step {
-    enum Kind { Write, Number, In, Out, Flush } kind;
+    enum Kind { Write, Pieces, Number, In, Out, Flush } kind;
+    /// Of pieces, a "|" stands between two of them.
     std::string text;
 };
+
+constexpr std::size_t MostPieces = 5;
+
+/// The pieces of a step; those that it does not have are empty.
+std::array<std::string_view, MostPieces> PiecesOf(const Step& step) {
+    std::array<std::string_view, MostPieces> pieces;
+    std::string_view rest = step.text;
+    for (std::string_view& piece : pieces) {
+        piece = rest.substr(0, rest.find('|'));
+        rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
+    }
+    return pieces;
+}
 
 std::ostream& operator<<(std::ostream& out, const Step& step) {
     return out << step.kind << " <" << step.text << ">";
@@ -137,6 +154,11 @@ void Apply(const Step& step, OutStream& out) {
     case Step::Write:
         out << step.text.c_str();
         break;
+    case Step::Pieces: {
+        const auto pieces = PiecesOf(step);
+        out.WritePieces({pieces[0], pieces[1], pieces[2], pieces[3], pieces[4]});
+        break;
+    }
     case Step::Number:
         out << std::stoi(step.text);
         break;
@@ -157,6 +179,11 @@ void Apply(const Step& step, SlowFileText& slow) {
     case Step::Write:
     case Step::Number:
         slow.Write(step.text);
+        break;
+    case Step::Pieces:
+        for (const std::string_view piece : PiecesOf(step)) {
+            slow.Write(std::string(piece));
+        }
         break;
     case Step::In:
         slow.Indent();
@@ -254,14 +281,23 @@ void CompareAllSequences(const std::vector<Step>& alphabet, std::size_t length,
 }
 
 const std::vector<Step>& NastySteps() {
-    static const std::vector<Step> steps{{Step::Write, "a"},    {Step::Write, " "},
-                                         {Step::Write, ","},    {Step::Write, "\""},
-                                         {Step::Write, "-"},    {Step::Write, "/"},
-                                         {Step::Write, "*"},    {Step::Write, "b\nc"},
-                                         {Step::Write, "\n"},   {Step::Write, ", d"},
-                                         {Step::Number, "-12"}, {Step::Write, "\"e f,g\""},
-                                         {Step::Flush, ""},     {Step::Write, std::string(85, 'y')},
-                                         {Step::Write, "\\"}};
+    static const std::vector<Step> steps{{Step::Write, "a"},
+                                         {Step::Write, " "},
+                                         {Step::Write, ","},
+                                         {Step::Write, "\""},
+                                         {Step::Write, "-"},
+                                         {Step::Write, "/"},
+                                         {Step::Write, "*"},
+                                         {Step::Write, "b\nc"},
+                                         {Step::Write, "\n"},
+                                         {Step::Write, ", d"},
+                                         {Step::Number, "-12"},
+                                         {Step::Write, "\"e f,g\""},
+                                         {Step::Flush, ""},
+                                         {Step::Write, std::string(85, 'y')},
+                                         {Step::Write, "\\"},
+                                         {Step::Pieces, "|a|, |bc\n|"},
+                                         {Step::Pieces, "a|b||\"c,|d\te f"}};
     return steps;
 }
 
@@ -286,6 +322,34 @@ TEST(Wrapping, AgreesWithASlowLayoutOnAllShortSequencesOfLongPieces) {
                         4, {"", " ", "x y"});
 }
 
+TEST(Wrapping, AgreesWithASlowLayoutOnPiecesOfEveryLengthAtEveryPlace) {
+    Comparison comparison;
+    for (int level = 0; level < 30; ++level) {
+        for (std::size_t length = 0; length <= 82; ++length) {
+            for (const char* pieces : {"|", ",|", "x\n|", "\n|y", "|\x1F|\x80", " |0123456"}) {
+                comparison.Run({{Step::Pieces, Fill("a", length) + "|" + pieces},
+                                {Step::Pieces, "|" + Fill("", length / 2) + "|.|" + pieces},
+                                {Step::Write, "\n"}});
+            }
+        }
+        comparison.Run({{Step::In, ""}});
+    }
+    comparison.ExpectSameText();
+}
+
+TEST(Wrapping, FindsALineFeedAnywhereInAPiece) {
+    Comparison comparison;
+    comparison.Run({{Step::In, ""}});
+    for (std::size_t length = 1; length <= 40; ++length) {
+        for (std::size_t place = 0; place < length; ++place) {
+            std::string piece(length, 'a');
+            piece[place] = '\n';
+            comparison.Run({{Step::Pieces, "b|" + piece + "|c"}, {Step::Write, piece}});
+        }
+    }
+    comparison.ExpectSameText();
+}
+
 rc::Gen<std::vector<Step>> AnySteps(bool plain) {
     using namespace rc;
     const auto pieceOf = [](std::string alphabet) {
@@ -295,6 +359,10 @@ rc::Gen<std::vector<Step>> AnySteps(bool plain) {
         gen::map(pieceOf(plain ? "abcdef,; " : "abcd  ,\"\\-/*\n"), [](std::string text) {
             return Step{Step::Write, std::move(text)};
         });
+    const auto pieces =
+        gen::map(pieceOf(plain ? "abcdef,; |||" : "abcd  ,\"\\-/*\n\t||||"), [](std::string text) {
+            return Step{Step::Pieces, std::move(text)};
+        });
     const auto number = gen::map(gen::arbitrary<int>(), [](int value) {
         return Step{Step::Number, std::to_string(value)};
     });
@@ -302,8 +370,9 @@ rc::Gen<std::vector<Step>> AnySteps(bool plain) {
         gen::map(gen::element(Step::In, Step::Out, Step::Flush), [](Step::Kind kind) {
             return Step{kind, ""};
         });
-    const auto step = plain ? gen::weightedOneOf<Step>({{8, write}, {1, number}})
-                            : gen::weightedOneOf<Step>({{16, write}, {3, number}, {2, other}});
+    const auto step =
+        plain ? gen::weightedOneOf<Step>({{4, write}, {4, pieces}, {1, number}})
+              : gen::weightedOneOf<Step>({{8, write}, {8, pieces}, {3, number}, {2, other}});
     return gen::scale(3.0, gen::container<std::vector<Step>>(step));
 }
 
