@@ -1,21 +1,23 @@
 #include "Vhdl/InstanceLists.h"
 
+#include "HdlModel/Netlist/WalkAhead.h"
+
 namespace Orn_Hdl {
 
 InstanceLists::InstanceLists(const Netlist& netlist) {
-    for (const Instance* instance : netlist.GetInstanceIterator()) {
-        if (const Component* const component = instance->GetComponent()) {
+    WalkAhead(netlist.GetInstanceIterator(), [this](const Instance& instance) {
+        if (const Component* const component = instance.GetComponent()) {
             std::vector<const Instance*>& instances = instances_[component];
             if (instances.empty()) {
                 AddComponent(component);
             }
-            instances.push_back(instance);
+            instances.push_back(&instance);
         }
-        if (instance->HasAttrs()) {
-            attributed_.push_back(instance);
-            holders_.push_back(instance);
+        if (instance.HasAttrs()) {
+            attributed_.push_back(&instance);
+            holders_.push_back(&instance);
         }
-    }
+    });
 }
 
 void InstanceLists::AddComponent(const Component* component) {

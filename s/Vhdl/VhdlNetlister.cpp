@@ -93,8 +93,10 @@ private:
     class Instances;
 
     void Prepare();
+    int GetLongestAttrName(const Writers::SignalLists& signals,
+                           const InstanceLists& instances) const;
     void WriteHead();
-    void WriteEntity(const std::vector<Signal*>& ports);
+    void WriteEntity(const Writers::SignalLists& signals);
     void WriteArchitecture(const Writers::SignalLists& signals, const InstanceLists& instances);
     void WriteAttrDeclarations(const std::vector<Signal*>& signals, const InstanceLists& instances);
     void WriteSignalDeclaration(const Signal& signal, int width);
@@ -200,8 +202,9 @@ void VhdlNetlister::Writer::Write() {
     Prepare();
     const Writers::SignalLists signals(netlist_, Language::Vhdl);
     const InstanceLists instances(netlist_);
+    attrWidth_ = GetLongestAttrName(signals, instances);
     WriteHead();
-    WriteEntity(signals.ports);
+    WriteEntity(signals);
     WriteArchitecture(signals, instances);
     out_.WriteEmptyLine();
     if (!options_.vhdl.suppressConfiguration) {
@@ -212,12 +215,24 @@ void VhdlNetlister::Writer::Write() {
 
 void VhdlNetlister::Writer::Prepare() {
     netlist_.SetBoxTypeAttribute();
-    // Before the netlist is sorted, its objects follow one another in memory.
-    attrWidth_ = Netlist::GetLongestAttrName(&netlist_);
     NetlistPass::Prepare();
     if (!options_.vhdl.openPin) {
         netlist_.ConnectOpenPinToDummy();
     }
+}
+
+/// The length of the longest name of an attribute of the netlist or of an object in it.
+int VhdlNetlister::Writer::GetLongestAttrName(const Writers::SignalLists& signals,
+                                              const InstanceLists& instances) const {
+    int longest = std::max(Netlist::GetLongestAttrName(static_cast<AttributeHolder*>(&netlist_)),
+                           signals.longestAttr);
+    for (const Component* component : netlist_.GetComponentIterator()) {
+        longest = std::max(longest, Netlist::GetLongestAttrName(component));
+    }
+    for (const Instance* instance : instances.GetAttributed()) {
+        longest = std::max(longest, Netlist::GetLongestAttrName(instance));
+    }
+    return longest;
 }
 
 void VhdlNetlister::Writer::WriteHead() {
@@ -232,19 +247,19 @@ void VhdlNetlister::Writer::WriteHead() {
     }
 }
 
-void VhdlNetlister::Writer::WriteEntity(const std::vector<Signal*>& ports) {
+void VhdlNetlister::Writer::WriteEntity(const Writers::SignalLists& signals) {
     const string_view name = netlist_.GetNameView();
     PutLine(out_, "entity", " ", name, " ", "is");
     out_.Indent();
     WriteGenericMap(netlist_);
-    const int width = Netlist::GetLongestPortName(netlist_.GetSignalIterator());
+    const int width = signals.longestPort;
     // VHDL has no empty list of ports.
-    if (!ports.empty() || !options_.legal) {
-        WritePortClause(ports, [this, width](const Signal& port) {
+    if (!signals.ports.empty() || !options_.legal) {
+        WritePortClause(signals.ports, [this, width](const Signal& port) {
             statements_.WritePortStatement(port.GetNameView(), port.GetPortPolarity(), width);
         });
     }
-    for (const Signal* port : ports) {
+    for (const Signal* port : signals.ports) {
         WriteAttrDeclaration(port);
         WriteAttrAssignment(*port);
     }
@@ -283,14 +298,14 @@ void VhdlNetlister::Writer::WriteArchitecture(const Writers::SignalLists& signal
                                               const InstanceLists& instances) {
     PutLine(out_, "architecture", " BEHAVIORAL ", "of", " ", netlist_.GetNameView(), " ", "is");
     out_.Indent();
-    WriteAttrDeclarations(signals.internals, instances);
-    const int width = Netlist::GetLongestSignalName(netlist_.GetSignalIterator());
+    WriteAttrDeclarations(signals.attributed, instances);
+    const int width = signals.longestDeclared;
     WriteEachSignal(signals.internals,
                     [this, width](OutStream& out) { return Declarations(out, *this, width); });
     if (!options_.vhdl.suppressComponent) {
         WriteComponents(instances.GetComponents());
     }
-    WriteSynthesisAttrAssignment(signals.internals, instances.GetAttributed());
+    WriteSynthesisAttrAssignment(signals.attributed, instances.GetAttributed());
     out_.Unindent();
     PutLine(out_, "begin");
     out_.Indent();

@@ -1,5 +1,6 @@
 #include "Writers/NetlistPass.h"
 
+#include "HdlModel/Netlist/FeedBack.h"
 #include "HdlModel/Netlist/NetlistSorting.h"
 #include "Port/OrderedWork.h"
 
@@ -26,8 +27,12 @@ InstanceStarts::Cursor InstanceStarts::Find(std::size_t instance) const noexcept
 }
 
 void NetlistPass::Prepare() {
+    // As long as the netlist is not sorted, its signals follow one another in memory.
+    const bool mayNeedDummies = FeedBack::MayNeedDummies(netlist_);
     Sort();
-    netlist_.CreateVhdlDummySignals();
+    if (mayNeedDummies) {
+        netlist_.CreateVhdlDummySignals();
+    }
     passesInit_ = PassesInit(language_, netlist_);
 }
 

@@ -21,6 +21,20 @@ struct SignalLists {
     std::vector<Signal*> constants;
     /// The signals with aliases; each alias is assigned to its signal.
     std::vector<Signal*> aliased;
+    /// The `internals` with attributes.
+    std::vector<Signal*> attributed;
+
+    /// \{
+    /// The lengths of the longest names in the netlist, omitted signals included: of its ports and
+    /// their parts, of its declared signals, and of the attributes of its signals.
+    int longestPort = 0;
+    int longestDeclared = 0;
+    int longestAttr = 0;
+    /// \}
+
+private:
+    void Measure(const Signal& signal) noexcept;
+    void Add(Signal& signal);
 };
 
 /// Whether a signal of that name can be written: the name must not be empty and, in VHDL, not the

@@ -445,6 +445,24 @@ TEST(VhdlAttributes, OfPortsHaveTheirTypeAndTheWidthOfAll) {
         (Lines{"attribute KEEP          : boolean ;", "attribute KEEP of A : signal is TRUE;"}));
 }
 
+TEST(VhdlAttributes, HaveTheWidthOfTheLongestNameOfAnyHolder) {
+    const char* const additions[] = {
+        "ADD MODULE ATTRIBUTE LONG_NAME x", "ADD SIGNAL ATTRIBUTE N LONG_NAME x",
+        "ADD SIGNAL ATTRIBUTE D(2) LONG_NAME x", "ADD COMPONENT ATTRIBUTE UNUSED LONG_NAME x",
+        "ADD INSTANCE ATTRIBUTE U1 LONG_NAME x"};
+    for (const char* const addition : additions) {
+        EngineScript script(
+            "Use AttrType\nADD PORT A Input\nADD COMPONENT C\nADD COMPONENT UNUSED\n"
+            "ADD INSTANCE C U1\nADD SIGNAL N\nADD SIGNAL D(3:0)\nADD SIGNAL D(2)\n"
+            "ADD SIGNAL ATTRIBUTE A KEEP x\n"
+            "SET SIGNAL ATTRIBUTE OPTION A KEEP -SYNATTR=ASSIGN\n" +
+            std::string(addition));
+        EXPECT_EQ(LinesThatBegin(script.Vhdl(), "attribute ").front(),
+                  "attribute KEEP      : string ;")
+            << addition;
+    }
+}
+
 // Black boxes and configurations
 
 TEST(VhdlConfiguration, ListsTheInstancesOfEachComponent) {

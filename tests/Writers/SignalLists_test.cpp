@@ -46,6 +46,43 @@ TEST(SignalLists, HoldEachSignalWhereItIsWritten) {
     EXPECT_EQ(NamesOf(lists.aliased), Names{"net"});
 }
 
+/// Gives a holder an attribute of that name.
+template <class Holder> void AddAttr(Holder& holder, const char* name) {
+    holder.AddAttr(new AttributeString(name, "value"));
+}
+
+TEST(SignalLists, MeasureAllNamesAndHoldInternalSignalsWithAttributes) {
+    Netlist netlist;
+    ScalarSignal* const port = Added(netlist, new ScalarSignal("port"));
+    port->SetPortPolarity(Support::In);
+    AddAttr(*port, "ofPort");
+    Bus* const portBus = Added(netlist, new Bus("p(9:8)"));
+    portBus->SetPortPolarity(Support::Out);
+    BusSlice* const slice = Added(netlist, new BusSlice("p(00009:8)", portBus));
+    AddAttr(*slice, "ofAPart");
+    AddAttr(*Added(netlist, new ScalarSignal("long_net")), "net");
+    Added(netlist, new ScalarSignal("plain"));
+    const SignalLists lists(netlist, Language::Vhdl);
+    EXPECT_EQ(NamesOf(lists.attributed), Names{"long_net"});
+    EXPECT_EQ(lists.longestPort, Netlist::GetLongestPortName(netlist.GetSignalIterator()));
+    EXPECT_EQ(lists.longestDeclared, 8) << "long_net";
+    EXPECT_EQ(lists.longestAttr, 7) << "ofAPart";
+}
+
+TEST(SignalLists, MeasureSignalsThatCannotBeWritten) {
+    Netlist netlist;
+    ScalarSignal* const open = Added(netlist, new ScalarSignal("open"));
+    AddAttr(*open, "attribute");
+    Added(netlist, new ScalarSignal("a"));
+    const SignalLists lists(netlist, Language::Vhdl);
+    EXPECT_TRUE(lists.attributed.empty());
+    EXPECT_EQ(lists.longestPort, 0);
+    EXPECT_EQ(lists.longestDeclared, 4);
+    EXPECT_EQ(lists.longestAttr, 9);
+    open->SetPortPolarity(Support::In);
+    EXPECT_EQ(SignalLists(netlist, Language::Vhdl).longestPort, 4);
+}
+
 TEST(RunsAgainstParent, OnlyOfASliceOfSeveralBits) {
     Bus descending("d(3:0)");
     Bus ascending("a(0:3)");

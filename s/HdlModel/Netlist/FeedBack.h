@@ -11,6 +11,10 @@ namespace Orn_Hdl::FeedBack {
 /// `outputPorts` false, an input port is driven inside.
 void AddSignals(const Netlist& netlist, bool outputPorts, StringSet& names);
 
+/// Whether the writers have to look for such ports: false when there are none, and when no dummy
+/// signals were made before. The order of the netlist makes no difference.
+bool MayNeedDummies(const Netlist& netlist);
+
 /// Adds the base names of the output ports that have several drivers.
 void AddWiredOrOutputs(const Netlist& netlist, StringSet& names);
 

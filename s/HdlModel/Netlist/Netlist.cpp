@@ -412,15 +412,17 @@ void NetlistSorting::SortPart(Netlist& netlist, std::size_t part) {
         });
         return;
     }
+    // As long as the instances are not sorted they follow one another in memory, their pins behind
+    // them.
+    for (Instance* instance : netlist.GetInstanceIterator()) {
+        instance->SortPinName();
+    }
     own.components.SortBy([](PtrArray<Component*>& components) {
         SortNaturally(components, [](const Component*) { return 0; });
     });
     own.instances.SortBy([](PtrArray<Instance*>& instances) {
         SortNaturally(instances, [](const Instance*) { return 0; });
     });
-    for (Instance* instance : netlist.GetInstanceIterator()) {
-        instance->SortPinName();
-    }
 }
 
 void Netlist::SortNetlist() {
