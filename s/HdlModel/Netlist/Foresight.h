@@ -34,13 +34,17 @@ public:
 
     /// Takes note of a line that will be executed `Distance` lines later.
     template <class Index> void Note(const Index& index, const Hashes& names) noexcept {
-        coming_[noted_ % Distance] = names;
+        // Loops rather than a function that takes what to do: a compiler may find that a function
+        // that only fetches has no effect, and drop the call.
+        std::size_t place = noted_ % Distance;
+        coming_[place] = names;
         ++noted_;
-        for (const std::uint32_t hash : names) {
-            index.PrefetchPlace(hash);
+        for (std::size_t i = 0; i < CountNew(place); ++i) {
+            index.PrefetchPlace(names[i]);
         }
-        for (const std::uint32_t hash : coming_[(noted_ + Distance / 2) % Distance]) {
-            if (const auto* const object = index.GuessObject(hash)) {
+        place = (place + Distance / 2) % Distance;
+        for (std::size_t i = 0; i < CountNew(place); ++i) {
+            if (const auto* const object = index.GuessObject(coming_[place][i])) {
                 Port::Prefetch(object);
                 Port::Prefetch(reinterpret_cast<const char*>(object) + Port::CacheLine);
             }
@@ -49,6 +53,13 @@ public:
 
 private:
     static constexpr int LeastSize = 10000;
+
+    /// How many names of a line are to be fetched. Lines behind each other often have to do with
+    /// one instance, which the last name is; the first of them has it fetched.
+    std::size_t CountNew(std::size_t place) const noexcept {
+        const std::size_t before = (place + Distance - 1) % Distance;
+        return coming_[place].back() == coming_[before].back() ? 1 : 2;
+    }
 
     std::array<Hashes, Distance> coming_{};
     std::size_t noted_ = 0;
