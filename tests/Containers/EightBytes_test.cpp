@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <cstdint>
+#include <numeric>
 #include <string>
 
 using namespace Orn_Hdl;
@@ -66,6 +67,17 @@ TEST(EightBytes, LoadsEveryCharacterOfAShortText) {
             other[i] = 'b';
             EXPECT_NE(EightBytes::LoadShort(other.data(), size), whole) << size << " " << i;
         }
+    }
+}
+
+TEST(EightBytes, CopiesEveryCharacterAndNoOther) {
+    for (std::size_t size = 0; size < 40; ++size) {
+        std::string text(size, ' ');
+        std::iota(text.begin(), text.end(), '0');
+        std::string copy(size + 2, '.');
+        const char* const end = EightBytes::Copy(text.data(), size, copy.data() + 1);
+        EXPECT_EQ(copy, "." + text + ".");
+        EXPECT_EQ(end, copy.data() + 1 + size);
     }
 }
 

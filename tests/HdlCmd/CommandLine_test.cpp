@@ -281,6 +281,18 @@ TEST_F(CommandLine, APhraseThatIsPresentGetsTheNewCreator) {
     EXPECT_EQ(factory_.GetCommandCreator("NOOP"), &LoggedCommand::Create);
 }
 
+TEST_F(CommandLine, PhrasesThatBeginAlikeAreToldApart) {
+    factory_.AddCommandCreator("ABCD LONGWORDS1", &LoggedCommand::Create);
+    for (const char* line : {"abcd longwords1", "ABCD LONGWORDS1 x"}) {
+        EXPECT_NE(factory_.GetCommandCreator(line), nullptr) << line;
+    }
+    for (const char* line : {"ABCDABCD LONGWORDS1", "ABCD LONGWORDS2", "ABCD LONGWORD",
+                             "ABCD LONGWORDS", "ABCD LONGWORDS12", "ABC LONGWORDS1", "A LONGWORDS1",
+                             "BCDA LONGWORDS1", "'' LONGWORDS1"}) {
+        EXPECT_EQ(factory_.GetCommandCreator(line), nullptr) << line;
+    }
+}
+
 TEST_F(CommandLine, CopiesOfAFactoryShareItsPhrases) {
     CommandFactory assigned;
     assigned = factory_;
