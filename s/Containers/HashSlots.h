@@ -35,6 +35,20 @@ public:
         return GetTable().Probe(hash, matches)->Get();
     }
 
+    /// Like `Find`, but only in the slots that `PrefetchPlace` fetches. The table must not be
+    /// empty.
+    template <class Matches> Value FindInPlace(std::uint32_t hash, Matches matches) const noexcept {
+        const Table<const Slot> table = GetTable();
+        const Slot* slot = table.GetHome(hash);
+        for (std::size_t i = 0; i < Usual && !slot->IsFree(); ++i) {
+            if (matches(slot->hash, slot->Get())) {
+                return slot->Get();
+            }
+            slot = table.GetNext(slot);
+        }
+        return Value();
+    }
+
     /// Makes room for more values, so that adding them allocates nothing. At most three quarters of
     /// the slots are used.
     void MakeRoom(std::size_t more = 1) {
@@ -111,16 +125,19 @@ public:
         count_ = 0;
     }
 
-    /// Prefetches the slots of a hash. The table must not be empty.
+    /// Prefetches the slots in which a search for a hash ends as a rule. The table must not be
+    /// empty.
     void PrefetchPlace(std::uint32_t hash) const noexcept {
-        // A search ends within four slots as a rule, which may stand in two lines of the cache.
-        constexpr std::size_t Usual = 4;
+        // They may stand in two lines of the cache.
         const Slot* const home = GetTable().GetHome(hash);
         Port::Prefetch(home);
         Port::Prefetch(reinterpret_cast<const char*>(home) + Usual * sizeof(Slot) - 1);
     }
 
 private:
+    /// How many slots a search visits at most as a rule.
+    static constexpr std::size_t Usual = 4;
+
     /// Without padding, so that most look-ups read one cache line and a million names need little
     /// memory.
     struct Slot {

@@ -138,9 +138,10 @@ public:
 
     /// Prefetches the slots of a hash. The index must not be empty.
     void PrefetchPlace(std::uint32_t hash) const noexcept { slots_.PrefetchPlace(hash); }
-    /// An object whose name probably has this hash; null if there is none.
+    /// An object whose name probably has this hash; null if there is none in the prefetched slots.
+    /// The index must not be empty.
     const T* GuessObject(std::uint32_t hash) const noexcept {
-        return slots_.Find(hash, [hash](std::uint32_t other, const T*) {
+        return slots_.FindInPlace(hash, [hash](std::uint32_t other, const T*) {
             return ((other ^ hash) & NameKey::NameBits) == 0;
         });
     }
