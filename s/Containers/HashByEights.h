@@ -28,32 +28,53 @@ inline std::uint64_t MultiplyAndFold(std::uint64_t a, std::uint64_t b) noexcept 
 #endif
 }
 
-/// Processes eight characters a step; the last step overlaps with the one before it. With the names
-/// of a flattened hierarchy, 50 characters long, a replay takes 1.3 times as long if single
-/// characters are hashed. With names of 8 characters there is no difference.
+inline std::uint64_t MixEight(std::uint64_t hash, std::uint64_t word) noexcept {
+    constexpr std::uint64_t Factor = 0x9E3779B97F4A7C15U;
+    return MultiplyAndFold(hash ^ word, Factor);
+}
+
+/// Continues a hash with at most 16 characters.
+/// \param fold returns eight characters with equivalent ones unified, each at its position.
+template <class Fold>
+inline std::uint64_t MixTwoEights(std::uint64_t hash, std::string_view text, Fold fold) noexcept {
+    using namespace EightBytes;
+    constexpr std::size_t Step = sizeof(std::uint64_t);
+    if (text.size() > Step) {
+        hash = MixEight(hash, fold(Load(text.data())));
+    }
+    // The last step overlaps with the one before it.
+    return MixEight(hash, fold(text.size() < Step ? LoadShort(text.data(), text.size())
+                                                  : Load(text.data() + text.size() - Step)));
+}
+
+/// What `WideHashByEights` returns for a text of at most 16 characters. It is short enough to be
+/// inlined.
+template <class Fold>
+inline std::uint64_t WideHashByTwoEights(std::string_view text, Fold fold) noexcept {
+    return MixTwoEights(text.size() ^ HashSeed(), text, fold);
+}
+
+/// Processes eight characters a step. With the names of a flattened hierarchy, 50 characters long,
+/// a replay takes 1.3 times as long if single characters are hashed. With names of 8 characters
+/// there is no difference.
 /// \param fold returns eight characters with equivalent ones unified, each at its position.
 template <class Fold>
 inline std::uint64_t WideHashByEights(std::string_view name, Fold fold) noexcept {
-    using namespace EightBytes;
     constexpr std::size_t Step = sizeof(std::uint64_t);
-    constexpr std::uint64_t Factor = 0x9E3779B97F4A7C15U;
-    const char* text = name.data();
-    std::size_t left = name.size();
-    std::uint64_t hash = left ^ HashSeed();
-    const auto mix = [&hash, fold](std::uint64_t word) {
-        hash = MultiplyAndFold(hash ^ fold(word), Factor);
-    };
-    for (; left > Step; left -= Step, text += Step) {
-        mix(Load(text));
+    std::uint64_t hash = name.size() ^ HashSeed();
+    for (; name.size() > 2 * Step; name.remove_prefix(Step)) {
+        hash = MixEight(hash, fold(EightBytes::Load(name.data())));
     }
-    const bool isShort = name.size() < Step;
-    mix(isShort ? LoadShort(text, left) : Load(text + left - Step));
-    return hash;
+    return MixTwoEights(hash, name, fold);
+}
+
+inline std::uint32_t UpperHalf(std::uint64_t hash) noexcept {
+    return static_cast<std::uint32_t>(hash >> 32U);
 }
 
 /// The upper half of the wide hash.
 template <class Fold> inline std::uint32_t HashByEights(std::string_view name, Fold fold) noexcept {
-    return static_cast<std::uint32_t>(WideHashByEights(name, fold) >> 32U);
+    return UpperHalf(WideHashByEights(name, fold));
 }
 
 /// The hash of a text, letter case ignored.

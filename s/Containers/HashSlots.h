@@ -32,7 +32,21 @@ public:
         if (slots_.empty()) {
             return Value();
         }
-        return slots_[Probe(hash, matches)].Get();
+        return GetTable().Probe(hash, matches)->Get();
+    }
+
+    /// Like `Find`, but only in the slots that `PrefetchPlace` fetches. The table must not be
+    /// empty.
+    template <class Matches> Value FindInPlace(std::uint32_t hash, Matches matches) const noexcept {
+        const Table<const Slot> table = GetTable();
+        const Slot* slot = table.GetHome(hash);
+        for (std::size_t i = 0; i < Usual && !slot->IsFree(); ++i) {
+            if (matches(slot->hash, slot->Get())) {
+                return slot->Get();
+            }
+            slot = table.GetNext(slot);
+        }
+        return Value();
     }
 
     /// Makes room for more values, so that adding them allocates nothing. At most three quarters of
@@ -45,33 +59,43 @@ public:
         while ((count_ + more) * 4 > size * 3) {
             size += size / 2;
         }
-        Slots former(size);
-        former.swap(slots_);
-        for (const Slot& slot : former) {
+        Slots larger(size);
+        const Table<Slot> table{larger.data(), size};
+        for (const Slot& slot : slots_) {
             if (!slot.IsFree()) {
-                slots_[FreePlace(slot.hash)] = slot;
+                *table.Probe(slot.hash, IsNone) = slot;
             }
         }
+        slots_.swap(larger);
     }
 
     /// Adds a value.
     void Add(std::uint32_t hash, Value value) {
         MakeRoom();
-        slots_[FreePlace(hash)].Set(hash, value);
+        GetTable().Probe(hash, IsNone)->Set(hash, value);
         ++count_;
     }
 
-    /// Adds a value, or replaces the first one for which `matches(hash, value)` is true.
+    /// Adds a value, or replaces the first one for which `matches(hash, value)` is true. A value
+    /// that is added is found faster than the others: the values in its way move on by one slot.
     template <class Matches> void AddOrReplace(std::uint32_t hash, Value value, Matches matches) {
         MakeRoom();
-        Slot& slot = slots_[Probe(hash, matches)];
-        count_ += slot.IsFree() ? 1 : 0;
-        slot.Set(hash, value);
+        const Table<Slot> table = GetTable();
+        Slot* slot = table.Probe(hash, matches);
+        if (slot->IsFree()) {
+            ++count_;
+            for (Slot* const home = table.GetHome(hash); slot != home;) {
+                Slot* const before = table.GetBefore(slot);
+                *slot = *before;
+                slot = before;
+            }
+        }
+        slot->Set(hash, value);
     }
 
     /// Replaces a value that was added with this hash by another one.
     void Replace(std::uint32_t hash, Value former, Value value) noexcept {
-        slots_[PlaceOf(hash, former)].Set(hash, value);
+        GetTable().Probe(hash, Is{former})->Set(hash, value);
     }
 
     /// Removes a value that was added with this hash, if it is present.
@@ -79,18 +103,20 @@ public:
         if (slots_.empty()) {
             return;
         }
-        std::size_t hole = PlaceOf(hash, value);
-        if (slots_[hole].IsFree()) {
+        const Table<Slot> table = GetTable();
+        Slot* hole = table.Probe(hash, Is{value});
+        if (hole->IsFree()) {
             return;
         }
         // A value behind the hole whose search would stop at the hole moves into it.
-        for (std::size_t i = Next(hole); !slots_[i].IsFree(); i = Next(i)) {
-            if (Distance(Home(slots_[i].hash), i) >= Distance(hole, i)) {
-                slots_[hole] = slots_[i];
-                hole = i;
+        for (Slot* slot = table.GetNext(hole); !slot->IsFree(); slot = table.GetNext(slot)) {
+            if (table.GetDistance(table.GetHome(slot->hash), slot) >=
+                table.GetDistance(hole, slot)) {
+                *hole = *slot;
+                hole = slot;
             }
         }
-        slots_[hole] = Slot();
+        *hole = Slot();
         --count_;
     }
 
@@ -99,16 +125,19 @@ public:
         count_ = 0;
     }
 
-    /// Prefetches the slots of a hash. The table must not be empty.
+    /// Prefetches the slots in which a search for a hash ends as a rule. The table must not be
+    /// empty.
     void PrefetchPlace(std::uint32_t hash) const noexcept {
-        // A search ends within four slots as a rule, which may stand in two lines of the cache.
-        constexpr std::size_t Usual = 4;
-        const Slot* const home = &slots_[Home(hash)];
+        // They may stand in two lines of the cache.
+        const Slot* const home = GetTable().GetHome(hash);
         Port::Prefetch(home);
         Port::Prefetch(reinterpret_cast<const char*>(home) + Usual * sizeof(Slot) - 1);
     }
 
 private:
+    /// How many slots a search visits at most as a rule.
+    static constexpr std::size_t Usual = 4;
+
     /// Without padding, so that most look-ups read one cache line and a million names need little
     /// memory.
     struct Slot {
@@ -130,28 +159,45 @@ private:
 
     using Slots = std::vector<Slot, Allocator<Slot>>;
 
-    /// The slot of the wanted value, or the free slot that ends the search.
-    template <class Matches> std::size_t Probe(std::uint32_t hash, Matches matches) const noexcept {
-        std::size_t i = Home(hash);
-        while (!slots_[i].IsFree() && !matches(slots_[i].hash, slots_[i].Get())) {
-            i = Next(i);
-        }
-        return i;
-    }
-    std::size_t FreePlace(std::uint32_t hash) const noexcept {
-        return Probe(hash, [](std::uint32_t, Value) { return false; });
-    }
-    std::size_t PlaceOf(std::uint32_t hash, Value wanted) const noexcept {
-        return Probe(hash, [wanted](std::uint32_t, Value value) { return value == wanted; });
-    }
+    struct Is {
+        Value wanted;
 
-    std::size_t Home(std::uint32_t hash) const noexcept {
-        return static_cast<std::size_t>((std::uint64_t(hash & PlaceBits) * slots_.size()) >> 32);
-    }
-    std::size_t Next(std::size_t i) const noexcept { return i + 1 == slots_.size() ? 0 : i + 1; }
-    std::size_t Distance(std::size_t from, std::size_t to) const noexcept {
-        return to >= from ? to - from : to + slots_.size() - from;
-    }
+        bool operator()(std::uint32_t /*hash*/, Value value) const noexcept {
+            return value == wanted;
+        }
+    };
+    static bool IsNone(std::uint32_t /*hash*/, Value /*value*/) noexcept { return false; }
+
+    /// Where the slots are and how many. A copy of it need not be read again after every slot that
+    /// is written.
+    template <class AnySlot> struct Table {
+        AnySlot* begin;
+        std::size_t size;
+
+        AnySlot* GetHome(std::uint32_t hash) const noexcept {
+            return begin + ((std::uint64_t(hash & PlaceBits) * size) >> 32);
+        }
+        AnySlot* GetNext(AnySlot* slot) const noexcept {
+            return slot + 1 == begin + size ? begin : slot + 1;
+        }
+        AnySlot* GetBefore(AnySlot* slot) const noexcept {
+            return (slot == begin ? begin + size : slot) - 1;
+        }
+        std::size_t GetDistance(const Slot* from, const Slot* to) const noexcept {
+            return static_cast<std::size_t>(to - from) + (to >= from ? 0 : size);
+        }
+        /// The slot of the wanted value, or the free slot that ends the search.
+        template <class Matches>
+        AnySlot* Probe(std::uint32_t hash, Matches matches) const noexcept {
+            AnySlot* slot = GetHome(hash);
+            while (!slot->IsFree() && !matches(slot->hash, slot->Get())) {
+                slot = GetNext(slot);
+            }
+            return slot;
+        }
+    };
+    Table<Slot> GetTable() noexcept { return {slots_.data(), slots_.size()}; }
+    Table<const Slot> GetTable() const noexcept { return {slots_.data(), slots_.size()}; }
 
     Slots slots_;
     std::size_t count_ = 0;

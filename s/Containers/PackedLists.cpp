@@ -8,6 +8,9 @@ std::size_t PackedLists::SplitUsualLine(std::string_view text, StringArray& list
     constexpr std::size_t Step = sizeof(std::uint64_t);
     list.text_.clear();
     list.slots_.clear();
+    if (text.size() < Step) {
+        return 0;
+    }
     std::size_t start = 0;
     // \return false if there is no memory for the word.
     const auto addWord = [&list, &start](std::size_t end) {
@@ -20,7 +23,8 @@ std::size_t PackedLists::SplitUsualLine(std::string_view text, StringArray& list
         start = end + 1;
         return true;
     };
-    for (std::size_t i = 0; i + Step <= text.size(); i += Step) {
+    const std::size_t last = text.size() - Step;
+    for (std::size_t i = 0; i <= last; i += Step) {
         // Blanks, quotes, line ends and NUL, and some characters that need no attention.
         std::uint64_t marks = EightBytes::MarkUpTo(EightBytes::Load(text.data() + i), '\'');
         for (; marks != 0; marks &= marks - 1) {

@@ -52,17 +52,18 @@ inline bool EqualAsARule(std::string_view a, std::string_view b) noexcept {
            (EightBytes::Equal(a.data(), b.data(), a.size()) || EqualFolded(a, b));
 }
 
+/// Not 0 if there are characters that normalisation changes: square brackets, braces, angle
+/// brackets or the minus. Few names contain any. Some other rare characters count, too.
+inline std::uint64_t MarkUnusualNameChars(std::uint64_t text) noexcept {
+    using namespace EightBytes;
+    // All but the minus are from 0x1B to 0x1E in their five lower bits.
+    return MarkRange(text & Each(0x1F), '[' & 0x1F, '>' & 0x1F) | MarkRange(text, '-', '-');
+}
+
 /// Eight characters of a name as compared by look-ups.
 inline std::uint64_t FoldEightNameChars(std::uint64_t text) noexcept {
-    using namespace EightBytes;
-    // Few names contain characters that normalisation changes: brackets, which differ from braces
-    // in one bit, angle brackets and the minus. Ignoring the bit also selects a few other
-    // characters.
-    const std::uint64_t alike = text | Each(0x20);
-    const std::uint64_t marks =
-        MarkRange(alike, '{', '}') | MarkRange(alike, '<', '>') | MarkRange(alike, '-', '-');
-    if (marks == 0) {
-        return ToUpper(text);
+    if (MarkUnusualNameChars(text) == 0) {
+        return EightBytes::ToUpper(text);
     }
     std::uint64_t folded = 0;
     for (unsigned shift = 0; shift < 64; shift += 8) {
@@ -71,8 +72,21 @@ inline std::uint64_t FoldEightNameChars(std::uint64_t text) noexcept {
     return folded;
 }
 
+/// Like `HashName`, but slower for short names without unusual characters.
+std::uint32_t HashAnyName(std::string_view name) noexcept;
+
+/// The hash of a name as compared by look-ups.
 inline std::uint32_t HashName(std::string_view name) noexcept {
-    return HashByEights(name, FoldEightNameChars);
+    constexpr std::size_t Short = 16;
+    if (name.size() > Short) {
+        return HashAnyName(name);
+    }
+    std::uint64_t unusual = 0;
+    const std::uint64_t hash = WideHashByTwoEights(name, [&unusual](std::uint64_t text) {
+        unusual |= MarkUnusualNameChars(text);
+        return EightBytes::ToUpper(text);
+    });
+    return unusual == 0 ? UpperHalf(hash) : HashAnyName(name);
 }
 
 /// A name to look up, hashed once. Objects of different groups may have the same name. The group is
@@ -124,9 +138,10 @@ public:
 
     /// Prefetches the slots of a hash. The index must not be empty.
     void PrefetchPlace(std::uint32_t hash) const noexcept { slots_.PrefetchPlace(hash); }
-    /// An object whose name probably has this hash; null if there is none.
+    /// An object whose name probably has this hash; null if there is none in the prefetched slots.
+    /// The index must not be empty.
     const T* GuessObject(std::uint32_t hash) const noexcept {
-        return slots_.Find(hash, [hash](std::uint32_t other, const T*) {
+        return slots_.FindInPlace(hash, [hash](std::uint32_t other, const T*) {
             return ((other ^ hash) & NameKey::NameBits) == 0;
         });
     }

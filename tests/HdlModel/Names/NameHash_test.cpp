@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <set>
 #include <string>
+#include <string_view>
 
 namespace {
 
@@ -35,6 +36,24 @@ TEST(NameHash, IsOneForNamesThatALookUpTakesForEqual) {
     EXPECT_EQ(HashName("a_long_bus<31>"), HashName("A_Long_Bus{31}"));
     EXPECT_EQ(HashName("a_long_bus_of_more_than_two_steps[7]"),
               HashName("A_LONG_BUS_OF_MORE_THAN_TWO_STEPS(7)"));
+}
+
+TEST(NameHash, IsOneForEverySpelling) {
+    // Short and long names, the unusual characters at every place.
+    for (std::size_t size = 1; size < 40; ++size) {
+        for (std::size_t place = 0; place < size; ++place) {
+            for (const std::string_view alike : {"([{<", ")]}>", ":-", "xX"}) {
+                std::string name(size, 'a');
+                name[place] = alike.front();
+                std::string capitals(size, 'A');
+                const std::uint32_t hash = HashName(name);
+                for (const char c : alike) {
+                    capitals[place] = c;
+                    ASSERT_EQ(HashName(capitals), hash) << capitals;
+                }
+            }
+        }
+    }
 }
 
 /// How many hashes there are of all names of two characters, eleven long.
