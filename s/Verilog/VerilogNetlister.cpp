@@ -3,6 +3,7 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Signals/SignalBits.h"
 #include "Orn_Hdl/LegalNetlist.h"
+#include "Streams/DirectText.h"
 #include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/DontCares.h"
@@ -73,7 +74,7 @@ private:
     void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
 
     void WriteNextItem(std::size_t column);
-    void WriteSemicolon() { PutLine(out_, ";"); }
+    void WriteSemicolon() { text_.PutLine(";"); }
     void EndDeclaration(const Signal& signal);
     void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
     template <class WriteStatement>
@@ -81,6 +82,7 @@ private:
                            const WriteStatement& writeStatement);
 
     VerilogStatements& statements_;
+    DirectText text_{out_};
     const Dialect& dialect_;
     WriteSignalVisitor connection_;
     WriteSignalVisitor reference_;
@@ -299,7 +301,7 @@ void VerilogNetlister::Writer::WriteInstantiation(const Instance& instance) {
     }
     statements_.WriteComment(&instance);
     const string_view name = instance.GetNameView();
-    Put(out_, componentName, " ", name, " ", "(");
+    text_.Put(componentName, " ", name, " ", "(");
     WriteConnections(instance, componentName.size() + name.size() + InstanceHeadLength);
 }
 
@@ -317,7 +319,7 @@ void VerilogNetlister::Writer::WriteConnections(const Instance& instance, std::s
         isLast = ++place == pins.end();
         WriteConnection(pin, before, isLast ? ")"sv : ", "sv);
         if (!isLast && options_.onePortPerLine) {
-            out_ << OutStream::NewLine;
+            text_.EndLine();
         }
     }
 }
@@ -326,7 +328,7 @@ void VerilogNetlister::Writer::WriteConnection(const Pin& pin, string_view befor
                                                string_view after) {
     const string_view name = Writers::GetBaseName(pin);
     if (const std::optional<string_view> signal = connection_.GetPiece(pin.GetSignal())) {
-        Put(out_, before, ".", name, "(", *signal, ")", after);
+        text_.Put(before, ".", name, "(", *signal, ")", after);
         return;
     }
     Put(out_, before, ".", name, "(");
