@@ -53,7 +53,8 @@ private:
 
     void Prepare();
     void SetNameCase();
-    static void SetNameCase(Object& object, HdlOptions::VerilogOption::CaseType nameCase);
+    template <class Objects>
+    static void SetNameCase(const Objects& objects, HdlOptions::VerilogOption::CaseType nameCase);
 
     void WriteHead();
     void WriteModulelAndPorts(const std::vector<Signal*>& ports);
@@ -152,29 +153,26 @@ void VerilogNetlister::Writer::Prepare() {
 }
 
 void VerilogNetlister::Writer::SetNameCase() {
-    for (Signal* signal : netlist_.GetSignalIterator()) {
-        SetNameCase(*signal, options_.verilog.signalCase);
-    }
-    for (Component* component : netlist_.GetComponentIterator()) {
-        SetNameCase(*component, options_.verilog.componentCase);
-    }
-    for (Instance* instance : netlist_.GetInstanceIterator()) {
-        SetNameCase(*instance, options_.verilog.instanceCase);
-    }
+    SetNameCase(netlist_.GetSignalIterator(), options_.verilog.signalCase);
+    SetNameCase(netlist_.GetComponentIterator(), options_.verilog.componentCase);
+    SetNameCase(netlist_.GetInstanceIterator(), options_.verilog.instanceCase);
 }
 
-void VerilogNetlister::Writer::SetNameCase(Object& object,
+template <class Objects>
+void VerilogNetlister::Writer::SetNameCase(const Objects& objects,
                                            HdlOptions::VerilogOption::CaseType nameCase) {
     if (nameCase == HdlOptions::VerilogOption::DEFSULT) {
         return;
     }
-    Port::String name = object.GetName();
-    if (nameCase == HdlOptions::VerilogOption::UPPERCASE) {
-        name.MakeUpper();
-    } else {
-        name.MakeLower();
+    for (Object* object : objects) {
+        Port::String name = object->GetName();
+        if (nameCase == HdlOptions::VerilogOption::UPPERCASE) {
+            name.MakeUpper();
+        } else {
+            name.MakeLower();
+        }
+        object->SetName(name.CStr());
     }
-    object.SetName(name.CStr());
 }
 
 void VerilogNetlister::Writer::WriteHead() {
