@@ -5,6 +5,7 @@
 #include "Streams/LineDst.h"
 #include "Streams/StreamBranch.h"
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -19,8 +20,8 @@ public:
 
     /// Writes texts as separate pieces: lines are only broken between pieces.
     template <class... Texts> void Put(const Texts&... texts) {
-        if (lines_ == nullptr || !lines_->AppendPlain(std::string_view(texts)...)) {
-            out_.WritePieces({std::string_view(texts)...});
+        if (lines_ == nullptr || !lines_->AppendPlain(ViewOf(texts)...)) {
+            out_.WritePieces({ViewOf(texts)...});
         }
     }
     /// Writes texts as separate pieces, and a line end.
@@ -42,6 +43,12 @@ public:
     }
 
 private:
+    static std::string_view ViewOf(std::string_view text) noexcept { return text; }
+    /// A literal, whose length need not be counted.
+    template <std::size_t Size> static std::string_view ViewOf(const char (&text)[Size]) noexcept {
+        return std::string_view(text, Size - 1);
+    }
+
     OutStream& out_;
     /// Null if the destination is of another kind.
     LineDst* const lines_;

@@ -316,7 +316,7 @@ void VhdlNetlister::Writer::WriteSignalDeclaration(const Signal& signal, int wid
     if (signal.GetSignalType() == SignalTypeBus) {
         statements_.WriteSignalVectorStatement(signal.GetNameView(), width);
     } else {
-        statements_.WriteSignalStatement(signal.GetNameView(), width);
+        VhdlStatements::WriteSignalStatement(text_, signal.GetNameView(), width);
     }
 }
 
