@@ -224,7 +224,12 @@ void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*
 
 void VerilogNetlister::Writer::WriteSignalDeclaration(const Signal& signal) {
     statements_.WriteComment(&signal);
-    statements_.WriteSignalDeclaration(signal.GetNameView());
+    const string_view name = signal.GetNameView();
+    if (Names::BusName bus; Names::ParseBus(name, bus)) {
+        statements_.WriteWireBus(bus.base, bus.leftIndex, bus.rightIndex);
+    } else {
+        VerilogStatements::WriteWire(text_, name);
+    }
     EndDeclaration(signal);
 }
 
