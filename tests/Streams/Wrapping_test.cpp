@@ -324,8 +324,8 @@ TEST(Wrapping, AgreesWithASlowLayoutOnAllShortSequencesNearTheEdge) {
     CompareAllSequences(NastySteps(), 3,
                         {"", Fill("", 79), Fill("", 80), Fill("a b,", 78), Fill("a,b", 78),
                          Fill("a \"b c,d\"", 78), Fill("a,\"b ", 78), Fill("\"a ", 79),
-                         Fill("a \"b \\\" c", 78), Fill("a \"b \\\\\" c", 78),
-                         Fill("a -", 78) + "-", "   " + Fill("", 70)});
+                         Fill("a \"b \\c\" d", 78), Fill("a \"b \\\" c", 78),
+                         Fill("a \"b \\\\\" c", 78), Fill("a -", 78) + "-", "   " + Fill("", 70)});
 }
 
 TEST(Wrapping, AgreesWithASlowLayoutOnAllShortSequencesOfLongPieces) {
