@@ -38,6 +38,7 @@ class PlainBranchDst final : public BranchDst {
 public:
     using BranchDst::BranchDst;
 
+    bool IsLayingOut() const noexcept override { return false; }
     void WriteNewLine() override;
     void Write(const char* text) override;
     void Write(int number) override;

@@ -1,11 +1,10 @@
 #include "Streams/LineDst.h"
 
-#include "Containers/EightBytes.h"
 #include "Port/Ascii.h"
+#include "Streams/PlainText.h"
 
 #include <algorithm>
 #include <charconv>
-#include <cstdint>
 #include <string>
 #include <utility>
 
@@ -13,7 +12,6 @@ namespace Orn_Hdl {
 
 namespace {
 
-constexpr std::string_view IndentStep = "   ";
 constexpr int ContinuationLevels = 2;
 // The buffer grows with the text: small files need little memory, and large ones few calls of the
 // system.
@@ -44,50 +42,6 @@ std::size_t FindOther(std::string_view text, std::size_t place) noexcept {
         ++place;
     }
     return place;
-}
-
-/// Whether a character is a line feed, or another control character, of which there are few.
-constexpr bool IsControl(char c) noexcept {
-    return static_cast<unsigned char>(c) < ' ';
-}
-
-/// Copies eight characters. \return false if there is a control character among them.
-inline bool CopyWord(const char* from, char* to) noexcept {
-    const std::uint64_t word = EightBytes::Load(from);
-    std::memcpy(to, &word, sizeof word);
-    return !EightBytes::HasBelow(word, ' ');
-}
-
-/// Copies a text of two or more characters, some of them twice. Most texts are so short that this
-/// is faster than a search and a call of `memcpy`. \return false, the text copied in part, if there
-/// is a control character in it.
-inline bool CopyPlain(std::string_view text, char* to) noexcept {
-    constexpr std::size_t Half = sizeof(std::uint32_t);
-    constexpr std::size_t Word = sizeof(std::uint64_t);
-    const char* const from = text.data();
-    const std::size_t size = text.size();
-    if (size < Half) {
-        const char first = from[0];
-        const char second = from[1];
-        const char last = from[size - 1];
-        to[0] = first;
-        to[1] = second;
-        to[size - 1] = last;
-        return !IsControl(first) && !IsControl(second) && !IsControl(last);
-    }
-    if (size < Word) {
-        const std::uint64_t both = EightBytes::LoadShort(from, size);
-        const std::uint64_t last = both >> 32U;
-        std::memcpy(to, &both, Half);
-        std::memcpy(to + size - Half, &last, Half);
-        return !EightBytes::HasBelow(both, ' ');
-    }
-    for (std::size_t i = 0; i < size - Word; i += Word) {
-        if (!CopyWord(from + i, to + i)) {
-            return false;
-        }
-    }
-    return CopyWord(from + size - Word, to + size - Word);
 }
 
 } // namespace
@@ -134,10 +88,8 @@ void LineDst::Write(int number) {
 }
 
 void LineDst::WriteNewLine() {
-    if (isTaking_) {
-        BeginLine();
-        Append("\n");
-        StartLine();
+    if (isTaking_ && !EndLine("")) {
+        WriteToLineEnd("\n");
     }
 }
 
@@ -148,62 +100,36 @@ void LineDst::WriteView(std::string_view text) {
 void LineDst::WritePieces(const std::string_view* pieces, std::size_t count) {
     if (isTaking_) {
         const std::string_view* const end = pieces + count;
-        const std::string_view* const rest = AppendPlain(pieces, end);
+        const std::string_view* const rest = AppendPlainly(pieces, end);
         if (rest != end) {
             WriteRest(rest, end);
         }
     }
 }
 
-/// Appends texts while they have no control characters and the line stays within its width and the
-/// buffer. \return the first text that is left.
-inline const std::string_view* LineDst::AppendPlain(const std::string_view* piece,
-                                                    const std::string_view* end) noexcept {
-    constexpr std::size_t MostLevels = Width / IndentStep.size();
-    const auto levels = static_cast<std::size_t>(GetIndentLevel());
-    if (GetLine().size() > Width || capacity_ - lineStart_ < Width || levels > MostLevels ||
-        piece == end) {
+/// Appends texts, one by one, while that needs no more than a copy.
+/// \return the first text that is left.
+inline const std::string_view* LineDst::AppendPlainly(const std::string_view* piece,
+                                                      const std::string_view* end) noexcept {
+    char* to = piece == end ? nullptr : FindPlace(piece->size());
+    if (to == nullptr) {
         return piece;
     }
-    char* to = buffer_.get() + used_;
-    const char* const limit = buffer_.get() + lineStart_ + Width;
-    if (GetLine().empty()) {
-        if (piece->empty()) {
-            return piece;
-        }
-        for (std::size_t i = 0; i < levels; ++i) {
-            std::memcpy(to, IndentStep.data(), IndentStep.size());
-            to += IndentStep.size();
-        }
-    }
-    for (; piece != end; ++piece) {
-        const std::size_t size = piece->size();
-        if (size > static_cast<std::size_t>(limit - to)) {
-            break;
-        }
-        if (size > 1) {
-            if (!CopyPlain(*piece, to)) {
-                break;
-            }
-        } else if (size == 1) {
-            if (IsControl(piece->front())) {
-                break;
-            }
-            *to = piece->front();
-        }
-        to += size;
+    const char* const limit = buffer_.get() + std::min(lineStart_ + Width, capacity_);
+    for (; piece != end && piece->size() <= static_cast<std::size_t>(limit - to) &&
+           PlainText::Copy(*piece, to);
+         ++piece) {
+        to += piece->size();
     }
     used_ = static_cast<std::size_t>(to - buffer_.get());
     return piece;
 }
 
-/// Writes texts, of which the first one cannot be appended as it is. This is no part of
-/// `WritePieces`, which is faster as long as it calls nothing.
-[[gnu::noinline]] void LineDst::WriteRest(const std::string_view* piece,
-                                          const std::string_view* end) {
+/// Writes texts, of which the first one cannot be appended as it is.
+void LineDst::WriteRest(const std::string_view* piece, const std::string_view* end) {
     while (piece != end) {
         WritePiece(*piece);
-        piece = AppendPlain(piece + 1, end);
+        piece = AppendPlainly(piece + 1, end);
     }
 }
 

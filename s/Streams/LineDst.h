@@ -2,6 +2,7 @@
 #pragma once
 
 #include "Orn_Hdl/Streams.h"
+#include "Streams/PlainText.h"
 
 #include <cstddef>
 #include <cstring>
@@ -25,6 +26,37 @@ public:
     void Write(int number) override;
     void WriteView(std::string_view text) override;
     void WritePieces(const std::string_view* pieces, std::size_t count) override;
+
+    /// Whether texts are laid out in lines; otherwise they stay as they are.
+    virtual bool IsLayingOut() const noexcept { return true; }
+    /// Does what `WritePieces` does if that means to copy the texts: they stay within the line and
+    /// the buffer, and have no control characters. \return false, nothing written, otherwise.
+    template <class... Texts> bool AppendPlain(Texts... texts) noexcept {
+        char* to = isTaking_ ? FindPlace((texts.size() + ...)) : nullptr;
+        const auto append = [&to](std::string_view text) {
+            const bool isPlain = PlainText::Copy(text, to);
+            to += text.size();
+            return isPlain;
+        };
+        if (to == nullptr || !(append(texts) && ...)) {
+            return false;
+        }
+        used_ = static_cast<std::size_t>(to - buffer_.get());
+        return true;
+    }
+    /// Writes a text and a line end as one piece, if the line has begun and there is room in the
+    /// buffer. \return false, nothing written, otherwise.
+    bool EndLine(std::string_view text) noexcept {
+        char* const to = buffer_.get() + used_;
+        if (!isTaking_ || used_ == lineStart_ || text.size() >= capacity_ - used_ ||
+            !PlainText::Copy(text, to)) {
+            return false;
+        }
+        to[text.size()] = '\n';
+        used_ += text.size() + 1;
+        StartLine();
+        return true;
+    }
 
 protected:
     LineDst() noexcept = default;
@@ -70,6 +102,8 @@ protected:
     virtual void WriteLongLine(std::string_view text) = 0;
 
 private:
+    static constexpr std::string_view IndentStep = "   ";
+
     /// The state of the search for a position to break the line. The search continues where it
     /// stopped, so a line of any length is searched once.
     struct BreakSearch {
@@ -84,8 +118,26 @@ private:
         bool isComment = false;
     };
 
-    const std::string_view* AppendPlain(const std::string_view* piece,
-                                        const std::string_view* end) noexcept;
+    /// Where a text can be copied to: behind the line, or behind the indentation of an empty one,
+    /// which is written there but is no part of the line yet.
+    /// \return null if the line may have to be broken or the buffer is full, and for no text in an
+    /// empty line.
+    char* FindPlace(std::size_t size) const noexcept {
+        const std::size_t length = used_ - lineStart_;
+        const std::size_t levels = length > 0 ? 0 : static_cast<std::size_t>(GetIndentLevel());
+        const std::size_t needed = levels * IndentStep.size() + size;
+        if (length + needed > Width || needed > capacity_ - used_ || length + size == 0) {
+            return nullptr;
+        }
+        char* place = buffer_.get() + used_;
+        for (std::size_t i = 0; i < levels; ++i) {
+            std::memcpy(place, IndentStep.data(), IndentStep.size());
+            place += IndentStep.size();
+        }
+        return place;
+    }
+    const std::string_view* AppendPlainly(const std::string_view* piece,
+                                          const std::string_view* end) noexcept;
     void WriteRest(const std::string_view* piece, const std::string_view* end);
     void WritePiece(std::string_view text);
     void WriteToLineEnd(std::string_view text);

@@ -19,6 +19,11 @@ bool StreamBranch::IsWriting(const OutStream& trunk) noexcept {
     return trunk.GetDestination() != nullptr && trunk.GetDestination()->IsWriting();
 }
 
+LineDst* StreamBranch::FindLines(const OutStream& stream) noexcept {
+    auto* const lines = dynamic_cast<LineDst*>(stream.GetDestination());
+    return lines != nullptr && lines->IsLayingOut() ? lines : nullptr;
+}
+
 bool StreamBranch::Join(OutStream& trunk) const {
     return trunk.GetDestination()->GetIndentLevel() == indentLevel_ &&
            trunk.GetDestination()->TakeLines(branch_.GetText());

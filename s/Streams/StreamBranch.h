@@ -18,6 +18,8 @@ public:
     static std::unique_ptr<StreamBranch> Make(const OutStream& trunk);
     /// Whether text of the stream goes anywhere; false after a failure.
     static bool IsWriting(const OutStream& trunk) noexcept;
+    /// The destination of a stream if it lays texts out in lines; otherwise null.
+    static LineDst* FindLines(const OutStream& stream) noexcept;
 
     OutStream& GetStream() noexcept { return stream_; }
     /// Begins with a new text, which gets no longer than `limit`.

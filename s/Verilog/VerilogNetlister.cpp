@@ -3,6 +3,7 @@
 #include "HdlModel/Names/Names.h"
 #include "HdlModel/Signals/SignalBits.h"
 #include "Orn_Hdl/LegalNetlist.h"
+#include "Streams/DirectText.h"
 #include "Verilog/Dialects.h"
 #include "Verilog/WriteSignalVisitor.h"
 #include "Writers/DontCares.h"
@@ -52,9 +53,8 @@ private:
 
     void Prepare();
     void SetNameCase();
-    template <class T>
-    static void SetNameCase(const Iterator<T*>& objects,
-                            HdlOptions::VerilogOption::CaseType nameCase);
+    template <class Objects>
+    static void SetNameCase(const Objects& objects, HdlOptions::VerilogOption::CaseType nameCase);
 
     void WriteHead();
     void WriteModulelAndPorts(const std::vector<Signal*>& ports);
@@ -75,7 +75,7 @@ private:
     void WriteDefParam(const Instance& instance, const PtrArray<Attribute*>& attributes);
 
     void WriteNextItem(std::size_t column);
-    void WriteSemicolon() { PutLine(out_, ";"); }
+    void WriteSemicolon() { text_.PutLine(";"); }
     void EndDeclaration(const Signal& signal);
     void EndStatement(const Iterator<Attribute*>& attributes, string_view objectName);
     template <class WriteStatement>
@@ -83,6 +83,7 @@ private:
                            const WriteStatement& writeStatement);
 
     VerilogStatements& statements_;
+    DirectText text_{out_};
     const Dialect& dialect_;
     WriteSignalVisitor connection_;
     WriteSignalVisitor reference_;
@@ -157,13 +158,13 @@ void VerilogNetlister::Writer::SetNameCase() {
     SetNameCase(netlist_.GetInstanceIterator(), options_.verilog.instanceCase);
 }
 
-template <class T>
-void VerilogNetlister::Writer::SetNameCase(const Iterator<T*>& objects,
+template <class Objects>
+void VerilogNetlister::Writer::SetNameCase(const Objects& objects,
                                            HdlOptions::VerilogOption::CaseType nameCase) {
     if (nameCase == HdlOptions::VerilogOption::DEFSULT) {
         return;
     }
-    for (T* object : objects) {
+    for (Object* object : objects) {
         Port::String name = object->GetName();
         if (nameCase == HdlOptions::VerilogOption::UPPERCASE) {
             name.MakeUpper();
@@ -223,7 +224,12 @@ void VerilogNetlister::Writer::WriteSignalDeclarations(const std::vector<Signal*
 
 void VerilogNetlister::Writer::WriteSignalDeclaration(const Signal& signal) {
     statements_.WriteComment(&signal);
-    statements_.WriteSignalDeclaration(signal.GetNameView());
+    const string_view name = signal.GetNameView();
+    if (Names::BusName bus; Names::ParseBus(name, bus)) {
+        statements_.WriteWireBus(bus.base, bus.leftIndex, bus.rightIndex);
+    } else {
+        VerilogStatements::WriteWire(text_, name);
+    }
     EndDeclaration(signal);
 }
 
@@ -298,7 +304,7 @@ void VerilogNetlister::Writer::WriteInstantiation(const Instance& instance) {
     }
     statements_.WriteComment(&instance);
     const string_view name = instance.GetNameView();
-    Put(out_, componentName, " ", name, " ", "(");
+    text_.Put(componentName, " ", name, " ", "(");
     WriteConnections(instance, componentName.size() + name.size() + InstanceHeadLength);
 }
 
@@ -316,7 +322,7 @@ void VerilogNetlister::Writer::WriteConnections(const Instance& instance, std::s
         isLast = ++place == pins.end();
         WriteConnection(pin, before, isLast ? ")"sv : ", "sv);
         if (!isLast && options_.onePortPerLine) {
-            out_ << OutStream::NewLine;
+            text_.EndLine();
         }
     }
 }
@@ -325,7 +331,7 @@ void VerilogNetlister::Writer::WriteConnection(const Pin& pin, string_view befor
                                                string_view after) {
     const string_view name = Writers::GetBaseName(pin);
     if (const std::optional<string_view> signal = connection_.GetPiece(pin.GetSignal())) {
-        Put(out_, before, ".", name, "(", *signal, ")", after);
+        text_.Put(before, ".", name, "(", *signal, ")", after);
         return;
     }
     Put(out_, before, ".", name, "(");

@@ -3,6 +3,7 @@
 #include "HdlModel/Names/Names.h"
 #include "Options/LanguageTraits.h"
 #include "Port/Ascii.h"
+#include "Streams/DirectText.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
@@ -107,7 +108,12 @@ void VerilogStatements::WriteSignalDeclaration(string_view name) {
 }
 
 void VerilogStatements::WriteWire(string_view name) {
-    Put(out_, "wire", " ", name);
+    DirectText text(out_);
+    WriteWire(text, name);
+}
+
+void VerilogStatements::WriteWire(DirectText& text, string_view name) {
+    text.Put("wire", " ", name);
 }
 
 void VerilogStatements::WriteWireBus(string_view base, int msb, int lsb) {

@@ -11,6 +11,17 @@ namespace Orn_Hdl {
 using std::string_view;
 using Writers::Put;
 
+namespace {
+
+constexpr char InBracket(char c) noexcept {
+    if (c == '(') {
+        return '[';
+    }
+    return c == ')' ? ']' : c;
+}
+
+} // namespace
+
 inline bool WriteSignalVisitor::IsWritten(string_view name) const noexcept {
     return place_ == Assignment || !Writers::IsOpen(name);
 }
@@ -31,9 +42,8 @@ std::optional<string_view> WriteSignalVisitor::GetPiece(const Signal* signal) {
 }
 
 string_view WriteSignalVisitor::InBrackets(string_view name) {
-    text_ = name;
-    std::replace(text_.begin(), text_.end(), '(', '[');
-    std::replace(text_.begin(), text_.end(), ')', ']');
+    text_.resize(name.size());
+    std::transform(name.begin(), name.end(), text_.begin(), InBracket);
     return text_;
 }
 

@@ -5,6 +5,7 @@
 #include "HdlModel/Signals/SignalBits.h"
 #include "Orn_Hdl/LegalNetlist.h"
 #include "Port/Prefetch.h"
+#include "Streams/DirectText.h"
 #include "Vhdl/InstanceLists.h"
 #include "Vhdl/WritePortAssignmentVisitor.h"
 #include "Writers/DontCares.h"
@@ -26,8 +27,6 @@ namespace {
 
 constexpr string_view PortIndentation = "       ";      // 7 blanks
 constexpr string_view GenericIndentation = "         "; // 9 blanks
-constexpr WritePortAssignmentVisitor::Separator AssociationPerLine = {",\n", "          "};
-constexpr WritePortAssignmentVisitor::Separator AssociationsInLine = {", ", ""};
 
 /// The keywords of a generic clause or a generic map.
 struct GenericForm {
@@ -131,6 +130,7 @@ private:
     void WriteAttrAssignment(const Signal& signal);
 
     VhdlStatements& statements_;
+    DirectText text_{out_};
     /// The names of the attributes that this file has declared.
     StringSet& declared_;
     /// The width of the column of names in the declarations of attributes.
@@ -160,8 +160,7 @@ class VhdlNetlister::Writer::Instances {
 public:
     Instances(OutStream& out, const Writer& whole)
         : statements_(out), writer_(out, statements_, whole),
-          portMap_(whole.options_.onePortPerLine ? AssociationPerLine : AssociationsInLine,
-                   statements_, out) {}
+          portMap_(whole.options_.onePortPerLine, statements_, out) {}
     Instances(const Instances&) = delete;
     Instances& operator=(const Instances&) = delete;
 
@@ -332,7 +331,7 @@ void VhdlNetlister::Writer::WriteSignalDeclaration(const Signal& signal, int wid
     if (signal.GetSignalType() == SignalTypeBus) {
         statements_.WriteSignalVectorStatement(signal.GetNameView(), width);
     } else {
-        statements_.WriteSignalStatement(signal.GetNameView(), width);
+        VhdlStatements::WriteSignalStatement(text_, signal.GetNameView(), width);
     }
 }
 
@@ -511,20 +510,20 @@ void VhdlNetlister::Writer::WriteInstance(const Instance& instance,
                                           WritePortAssignmentVisitor& portMap) {
     const Component* const component = instance.GetComponent();
     statements_.WriteComment(&instance);
-    PutLine(out_, instance.GetNameView(), " : ",
-            component == nullptr ? string_view() : component->GetNameView());
+    text_.PutLine(instance.GetNameView(), " : ",
+                  component == nullptr ? string_view() : component->GetNameView());
     WriteInstanceGenericMap(instance);
     out_.Indent();
     const Iterator<Pin*> pins = instance.GetPinIterator();
     if (!pins.IsAtEnd()) {
-        Put(out_, "port", " ", "map", " (");
+        text_.Put("port", " ", "map", " (");
         portMap.BeginPortMap();
         for (const Pin* pin : pins) {
             portMap.WritePin(*pin);
         }
-        Put(out_, ")");
+        text_.Put(")");
     }
-    PutLine(out_, ";");
+    text_.PutLine(";");
     out_.Unindent();
 }
 
@@ -575,7 +574,7 @@ void VhdlNetlister::Writer::WriteConfigurationItem(const Component& component,
     constexpr std::size_t Lead = 8;
     for (std::size_t i = 0; i < instances.size(); ++i) {
         Port::Prefetch(instances[std::min(i + Lead, instances.size() - 1)]);
-        Put(out_, (i == 0 ? "" : ", "), instances[i]->GetNameView());
+        text_.Put((i == 0 ? ""sv : ", "sv), instances[i]->GetNameView());
     }
     PutLine(out_, " : ", component.GetNameView());
     out_.Indent();

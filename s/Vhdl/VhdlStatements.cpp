@@ -4,6 +4,7 @@
 #include "Options/LanguageTraits.h"
 #include "Orn_Hdl/Options.h"
 #include "Port/Ascii.h"
+#include "Streams/DirectText.h"
 #include "Writers/OneLine.h"
 #include "Writers/Text.h"
 
@@ -125,8 +126,13 @@ void VhdlStatements::WriteSignalStatement(const char* name, int width) {
 }
 
 void VhdlStatements::WriteSignalStatement(string_view name, int width) {
-    PutLine(out_, "signal", " ", name, " ", Padding(name, width).GetView(), ":", " ", "std_logic",
-            ";");
+    DirectText text(out_);
+    WriteSignalStatement(text, name, width);
+}
+
+void VhdlStatements::WriteSignalStatement(DirectText& text, string_view name, int width) {
+    const Writers::Blanks padding = Padding(name, width);
+    text.PutLine("signal", " ", name, " ", padding.GetView(), ":", " ", "std_logic", ";");
 }
 
 void VhdlStatements::WriteSignalVectorStatement(const char* name, int width) {

@@ -5,6 +5,7 @@
 #include "Writers/Text.h"
 
 #include <climits>
+#include <utility>
 
 namespace Orn_Hdl {
 
@@ -46,20 +47,31 @@ void WritePortAssignmentVisitor::SetFormalPiece(const std::string& formal, int s
     }
 }
 
-void WritePortAssignmentVisitor::WriteFormal() {
-    const Separator separator = TakeSeparator();
-    if (isScalarFormal_) {
-        Put(out_, separator.after, separator.before, formal_, "=>");
-    } else {
-        Put(out_, separator.after, separator.before);
-        statements_.WriteBus(formal_);
-        Put(out_, "=>");
+/// Ends the association in front of the next one, if there is any.
+/// \return what the next one begins with.
+string_view WritePortAssignmentVisitor::EndFormerAssociation() {
+    if (std::exchange(isFirst_, false)) {
+        return {};
     }
+    if (!isOnePerLine_) {
+        return ", ";
+    }
+    text_.EndLine(",");
+    return "          ";
+}
+
+void WritePortAssignmentVisitor::WriteFormal() {
+    Put(out_, EndFormerAssociation());
+    if (isScalarFormal_) {
+        Put(out_, formal_);
+    } else {
+        statements_.WriteBus(formal_);
+    }
+    Put(out_, "=>");
 }
 
 void WritePortAssignmentVisitor::WriteAssociation(string_view formal, string_view actual) {
-    const Separator separator = TakeSeparator();
-    Put(out_, separator.after, separator.before, formal, "=>", actual);
+    text_.Put(EndFormerAssociation(), formal, "=>", actual);
 }
 
 void WritePortAssignmentVisitor::WriteScalar(string_view actual) {

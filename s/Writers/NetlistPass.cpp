@@ -11,7 +11,7 @@ namespace Orn_Hdl::Writers {
 InstanceStarts::InstanceStarts(const Netlist& netlist) : distance_(GetRangeSizes().items) {
     const Iterator<Instance*> instances = netlist.GetInstanceIterator();
     for (Cursor place = instances.begin(); place != instances.end(); ++place) {
-        if (count_ % distance_ == 0) {
+        if (count_ == places_.size() * distance_) {
             places_.push_back(place);
         }
         ++count_;

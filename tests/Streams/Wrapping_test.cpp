@@ -1,5 +1,6 @@
 #include "Orn_Hdl/Streams.h"
 
+#include "Streams/DirectText.h"
 #include "Support/TemporaryFolder.h"
 
 #include <gtest/gtest.h>
@@ -13,6 +14,7 @@
 
 namespace {
 
+using Orn_Hdl::DirectText;
 using Orn_Hdl::OutStream;
 using Orn_Hdl::TextFileOutStream;
 using Orn_Hdl::TextMemOutStream;
@@ -125,10 +127,10 @@ private:
 };
 
 /// What a caller does to a stream: write a text, several pieces or a number, indent, unindent,
-/// flush.
+/// flush. Pieces and line ends can also go straight into its line.
 struct Step {
-    enum Kind { Write, Pieces, Number, In, Out, Flush } kind;
-    /// Of pieces, a "|" stands between two of them.
+    enum Kind { Write, Pieces, DirectPieces, DirectEnd, Number, In, Out, Flush } kind;
+    /// Of pieces, a "|" stands between two of them. Of an end, what stands in front of it.
     std::string text;
 };
 
@@ -159,6 +161,18 @@ void Apply(const Step& step, OutStream& out) {
         out.WritePieces({pieces[0], pieces[1], pieces[2], pieces[3], pieces[4]});
         break;
     }
+    case Step::DirectPieces: {
+        const auto pieces = PiecesOf(step);
+        DirectText(out).Put(pieces[0], pieces[1], pieces[2], pieces[3], pieces[4]);
+        break;
+    }
+    case Step::DirectEnd:
+        if (step.text.empty()) {
+            DirectText(out).EndLine();
+        } else {
+            DirectText(out).EndLine(step.text);
+        }
+        break;
     case Step::Number:
         out << std::stoi(step.text);
         break;
@@ -180,7 +194,11 @@ void Apply(const Step& step, SlowFileText& slow) {
     case Step::Number:
         slow.Write(step.text);
         break;
+    case Step::DirectEnd:
+        slow.Write(step.text + "\n");
+        break;
     case Step::Pieces:
+    case Step::DirectPieces:
         for (const std::string_view piece : PiecesOf(step)) {
             slow.Write(std::string(piece));
         }
@@ -297,7 +315,8 @@ const std::vector<Step>& NastySteps() {
                                          {Step::Write, std::string(85, 'y')},
                                          {Step::Write, "\\"},
                                          {Step::Pieces, "|a|, |bc\n|"},
-                                         {Step::Pieces, "a|b||\"c,|d\te f"}};
+                                         {Step::DirectPieces, "|a|, |b\"c|d"},
+                                         {Step::DirectEnd, ","}};
     return steps;
 }
 
@@ -305,8 +324,8 @@ TEST(Wrapping, AgreesWithASlowLayoutOnAllShortSequencesNearTheEdge) {
     CompareAllSequences(NastySteps(), 3,
                         {"", Fill("", 79), Fill("", 80), Fill("a b,", 78), Fill("a,b", 78),
                          Fill("a \"b c,d\"", 78), Fill("a,\"b ", 78), Fill("\"a ", 79),
-                         Fill("a \"b \\\" c", 78), Fill("a \"b \\\\\" c", 78),
-                         Fill("a -", 78) + "-", "   " + Fill("", 70)});
+                         Fill("a \"b \\c\" d", 78), Fill("a \"b \\\" c", 78),
+                         Fill("a \"b \\\\\" c", 78), Fill("a -", 78) + "-", "   " + Fill("", 70)});
 }
 
 TEST(Wrapping, AgreesWithASlowLayoutOnAllShortSequencesOfLongPieces) {
@@ -327,9 +346,11 @@ TEST(Wrapping, AgreesWithASlowLayoutOnPiecesOfEveryLengthAtEveryPlace) {
     for (int level = 0; level < 30; ++level) {
         for (std::size_t length = 0; length <= 82; ++length) {
             for (const char* pieces : {"|", ",|", "x\n|", "\n|y", "|\x1F|\x80", " |0123456"}) {
-                comparison.Run({{Step::Pieces, Fill("a", length) + "|" + pieces},
-                                {Step::Pieces, "|" + Fill("", length / 2) + "|.|" + pieces},
-                                {Step::Write, "\n"}});
+                for (const Step::Kind kind : {Step::Pieces, Step::DirectPieces}) {
+                    comparison.Run({{kind, Fill("a", length) + "|" + pieces},
+                                    {kind, "|" + Fill("", length / 2) + "|.|" + pieces},
+                                    {Step::DirectEnd, length % 2 == 0 ? "" : ","}});
+                }
             }
         }
         comparison.Run({{Step::In, ""}});
@@ -344,7 +365,11 @@ TEST(Wrapping, FindsALineFeedAnywhereInAPiece) {
         for (std::size_t place = 0; place < length; ++place) {
             std::string piece(length, 'a');
             piece[place] = '\n';
-            comparison.Run({{Step::Pieces, "b|" + piece + "|c"}, {Step::Write, piece}});
+            comparison.Run({{Step::Pieces, "b|" + piece + "|c"},
+                            {Step::Write, piece},
+                            {Step::DirectPieces, piece + "|d"},
+                            {Step::DirectPieces, "e|" + piece},
+                            {Step::DirectEnd, piece}});
         }
     }
     comparison.ExpectSameText();
@@ -361,15 +386,15 @@ rc::Gen<std::vector<Step>> AnySteps(bool plain) {
         });
     const auto pieces =
         gen::map(pieceOf(plain ? "abcdef,; |||" : "abcd  ,\"\\-/*\n\t||||"), [](std::string text) {
-            return Step{Step::Pieces, std::move(text)};
+            return Step{text.size() % 2 == 0 ? Step::Pieces : Step::DirectPieces, std::move(text)};
         });
     const auto number = gen::map(gen::arbitrary<int>(), [](int value) {
         return Step{Step::Number, std::to_string(value)};
     });
-    const auto other =
-        gen::map(gen::element(Step::In, Step::Out, Step::Flush), [](Step::Kind kind) {
-            return Step{kind, ""};
-        });
+    const auto other = gen::map(gen::element(Step::In, Step::Out, Step::Flush, Step::DirectEnd),
+                                [](Step::Kind kind) {
+                                    return Step{kind, ""};
+                                });
     const auto step =
         plain ? gen::weightedOneOf<Step>({{4, write}, {4, pieces}, {1, number}})
               : gen::weightedOneOf<Step>({{8, write}, {8, pieces}, {3, number}, {2, other}});

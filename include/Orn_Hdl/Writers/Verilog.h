@@ -18,6 +18,8 @@
 
 namespace Orn_Hdl {
 
+class DirectText;
+
 /// Writes single Verilog constructs (IEEE 1364-1995) with their parts unchanged. Unless a function
 /// says otherwise, it leaves the statement open: the caller writes ";" or continues it.
 class ORN_HDL_API VerilogStatements {
@@ -80,6 +82,7 @@ private:
     void WriteConstant(bool singleBit, const BitVectorValue& value);
     void WriteRange(int msb, int lsb);
     void WriteWire(std::string_view name);
+    ORN_HDL_LOCAL static void WriteWire(DirectText& text, std::string_view name);
     void WriteWireBus(std::string_view base, int msb, int lsb);
     void WriteQSNAttrStatement(std::string_view name, const char* instanceName,
                                std::string_view value);

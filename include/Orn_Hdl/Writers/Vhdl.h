@@ -15,6 +15,8 @@
 
 namespace Orn_Hdl {
 
+class DirectText;
+
 /// Writes single VHDL constructs (IEEE 1076-1993) with their parts unchanged. Unless a function
 /// says otherwise, it ends the line.
 class ORN_HDL_API VhdlStatements {
@@ -91,6 +93,8 @@ private:
     // Overloads for names that are not copied.
     void WriteBus(std::string_view name);
     void WriteSignalStatement(std::string_view name, int width);
+    ORN_HDL_LOCAL static void WriteSignalStatement(DirectText& text, std::string_view name,
+                                                   int width);
     void WriteSignalVectorStatement(std::string_view name, int width);
     void WritePortStatement(std::string_view name, const Polarity& polarity, int width);
     void WriteSignalAssignment(std::string_view left, std::string_view right);
