@@ -20,7 +20,7 @@ public:
     /// The text at `index`, closed by a NUL; empty if there is none.
     const char* Get(int index) const noexcept {
         const auto place = static_cast<std::size_t>(index);
-        return place < count_ ? room_.data() + starts_[place] : "";
+        return place < count_ ? &room_[starts_[place]] : "";
     }
 
     /// Raises a flag, an enumerator of the command's own flags.

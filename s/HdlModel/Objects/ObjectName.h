@@ -22,9 +22,11 @@ public:
     /// Copies the name; the details stay with their owner.
     ObjectName(const ObjectName& other) noexcept : ObjectName() { *this = other; }
     /// Copies the name; the details stay with their owner.
+    // A name that is assigned to itself moves to where it is.
+    // NOLINTNEXTLINE(bugprone-unhandled-self-assignment)
     ObjectName& operator=(const ObjectName& other) noexcept {
         if (length_ <= InlineCapacity && other.length_ <= InlineCapacity) {
-            std::memcpy(bytes_, other.bytes_, sizeof bytes_);
+            std::memmove(bytes_, other.bytes_, sizeof bytes_);
             length_ = other.length_;
         } else {
             CopyLong(other);
