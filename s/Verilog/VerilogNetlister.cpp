@@ -49,9 +49,7 @@ private:
 
     void Prepare();
     void SetNameCase();
-    template <class T>
-    static void SetNameCase(const Iterator<T*>& objects,
-                            HdlOptions::VerilogOption::CaseType nameCase);
+    static void SetNameCase(Object& object, HdlOptions::VerilogOption::CaseType nameCase);
 
     void WriteHead();
     void WriteModulelAndPorts(const std::vector<Signal*>& ports);
@@ -147,26 +145,29 @@ void VerilogNetlister::Writer::Prepare() {
 }
 
 void VerilogNetlister::Writer::SetNameCase() {
-    SetNameCase(netlist_.GetSignalIterator(), options_.verilog.signalCase);
-    SetNameCase(netlist_.GetComponentIterator(), options_.verilog.componentCase);
-    SetNameCase(netlist_.GetInstanceIterator(), options_.verilog.instanceCase);
+    for (Signal* signal : netlist_.GetSignalIterator()) {
+        SetNameCase(*signal, options_.verilog.signalCase);
+    }
+    for (Component* component : netlist_.GetComponentIterator()) {
+        SetNameCase(*component, options_.verilog.componentCase);
+    }
+    for (Instance* instance : netlist_.GetInstanceIterator()) {
+        SetNameCase(*instance, options_.verilog.instanceCase);
+    }
 }
 
-template <class T>
-void VerilogNetlister::Writer::SetNameCase(const Iterator<T*>& objects,
+void VerilogNetlister::Writer::SetNameCase(Object& object,
                                            HdlOptions::VerilogOption::CaseType nameCase) {
     if (nameCase == HdlOptions::VerilogOption::DEFSULT) {
         return;
     }
-    for (T* object : objects) {
-        Port::String name = object->GetName();
-        if (nameCase == HdlOptions::VerilogOption::UPPERCASE) {
-            name.MakeUpper();
-        } else {
-            name.MakeLower();
-        }
-        object->SetName(name.CStr());
+    Port::String name = object.GetName();
+    if (nameCase == HdlOptions::VerilogOption::UPPERCASE) {
+        name.MakeUpper();
+    } else {
+        name.MakeLower();
     }
+    object.SetName(name.CStr());
 }
 
 void VerilogNetlister::Writer::WriteHead() {
