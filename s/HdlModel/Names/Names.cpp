@@ -304,13 +304,13 @@ private:
 
 } // namespace
 
-NaturalKey::NaturalKey(int rank, string_view name, std::uint32_t index) noexcept : index_(index) {
+NaturalKey::NaturalKey(int rank, string_view name, std::uint32_t index) noexcept {
     NaturalKeyBytes bytes;
     if (bytes.AppendRank(rank)) {
         bytes.AppendName(name);
     }
-    first_ = bytes.Get<std::uint64_t>(0);
-    second_ = bytes.Get<std::uint32_t>(sizeof first_);
+    start_ = bytes.Get<std::uint64_t>(0);
+    restAndIndex_ = std::uint64_t(bytes.Get<std::uint32_t>(sizeof start_)) << 32U | index;
 }
 
 } // namespace Orn_Hdl::Names

@@ -139,26 +139,30 @@ int CompareNatural(std::string_view a, std::string_view b) noexcept;
 std::size_t SharedLength(std::string_view a, std::string_view b, std::size_t known) noexcept;
 
 /// An object to sort, in sixteen bytes: its index, and a key made of its rank and the start of its
-/// name. A smaller key sorts first, by rank, then in natural order; equal keys say nothing.
+/// name. A smaller key sorts first, by rank, then in natural order; equal keys say nothing of the
+/// order, and the one with the smaller index sorts first.
 class NaturalKey {
 public:
     NaturalKey(int rank, std::string_view name, std::uint32_t index) noexcept;
     /// The key of no name, which is yet to be replaced.
-    explicit NaturalKey(std::uint32_t index) noexcept : first_(0), second_(0), index_(index) {}
+    explicit NaturalKey(std::uint32_t index) noexcept : start_(0), restAndIndex_(index) {}
 
-    std::uint32_t GetIndex() const noexcept { return index_; }
+    std::uint32_t GetIndex() const noexcept { return static_cast<std::uint32_t>(restAndIndex_); }
 
-    friend bool operator!=(const NaturalKey& a, const NaturalKey& b) noexcept {
-        return a.first_ != b.first_ || a.second_ != b.second_;
+    /// Whether the keys are equal, whatever their indices.
+    friend bool AreEqual(const NaturalKey& a, const NaturalKey& b) noexcept {
+        return a.start_ == b.start_ && a.restAndIndex_ >> 32U == b.restAndIndex_ >> 32U;
     }
     friend bool operator<(const NaturalKey& a, const NaturalKey& b) noexcept {
-        return a.first_ != b.first_ ? a.first_ < b.first_ : a.second_ < b.second_;
+        return a.start_ != b.start_ ? a.start_ < b.start_ : a.restAndIndex_ < b.restAndIndex_;
     }
 
 private:
-    std::uint64_t first_;
-    std::uint32_t second_;
-    std::uint32_t index_;
+    /// The first eight bytes of the key.
+    std::uint64_t start_;
+    /// The other four bytes in the upper half, the index in the lower one: sorting compares both at
+    /// once.
+    std::uint64_t restAndIndex_;
 };
 
 } // namespace Orn_Hdl::Names

@@ -24,10 +24,13 @@ public:
         for (int i = 0; i < objects.GetSize(); ++i) {
             keys_.emplace_back(static_cast<std::uint32_t>(i));
         }
-        SortByKeys(keys_.begin(), keys_.end(), SharedOf(keys_.begin(), keys_.end(), 0));
+        SortByKeys(keys_.begin(), keys_.end(), 0);
     }
 
-    T* GetAt(int i) const noexcept { return ObjectOf(keys_[static_cast<std::size_t>(i)]); }
+    /// The index of the object that is the i-th in order.
+    int GetIndex(int i) const noexcept {
+        return static_cast<int>(keys_[static_cast<std::size_t>(i)].GetIndex());
+    }
 
 private:
     using Key = Names::NaturalKey;
@@ -48,18 +51,46 @@ private:
         return shared;
     }
 
-    /// Comparing the indices of equal names makes the order stable.
-    void SortByKeys(Place first, Place last, std::size_t shared) {
+    /// The length of the common prefix of some names of a range: most often that of all of them.
+    /// Names that follow one another in turn are told from each other by the odd step.
+    std::size_t GuessShared(Place first, Place last, std::size_t known) const noexcept {
+        constexpr std::ptrdiff_t Samples = 32;
+        const std::ptrdiff_t step = (last - first) / Samples | 1;
+        const std::string_view name = ObjectOf(*first)->GetNameView();
+        std::size_t shared = name.size();
+        for (std::ptrdiff_t i = step; i < last - first; i += step) {
+            const std::string_view other = ObjectOf(first[i])->GetNameView();
+            shared = std::min(shared, Names::SharedLength(name, other, known));
+        }
+        return shared;
+    }
+
+    /// Makes the keys of the parts of names behind a prefix.
+    /// \return false if it is not a common prefix of all names.
+    bool MakeKeys(Place first, Place last, std::size_t known, std::size_t shared) noexcept {
+        const std::string_view prefix = ObjectOf(*first)->GetNameView().substr(0, shared);
         for (Place key = first; key != last; ++key) {
             const T* const object = ObjectOf(*key);
-            *key = Key(rankOf_(object), object->GetNameView().substr(shared), key->GetIndex());
+            const std::string_view name = object->GetNameView();
+            if (Names::SharedLength(prefix, name, known) < shared) {
+                return false;
+            }
+            *key = Key(rankOf_(object), name.substr(shared), key->GetIndex());
         }
-        std::sort(first, last, [](const Key& a, const Key& b) {
-            return a != b ? a < b : a.GetIndex() < b.GetIndex();
-        });
+        return true;
+    }
+
+    /// \param known so many characters are known to be common to all names.
+    void SortByKeys(Place first, Place last, std::size_t known) {
+        std::size_t shared = GuessShared(first, last, known);
+        if (!MakeKeys(first, last, known, shared)) {
+            shared = SharedOf(first, last, known);
+            MakeKeys(first, last, known, shared);
+        }
+        std::sort(first, last);
         while (first != last) {
-            const Place next =
-                std::find_if(first + 1, last, [first](const Key& key) { return key != *first; });
+            const Place next = std::find_if(
+                first + 1, last, [first](const Key& key) { return !AreEqual(key, *first); });
             if (next - first > 1) {
                 SortEqual(first, next, shared);
             }
@@ -68,9 +99,8 @@ private:
     }
 
     void SortEqual(Place first, Place last, std::size_t known) {
-        const std::size_t shared = SharedOf(first, last, known);
-        if (shared > known) {
-            SortByKeys(first, last, shared);
+        if (SharedOf(first, last, known) > known) {
+            SortByKeys(first, last, known);
             return;
         }
         std::sort(first, last, [this](const Key& a, const Key& b) {
@@ -113,10 +143,10 @@ template <class T, class RankOf> void SortNaturally(PtrArray<T*>& objects, RankO
     if (sorted == size) {
         return;
     }
+    const NaturalKeySort byKeys(objects, rankOf, compare);
     const PtrArray<T*> unsorted = objects;
-    const NaturalKeySort byKeys(unsorted, rankOf, compare);
     for (int i = 0; i < size; ++i) {
-        Reordering::Place(objects, i, byKeys.GetAt(i));
+        Reordering::Place(objects, i, unsorted.GetAt(byKeys.GetIndex(i)));
     }
 }
 

@@ -175,6 +175,20 @@ TEST(NaturalOrder, AgreesWithASlowOrderOnGroupsOfLongNames) {
     EXPECT_TRUE(SortedAsSignals(names) == expected);
 }
 
+TEST(NaturalOrder, AgreesWithASlowOrderWhereASingleNameBeginsOtherwise) {
+    Names alike;
+    for (int i = 400; i > 0; --i) {
+        alike.push_back("top_of_core_" + std::to_string(i));
+    }
+    for (const std::size_t place : {0, 1, 2, 200, 399}) {
+        for (const char* const other : {"to", "top_of", "tOP_OG_1", "top_of_core", "zero"}) {
+            Names names = alike;
+            names[place] = other;
+            EXPECT_TRUE(SortedAsInstances(names) == SortedSlowly(names)) << other << ' ' << place;
+        }
+    }
+}
+
 TEST(NaturalOrder, ComesBehindTheOrderOfPolaritiesWhateverTheirValues) {
     constexpr int Least = std::numeric_limits<int>::min();
     constexpr int Most = std::numeric_limits<int>::max();
