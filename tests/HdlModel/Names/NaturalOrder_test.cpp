@@ -180,7 +180,7 @@ TEST(NaturalOrder, AgreesWithASlowOrderWhereASingleNameBeginsOtherwise) {
     for (int i = 400; i > 0; --i) {
         alike.push_back("top_of_core_" + std::to_string(i));
     }
-    for (const std::size_t place : {0, 1, 2, 200, 399}) {
+    for (const std::size_t place : {0U, 1U, 2U, 200U, 399U}) {
         for (const char* const other : {"to", "top_of", "tOP_OG_1", "top_of_core", "zero"}) {
             Names names = alike;
             names[place] = other;
