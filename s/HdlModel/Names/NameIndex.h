@@ -52,17 +52,9 @@ inline bool EqualAsARule(std::string_view a, std::string_view b) noexcept {
            (EightBytes::Equal(a.data(), b.data(), a.size()) || EqualFolded(a, b));
 }
 
-/// Not 0 if there are characters that normalisation changes: square brackets, braces, angle
-/// brackets or the minus. Few names contain any. Some other rare characters count, too.
-inline std::uint64_t MarkUnusualNameChars(std::uint64_t text) noexcept {
-    using namespace EightBytes;
-    // All but the minus are from 0x1B to 0x1E in their five lower bits.
-    return MarkRange(text & Each(0x1F), '[' & 0x1F, '>' & 0x1F) | MarkRange(text, '-', '-');
-}
-
 /// Eight characters of a name as compared by look-ups.
 inline std::uint64_t FoldEightNameChars(std::uint64_t text) noexcept {
-    if (MarkUnusualNameChars(text) == 0) {
+    if (Names::MarkUnusual(text) == 0) {
         return EightBytes::ToUpper(text);
     }
     std::uint64_t folded = 0;
@@ -83,7 +75,7 @@ inline std::uint32_t HashName(std::string_view name) noexcept {
     }
     std::uint64_t unusual = 0;
     const std::uint64_t hash = WideHashByTwoEights(name, [&unusual](std::uint64_t text) {
-        unusual |= MarkUnusualNameChars(text);
+        unusual |= Names::MarkUnusual(text);
         return EightBytes::ToUpper(text);
     });
     return unusual == 0 ? UpperHalf(hash) : HashAnyName(name);

@@ -10,10 +10,10 @@ using std::string_view;
 
 bool IsNormalized(string_view name) noexcept {
     using namespace EightBytes;
-    while (name.size() >= Count && !MayDiffer(Load(name.data()))) {
+    while (name.size() >= Count && MarkUnusual(Load(name.data())) == 0) {
         name.remove_prefix(Count);
     }
-    if (name.size() < Count && !MayDiffer(LoadShort(name.data(), name.size()))) {
+    if (name.size() < Count && MarkUnusual(LoadShort(name.data(), name.size())) == 0) {
         return true;
     }
     return std::all_of(name.begin(), name.end(), [](char c) { return Normalized(c) == c; });

@@ -33,14 +33,12 @@ constexpr char Normalized(char c) noexcept {
     }
 }
 
-/// Whether one of eight characters may differ from its normalised form: few names contain one that
-/// does. A few other characters are taken for such ones.
-constexpr bool MayDiffer(std::uint64_t eight) noexcept {
+/// Not 0 if there are characters that normalisation changes: square brackets, braces, angle
+/// brackets or the minus. Few names contain any. Some other rare characters count, too.
+inline std::uint64_t MarkUnusual(std::uint64_t eight) noexcept {
     using namespace EightBytes;
-    // Brackets differ from braces in one bit.
-    const std::uint64_t alike = eight | Each(0x20);
-    return (MarkRange(alike, '{', '}') | MarkRange(alike, '<', '>') | MarkRange(alike, '-', '-')) !=
-           0;
+    // All but the minus are from 0x1B to 0x1E in their five lower bits.
+    return MarkRange(eight & Each(0x1F), '[' & 0x1F, '>' & 0x1F) | MarkRange(eight, '-', '-');
 }
 
 bool IsNormalized(std::string_view name) noexcept;

@@ -151,6 +151,18 @@ void ExpectNormalised(const std::string& text) {
         << text;
 }
 
+TEST(NameRules, EveryCharacterIsNormalisedAtEveryPlace) {
+    for (std::size_t size = 1; size <= 20; ++size) {
+        for (std::size_t place = 0; place < size; ++place) {
+            for (int c = 1; c < 256; ++c) {
+                std::string text(size, 'n');
+                text[place] = static_cast<char>(c);
+                ExpectNormalised(text);
+            }
+        }
+    }
+}
+
 TEST(NameRules, HoldForAllShortTexts) {
     Support::ForEachText("A1(:),+", 6, ExpectRulesHold);
 }
