@@ -17,11 +17,12 @@ template <class T, class Visit> void WalkAhead(const Iterator<T*>& objects, cons
         ++coming;
     }
     for (T* object : objects) {
-        const char* const start = reinterpret_cast<const char*>(*coming);
-        for (std::size_t offset = 0; offset < sizeof(T); offset += Port::CacheLine) {
-            Port::Prefetch(start + offset);
+        if (const T* const next = *coming) {
+            for (std::size_t offset = 0; offset < sizeof(T); offset += Port::CacheLine) {
+                Port::Prefetch(reinterpret_cast<const char*>(next) + offset);
+            }
+            ++coming;
         }
-        ++coming;
         visit(*object);
     }
 }
