@@ -38,13 +38,12 @@ inline std::uint64_t MixEight(std::uint64_t hash, std::uint64_t word) noexcept {
 template <class Fold>
 inline std::uint64_t MixTwoEights(std::uint64_t hash, std::string_view text, Fold fold) noexcept {
     using namespace EightBytes;
-    constexpr std::size_t Step = sizeof(std::uint64_t);
-    if (text.size() > Step) {
+    if (text.size() > Count) {
         hash = MixEight(hash, fold(Load(text.data())));
     }
     // The last step overlaps with the one before it.
-    return MixEight(hash, fold(text.size() < Step ? LoadShort(text.data(), text.size())
-                                                  : Load(text.data() + text.size() - Step)));
+    return MixEight(hash, fold(text.size() < Count ? LoadShort(text.data(), text.size())
+                                                   : Load(text.data() + text.size() - Count)));
 }
 
 /// What `WideHashByEights` returns for a text of at most 16 characters. It is short enough to be
@@ -60,10 +59,10 @@ inline std::uint64_t WideHashByTwoEights(std::string_view text, Fold fold) noexc
 /// \param fold returns eight characters with equivalent ones unified, each at its position.
 template <class Fold>
 inline std::uint64_t WideHashByEights(std::string_view name, Fold fold) noexcept {
-    constexpr std::size_t Step = sizeof(std::uint64_t);
+    using namespace EightBytes;
     std::uint64_t hash = name.size() ^ HashSeed();
-    for (; name.size() > 2 * Step; name.remove_prefix(Step)) {
-        hash = MixEight(hash, fold(EightBytes::Load(name.data())));
+    for (; name.size() > 2 * Count; name.remove_prefix(Count)) {
+        hash = MixEight(hash, fold(Load(name.data())));
     }
     return MixTwoEights(hash, name, fold);
 }

@@ -5,7 +5,7 @@
 namespace Orn_Hdl {
 
 std::size_t PackedLists::SplitUsualLine(std::string_view text, StringArray& list) noexcept {
-    constexpr std::size_t Step = sizeof(std::uint64_t);
+    constexpr std::size_t Step = EightBytes::Count;
     list.text_.clear();
     list.slots_.clear();
     if (text.size() < Step) {

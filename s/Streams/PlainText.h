@@ -26,8 +26,8 @@ inline bool CopyEight(const char* from, char* to) noexcept {
 /// search and a call of `memcpy`.
 /// \return false, the text copied in part, if there is a control character in it.
 inline bool Copy(std::string_view text, char* to) noexcept {
-    constexpr std::size_t Half = sizeof(std::uint32_t);
-    constexpr std::size_t Word = sizeof(std::uint64_t);
+    constexpr std::size_t Word = EightBytes::Count;
+    constexpr std::size_t Half = Word / 2;
     const char* const from = text.data();
     const std::size_t size = text.size();
     if (size <= 1) {
